@@ -1,0 +1,138 @@
+#pragma once
+
+#include <algorithm>
+#include <cassert>
+#include <cstddef>
+#include <iterator>
+#include <vector>
+
+// A sequence with access by position in O(log blocks), and insertion and removal anywhere without moving the
+// whole sequence: it is kept in blocks of at most kBlockLimit items. With a million items an insertion moves
+// some 8 KiB.
+template <typename T>
+class BlockedList {
+ public:
+    class const_iterator {
+     public:
+        using iterator_category = std::forward_iterator_tag;
+        using value_type = T;
+        using difference_type = std::ptrdiff_t;
+        using pointer = const T*;
+        using reference = const T&;
+
+        const_iterator() = default;
+        const_iterator(const BlockedList* list, std::size_t block, std::size_t offset)
+            : list_(list), block_(block), offset_(offset) {}
+        reference operator*() const { return list_->blocks_[block_][offset_]; }
+        pointer operator->() const { return &**this; }
+        const_iterator& operator++() {
+            if (++offset_ == list_->blocks_[block_].size()) {
+                ++block_;
+                offset_ = 0;
+            }
+            return *this;
+        }
+        const_iterator operator++(int) {
+            auto before = *this;
+            ++*this;
+            return before;
+        }
+        bool operator==(const const_iterator& other) const = default;
+
+     private:
+        const BlockedList* list_ = nullptr;
+        std::size_t block_ = 0;
+        std::size_t offset_ = 0;
+    };
+
+    std::size_t size() const { return size_; }
+    bool empty() const { return size_ == 0; }
+    const_iterator begin() const { return {this, 0, 0}; }
+    const_iterator end() const { return {this, blocks_.size(), 0}; }
+
+    const T& operator[](std::size_t index) const {
+        const auto block = BlockOf(index);
+        return blocks_[block][index - starts_[block]];
+    }
+    T& operator[](std::size_t index) {
+        const auto block = BlockOf(index);
+        return blocks_[block][index - starts_[block]];
+    }
+
+    void clear() {
+        blocks_.clear();
+        starts_.clear();
+        size_ = 0;
+    }
+
+    void append(T item) { insert(size_, std::move(item)); }
+
+    // Before the item at `index`; `index` may be size().
+    void insert(std::size_t index, T item) {
+        assert(index <= size_);
+        if (blocks_.empty()) {
+            blocks_.emplace_back();
+            starts_.push_back(0);
+        }
+        const auto block = index == size_ ? blocks_.size() - 1 : BlockOf(index);
+        auto& items = blocks_[block];
+        items.insert(items.begin() + static_cast<std::ptrdiff_t>(index - starts_[block]), std::move(item));
+        ++size_;
+        for (std::size_t later = block + 1; later < starts_.size(); ++later)
+            ++starts_[later];
+        if (items.size() >= kBlockLimit) Split(block);
+    }
+
+    void removeAt(std::size_t index) {
+        assert(index < size_);
+        const auto block = BlockOf(index);
+        auto& items = blocks_[block];
+        items.erase(items.begin() + static_cast<std::ptrdiff_t>(index - starts_[block]));
+        --size_;
+        for (std::size_t later = block + 1; later < starts_.size(); ++later)
+            --starts_[later];
+        if (items.empty()) {
+            blocks_.erase(blocks_.begin() + static_cast<std::ptrdiff_t>(block));
+            starts_.erase(starts_.begin() + static_cast<std::ptrdiff_t>(block));
+        }
+    }
+
+    // Replaces the contents.
+    void assign(std::vector<T> items) {
+        clear();
+        for (std::size_t from = 0; from < items.size(); from += kBlockLimit / 2) {
+            const auto to = std::min(items.size(), from + kBlockLimit / 2);
+            starts_.push_back(from);
+            blocks_.emplace_back(std::make_move_iterator(items.begin() + static_cast<std::ptrdiff_t>(from)),
+                                 std::make_move_iterator(items.begin() + static_cast<std::ptrdiff_t>(to)));
+        }
+        size_ = items.size();
+    }
+
+ private:
+    static constexpr std::size_t kBlockLimit = 2048;
+
+    std::size_t BlockOf(std::size_t index) const {
+        assert(index < size_);
+        const auto next = std::upper_bound(starts_.begin(), starts_.end(), index);
+        return static_cast<std::size_t>(next - starts_.begin()) - 1;
+    }
+
+    void Split(std::size_t block) {
+        // Appending (reading a file, adding at the end) leaves full blocks behind; elsewhere both halves get
+        // room.
+        const bool last = block + 1 == blocks_.size();
+        const auto keep = last ? kBlockLimit - 1 : kBlockLimit / 2;
+        auto& items = blocks_[block];
+        const auto cut = items.begin() + static_cast<std::ptrdiff_t>(keep);
+        std::vector<T> tail(std::make_move_iterator(cut), std::make_move_iterator(items.end()));
+        items.erase(cut, items.end());
+        const auto start = starts_[block] + keep;
+        blocks_.insert(blocks_.begin() + static_cast<std::ptrdiff_t>(block) + 1, std::move(tail));
+        starts_.insert(starts_.begin() + static_cast<std::ptrdiff_t>(block) + 1, start);
+    }
+
+    std::vector<std::vector<T>> blocks_;
+    std::vector<std::size_t> starts_;  // position of each block's first item
+    std::size_t size_ = 0;
+};

@@ -1,0 +1,43 @@
+#pragma once
+
+#include <QString>
+#include <QStringList>
+
+#include "MusicManagment/database/MusicManagment.h"
+
+// How songs enter the collection.
+
+// What came of the files of one intake.
+struct IntakeResult {
+    int Added = 0;
+    int Known = 0;  // already in the collection
+    int Banned = 0;
+    int Unreadable = 0;           // files and folders that could not be read or are not what their name says
+    bool Stopped = false;         // the user asked to stop; what was taken in stays
+    QStringList NewFiles;         // in the order in which they were taken in
+    QStringList UnreadableNames;  // each with the reason
+};
+
+// ".mp3;.mp2;.wma;.wav;": the extensions that make a file a song.
+QString AcceptedExtensions();
+bool IsSongFile(const QString& path);
+
+// Lets the user pick files (unless some are given), adds them and reports. Throws EMusicDatabaseException
+// while another long operation runs.
+IntakeResult AddSongsFromDialog(TMusicDatabase& database, const QStringList& files = {});
+// The same for a folder; without one the user picks it.
+IntakeResult AddFolder(TMusicDatabase& database, const QString& folder, bool withSubfolders);
+// Files and folders together, as a drop or a command line gives them: one run and one result, without the
+// report.
+IntakeResult AddPaths(TMusicDatabase& database, const QStringList& paths, bool withSubfolders);
+
+// Adds every file of `list` inside a run that is already going; afterwards `list` holds only those taken in.
+// With `checkExisting` files that are in the collection are passed over. Returns how many were taken in.
+int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
+                QStringList* newNames = nullptr, IntakeResult* result = nullptr);
+// Adds one file; -1 when it does not exist or could not be taken in.
+SongIndex AddSongFile(TMusicDatabase& database, const QString& path, const SongOverrides& overrides = {});
+
+// The message of the report, and the text of its details.
+QString IntakeMessage(const IntakeResult& result);
+QString IntakeDetails(const IntakeResult& result);

@@ -1,0 +1,283 @@
+#pragma once
+
+#include <QObject>
+#include <QPointer>
+#include <QString>
+#include <QStringList>
+#include <QTimer>
+#include <functional>
+#include <memory>
+#include <optional>
+
+#include "CommonRUKTools/Errors.h"
+#include "MusicManagment/database/GroupLists.h"
+#include "MusicManagment/database/Progress.h"
+#include "MusicManagment/database/SongList.h"
+#include "MusicManagment/database/SongTypes.h"
+#include "MusicManagment/database/Sorting.h"
+#include "ReadMPEGHeader/AudioFile.h"
+
+class OverviewView;
+class SongListView;
+class TMusicDatabase;
+
+class EMusicDatabaseException : public ERukException {
+ public:
+    using ERukException::ERukException;
+};
+
+using TNotifyEvent = std::function<void(TMusicDatabase&)>;
+using TChangeEvent = std::function<void(TMusicDatabase&, SongIndex index, TChangeType change)>;
+using TProgressEvent = std::function<void(TMusicDatabase&, const ProgressPoint&)>;
+
+// How an entry is added.
+struct AddOptions {
+    bool CountOnly = false;  // only count it in the summary lists
+    bool SkipChecks =
+        false;  // no look at disk and ban list, no counting, no event: reading a file that has its lists
+    bool KeepModified = false;  // do not mark the database modified
+};
+
+// Values that replace what was read from an audio file; absent keeps what was read.
+struct SongOverrides {
+    std::optional<quint16> Length{};
+    std::optional<quint8> MainGenre{};
+    std::optional<quint32> Flags{};
+    std::optional<double> AddTime{};
+    std::optional<quint32> PlayCount{};
+    std::optional<quint16> Reserved{};
+};
+
+struct CdName {
+    QString Name;
+    quint32 Serial = 0;  // volume serial number
+};
+
+// The collection: song entries in one sort order, the lists that count them, the settings of the collection.
+// Single-threaded. What a capability does with the songs (file format, intake, sorting) lies beside this
+// class.
+class TMusicDatabase : public QObject {
+ public:
+    explicit TMusicDatabase(QObject* parent = nullptr);
+    ~TMusicDatabase() override;
+
+    // --- Songs, in the current sort order ---
+    int Count() const { return static_cast<int>(songs_.Count()); }
+    const TID3Tag& Song(SongIndex index) const { return songs_.At(index); }
+    const SongList& Songs() const { return songs_; }
+    // -1 when no song has this path.
+    SongIndex IndexOf(const QString& fileName) const;
+    bool Contains(const QString& fileName) const { return songs_.Find(fileName) != nullptr; }
+    // A copy of the entry at `index`, or with index -1 of the one with this path; a path that is not in the
+    // collection is filled from the file itself. Throws EMusicDatabaseException for an index out of range.
+    TID3Tag GetEntry(SongIndex index, const QString& fileName = QString()) const;
+    // Throws EMusicDatabaseException when no song has this path.
+    SongIndex RequireIndexOf(const QString& fileName) const;
+
+    // Adds an entry, its path first taken from `fileName`. Returns its place, or -1 when it was only counted
+    // or refused (database busy or read-only, file missing, song banned).
+    SongIndex AddEntry(const QString& fileName, TID3Tag record, const AddOptions& options = {});
+    // Reads the file and adds it; -1 when it does not exist or was refused. Throws EStreamError when it
+    // cannot be read.
+    SongIndex AddSong(const QString& path, const SongOverrides& overrides = {},
+                      const AddOptions& options = {});
+    // Replaces an entry, counts its groups anew and puts it in its place; returns the new place, -1 when
+    // refused.
+    SongIndex UpdateEntry(SongIndex index, TID3Tag record);
+    // Removes an entry from the collection; the file stays. False when refused.
+    bool RemoveEntry(SongIndex index);
+    // Empties the database; does nothing while it is busy.
+    void Clear(bool notify = true, bool keepFileName = false);
+    bool IsBanned(const TID3Tag& record) const;
+
+    // --- Files (DatabaseFile.cpp) ---
+    // Writes to `fileName`, or the current one, or asks. False when the user cancelled or stopped the run.
+    // Throws EMusicDatabaseException or EStreamError; the old file is then as it was.
+    bool SaveDatabase(const QString& fileName = QString(), bool keepName = false, bool askForName = false);
+    // Reads a database, an empty name clears. False when the user stopped the run; the songs read so far are
+    // kept. Throws EMusicDatabaseException or EStreamError; the songs read before the error are kept.
+    bool OpenDatabase(const QString& fileName, bool keepName = false);
+    // Asks for the file first; false also when the user cancelled.
+    bool OpenDatabaseFromDialog();
+
+    // --- Summary lists: caption and number of songs of each row ---
+    const GroupLists& Groups() const { return groups_; }
+    GroupLists& EditGroups() { return groups_; }  // for the reader of database files
+    const SortedTextList& Artists() const { return groups_.Artists(); }
+    const SortedTextList& Albums() const { return groups_.Albums(); }
+    const SortedTextList& Years() const { return groups_.Years(); }
+    const SortedTextList& Lengths() const { return groups_.Lengths(); }
+    const GenreCounts& Genres() const { return groups_.Genres(); }
+    // Counts everything anew from the songs and raises OnOverviewChanged.
+    void RecountGroups();
+
+    // --- Properties ---
+    const QString& FileName() const { return fileName_; }
+    void SetFileName(const QString& fileName) { fileName_ = fileName; }
+    int AutoSave() const { return autoSave_; }
+    // Milliseconds; 0 and -1 stop the timed saving, -1 saves after every command. Throws
+    // EMusicDatabaseException below -1.
+    void SetAutoSave(int interval);
+    bool Modified() const { return modified_; }
+    void SetModified(bool modified);
+    const QStringList& UpdateFolders() const { return updateFolders_; }
+    void SetUpdateFolders(const QStringList& folders) { updateFolders_ = folders; }
+    SortedTextList& BannList() { return bannList_; }
+    const SortedTextList& BannList() const { return bannList_; }
+    const QString& Caption() const { return caption_; }
+    int Compression() const { return compression_; }
+    // zlib level: 0 none, 1 fastest, -1 default, 9 best. Other values are refused with
+    // EMusicDatabaseException.
+    void SetCompression(int level);
+    bool Asynchronous() const { return asynchronous_; }
+    void SetAsynchronous(bool value) { asynchronous_ = value; }
+    bool AutoDelBannedFiles() const { return autoDelBannedFiles_; }
+    void SetAutoDelBannedFiles(bool value) { autoDelBannedFiles_ = value; }
+    TSortType SortType() const { return order_.SortType; }
+    TSubSortType SubSortType() const { return order_.SubSortType; }
+    bool SortBackwards() const { return order_.Backwards; }
+    // Each sorts the list anew when the value changes. Throw EMusicDatabaseException while the database is
+    // busy.
+    void SetSortType(TSortType type);
+    void SetSubSortType(TSubSortType type);
+    void SetSortBackwards(bool backwards);
+    bool FollowFocus() const { return followFocus_; }
+    void SetFollowFocus(bool value) { followFocus_ = value; }
+    bool MoveMP3sAfterGenreChange() const { return moveMP3sAfterGenreChange_; }
+    void SetMoveMP3sAfterGenreChange(bool value) { moveMP3sAfterGenreChange_ = value; }
+    const QString& MP3MoveRootDir() const { return mp3MoveRootDir_; }
+    void SetMP3MoveRootDir(const QString& folder);  // stored with a trailing separator
+    const QStringList& MP3MoveSubDirs() const { return mp3MoveSubDirs_; }
+    void SetMP3MoveSubDirs(QStringList names);  // stored as exactly 20 names without trailing separators
+    const QString& MP3NamePattern() const { return mp3NamePattern_; }
+    void SetMP3NamePattern(const QString& pattern) { mp3NamePattern_ = pattern; }
+    const std::vector<CdName>& CDNames() const { return cdNames_; }
+    void SetCDNames(
+        std::vector<CdName> names);  // sorted by name; of one serial the last stays, serial 0 is dropped
+    bool UseWinAmpForLenCheck() const { return useWinAmpForLenCheck_; }
+    void SetUseWinAmpForLenCheck(bool value) { useWinAmpForLenCheck_ = value; }
+    bool ReadOnly() const { return readOnly_; }
+    void SetReadOnly(bool value) { readOnly_ = value; }
+    bool RenameAndMoveMP3s() const { return renameAndMoveMP3s_; }
+    void SetRenameAndMoveMP3s(bool value) { renameAndMoveMP3s_ = value; }
+    // Whether files are read with the modern profile; off in a new component, switched on by the programs.
+    bool ModernTags() const { return modernTags_; }
+    void SetModernTags(bool value) { modernTags_ = value; }
+
+    // Linked components; each reference clears itself when the other goes.
+    QObject* PlayList() const { return playList_; }
+    void SetPlayList(QObject* component) { playList_ = component; }
+    QObject* PlaySound() const { return playSound_; }
+    void SetPlaySound(QObject* component) { playSound_ = component; }
+    QObject* RemoteControl() const { return remoteControl_; }
+    void SetRemoteControl(QObject* component) { remoteControl_ = component; }
+
+    // The linked views, told after the events; the view clears the link before it goes.
+    void SetSongListView(SongListView* view) { songListView_ = view; }
+    void SetOverviewView(OverviewView* view);
+
+    // --- Long operations ---
+    // Shows a message and throws EAbort when a run is going. Prefer the ProgressRun object of Progress.h.
+    void StartProgress(const QString& description, bool lockMenu);
+    // Raises OnProgress, lets the interface work when Asynchronous; true when the user asked to stop.
+    bool Progress(const ProgressPoint& point, bool resetAbort = false, bool report = true);
+    void EndProgress(bool unlockMenu);
+    void ResetProgress();
+    void RequestAbort() { abortRequested_ = true; }
+    bool ProgressRunning() const { return progressRunning_; }
+    bool MenuLocked() const { return menuLocked_; }
+    const ProgressPoint& LastProgress() const { return lastProgress_; }
+    int MainPercent() const { return mainPercent_; }  // -1 unknown
+    int SubPercent() const { return subPercent_; }
+
+    // While above 0 the song list must not change.
+    bool Busy() const { return busy_ > 0; }
+    void BeginBusy() { ++busy_; }
+    void EndBusy() { --busy_; }
+    // While above 0 added songs keep the order of the file and views are not told of each.
+    bool Loading() const { return loading_ > 0; }
+    void BeginLoading() { ++loading_; }
+    void EndLoading() { --loading_; }
+
+    // What the automatic save does at each tick of its timer.
+    void AutoSaveTick();
+    bool AutoSaveTimerActive() const { return autoSaveTimer_ && autoSaveTimer_->isActive(); }
+    // Saves at once when AutoSave is -1; called at the end of every command that changes songs.
+    void SaveAfterCommand();
+
+    // How this database reads audio files.
+    ReadOptions AudioReadOptions() const;
+
+    // --- Events ---
+    TNotifyEvent OnModifiedChange;
+    TChangeEvent OnChange;
+    TNotifyEvent OnClear;
+    std::function<void(TMusicDatabase&, int count)> OnPrepareMultiAdd;
+    TNotifyEvent OnOverviewChanged;
+    std::function<void(TMusicDatabase&, TOVType, int index, const QString& caption, int count)>
+        OnOverviewInsert;
+    std::function<void(TMusicDatabase&, TOVType, int index)> OnOverviewDelete;
+    std::function<void(TMusicDatabase&, TOVType, int index, int count)> OnOverviewUpdate;
+    TNotifyEvent OnStartProgress;
+    TProgressEvent OnProgress;
+    TNotifyEvent OnResetProgress;
+    TNotifyEvent OnEndProgress;
+    TNotifyEvent OnCaptionChanged;
+
+    // Raising events whose cause lies in a capability beside this class.
+    void RaiseChange(SongIndex index, TChangeType change);
+    void RaisePrepareMultiAdd(int count);
+    void RaiseOverviewChanged();
+
+ private:
+    class GroupEvents;
+
+    void SetCaption(const QString& caption);
+    bool Accepts(const TID3Tag& record);
+    void RaiseClear();
+    void Resort(const SongOrder& order);
+    SongOrder CurrentOrder() const;
+    SongIndex Replace(SongIndex index);
+
+    SongList songs_;
+    GroupLists groups_;
+    std::unique_ptr<GroupEvents> groupEvents_;
+    SongOrder order_;
+    bool knownSorted_ = true;  // false after reading a file, until the order has been looked at
+
+    QString fileName_;
+    QString caption_;
+    QStringList updateFolders_;
+    SortedTextList bannList_;
+    std::vector<CdName> cdNames_;
+    QString mp3MoveRootDir_;
+    QStringList mp3MoveSubDirs_;
+    QString mp3NamePattern_;
+    int autoSave_ = 0;
+    int compression_ = 1;
+    bool modified_ = false;
+    bool asynchronous_ = true;
+    bool autoDelBannedFiles_ = false;
+    bool followFocus_ = true;
+    bool moveMP3sAfterGenreChange_ = false;
+    bool useWinAmpForLenCheck_ = false;
+    bool readOnly_ = false;
+    bool renameAndMoveMP3s_ = true;
+    bool modernTags_ = false;
+
+    QPointer<QObject> playList_;
+    QPointer<QObject> playSound_;
+    QPointer<QObject> remoteControl_;
+    SongListView* songListView_ = nullptr;
+    OverviewView* overviewView_ = nullptr;
+    std::unique_ptr<QTimer> autoSaveTimer_;
+
+    ProgressPoint lastProgress_;
+    int mainPercent_ = -1;
+    int subPercent_ = -1;
+    bool progressRunning_ = false;
+    bool abortRequested_ = false;
+    bool menuLocked_ = false;
+    int busy_ = 0;
+    int loading_ = 0;
+};

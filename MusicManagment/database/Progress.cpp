@@ -1,0 +1,1 @@
+#include "MusicManagment/database/Progress.h"

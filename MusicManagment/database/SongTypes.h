@@ -1,0 +1,62 @@
+#pragma once
+
+#include <QString>
+#include <QStringList>
+#include <QtGlobal>
+
+// Position of a song in the list, 0 to count - 1; -1 none, or all songs where an event says so.
+using SongIndex = int;
+
+enum TSortType {
+    stTitle,
+    stArtist,
+    stAlbum,
+    stComment,
+    stYear,
+    stLength,
+    stGenre,
+    stPath,
+    stPlayCnt,
+    stAddTime,
+    stFlags,
+    stCacheType,
+};
+
+// What decides between songs that are equal under the sort type.
+enum TSubSortType {
+    sstGATL,  // genre, artist, title, length
+    sstATL,   // artist, title, length
+    sstPath,
+};
+
+enum TOVType { ovArtist, ovAlbum, ovYear, ovLength, ovGenre };
+inline constexpr int kOverviewTypeCount = 5;
+
+enum TChangeType { ctChanged = 0, ctInserted = 1, ctRemoved = 2 };
+
+// Headings of progress runs. The numbers are part of the interface to the views.
+enum TProgressType {
+    ptOther = 0,
+    ptLoadDatabase = 3,
+    ptSaveDatabase = 4,
+    ptSearchFolders = 5,
+    ptAddSongs = 6,
+    ptReadBackupCd = 7,
+    ptCopySongs = 8,
+};
+
+// Bits of TID3Tag::Flags.
+enum TSongFlag : quint32 { sfBurned = 1, sfDamaged = 2, sfLengthCorrect = 4, sfRemixed = 8 };
+
+// "Auf CD gebrannt, Remixed"; "(keine)" when no bit is set.
+QString FormatSongFlags(quint32 flags);
+// The names offered where flags are set or cleared, in bit order.
+QStringList SongFlagNames();
+
+// Default names of the genre folders, one for each main genre.
+QStringList DefaultGenreFolderNames();
+
+// A path on a catalogued CD: ':' + 8 hexadecimal digits + ':' + path.
+inline bool IsCdPath(const QString& path) {
+    return path.startsWith(u':');
+}

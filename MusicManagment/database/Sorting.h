@@ -1,0 +1,29 @@
+#pragma once
+
+#include <QHash>
+#include <vector>
+
+#include "MusicManagment/database/SongList.h"
+#include "MusicManagment/database/SongTypes.h"
+
+// An order of songs.
+struct SongOrder {
+    TSortType SortType = stGenre;
+    TSubSortType SubSortType = sstGATL;
+    bool Backwards = false;
+    quint32 ShownFlag = 0;  // with stFlags: the only bit that counts; 0 compares the whole flags
+
+    bool operator==(const SongOrder&) const = default;
+};
+
+// Below, equal or above 0, as `a` comes before, beside or after `b`.
+int CompareSongs(const SongOrder& order, const TID3Tag& a, const TID3Tag& b);
+
+// Sorts all entries. Songs that are equal in every key keep their relative position.
+void SortSongs(const SongOrder& order, std::vector<SongList::Entry>& entries);
+bool IsSorted(const SongOrder& order, const SongList& songs);
+
+// Where the entry at `index` belongs, counted before it is taken out: `index` itself when it stays, else the
+// position before which it is to stand. `sorted` says that the other entries are in order, which allows a
+// binary search; the result is that of the walk in either case.
+SongIndex TargetPosition(const SongOrder& order, const SongList& songs, SongIndex index, bool sorted);

@@ -1,0 +1,1 @@
+#include "ReadMPEGHeader/AudioFile.h"

@@ -1,0 +1,24 @@
+#pragma once
+
+#include <QString>
+
+#include "ReadMPEGHeader/ID3Tag.h"
+
+// Texts in which the fields of a record are shown.
+
+// "45 s", "3:05", "1:00:00"; with `alwaysClock` "0:45". Seconds, not negative.
+QString FormatLength(int seconds, bool alwaysClock);
+QString FormatBitRate(int kbits);
+QString FormatSampleRate(int hertz);
+QString FormatChannelMode(int mode);
+QString FormatEmphasis(int emphasis);
+// "Private, Original"; empty when no bit is set.
+QString FormatHeaderFlags(const TID3Tag& tag);
+// For containers that count channels (WAV, WMA).
+QString FormatChannelCount(int count);
+
+// Exactly four characters, each a digit or a capital letter A to Z.
+bool IsValidYearText(const QString& text);
+// The year that a text means: two digits below 21 are in this century, 21 to 98 in the last; 0 when no
+// number. 99 stays 99: the bound is exclusive on purpose.
+int ExpandYear(const QString& text);

@@ -1,0 +1,78 @@
+#include "ReadMPEGHeader/ID3Tag.h"
+
+#include <QFileInfo>
+#include <array>
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+struct FileType {
+    QStringView Extension;
+    QStringView Description;
+};
+
+constexpr std::array<FileType, 8> kFileTypes = {{
+    {u".wav", u"Wave"},
+    {u".wma", u"Windows Media Audio"},
+    {u".voc", u"VOC Soundfile"},
+    {u".avi", u"Video (AVI)"},
+    {u".mpg", u"Video (MPG)"},
+    {u".mpeg", u"Video (MPG)"},
+    {u".mid", u"Midi Soundfile"},
+    {u".mod", u"MOD Soundfile"},
+}};
+
+void CopyTags(TID3Tag& target, const TID3Tag& source) {
+    if (target.FileName.isEmpty()) target.FileName = source.FileName;
+    target.Title = source.Title;
+    target.Artist = source.Artist;
+    target.Album = source.Album;
+    target.Year = source.Year;
+    target.Comment = source.Comment;
+    target.Genre = source.Genre;
+    target.Track = source.Track;
+}
+
+void FillEmpty(TID3Tag& target, const TID3Tag& source) {
+    if (target.MPEGLayer.isEmpty()) target.MPEGLayer = source.MPEGLayer;
+    if (target.Length == 0) target.Length = source.Length;
+    if (target.PlayCount == 0) target.PlayCount = source.PlayCount;
+}
+
+// Every field that the tags do not already cover; the track among them.
+void CopyTechnical(TID3Tag& target, const TID3Tag& source) {
+    TID3Tag merged = source;
+    merged.FileName = target.FileName;
+    merged.Title = target.Title;
+    merged.Artist = target.Artist;
+    merged.Album = target.Album;
+    merged.Year = target.Year;
+    merged.Comment = target.Comment;
+    merged.Genre = target.Genre;
+    target = merged;
+}
+
+}  // namespace
+
+void ResetTag(bool keep, TID3Tag& tag, double fileTime) {
+    tag = TID3Tag();
+    if (keep) return;
+    tag.Year = u"0000"_s;
+    tag.MPEGLayer = u"MPEG ??? Layer ???"_s;
+    tag.AddTime = fileTime;
+}
+
+void MergeTag(TID3Tag& target, const TID3Tag& source, MergeMode mode) {
+    CopyTags(target, source);
+    if (mode == MergeMode::FillEmpty) FillEmpty(target, source);
+    if (mode == MergeMode::Technical) CopyTechnical(target, source);
+}
+
+void DescribeByExtension(const QString& path, TID3Tag& tag) {
+    const qsizetype dot = path.lastIndexOf(u'.');
+    if (dot < 0) return;
+    const QString extension = path.mid(dot).toLower();
+    for (const auto& type : kFileTypes)
+        if (extension == type.Extension) tag.MPEGLayer = type.Description.toString();
+}

@@ -1,0 +1,1 @@
+#include "ReadMPEGHeader/ID3v1.h"

@@ -1,0 +1,24 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+
+#include "CommonRUKTools/FileSource.h"
+#include "ReadMPEGHeader/FrameListener.h"
+#include "ReadMPEGHeader/ID3Tag.h"
+#include "ReadMPEGHeader/XrukFrame.h"
+
+// Reads the ID3v2 tag whose header starts at `position` into a fresh record (https://id3.org/id3v2.3.0, with
+// this program's own reading of it: frames follow the 10-byte header directly, sizes are plain 32-bit numbers
+// in every version, any encoding but 0 is UTF-16 little-endian). `endPosition` becomes the first byte after
+// the tag, also when a frame reaches beyond the file. `xruk`, when given, receives the program's private
+// frame. Returns true when a tag was read. Throws EStreamError when the tag ends beyond the file; `tag` then
+// holds the frames read so far.
+bool ReadID3v2(ByteSource& stream, std::int64_t position, std::int64_t& endPosition, TID3Tag& tag,
+               const FrameListener& listener, std::optional<XrukFrame>* xruk = nullptr);
+
+// The same for the layouts of ID3v2.2, 2.3 and 2.4 as their standards describe them: frame sizes of each
+// version, extended header, unsynchronisation, compressed frames, encodings 0 to 3, "TDRC" as year, genre by
+// number or name. Encrypted frames and frames of later versions only go to the listener.
+bool ReadID3v2Modern(ByteSource& stream, std::int64_t position, std::int64_t& endPosition, TID3Tag& tag,
+                     const FrameListener& listener, std::optional<XrukFrame>* xruk = nullptr);

@@ -1,0 +1,15 @@
+#pragma once
+
+#include <QString>
+#include <QtGlobal>
+
+// What the last MPEG analysis found beside the record; reset by every call of ReadAudioFile.
+struct MpegResults {
+    qint32 FrameSize = -1;  // bytes
+    qint32 FrameCount = -1;
+    int VbrMarker = -1;  // a byte of the VBR header; 0 when there is none
+    QString VbrName;     // "Xing", "FhG (VBRI)" or empty
+};
+
+// Process-wide: valid until the next call of ReadAudioFile.
+const MpegResults& LastMpegResults();

@@ -1,0 +1,1 @@
+#include "ReadMPEGHeader/XrukFrame.h"

@@ -1,0 +1,33 @@
+# Warnings for our own code, ccache where it is installed, and one precompiled Qt Core header for the engine.
+
+find_program(TUNESTEAD_CCACHE ccache)
+if(TUNESTEAD_CCACHE)
+  # Without these ccache refuses every source that uses a precompiled header.
+  set(CMAKE_CXX_COMPILER_LAUNCHER ${CMAKE_COMMAND} -E env
+    CCACHE_SLOPPINESS=pch_defines,time_macros,include_file_mtime,include_file_ctime ${TUNESTEAD_CCACHE})
+endif()
+
+if(CMAKE_CXX_COMPILER_ID MATCHES "GNU|Clang")
+  add_compile_options(-Wall -Wextra -Wpedantic -Wconversion -Wshadow -Wnon-virtual-dtor -Woverloaded-virtual -Werror)
+  if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
+    # ccache can only reuse a precompiled header that is the same each time it is built.
+    add_compile_options(-fpch-deps -fpch-preprocess)
+  endif()
+endif()
+add_compile_definitions(QT_NO_CAST_FROM_ASCII QT_NO_CAST_TO_ASCII QT_NO_KEYWORDS QT_NO_FOREACH)
+
+# A static library of the engine: sources beside the calling list file, includes from the project's root.
+function(tunestead_library name)
+  add_library(${name} STATIC ${ARGN})
+  target_include_directories(${name} PUBLIC ${PROJECT_SOURCE_DIR})
+  tunestead_precompile(${name})
+endfunction()
+
+# The engine's libraries share the precompiled header of the first of them.
+function(tunestead_precompile target)
+  if(target STREQUAL CommonRUKTools)
+    target_precompile_headers(${target} PRIVATE ${PROJECT_SOURCE_DIR}/cmake/EnginePrecompiled.h)
+  else()
+    target_precompile_headers(${target} REUSE_FROM CommonRUKTools)
+  endif()
+endfunction()
