@@ -258,7 +258,7 @@ void SortRun(const SongOrder& order, Entries entries, std::span<SortItem> run, s
         return result != 0 ? sign * result < 0 : a.Index < b.Index;
     });
     for (const Last& item : last)
-        result.push_back(item.Index);
+        places.push_back(item.Index);
 }
 
 // The old places of the entries, in their new order.
