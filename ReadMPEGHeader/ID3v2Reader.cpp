@@ -1,1 +1,56 @@
 #include "ReadMPEGHeader/ID3v2Reader.h"
+
+#include <string>
+
+#include "CommonRUKTools/Errors.h"
+#include "ReadMPEGHeader/ID3v2Frames.h"
+#include "ReadMPEGHeader/ID3v2Header.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+constexpr std::size_t kFrameHeaderSize = 10;
+
+bool IsPadding(std::string_view id) {
+    return id == std::string_view("\0\0\0\0", 4);
+}
+
+// Hands over the frames between `position` and `end`.
+void WalkFrames(ByteSource& stream, std::int64_t position, std::int64_t end, ID3v2Frames& frames) {
+    while (end - position >= static_cast<std::int64_t>(kFrameHeaderSize)) {
+        const auto header = stream.ReadExactly(position, kFrameHeaderSize);
+        position += kFrameHeaderSize;
+        ByteReader reader(header);
+        const std::string_view id = AsText(reader.Take(4));
+        const std::int64_t size = reader.U32Be();
+        if (IsPadding(id)) return;
+        if (size > end - position) throw EStreamError(u"Ein Frame reicht über das Ende des Tags hinaus"_s);
+        if (frames.NeedsBody(id)) {
+            const auto body = stream.ReadExactly(position, static_cast<std::size_t>(size));
+            frames.Take(id, QString::fromLatin1(id.data(), 4), body);
+        }
+        position += size;
+    }
+}
+
+}  // namespace
+
+bool ReadID3v2(ByteSource& stream, std::int64_t position, std::int64_t& endPosition, TID3Tag& tag,
+               const FrameListener& listener, std::optional<XrukFrame>* xruk) {
+    ResetTag(true, tag, 0);
+    const auto header = ID3v2Header::Read(stream, position);
+    if (!header) return false;
+    const std::int64_t firstFrame = position + static_cast<std::int64_t>(kId3v2HeaderSize);
+    endPosition = firstFrame + header->Size;
+    ID3v2Frames frames(TextRules::Classic, tag, listener, xruk);
+    try {
+        WalkFrames(stream, firstFrame, endPosition, frames);
+    } catch (const EStreamError&) {
+        frames.Finish();
+        throw;
+    }
+    frames.Finish();
+    if (endPosition > stream.Size()) throw EStreamError(u"Unerwartetes Ende der Datei"_s);
+    return true;
+}

@@ -1,0 +1,1 @@
+#include "ReadMPEGHeader/ID3v2Reader.h"
