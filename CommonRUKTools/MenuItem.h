@@ -1,0 +1,57 @@
+#pragma once
+
+#include <QString>
+#include <QtGlobal>
+#include <functional>
+#include <memory>
+#include <vector>
+
+// A menu without a toolkit: a tree of captioned items that components build and the shell shows.
+class TMenuExItem {
+ public:
+    enum class ItemKind { Submenu, Command, Separator, Radio };
+
+    TMenuExItem(ItemKind kind, QString caption, int id = 0, QString shortcut = QString())
+        : kind_(kind), caption_(std::move(caption)), id_(id), shortcut_(std::move(shortcut)) {}
+
+    ItemKind Kind() const { return kind_; }
+    const QString& Caption() const { return caption_; }
+    // Number of the command; 0 for separators and submenus without one.
+    int Id() const { return id_; }
+    // As "Ctrl+Alt+N"; empty for none.
+    const QString& Shortcut() const { return shortcut_; }
+
+    bool Enabled() const { return enabled_; }
+    void SetEnabled(bool enabled) { enabled_ = enabled; }
+    // Why the item is disabled or what it does; empty for none.
+    const QString& Hint() const { return hint_; }
+    void SetHint(const QString& hint) { hint_ = hint; }
+    // For radio items, and for commands that switch something on and off.
+    bool Checkable() const { return kind_ == ItemKind::Radio || checkable_; }
+    void SetCheckable(bool checkable) { checkable_ = checkable; }
+    bool Checked() const { return checked_; }
+    void SetChecked(bool checked) { checked_ = checked; }
+    // Shown bold, run by a double click.
+    bool IsDefault() const { return isDefault_; }
+    void SetDefault(bool isDefault) { isDefault_ = isDefault; }
+
+    const std::vector<std::unique_ptr<TMenuExItem>>& Items() const { return items_; }
+    TMenuExItem& Add(ItemKind kind, const QString& caption, int id = 0, const QString& shortcut = QString()) {
+        items_.push_back(std::make_unique<TMenuExItem>(kind, caption, id, shortcut));
+        return *items_.back();
+    }
+    // The item with this number in this tree; nullptr when there is none.
+    TMenuExItem* Find(int id);
+
+ private:
+    ItemKind kind_;
+    QString caption_;
+    int id_;
+    QString shortcut_;
+    QString hint_;
+    bool enabled_ = true;
+    bool checkable_ = false;
+    bool checked_ = false;
+    bool isDefault_ = false;
+    std::vector<std::unique_ptr<TMenuExItem>> items_;
+};
