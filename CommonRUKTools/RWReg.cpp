@@ -19,7 +19,8 @@ const QString kBinary = u"hex:"_s;
 QString GroupOf(const QString& key) {
     QString group = key;
     group.replace(u'\\', u'/');
-    while (group.startsWith(u'/')) group.remove(0, 1);
+    while (group.startsWith(u'/'))
+        group.remove(0, 1);
     return group;
 }
 
@@ -88,7 +89,8 @@ void TRWReg::Delete(const QString& name) {
 }
 
 void TRWReg::DeleteNumbered(const QString& name, int first) {
-    for (int i = first; Exists(name + QString::number(i)); ++i) Delete(name + QString::number(i));
+    for (int i = first; Exists(name + QString::number(i)); ++i)
+        Delete(name + QString::number(i));
 }
 
 void TRWReg::Flush() {

@@ -7,11 +7,13 @@
 
 class QSettings;
 
-// The settings of the program: named values under a hierarchical key, each of which keeps its type (integer, boolean,
-// string, binary). They lie in a text file in the user's configuration folder; the file is only ever replaced whole.
+// The settings of the program: named values under a hierarchical key, each of which keeps its type (integer,
+// boolean, string, binary). They lie in a text file in the user's configuration folder; the file is only ever
+// replaced whole.
 class TRWReg {
  public:
-    // `key` as "\Software\RUK\Tunestead3"; `file` is another place for the values, as tests and portable use need it.
+    // `key` as "\Software\RUK\Tunestead3"; `file` is another place for the values, as tests and portable use
+    // need it.
     explicit TRWReg(const QString& key, const QString& file = DefaultFile());
     // Writes what has changed.
     ~TRWReg();

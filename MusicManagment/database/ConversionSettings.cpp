@@ -17,7 +17,8 @@ void ConversionSettings::Load(const TRWReg& settings) {
     LoadRecord(settings, u"WAVEncoderSettings"_s, Wav);
     LoadRecord(settings, u"MP3EncoderSettings"_s, Mp3);
     LoadRecord(settings, u"WMAEncoderSettings"_s, Wma);
-    if (const auto format = settings.ReadInteger(u"LastMusicFormat"_s)) LastMusicFormat = static_cast<quint8>(*format);
+    if (const auto format = settings.ReadInteger(u"LastMusicFormat"_s))
+        LastMusicFormat = static_cast<quint8>(*format);
 }
 
 void ConversionSettings::Save(TRWReg& settings) const {

@@ -24,7 +24,8 @@ class CollisionPolicy {
         if (policy_ != Existing::Ask) return policy_ == Existing::Replace;
         const int answer = UserDialogs().Ask(
             u"Die Datei "_s + name + u" existiert bereits."_s,
-            {u"Ersetzen"_s, u"Alle ersetzen"_s, u"Überspringen"_s, u"Alle überspringen"_s, u"Abbrechen"_s}, 4);
+            {u"Ersetzen"_s, u"Alle ersetzen"_s, u"Überspringen"_s, u"Alle überspringen"_s, u"Abbrechen"_s},
+            4);
         if (answer == 4) throw EAbort();
         if (answer == 1) policy_ = Existing::Replace;
         if (answer == 3) policy_ = Existing::Skip;
@@ -46,7 +47,8 @@ class Copier {
         const QString target = folder_.filePath(name);
         try {
             FileSource source(path);
-            if (QFileInfo(target) == QFileInfo(path)) throw EStreamError(u"Quelle und Ziel sind dieselbe Datei"_s);
+            if (QFileInfo(target) == QFileInfo(path))
+                throw EStreamError(u"Quelle und Ziel sind dieselbe Datei"_s);
             if (QFileInfo::exists(target) && !collisions_.MayReplace(name)) return true;
             SafeFile file(target);
             if (!CopyBytes(number, name, source, file)) return false;
@@ -87,10 +89,12 @@ class Copier {
 
 CopyResult CopySongs(TMusicDatabase& database, const std::vector<SongIndex>& songs, const QString& folder) {
     QStringList paths;
-    for (const SongIndex index : songs) paths << database.Song(index).FileName;
+    for (const SongIndex index : songs)
+        paths << database.Song(index).FileName;
     const ProgressRun run(database, u"Kopiere die Songs an die Zielorte"_s);
     Copier copier(database, folder, static_cast<int>(paths.size()));
     CopyResult result;
-    for (int i = 0; i < paths.size() && !result.Stopped; ++i) result.Stopped = !copier.Copy(i, paths[i], result);
+    for (int i = 0; i < paths.size() && !result.Stopped; ++i)
+        result.Stopped = !copier.Copy(i, paths[i], result);
     return result;
 }

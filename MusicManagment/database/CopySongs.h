@@ -11,6 +11,6 @@ struct CopyResult {
     bool Stopped = false;
 };
 
-// Copies the files of songs into a folder, with progress. A file of the same name is only replaced when the user says
-// so. A copy that fails or is stopped half-way leaves nothing behind.
+// Copies the files of songs into a folder, with progress. A file of the same name is only replaced when the
+// user says so. A copy that fails or is stopped half-way leaves nothing behind.
 CopyResult CopySongs(TMusicDatabase& database, const std::vector<SongIndex>& songs, const QString& folder);

@@ -36,7 +36,8 @@ constexpr MenuRow kDatabase[] = {
     {kCommand, u"Datenbank speichern unter...", mcSaveAs},
     kLine,
     {kCommand, u"Datenbank updaten (Nur neue oder entfernte Songs suchen)...", mcUpdate, u"Ctrl+U"},
-    {kCommand, u"Datenbank updaten (Auch ID3-Tags auf Änderungen prüfen)...", mcUpdateWithTags, u"Ctrl+Alt+U"},
+    {kCommand, u"Datenbank updaten (Auch ID3-Tags auf Änderungen prüfen)...", mcUpdateWithTags,
+     u"Ctrl+Alt+U"},
     {kCommand, u"Songs zur Datenbank hinzufügen...", mcAddSongs},
     {kCommand, u"Ordner zur Datenbank hinzufügen...", mcAddFolder},
 };
@@ -120,7 +121,8 @@ void AddRows(TMenuExItem& parent, std::span<const MenuRow> rows, bool readOnly) 
     }
 }
 
-void AddSubmenu(TMenuExItem& parent, const QString& caption, int id, std::span<const MenuRow> rows, bool readOnly) {
+void AddSubmenu(TMenuExItem& parent, const QString& caption, int id, std::span<const MenuRow> rows,
+                bool readOnly) {
     AddRows(parent.Add(Kind::Submenu, caption, id), rows, readOnly);
 }
 
@@ -140,7 +142,8 @@ void SetChecked(TMenuExItem& menu, int id, bool checked) {
 
 void EnableAll(TMenuExItem& menu, bool enabled) {
     if (menu.Kind() == Kind::Command || menu.Kind() == Kind::Radio) menu.SetEnabled(enabled);
-    for (const auto& item : menu.Items()) EnableAll(*item, enabled);
+    for (const auto& item : menu.Items())
+        EnableAll(*item, enabled);
 }
 
 // True when the id was one of the kinds that only set a property.
@@ -172,7 +175,8 @@ std::unique_ptr<TMenuExItem> BuildDatabaseMenu(bool readOnly) {
 
 void UpdateDatabaseMenu(TMenuExItem& menu, const TMusicDatabase& database) {
     EnableAll(menu, !database.MenuLocked());
-    for (int id = mcSortFirst; id <= mcSortLast; ++id) SetChecked(menu, id, id - mcSortFirst == database.SortType());
+    for (int id = mcSortFirst; id <= mcSortLast; ++id)
+        SetChecked(menu, id, id - mcSortFirst == database.SortType());
     for (int id = mcSubSortFirst; id <= mcSubSortLast; ++id)
         SetChecked(menu, id, id - mcSubSortFirst == database.SubSortType());
     SetChecked(menu, mcReverse, database.SortBackwards());
@@ -182,16 +186,37 @@ void UpdateDatabaseMenu(TMenuExItem& menu, const TMusicDatabase& database) {
 bool RunDatabaseCommand(TMusicDatabase& database, int id) {
     if (ApplyOrderCommand(database, id)) return true;
     switch (id) {
-        case mcNew: database.OpenDatabase(QString()); return true;
-        case mcOpen: database.OpenDatabaseFromDialog(); return true;
-        case mcSave: database.SaveDatabase(); return true;
-        case mcSaveAs: database.SaveDatabase(QString(), false, true); return true;
-        case mcUpdate: UpdateDatabase(database, UpdateTags::Keep); return true;
-        case mcUpdateWithTags: UpdateDatabase(database, UpdateTags::Reread); return true;
-        case mcAddSongs: AddSongsFromDialog(database); return true;
-        case mcAddFolder: AddFolder(database, QString(), true); return true;
-        case mcSearchNew: SearchNewSongs(database); return true;
-        case mcRecount: database.RecountGroups(); return true;
-        default: return false;
+        case mcNew:
+            database.OpenDatabase(QString());
+            return true;
+        case mcOpen:
+            database.OpenDatabaseFromDialog();
+            return true;
+        case mcSave:
+            database.SaveDatabase();
+            return true;
+        case mcSaveAs:
+            database.SaveDatabase(QString(), false, true);
+            return true;
+        case mcUpdate:
+            UpdateDatabase(database, UpdateTags::Keep);
+            return true;
+        case mcUpdateWithTags:
+            UpdateDatabase(database, UpdateTags::Reread);
+            return true;
+        case mcAddSongs:
+            AddSongsFromDialog(database);
+            return true;
+        case mcAddFolder:
+            AddFolder(database, QString(), true);
+            return true;
+        case mcSearchNew:
+            SearchNewSongs(database);
+            return true;
+        case mcRecount:
+            database.RecountGroups();
+            return true;
+        default:
+            return false;
     }
 }

@@ -44,10 +44,10 @@ enum MenuCommand : int {
 // Builds the command menu of a database; without the items that write when it is read-only.
 std::unique_ptr<TMenuExItem> BuildDatabaseMenu(bool readOnly);
 
-// Sets the marks of the items that show the state of the database, and disables its commands while a run has locked the
-// menu.
+// Sets the marks of the items that show the state of the database, and disables its commands while a run has
+// locked the menu.
 void UpdateDatabaseMenu(TMenuExItem& menu, const TMusicDatabase& database);
 
-// Runs the operation behind a command. False when it is none of the engine's: the shell's, or of a later version.
-// Throws what the operation throws.
+// Runs the operation behind a command. False when it is none of the engine's: the shell's, or of a later
+// version. Throws what the operation throws.
 bool RunDatabaseCommand(TMusicDatabase& database, int id);

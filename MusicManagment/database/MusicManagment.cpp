@@ -8,6 +8,7 @@
 #include "CommonRUKTools/Clock.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/FileSource.h"
+#include "MusicManagment/database/Menu.h"
 #include "MusicManagment/database/RecycleBin.h"
 #include "MusicManagment/database/Views.h"
 
@@ -135,7 +136,8 @@ bool TMusicDatabase::IsBanned(const TID3Tag& record) const {
 }
 
 // The looks at the disk and at the ban list before a song is taken in.
-bool TMusicDatabase::Accepts(const TID3Tag& record) {
+bool TMusicDatabase::Accepts(const TID3Tag& record, const AddOptions& options) {
+    if (options.SkipChecks || options.SkipDiskChecks) return true;
     const QString path = ResolvedPath(record.FileName);
     if (!path.isEmpty() && !FileSource::Exists(path)) return false;
     if (!IsBanned(record)) return true;
@@ -152,7 +154,7 @@ SongIndex TMusicDatabase::AddEntry(const QString& fileName, TID3Tag record, cons
         groups_.Add(record, groupEvents_.get());
         return -1;
     }
-    if (!options.SkipChecks && !Accepts(record)) return -1;
+    if (!Accepts(record, options)) return -1;
 
     if (!options.KeepModified) SetModified(true);
     if (!Loading()) EnsureSorted();
@@ -315,6 +317,28 @@ ReadOptions TMusicDatabase::AudioReadOptions() const {
     for (const QString& name : mp3MoveSubDirs_)
         options.ExcludedArtistFolders << name.toUpper();
     return options;
+}
+
+void TMusicDatabase::SetReadOnly(bool value) {
+    if (value == readOnly_) return;
+    readOnly_ = value;
+    menu_.reset();
+}
+
+// --- Command menu ---
+
+TMenuExItem& TMusicDatabase::Menu() {
+    if (!menu_) menu_ = BuildDatabaseMenu(readOnly_);
+    UpdateDatabaseMenu(*menu_, *this);
+    return *menu_;
+}
+
+bool TMusicDatabase::ClickMenuItem(int id, void* platformItem) {
+    const TMenuExItem* item = Menu().Find(id);
+    if (item == nullptr || !item->Enabled()) return false;
+    bool proceed = true;
+    if (OnMenuItemClicked) OnMenuItemClicked(*this, *item, platformItem, id, proceed);
+    return !proceed || RunDatabaseCommand(*this, id);
 }
 
 // --- Automatic save ---

@@ -10,6 +10,8 @@
 #include <optional>
 
 #include "CommonRUKTools/Errors.h"
+#include "CommonRUKTools/MenuItem.h"
+#include "MusicManagment/database/ConversionSettings.h"
 #include "MusicManagment/database/GroupLists.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/SongList.h"
@@ -18,6 +20,7 @@
 #include "ReadMPEGHeader/AudioFile.h"
 
 class OverviewView;
+class SettingsClient;
 class SongListView;
 class TMusicDatabase;
 
@@ -28,11 +31,16 @@ class EMusicDatabaseException : public ERukException {
 
 using TNotifyEvent = std::function<void(TMusicDatabase&)>;
 using TChangeEvent = std::function<void(TMusicDatabase&, SongIndex index, TChangeType change)>;
+// `platformItem` is the toolkit's own item, nullptr when the command came another way. With `proceed` set to
+// false the database does nothing more.
+using TMenuItemClickedEvent = std::function<void(TMusicDatabase&, const TMenuExItem& item, void* platformItem,
+                                                 qint64 userId, bool& proceed)>;
 using TProgressEvent = std::function<void(TMusicDatabase&, const ProgressPoint&)>;
 
 // How an entry is added.
 struct AddOptions {
-    bool CountOnly = false;  // only count it in the summary lists
+    bool CountOnly = false;       // only count it in the summary lists
+    bool SkipDiskChecks = false;  // no look at disk and ban list: songs that the user brings back
     bool SkipChecks =
         false;  // no look at disk and ban list, no counting, no event: reading a file that has its lists
     bool KeepModified = false;  // do not mark the database modified
@@ -163,7 +171,7 @@ class TMusicDatabase : public QObject {
     bool UseWinAmpForLenCheck() const { return useWinAmpForLenCheck_; }
     void SetUseWinAmpForLenCheck(bool value) { useWinAmpForLenCheck_ = value; }
     bool ReadOnly() const { return readOnly_; }
-    void SetReadOnly(bool value) { readOnly_ = value; }
+    void SetReadOnly(bool value);
     bool RenameAndMoveMP3s() const { return renameAndMoveMP3s_; }
     void SetRenameAndMoveMP3s(bool value) { renameAndMoveMP3s_ = value; }
     // Whether files are read with the modern profile; off in a new component, switched on by the programs.
@@ -214,6 +222,21 @@ class TMusicDatabase : public QObject {
     // Saves at once when AutoSave is -1; called at the end of every command that changes songs.
     void SaveAfterCommand();
 
+    // --- Command menu (Menu.h) ---
+    // Built at the first call and kept until ReadOnly changes.
+    TMenuExItem& Menu();
+    // Raises OnMenuItemClicked and then, unless the handler stops it, runs the operation behind the item.
+    // False when nobody knew the command. Throws what the operation throws.
+    bool ClickMenuItem(int id, void* platformItem = nullptr);
+
+    // --- Settings (Settings.h) ---
+    ConversionSettings& Conversion() { return conversion_; }
+    const ConversionSettings& Conversion() const { return conversion_; }
+    // Components whose settings are kept with those of the database; each leaves before it goes.
+    void JoinSettings(SettingsClient& client) { settingsClients_.push_back(&client); }
+    void LeaveSettings(SettingsClient& client) { std::erase(settingsClients_, &client); }
+    const std::vector<SettingsClient*>& SettingsClients() const { return settingsClients_; }
+
     // How this database reads audio files.
     ReadOptions AudioReadOptions() const;
 
@@ -232,6 +255,7 @@ class TMusicDatabase : public QObject {
     TNotifyEvent OnResetProgress;
     TNotifyEvent OnEndProgress;
     TNotifyEvent OnCaptionChanged;
+    TMenuItemClickedEvent OnMenuItemClicked;
 
     // Raising events whose cause lies in a capability beside this class.
     void RaiseChange(SongIndex index, TChangeType change);
@@ -243,7 +267,7 @@ class TMusicDatabase : public QObject {
     friend class GroupEvents;
 
     void ReportProgress();
-    bool Accepts(const TID3Tag& record);
+    bool Accepts(const TID3Tag& record, const AddOptions& options);
     void RaiseClear();
     void ChangeOrder(const SongOrder& order);
     SongOrder CurrentOrder() const;
@@ -260,6 +284,9 @@ class TMusicDatabase : public QObject {
     QStringList updateFolders_;
     SortedTextList bannList_;
     std::vector<CdName> cdNames_;
+    std::unique_ptr<TMenuExItem> menu_;
+    ConversionSettings conversion_;
+    std::vector<SettingsClient*> settingsClients_;
     QString mp3MoveRootDir_;
     QStringList mp3MoveSubDirs_;
     QString mp3NamePattern_;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QSet>
 #include <QString>
 #include <QStringList>
 #include <vector>
@@ -15,6 +16,6 @@ using RemovedSongs = std::vector<TID3Tag>;
 RemovedSongs RemoveSongs(TMusicDatabase& database, const QStringList& paths);
 RemovedSongs RemoveSongs(TMusicDatabase& database, std::vector<SongIndex> positions);
 
-// Brings songs back, also those whose files are gone meanwhile. Returns how many; those that are in the collection
-// again already are passed over.
+// Brings songs back, also those whose files are gone meanwhile. Returns how many; those that are in the
+// collection again already are passed over.
 int RestoreSongs(TMusicDatabase& database, const RemovedSongs& songs);

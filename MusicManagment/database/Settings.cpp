@@ -21,7 +21,8 @@ constexpr BoolSetting kBools[] = {
     {u"Asynchronous", &Database::Asynchronous, &Database::SetAsynchronous},
     {u"AutoDelBannedFiles", &Database::AutoDelBannedFiles, &Database::SetAutoDelBannedFiles},
     {u"SortBackwards", &Database::SortBackwards, &Database::SetSortBackwards},
-    {u"MoveMP3sAfterGenreChange", &Database::MoveMP3sAfterGenreChange, &Database::SetMoveMP3sAfterGenreChange},
+    {u"MoveMP3sAfterGenreChange", &Database::MoveMP3sAfterGenreChange,
+     &Database::SetMoveMP3sAfterGenreChange},
     {u"UseWinAmpForLenCheck", &Database::UseWinAmpForLenCheck, &Database::SetUseWinAmpForLenCheck},
     {u"FollowFocus", &Database::FollowFocus, &Database::SetFollowFocus},
     {u"RenameAndMoveMP3s", &Database::RenameAndMoveMP3s, &Database::SetRenameAndMoveMP3s},
@@ -38,7 +39,8 @@ std::optional<Enum> ReadEnum(const TRWReg& settings, const QString& name, int co
 // NAME0, NAME1, ... up to the first that is missing.
 QStringList ReadNumbered(const TRWReg& settings, const QString& name) {
     QStringList texts;
-    while (const auto text = settings.ReadString(name + QString::number(texts.size()))) texts << *text;
+    while (const auto text = settings.ReadString(name + QString::number(texts.size())))
+        texts << *text;
     return texts;
 }
 
@@ -90,7 +92,8 @@ void LoadDatabaseSettings(TMusicDatabase& database, const TRWReg& settings) {
         database.SetCompression(*level);
     for (const BoolSetting& setting : kBools)
         if (const auto value = settings.ReadBool(setting.Name.toString())) (database.*setting.Set)(*value);
-    if (const auto type = ReadEnum<TSortType>(settings, u"SortType"_s, stCacheType + 1)) database.SetSortType(*type);
+    if (const auto type = ReadEnum<TSortType>(settings, u"SortType"_s, stCacheType + 1))
+        database.SetSortType(*type);
     if (const auto type = ReadEnum<TSubSortType>(settings, u"SubSortType"_s, sstPath + 1))
         database.SetSubSortType(*type);
     if (const auto folder = settings.ReadString(u"MP3MoveRootDir"_s)) database.SetMP3MoveRootDir(*folder);
@@ -98,13 +101,15 @@ void LoadDatabaseSettings(TMusicDatabase& database, const TRWReg& settings) {
     LoadGenreFolders(database, settings);
     LoadCdNames(database, settings);
     database.Conversion().Load(settings);
-    for (SettingsClient* client : database.SettingsClients()) client->LoadSettings(settings);
+    for (SettingsClient* client : database.SettingsClients())
+        client->LoadSettings(settings);
 }
 
 void SaveDatabaseSettings(const TMusicDatabase& database, TRWReg& settings) {
     settings.WriteInteger(u"AutoSave"_s, database.AutoSave());
     settings.WriteInteger(u"Compression"_s, database.Compression());
-    for (const BoolSetting& setting : kBools) settings.WriteBool(setting.Name.toString(), (database.*setting.Get)());
+    for (const BoolSetting& setting : kBools)
+        settings.WriteBool(setting.Name.toString(), (database.*setting.Get)());
     settings.WriteInteger(u"SortType"_s, database.SortType());
     settings.WriteInteger(u"SubSortType"_s, database.SubSortType());
     settings.WriteString(u"MP3MoveRootDir"_s, database.MP3MoveRootDir());
@@ -112,5 +117,6 @@ void SaveDatabaseSettings(const TMusicDatabase& database, TRWReg& settings) {
     SaveGenreFolders(database, settings);
     SaveCdNames(database, settings);
     database.Conversion().Save(settings);
-    for (const SettingsClient* client : database.SettingsClients()) client->SaveSettings(settings);
+    for (const SettingsClient* client : database.SettingsClients())
+        client->SaveSettings(settings);
 }

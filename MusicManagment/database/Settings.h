@@ -3,8 +3,8 @@
 class TMusicDatabase;
 class TRWReg;
 
-// A component whose settings are kept together with those of the database: playlist, player, remote control, views.
-// Values that are missing leave the component as it is.
+// A component whose settings are kept together with those of the database: playlist, player, remote control,
+// views. Values that are missing leave the component as it is.
 class SettingsClient {
  public:
     virtual ~SettingsClient() = default;
@@ -12,7 +12,8 @@ class SettingsClient {
     virtual void SaveSettings(TRWReg& settings) const = 0;
 };
 
-// Reads the settings of the database and of every client that has joined it. A missing value leaves its property as it
-// is, but AutoSave becomes 0 and missing genre folders become the 20 default names. Values out of range count as missing.
+// Reads the settings of the database and of every client that has joined it. A missing value leaves its
+// property as it is, but AutoSave becomes 0 and missing genre folders become the 20 default names. Values out
+// of range count as missing.
 void LoadDatabaseSettings(TMusicDatabase& database, const TRWReg& settings);
 void SaveDatabaseSettings(const TMusicDatabase& database, TRWReg& settings);

@@ -19,7 +19,8 @@ constexpr qsizetype kListedSongs = 15;
 
 // A folder without any entry counts as missing: that is what the mount point of an unplugged disk looks like.
 bool IsThere(const QString& folder) {
-    return QFileInfo(folder).isDir() && !QDir(folder).isEmpty(QDir::AllEntries | QDir::NoDotAndDotDot | QDir::Hidden);
+    return QFileInfo(folder).isDir() &&
+           !QDir(folder).isEmpty(QDir::AllEntries | QDir::NoDotAndDotDot | QDir::Hidden);
 }
 
 QString WithSeparator(const QString& folder) {
@@ -33,7 +34,8 @@ struct UpdateFolderSets {
 
 UpdateFolderSets SplitFolders(const QStringList& folders) {
     UpdateFolderSets sets;
-    for (const QString& folder : folders) (IsThere(folder) ? sets.There : sets.Missing) << folder;
+    for (const QString& folder : folders)
+        (IsThere(folder) ? sets.There : sets.Missing) << folder;
     return sets;
 }
 
@@ -83,14 +85,16 @@ bool SameSong(const TID3Tag& a, const TID3Tag& b) {
 }
 
 bool ProgressAt(TMusicDatabase& database, qint64 current, qint64 total, const QString& description) {
-    return database.Progress({.Cur = current, .Max = total, .Type = ptSearchFolders, .Description = description});
+    return database.Progress(
+        {.Cur = current, .Max = total, .Type = ptSearchFolders, .Description = description});
 }
 
 // Paths first, because an updated song may change its place while the list is walked.
 QStringList AllPaths(const TMusicDatabase& database) {
     QStringList paths;
     paths.reserve(database.Count());
-    for (const auto& song : database.Songs()) paths << song->FileName;
+    for (const auto& song : database.Songs())
+        paths << song->FileName;
     return paths;
 }
 
@@ -111,12 +115,14 @@ void RereadSong(TMusicDatabase& database, const QString& path, UpdateResult& res
 }
 
 // Looks at every song: gone ones are returned, present ones are read again where asked for.
-QStringList CheckSongs(TMusicDatabase& database, UpdateTags tags, const UpdateFolderSets& folders, UpdateResult& result) {
+QStringList CheckSongs(TMusicDatabase& database, UpdateTags tags, const UpdateFolderSets& folders,
+                       UpdateResult& result) {
     GoneFiles goneFiles(folders);
     QStringList gone;
     const QStringList paths = AllPaths(database);
     for (qsizetype i = 0; i < paths.size(); ++i) {
-        if (i % kProgressStep == 0 && ProgressAt(database, i, paths.size(), u"Prüfe die vorhandenen Songs"_s)) {
+        if (i % kProgressStep == 0 &&
+            ProgressAt(database, i, paths.size(), u"Prüfe die vorhandenen Songs"_s)) {
             result.Stopped = true;
             break;
         }
@@ -129,10 +135,13 @@ QStringList CheckSongs(TMusicDatabase& database, UpdateTags tags, const UpdateFo
 }
 
 bool ConfirmRemoval(const QStringList& gone) {
-    QString text = u"Diese Songs ("_s + QString::number(gone.size()) +
-                   u") sind nicht mehr auf der Festplatte vorhanden. Sollen sie aus der Datenbank entfernt werden?\n"_s;
-    for (const QString& path : gone.first(std::min(gone.size(), kListedSongs))) text += u'\n' + path;
-    if (gone.size() > kListedSongs) text += u"\n... und "_s + QString::number(gone.size() - kListedSongs) + u" weitere"_s;
+    QString text =
+        u"Diese Songs ("_s + QString::number(gone.size()) +
+        u") sind nicht mehr auf der Festplatte vorhanden. Sollen sie aus der Datenbank entfernt werden?\n"_s;
+    for (const QString& path : gone.first(std::min(gone.size(), kListedSongs)))
+        text += u'\n' + path;
+    if (gone.size() > kListedSongs)
+        text += u"\n... und "_s + QString::number(gone.size() - kListedSongs) + u" weitere"_s;
     return UserDialogs().Ask(text, {u"Entfernen"_s, u"Behalten"_s}, 1) == 0;
 }
 
@@ -141,7 +150,8 @@ void RequireFolders(const TMusicDatabase& database) {
         throw EMusicDatabaseException(u"Hinzufügen von Songs zur Datenbank ist momentan nicht möglich."_s);
     if (database.UpdateFolders().isEmpty())
         throw EMusicDatabaseException(
-            u"Es ist noch kein Ordner eingetragen, in dem nach Songs gesucht werden soll. Fügen Sie zuerst einen Ordner zur "
+            u"Es ist noch kein Ordner eingetragen, in dem nach Songs gesucht werden soll. Fügen Sie zuerst "
+            u"einen Ordner zur "
             "Datenbank hinzu."_s);
 }
 
@@ -189,11 +199,14 @@ IntakeResult SearchNewSongs(TMusicDatabase& database) {
 QString UpdateMessage(const UpdateResult& result) {
     QString text = IntakeMessage(result.Intake);
     if (!result.Changed.isEmpty())
-        text += u"\nBei "_s + QString::number(result.Changed.size()) + u" Song(s) wurden geänderte Tags übernommen."_s;
+        text += u"\nBei "_s + QString::number(result.Changed.size()) +
+                u" Song(s) wurden geänderte Tags übernommen."_s;
     if (!result.Removed.isEmpty())
-        text += u"\n"_s + QString::number(result.Removed.size()) + u" Song(s) wurde(n) aus der Datenbank entfernt."_s;
+        text += u"\n"_s + QString::number(result.Removed.size()) +
+                u" Song(s) wurde(n) aus der Datenbank entfernt."_s;
     if (!result.MissingFolders.isEmpty())
-        text += u"\nNicht erreichbar, ihre Songs bleiben in der Datenbank:\n"_s + result.MissingFolders.join(u'\n');
+        text += u"\nNicht erreichbar, ihre Songs bleiben in der Datenbank:\n"_s +
+                result.MissingFolders.join(u'\n');
     if (result.Stopped) text += u"\nDer Vorgang wurde abgebrochen."_s;
     return text;
 }

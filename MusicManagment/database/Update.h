@@ -19,10 +19,10 @@ struct UpdateResult {
     bool Stopped = false;
 };
 
-// Searches the update folders for new songs, finds songs whose files are gone, and removes those after the user has seen
-// and confirmed the list. Songs below a folder that is not there (an unplugged disk, an empty mount point) stay.
-// Reports to the user at the end. Throws EMusicDatabaseException while another run is going or when there are no update
-// folders.
+// Searches the update folders for new songs, finds songs whose files are gone, and removes those after the
+// user has seen and confirmed the list. Songs below a folder that is not there (an unplugged disk, an empty
+// mount point) stay. Reports to the user at the end. Throws EMusicDatabaseException while another run is
+// going or when there are no update folders.
 UpdateResult UpdateDatabase(TMusicDatabase& database, UpdateTags tags);
 
 // Only searches the update folders for new songs, and reports.
