@@ -97,6 +97,17 @@ class BlockedList {
         }
     }
 
+    // Empties the list and returns its items in their order.
+    std::vector<T> takeAll() {
+        std::vector<T> items;
+        items.reserve(size_);
+        for (auto& block : blocks_)
+            items.insert(items.end(), std::make_move_iterator(block.begin()),
+                         std::make_move_iterator(block.end()));
+        clear();
+        return items;
+    }
+
     // Replaces the contents.
     void assign(std::vector<T> items) {
         clear();

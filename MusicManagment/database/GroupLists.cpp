@@ -1,1 +1,178 @@
 #include "MusicManagment/database/GroupLists.h"
+
+#include <algorithm>
+#include <initializer_list>
+#include <vector>
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+// Ranges of a number, each with its caption. The captions are made once, so that all songs of a bucket share
+// one text.
+class Buckets {
+ public:
+    struct Row {
+        int From;  // first value; the range ends where the next begins
+        QString Text;
+    };
+
+    Buckets(std::initializer_list<Row> rows) : rows_(rows) {}
+
+    const QString& TextOf(int value) const {
+        std::size_t row = rows_.size() - 1;
+        while (row > 0 && value < rows_[row].From)
+            --row;
+        return rows_[row].Text;
+    }
+    // Texts that are no bucket come last.
+    int Compare(QStringView a, QStringView b) const {
+        const int difference = Rank(a) - Rank(b);
+        return difference != 0 ? difference : a.compare(b);
+    }
+
+ private:
+    int Rank(QStringView text) const {
+        constexpr int kNoBucket = 255;
+        for (std::size_t i = 0; i < rows_.size(); ++i)
+            if (text == rows_[i].Text) return static_cast<int>(i);
+        return kNoBucket;
+    }
+
+    std::vector<Row> rows_;
+};
+
+constexpr int kFarFuture = 2051;
+
+const Buckets& YearBuckets() {
+    static const Buckets buckets{{0, u"Unbekannt"_s},         {1, u"Vor 1900"_s},
+                                 {1900, u"1900 bis 1949"_s},  {1950, u"In den 50ern"_s},
+                                 {1960, u"In den 60ern"_s},   {1970, u"In den 70ern"_s},
+                                 {1980, u"In den 80ern"_s},   {1990, u"In den 90ern"_s},
+                                 {2000, u"2000 bis heute"_s}, {kFarFuture, u"In ferner Zukunft :)"_s}};
+    return buckets;
+}
+
+const Buckets& LengthBuckets() {
+    static const Buckets buckets{
+        {0, u"Fehlerhafte Angabe"_s}, {1, u"Unter einer Minute"_s},        {60, u"1 bis 2 Minuten"_s},
+        {120, u"2 bis 3 Minuten"_s},  {180, u"3 bis 4 Minuten"_s},         {240, u"4 bis 5 Minuten"_s},
+        {300, u"5 bis 10 Minuten"_s}, {600, u"10 Minuten bis 1 Stunde"_s}, {3600, u"Über 1 Stunde"_s}};
+    return buckets;
+}
+
+int CompareYears(QStringView a, QStringView b) {
+    return YearBuckets().Compare(a, b);
+}
+
+int CompareLengths(QStringView a, QStringView b) {
+    return LengthBuckets().Compare(a, b);
+}
+
+constexpr TOVType kTextTypes[] = {ovArtist, ovAlbum, ovYear, ovLength};
+
+// The caption under which a song is counted in a text list.
+QString GroupCaption(TOVType type, const TID3Tag& song) {
+    switch (type) {
+        case ovArtist:
+            return song.Artist;
+        case ovAlbum:
+            return song.Album;
+        case ovYear:
+            return YearBucket(YearNumber(song.Year));
+        default:
+            return LengthBucket(song.Length);
+    }
+}
+
+}  // namespace
+
+int YearNumber(const QString& year) {
+    bool isNumber = false;
+    const int number = year.toInt(&isNumber);
+    return isNumber ? number : 0;
+}
+
+QString YearBucket(int year) {
+    // A negative year is as wrong as one far ahead, and is shown with it.
+    return YearBuckets().TextOf(year < 0 ? kFarFuture : year);
+}
+
+QString LengthBucket(int seconds) {
+    return LengthBuckets().TextOf(seconds);
+}
+
+TYearList::TYearList() : SortedTextList(&CompareYears) {}
+TLengthList::TLengthList() : SortedTextList(&CompareLengths) {}
+
+GroupLists::GroupLists() : lists_{SortedTextList(), SortedTextList(), TYearList(), TLengthList()} {}
+
+void GroupLists::Clear() {
+    for (SortedTextList& list : lists_)
+        list.Clear();
+    genres_.fill(0);
+}
+
+void GroupLists::Add(const TID3Tag& song, GroupListener* listener) {
+    for (const TOVType type : kTextTypes)
+        CountUp(type, GroupCaption(type, song), listener);
+    CountGenre(song, 1, listener);
+}
+
+void GroupLists::Remove(const TID3Tag& song, GroupListener* listener) {
+    for (const TOVType type : kTextTypes)
+        CountDown(type, GroupCaption(type, song), listener);
+    CountGenre(song, -1, listener);
+}
+
+void GroupLists::AddRow(TOVType type, const QString& caption, int count) {
+    SortedTextList& list = lists_[type];
+    const int before = list.Count();
+    const int row = list.Insert(caption, count);
+    if (list.Count() == before) list.SetNumber(row, list.At(row).Number + count);
+}
+
+int GroupLists::RowCount(TOVType type) const {
+    return type == ovGenre ? kMainGenreCount : lists_[type].Count();
+}
+
+QString GroupLists::RowCaption(TOVType type, int row) const {
+    return type == ovGenre ? MainGenreLongName(row) : lists_[type].At(row).Text;
+}
+
+int GroupLists::RowSongCount(TOVType type, int row) const {
+    return type == ovGenre ? genres_[static_cast<std::size_t>(row)] : lists_[type].At(row).Number;
+}
+
+void GroupLists::CountUp(TOVType type, const QString& caption, GroupListener* listener) {
+    SortedTextList& list = lists_[type];
+    const int before = list.Count();
+    const int row = list.Insert(caption, 1);
+    if (list.Count() > before) {
+        if (listener != nullptr) listener->RowInserted(type, row, caption, 1);
+        return;
+    }
+    list.SetNumber(row, list.At(row).Number + 1);
+    if (listener != nullptr) listener->RowUpdated(type, row, list.At(row).Number);
+}
+
+void GroupLists::CountDown(TOVType type, const QString& caption, GroupListener* listener) {
+    SortedTextList& list = lists_[type];
+    const int row = list.IndexOf(caption);
+    if (row < 0) return;  // the lists came from a file that counted differently
+    const int left = list.At(row).Number - 1;
+    if (left > 0) {
+        list.SetNumber(row, left);
+        if (listener != nullptr) listener->RowUpdated(type, row, left);
+        return;
+    }
+    list.RemoveAt(row);
+    if (listener != nullptr) listener->RowDeleted(type, row);
+}
+
+void GroupLists::CountGenre(const TID3Tag& song, int change, GroupListener* listener) {
+    const int row = song.MainGenre < kMainGenreCount ? song.MainGenre : 0;
+    int& count = genres_[static_cast<std::size_t>(row)];
+    count = std::max(0, count + change);
+    if (listener != nullptr) listener->RowUpdated(ovGenre, row, count);
+}

@@ -73,6 +73,10 @@ class TMusicDatabase : public QObject {
     TID3Tag GetEntry(SongIndex index, const QString& fileName = QString()) const;
     // Throws EMusicDatabaseException when no song has this path.
     SongIndex RequireIndexOf(const QString& fileName) const;
+    // A file keeps the order in which it was saved; this puts the songs into the current one when they are
+    // not in it. Every placing of a song does so first. Throws EMusicDatabaseException while the database is
+    // busy.
+    void EnsureSorted();
 
     // Adds an entry, its path first taken from `fileName`. Returns its place, or -1 when it was only counted
     // or refused (database busy or read-only, file missing, song banned).
@@ -89,6 +93,8 @@ class TMusicDatabase : public QObject {
     // Empties the database; does nothing while it is busy.
     void Clear(bool notify = true, bool keepFileName = false);
     bool IsBanned(const TID3Tag& record) const;
+    // Sorts the whole list anew. Throws EMusicDatabaseException while the database is busy.
+    void Resort();
 
     // --- Files (DatabaseFile.cpp) ---
     // Writes to `fileName`, or the current one, or asks. False when the user cancelled or stopped the run.
@@ -174,7 +180,7 @@ class TMusicDatabase : public QObject {
 
     // The linked views, told after the events; the view clears the link before it goes.
     void SetSongListView(SongListView* view) { songListView_ = view; }
-    void SetOverviewView(OverviewView* view);
+    void SetOverviewView(OverviewView* view) { overviewView_ = view; }
 
     // --- Long operations ---
     // Shows a message and throws EAbort when a run is going. Prefer the ProgressRun object of Progress.h.
@@ -196,7 +202,10 @@ class TMusicDatabase : public QObject {
     void EndBusy() { --busy_; }
     // While above 0 added songs keep the order of the file and views are not told of each.
     bool Loading() const { return loading_ > 0; }
-    void BeginLoading() { ++loading_; }
+    void BeginLoading() {
+        ++loading_;
+        maybeUnsorted_ = true;
+    }
     void EndLoading() { --loading_; }
 
     // What the automatic save does at each tick of its timer.
@@ -231,11 +240,12 @@ class TMusicDatabase : public QObject {
 
  private:
     class GroupEvents;
+    friend class GroupEvents;
 
-    void SetCaption(const QString& caption);
+    void ReportProgress();
     bool Accepts(const TID3Tag& record);
     void RaiseClear();
-    void Resort(const SongOrder& order);
+    void ChangeOrder(const SongOrder& order);
     SongOrder CurrentOrder() const;
     SongIndex Replace(SongIndex index);
 
@@ -243,7 +253,7 @@ class TMusicDatabase : public QObject {
     GroupLists groups_;
     std::unique_ptr<GroupEvents> groupEvents_;
     SongOrder order_;
-    bool knownSorted_ = true;  // false after reading a file, until the order has been looked at
+    bool maybeUnsorted_ = false;  // after reading a file, until the order has been looked at
 
     QString fileName_;
     QString caption_;
@@ -254,7 +264,7 @@ class TMusicDatabase : public QObject {
     QStringList mp3MoveSubDirs_;
     QString mp3NamePattern_;
     int autoSave_ = 0;
-    int compression_ = 1;
+    TCompressionLevel compression_ = clFastest;
     bool modified_ = false;
     bool asynchronous_ = true;
     bool autoDelBannedFiles_ = false;

@@ -1,1 +1,12 @@
 #include "MusicManagment/database/Progress.h"
+
+#include "MusicManagment/database/MusicManagment.h"
+
+ProgressRun::ProgressRun(TMusicDatabase& database, const QString& description, bool lockMenu)
+    : database_(database), lockMenu_(lockMenu) {
+    database_.StartProgress(description, lockMenu);
+}
+
+ProgressRun::~ProgressRun() {
+    database_.EndProgress(lockMenu_);
+}

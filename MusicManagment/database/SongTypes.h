@@ -32,6 +32,8 @@ enum TSubSortType {
 enum TOVType { ovArtist, ovAlbum, ovYear, ovLength, ovGenre };
 inline constexpr int kOverviewTypeCount = 5;
 
+enum TCompressionLevel { clNone = 0, clFastest = 1, clDefault = 2, clMax = 3 };
+
 enum TChangeType { ctChanged = 0, ctInserted = 1, ctRemoved = 2 };
 
 // Headings of progress runs. The numbers are part of the interface to the views.

@@ -24,6 +24,7 @@ void SortSongs(const SongOrder& order, std::vector<SongList::Entry>& entries);
 bool IsSorted(const SongOrder& order, const SongList& songs);
 
 // Where the entry at `index` belongs, counted before it is taken out: `index` itself when it stays, else the
-// position before which it is to stand. `sorted` says that the other entries are in order, which allows a
-// binary search; the result is that of the walk in either case.
-SongIndex TargetPosition(const SongOrder& order, const SongList& songs, SongIndex index, bool sorted);
+// position before which it is to stand. All other entries must be in order. Among equal entries the place is
+// the one that a walk from the middle of the list (from beside the entry, when it is not the first) meets
+// first.
+SongIndex TargetPosition(const SongOrder& order, const SongList& songs, SongIndex index);

@@ -1,0 +1,23 @@
+#!/usr/bin/env bash
+# Installs what is missing, builds everything and runs every check: format, tests, tests under the sanitizers, lint.
+set -euo pipefail
+cd "$(dirname "$(realpath "$0")")"
+. tools/packages.sh
+install_packages "${build_packages[@]}" "${desktop_packages[@]}" "${test_packages[@]}"
+
+echo "== Format"
+git ls-files '*.h' '*.cpp' | xargs clang-format --dry-run -Werror
+
+echo "== Build and test"
+cmake --preset release -DTUNESTEAD_TESTS=ON -DTUNESTEAD_BENCH=ON >/dev/null
+cmake --build --preset release
+desktop-file-validate data/tunestead.desktop
+ctest --preset release
+
+echo "== Tests under the address and undefined-behaviour sanitizers"
+cmake --preset asan >/dev/null
+cmake --build --preset asan
+ctest --preset asan
+
+echo "== Lint"
+tools/lint.sh
