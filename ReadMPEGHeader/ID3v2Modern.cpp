@@ -160,13 +160,8 @@ bool ReadID3v2Modern(ByteSource& stream, std::int64_t position, std::int64_t& en
     endPosition = lastFrameEnd + (hasFooter ? static_cast<std::int64_t>(kId3v2HeaderSize) : 0);
     if (!IsKnownLayout(*header)) return false;
     ID3v2Frames frames(header->Version == 4 ? TextRules::Id3v24 : TextRules::Id3v23, tag, listener, xruk);
-    try {
-        ReadFrames(stream, firstFrame, std::min(lastFrameEnd, stream.Size()), *header, frames);
-    } catch (const EStreamError&) {
-        frames.Finish();
-        throw;
-    }
-    frames.Finish();
+    frames.Fill(
+        [&] { ReadFrames(stream, firstFrame, std::min(lastFrameEnd, stream.Size()), *header, frames); });
     if (endPosition > stream.Size()) throw EStreamError(u"Unerwartetes Ende der Datei"_s);
     return true;
 }

@@ -44,13 +44,7 @@ bool ReadID3v2(ByteSource& stream, std::int64_t position, std::int64_t& endPosit
     const std::int64_t firstFrame = position + static_cast<std::int64_t>(kId3v2HeaderSize);
     endPosition = firstFrame + header->Size;
     ID3v2Frames frames(TextRules::Classic, tag, listener, xruk);
-    try {
-        WalkFrames(stream, firstFrame, endPosition, frames);
-    } catch (const EStreamError&) {
-        frames.Finish();
-        throw;
-    }
-    frames.Finish();
+    frames.Fill([&] { WalkFrames(stream, firstFrame, endPosition, frames); });
     if (endPosition > stream.Size()) throw EStreamError(u"Unerwartetes Ende der Datei"_s);
     return true;
 }
