@@ -7,6 +7,7 @@
 
 #include "CommonRUKTools/ByteWriter.h"
 #include "ReadMPEGHeader/AudioFile.h"
+#include "tests/ReadMPEGHeader/Id3v2Builder.h"
 
 using Bytes = std::vector<std::uint8_t>;
 
@@ -21,50 +22,10 @@ inline constexpr FrameKind kMono64 = {{0xFF, 0xFB, 0x50, 0xC4}, 208};
 inline constexpr FrameKind kLsfStereo64 = {{0xFF, 0xF3, 0x80, 0x04}, 208};  // MPEG 2 Layer III, 22050 Hz
 inline constexpr FrameKind kLsfMono64 = {{0xFF, 0xF3, 0x80, 0xC4}, 208};
 
-// Builds an ID3v2 tag.
-class TagBuilder {
- public:
-    explicit TagBuilder(std::uint8_t version = 3) : version_(version) {}
-
-    TagBuilder& Frame(std::string_view id, std::string_view body) {
-        frames_.Raw(id);
-        const auto size = static_cast<std::uint32_t>(body.size());
-        version_ == 4 ? SynchSafe(frames_, size) : frames_.U32Be(size);
-        frames_.U16Be(0);
-        frames_.Raw(body);
-        return *this;
-    }
-    // Encoding 0; the text is plain ASCII.
-    TagBuilder& Text(std::string_view id, std::string_view text) {
-        return Frame(id, std::string(1, '\0') + std::string(text));
-    }
-    TagBuilder& Titles(std::string_view title, std::string_view artist) {
-        return Text("TIT2", title).Text("TPE1", artist);
-    }
-    TagBuilder& Padding(std::size_t count) {
-        frames_.Zeros(count);
-        return *this;
-    }
-    // The size in the header counts `beyond` bytes that do not follow.
-    Bytes Build(std::uint32_t beyond = 0) const {
-        ByteWriter tag;
-        tag.Raw("ID3");
-        tag.U8(version_);
-        tag.U16Be(0);
-        SynchSafe(tag, static_cast<std::uint32_t>(frames_.Size()) + beyond);
-        tag.Raw(frames_.Bytes());
-        return tag.Bytes();
-    }
-
- private:
-    static void SynchSafe(ByteWriter& writer, std::uint32_t value) {
-        for (int shift = 21; shift >= 0; shift -= 7)
-            writer.U8((value >> shift) & 0x7F);
-    }
-
-    std::uint8_t version_;
-    ByteWriter frames_;
-};
+// A tag with the two texts without which it does not count.
+inline Id3v2Builder TitledTag(std::string_view title, std::string_view artist, std::uint8_t version = 3) {
+    return Id3v2Builder(version).Text("TIT2", title).Text("TPE1", artist);
+}
 
 // Builds a sound file piece by piece.
 class Mp3Builder {

@@ -40,7 +40,7 @@ Search FindModern(const Mp3Builder& file) {
 constexpr std::array<std::uint8_t, 2> kSync = {0xFF, 0xE0};
 
 Bytes BigTag(std::size_t size) {
-    return TagBuilder().Titles("Title", "Artist").Frame("APIC", std::string(size, '\xFF')).Build();
+    return TitledTag("Title", "Artist").Frame("APIC", std::string(size, '\xFF')).Build();
 }
 
 }  // namespace
@@ -60,7 +60,7 @@ TEST(ClassicSearch, OnlyWholeBlocksOfTheFirst256KilobytesAreExamined) {
 }
 
 TEST(ClassicSearch, ATagIsFoundWhereverItStandsAndSkipped) {
-    const auto tag = TagBuilder().Titles("\xFF\xFB", "x").Padding(50).Build();
+    const auto tag = TitledTag("\xFF\xFB", "x").Padding(50).Build();
     for (const std::size_t position : {0u, 29u, 30u, 31u, 32u, 5000u}) {
         const auto file = Mp3Builder().Noise(position).Raw(tag).Frames(2);
         // A title that looks like a sync hides the tag when both marks end in the same block.
@@ -78,20 +78,20 @@ TEST(ClassicSearch, ATagIsFoundWhereverItStandsAndSkipped) {
 
 TEST(ClassicSearch, ATagIsNoPartOfASyncThatFollowsIt) {
     // The tag ends with 0xFF at the end of a block; 0xFB behind it is no sync with that.
-    const auto tag = TagBuilder().Frame("APIC", std::string(43, 'x') + '\xFF').Build();
+    const auto tag = Id3v2Builder().Frame("APIC", std::string(43, 'x') + '\xFF').Build();
     ASSERT_EQ(tag.size(), 64u);
     const auto file = Mp3Builder().Raw(tag).Raw(std::array<std::uint8_t, 1>{0xFB}).Noise(99).Frames(1);
     EXPECT_EQ(FindClassic(file).Frame, 64 + 100);
 }
 
 TEST(ClassicSearch, OnlyOneTagIsRead) {
-    const auto tag = TagBuilder().Titles("Title", "Artist").Padding(40).Build();
+    const auto tag = TitledTag("Title", "Artist").Padding(40).Build();
     const auto file = Mp3Builder().Raw(tag).Raw(tag).Frames(1);
     EXPECT_EQ(FindClassic(file).Tags.size(), 1u);
 }
 
 TEST(ModernSearch, ATextThatLooksLikeASyncDoesNotHideTheTag) {
-    const auto tag = TagBuilder().Frame("TIT2", std::string_view("\1\xFF\xFEH\0i\0", 7)).Build();
+    const auto tag = Id3v2Builder().Frame("TIT2", std::string_view("\1\xFF\xFEH\0i\0", 7)).Build();
     const auto file = Mp3Builder().Raw(tag).Frames(2);
     EXPECT_EQ(FindModern(file).Frame, tag.size());
     EXPECT_EQ(FindModern(file).Tags.size(), 1u);
@@ -116,7 +116,7 @@ TEST(ModernSearch, StackedTagsAreSkippedAndTheFirstIsRead) {
 }
 
 TEST(ModernSearch, ATagAmidTheSoundIsChance) {
-    const auto file = Mp3Builder().Frames(1).Raw(TagBuilder().Titles("a", "b").Build()).Frames(1);
+    const auto file = Mp3Builder().Frames(1).Raw(TitledTag("a", "b").Build()).Frames(1);
     EXPECT_TRUE(FindModern(file).Tags.empty());
 }
 
