@@ -13,6 +13,7 @@
 
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/Intake.h"
+//TMP #include "MusicManagment/database/IntakeReport.h"
 #include "app/CommandRunner.h"
 #include "app/MainMenu.h"
 #include "app/Startup.h"
@@ -61,9 +62,7 @@ void TTunesteadMainWnd::SetUpDatabase() {
         totals_.SongChanged(index, change);
     };
     progress_.OnRunning = [this](bool running) { RunningChanged(running); };
-    commands_.OnIntake = [this](const IntakeResult& result) {
-        statusBar()->showMessage(IntakeMessage(result));
-    };
+    commands_.OnIntake = [this](const IntakeResult& result) { ShowIntake(result); };
     const auto follow = [this] { ListChanged(); };
     connect(&songs_, &QAbstractItemModel::modelReset, this, follow);
     connect(&songs_, &QAbstractItemModel::rowsInserted, this, follow);
@@ -113,6 +112,12 @@ void TTunesteadMainWnd::ListChanged() {
     if (centre_->currentWidget() == wanted) return;
     centre_->setCurrentWidget(wanted);
     wanted->setFocus();
+}
+
+// A box only where there is something to worry about.
+void TTunesteadMainWnd::ShowIntake(const IntakeResult& result) {
+    statusBar()->showMessage(IntakeMessage(result));
+    //TMP     if (result.Unreadable > 0) ReportIntake(result);
 }
 
 // --- Files from other windows ---

@@ -23,6 +23,7 @@ QString ProgressHeading(TProgressType type) {
 }
 
 QString ProgressLabel(qint64 current, qint64 maximum, const QString& description) {
+    if (maximum <= 0 && !description.isEmpty()) return description;
     const QString label = QString::number(current) + u" von "_s + QString::number(maximum);
     return description.isEmpty() ? label : label + u" - "_s + description;
 }

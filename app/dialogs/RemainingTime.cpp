@@ -19,7 +19,7 @@ void RemainingTime::Start(qint64 now) {
 std::optional<int> RemainingTime::Estimate(qint64 current, qint64 maximum, qint64 now) {
     // A run may have several stages; what one took says nothing about the next.
     if (maximum != maximum_ || current < last_) {
-        if (maximum_ > 0) begin_ = now;
+        begin_ = now;
         first_ = current;
         maximum_ = maximum;
     }
