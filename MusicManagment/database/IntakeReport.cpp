@@ -51,7 +51,10 @@ QString IntakeDetails(const IntakeResult& result) {
     return text;
 }
 
+void ShowReport(const QString& message, const QString& details) {
+    if (UserDialogs().Ask(message, {u"OK"_s, u"Details"_s}, kOkButton) == kDetailsButton) ShowDetails(details);
+}
+
 void ReportIntake(const IntakeResult& result) {
-    if (UserDialogs().Ask(IntakeMessage(result), {u"OK"_s, u"Details"_s}, kOkButton) == kDetailsButton)
-        ShowDetails(IntakeDetails(result));
+    ShowReport(IntakeMessage(result), IntakeDetails(result));
 }
