@@ -106,6 +106,7 @@ class AudioFileReading {
         const auto info = ReadAsfHeader(stream_);
         if (!info) return false;
         wma_ = TagFromAsf(*info, profile_.WmaLength());
+        if (wma_->AddTime == 0) wma_->AddTime = result_.AddTime;  // the header names no creation time
         hasTechnicalData_ = true;
         return true;
     }

@@ -1,17 +1,18 @@
 #pragma once
 
 #include <QtGlobal>
-#include <algorithm>
-#include <cstdint>
 #include <limits>
+#include <utility>
 
 // Values of a container as the fields of a TID3Tag hold them.
 
 // `value`, or the nearest bound of `Target`.
-template <typename Target>
-constexpr Target Saturated(std::int64_t value) {
-    return static_cast<Target>(std::clamp<std::int64_t>(value, std::numeric_limits<Target>::min(),
-                                                        std::numeric_limits<Target>::max()));
+template <typename Target, typename Value>
+constexpr Target Saturated(Value value) {
+    using Limits = std::numeric_limits<Target>;
+    if (std::cmp_less(value, Limits::min())) return Limits::min();
+    if (std::cmp_greater(value, Limits::max())) return Limits::max();
+    return static_cast<Target>(value);
 }
 
 // Channel mode of containers that count channels (WAV, WMA); 0 for a count without a mode.

@@ -191,18 +191,27 @@ TEST(ID3v2Reader, DamageEndsTheTagAndKeepsWhatWasRead) {
     auto lying = good;
     lying.SizedFrame("TPE1", 0x7FFFFFFF, "\0x"s);
     check(lying.Build(), 10 + 13 + 18 + 12);
-    auto beyondTag = good;
-    auto bytes = beyondTag.SizedFrame("TPE1", 3, "\0x"s).Build();
-    bytes.resize(bytes.size() + 100);
-    check(bytes, 10 + 13 + 18 + 12);
     auto cut = good;
-    bytes = cut.Text("TPE1", "Band").Build();
+    auto bytes = cut.Text("TPE1", "Band").Build();
     bytes.pop_back();
     check(bytes, 10 + 13 + 18 + 15);
     auto cutPadding = good;
     bytes = cutPadding.Padding(50).Build();
     bytes.resize(60);
     check(bytes, 10 + 13 + 18 + 50);
+}
+
+TEST(ID3v2Reader, AFrameThatReachesBeyondTheTagIsTheLast) {
+    // A size of 200 as ID3v2.4 writes it is 328 here; behind it stands sound.
+    auto bytes = Id3v2Builder(4).Text("TIT2", "da").Frame("APIC", std::string(200, 'x')).Build();
+    const auto end = static_cast<std::int64_t>(bytes.size());
+    bytes.resize(bytes.size() + 1000);
+    const auto outcome = ReadWith(ReadID3v2, bytes);
+    EXPECT_TRUE(outcome.Read);
+    EXPECT_EQ(outcome.End, end);
+    EXPECT_EQ(outcome.Tag.Title, u"da"_s);
+    bytes.resize(static_cast<std::size_t>(end) + 10);
+    EXPECT_TRUE(ReadWith(ReadID3v2, bytes).Threw);
 }
 
 TEST(ID3v2Reader, ListenerHearsOfFramesThatTheRecordDoesNotKnow) {
