@@ -2,6 +2,7 @@
 
 #include <QStringConverter>
 #include <array>
+#include <cstring>
 #include <memory>
 
 #include "CommonRUKTools/Errors.h"
@@ -33,6 +34,11 @@ QByteArrayView View(ByteSpan bytes) {
 
 std::size_t AsciiPrefix(ByteSpan bytes) {
     std::size_t i = 0;
+    // Eight bytes at a time: most texts are ASCII throughout.
+    for (std::uint64_t eight = 0; i + sizeof(eight) <= bytes.size(); i += sizeof(eight)) {
+        std::memcpy(&eight, bytes.data() + i, sizeof(eight));
+        if ((eight & 0x8080808080808080u) != 0) break;
+    }
     while (i < bytes.size() && bytes[i] < 0x80)
         ++i;
     return i;

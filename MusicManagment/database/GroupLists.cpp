@@ -85,6 +85,16 @@ QString GroupCaption(TOVType type, const TID3Tag& song) {
     }
 }
 
+std::size_t GenreRowOf(const TID3Tag& song) {
+    return song.MainGenre < kMainGenreCount ? song.MainGenre : 0;
+}
+
+// A number from a file, so that two of them can be added and songs counted on without an overflow.
+int PossibleCount(int count) {
+    constexpr int kMost = 1 << 29;
+    return std::clamp(count, 0, kMost);
+}
+
 }  // namespace
 
 int YearNumber(const QString& year) {
@@ -128,8 +138,13 @@ void GroupLists::Remove(const TID3Tag& song, GroupListener* listener) {
 void GroupLists::AddRow(TOVType type, const QString& caption, int count) {
     SortedTextList& list = lists_[type];
     const int before = list.Count();
-    const int row = list.Insert(caption, count);
-    if (list.Count() == before) list.SetNumber(row, list.At(row).Number + count);
+    const int number = PossibleCount(count);
+    const int row = list.Insert(caption, number);
+    if (list.Count() == before) list.SetNumber(row, PossibleCount(list.At(row).Number + number));
+}
+
+void GroupLists::SetGenreCount(int genre, int count) {
+    genres_[static_cast<std::size_t>(genre)] = PossibleCount(count);
 }
 
 int GroupLists::RowCount(TOVType type) const {
@@ -171,8 +186,22 @@ void GroupLists::CountDown(TOVType type, const QString& caption, GroupListener* 
 }
 
 void GroupLists::CountGenre(const TID3Tag& song, int change, GroupListener* listener) {
-    const int row = song.MainGenre < kMainGenreCount ? song.MainGenre : 0;
-    int& count = genres_[static_cast<std::size_t>(row)];
+    const std::size_t row = GenreRowOf(song);
+    int& count = genres_[row];
     count = std::max(0, count + change);
-    if (listener != nullptr) listener->RowUpdated(ovGenre, row, count);
+    if (listener != nullptr) listener->RowUpdated(ovGenre, static_cast<int>(row), count);
+}
+
+void GroupTally::Add(const TID3Tag& song) {
+    for (const TOVType type : kTextTypes)
+        ++captions_[type][GroupCaption(type, song)];
+    ++genres_[GenreRowOf(song)];
+}
+
+void GroupTally::WriteTo(GroupLists& lists) const {
+    for (const TOVType type : kTextTypes)
+        for (auto row = captions_[type].cbegin(); row != captions_[type].cend(); ++row)
+            lists.AddRow(type, row.key(), row.value());
+    for (int genre = 0; genre < kMainGenreCount; ++genre)
+        lists.SetGenreCount(genre, genres_[static_cast<std::size_t>(genre)]);
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QHash>
 #include <QString>
 #include <array>
 
@@ -46,9 +47,10 @@ class GroupLists {
     void Add(const TID3Tag& song, GroupListener* listener);
     void Remove(const TID3Tag& song, GroupListener* listener);
 
-    // Rows as a database file gives them; a text that is there already adds to its number.
+    // Rows as a database file gives them; a text that is there already adds to its number. A number that no
+    // collection can reach is taken as the nearest that one can.
     void AddRow(TOVType type, const QString& caption, int count);
-    void SetGenreCount(int genre, int count) { genres_[static_cast<std::size_t>(genre)] = count; }
+    void SetGenreCount(int genre, int count);
 
     const SortedTextList& Artists() const { return lists_[ovArtist]; }
     const SortedTextList& Albums() const { return lists_[ovAlbum]; }
@@ -67,5 +69,17 @@ class GroupLists {
     void CountGenre(const TID3Tag& song, int change, GroupListener* listener);
 
     std::array<SortedTextList, 4> lists_;
+    GenreCounts genres_{};
+};
+
+// Counts many songs at once: a row is looked for once for each caption instead of once for each song.
+class GroupTally {
+ public:
+    void Add(const TID3Tag& song);
+    // Adds a row for each caption to `lists` and sets its genres.
+    void WriteTo(GroupLists& lists) const;
+
+ private:
+    std::array<QHash<QString, int>, 4> captions_;
     GenreCounts genres_{};
 };

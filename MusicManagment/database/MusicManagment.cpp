@@ -216,9 +216,11 @@ void TMusicDatabase::Clear(bool notify, bool keepFileName) {
 }
 
 void TMusicDatabase::RecountGroups() {
-    groups_.Clear();
+    GroupTally tally;
     for (const auto& song : songs_)
-        groups_.Add(*song, nullptr);
+        tally.Add(*song);
+    groups_.Clear();
+    tally.WriteTo(groups_);
     RaiseOverviewChanged();
 }
 

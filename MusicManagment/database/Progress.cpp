@@ -10,3 +10,7 @@ ProgressRun::ProgressRun(TMusicDatabase& database, const QString& description, b
 ProgressRun::~ProgressRun() {
     database_.EndProgress(lockMenu_);
 }
+
+void RefuseDuringRun(TMusicDatabase& database) {
+    if (database.ProgressRunning()) const ProgressRun refused(database, QString());
+}

@@ -29,3 +29,7 @@ class ProgressRun {
     TMusicDatabase& database_;
     bool lockMenu_;
 };
+
+// For a command that empties or creates something before its own run begins. Throws EAbort, after telling the
+// user, when a run is going.
+void RefuseDuringRun(TMusicDatabase& database);

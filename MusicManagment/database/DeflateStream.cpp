@@ -1,0 +1,41 @@
+#include "MusicManagment/database/DeflateStream.h"
+
+#include <new>
+
+namespace {
+
+constexpr std::size_t kBuffer = std::size_t{256} * 1024;
+
+}  // namespace
+
+DeflateStream::DeflateStream(SafeFile& file, int level) : file_(file), output_(kBuffer) {
+    if (deflateInit(&zlib_, level) != Z_OK) throw std::bad_alloc();
+    zlib_.next_out = output_.data();
+    zlib_.avail_out = static_cast<uInt>(output_.size());
+}
+
+DeflateStream::~DeflateStream() {
+    deflateEnd(&zlib_);
+}
+
+void DeflateStream::Write(ByteSpan bytes) {
+    Deflate(bytes, Z_NO_FLUSH);
+}
+
+void DeflateStream::Finish() {
+    Deflate({}, Z_FINISH);
+    file_.Write(ByteSpan(output_).first(output_.size() - zlib_.avail_out));
+}
+
+void DeflateStream::Deflate(ByteSpan bytes, int flush) {
+    zlib_.next_in = bytes.data();
+    zlib_.avail_in = static_cast<uInt>(bytes.size());
+    while (true) {
+        const int result = deflate(&zlib_, flush);
+        if (zlib_.avail_out > 0 && (flush == Z_NO_FLUSH || result == Z_STREAM_END)) return;
+        file_.Write(output_);
+        zlib_.next_out = output_.data();
+        zlib_.avail_out = static_cast<uInt>(output_.size());
+        if (result == Z_STREAM_END) return;
+    }
+}
