@@ -9,6 +9,7 @@
 #include "CommonRUKTools/Errors.h"
 #include "ReadMPEGHeader/MpegResults.h"
 #include "tests/PrintQt.h"
+#include "tests/ReadMPEGHeader/AsfBuilder.h"
 #include "tests/ReadMPEGHeader/Builders.h"
 
 using namespace Qt::StringLiterals;
@@ -200,6 +201,18 @@ TEST(AudioFile, WaveFilesAreNotSearchedForFramesAndMayCarryATrailingTag) {
     // A RIFF file of another form stays what its name says.
     wave[8] = 'X';
     EXPECT_EQ(Read(wave, InProfile(ReadProfile::Classic), u"/m/a.avi"_s).MPEGLayer, u"Video (AVI)"_s);
+}
+
+TEST(AudioFile, OnlyAReadableWmaHeaderSuppressesTheFileName) {
+    const auto options = InProfile(ReadProfile::Classic);
+    const auto wma = AsfBuilder().Content(u"Waterloo"_s, u""_s, u""_s).Build();
+    EXPECT_EQ(Read(wma, options, u"/m/A - B.wma"_s).Title, u"Waterloo"_s);
+    EXPECT_EQ(Read(wma, options, u"/m/A - B.wma"_s).Artist, u""_s);
+    const Bytes damaged(wma.begin(), wma.begin() + 20);
+    const auto tag = Read(damaged, options, u"/m/A - B.wma"_s);
+    EXPECT_EQ(tag.Title, u"B"_s);
+    EXPECT_EQ(tag.MPEGLayer, u"Windows Media Audio"_s);
+    EXPECT_TRUE(LastDebugData().Text.startsWith(u"ASF"_s));
 }
 
 TEST(AudioFile, ATrailerThatLeadsNowhereIsIgnored) {
