@@ -3,16 +3,23 @@
 #include <algorithm>
 #include <cstring>
 
+namespace {
+
+// Holds an ID3v1 tag and a trailer behind it.
+constexpr std::size_t kTailSize = 256;
+
+}  // namespace
+
 std::size_t BufferedSource::ReadAt(std::int64_t position, std::span<std::uint8_t> target) {
-    if (position < 0 || position >= Size()) return 0;
+    if (position < 0 || position >= size_) return 0;
     const auto count = static_cast<std::size_t>(
-        std::min<std::int64_t>(Size() - position, static_cast<std::int64_t>(target.size())));
+        std::min<std::int64_t>(size_ - position, static_cast<std::int64_t>(target.size())));
     if (count > chunk_) return source_.ReadAt(position, target.first(count));
     const Window& window = Fetch(position, count);
-    if (position >= window.start + static_cast<std::int64_t>(window.bytes.size())) return 0;
     const auto offset = static_cast<std::size_t>(position - window.start);
-    const auto held = std::min(count, window.bytes.size() - offset);
-    if (held > 0) std::memcpy(target.data(), window.bytes.data() + offset, held);
+    if (offset >= window.size) return 0;
+    const auto held = std::min(count, window.size - offset);
+    std::memcpy(target.data(), window.bytes.get() + offset, held);
     return held;
 }
 
@@ -22,11 +29,22 @@ const BufferedSource::Window& BufferedSource::Fetch(std::int64_t position, std::
         newest_ = i;
         return windows_[i];
     }
+    if (tail_.Holds(position, count)) return tail_;
+    const auto left = static_cast<std::size_t>(std::min<std::int64_t>(size_ - position, chunk_));
+    if (left <= kTailSize && kTailSize <= chunk_) {
+        const auto size = std::min<std::int64_t>(size_, kTailSize);
+        Fill(tail_, size_ - size, static_cast<std::size_t>(size));
+        return tail_;
+    }
     newest_ = 1 - newest_;
-    Window& window = windows_[newest_];
-    window.start = position;
-    const auto size = std::min<std::int64_t>(Size() - position, static_cast<std::int64_t>(chunk_));
-    window.bytes.resize(static_cast<std::size_t>(size));
-    window.bytes.resize(source_.ReadAt(position, window.bytes));
-    return window;
+    Fill(windows_[newest_], position, left);
+    return windows_[newest_];
+}
+
+void BufferedSource::Fill(Window& window, std::int64_t start, std::size_t count) {
+    const auto capacity = &window == &tail_ ? kTailSize : chunk_;
+    if (!window.bytes) window.bytes = std::make_unique_for_overwrite<std::uint8_t[]>(capacity);
+    window.size = 0;  // stays so when the medium fails
+    window.size = source_.ReadAt(start, {window.bytes.get(), count});
+    window.start = start;
 }

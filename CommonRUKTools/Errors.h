@@ -24,6 +24,13 @@ class EStreamError : public ERukException {
     using ERukException::ERukException;
 };
 
+// The medium itself failed (disk, network drive, removed stick), as opposed to a file whose contents end
+// early.
+class EMediumError : public EStreamError {
+ public:
+    using EStreamError::EStreamError;
+};
+
 // Ends the running command without a message: the user has been told already, or chose to stop.
 class EAbort : public ERukException {
  public:

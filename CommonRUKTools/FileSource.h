@@ -2,6 +2,7 @@
 
 #include <QString>
 #include <cstdint>
+#include <memory>
 #include <span>
 #include <vector>
 
@@ -14,7 +15,7 @@ class ByteSource {
     virtual ~ByteSource() = default;
     virtual std::int64_t Size() const = 0;
     // Reads up to `target.size()` bytes from `position`; returns how many there were (fewer only at the end).
-    // Throws EStreamError when the medium fails.
+    // Throws EMediumError when the medium fails.
     virtual std::size_t ReadAt(std::int64_t position, std::span<std::uint8_t> target) = 0;
 
     // Exactly `count` bytes from `position`; the count is checked against the size before anything is
@@ -39,6 +40,9 @@ class FileSource : public ByteSource {
  public:
     // Throws EStreamError when the file cannot be opened or is not a regular file (a pipe never blocks here).
     explicit FileSource(const QString& path);
+    // The same in one step with the question whether there is such a file: nullptr when the name leads to
+    // nothing.
+    static std::unique_ptr<FileSource> TryOpen(const QString& path);
     ~FileSource() override;
     FileSource(const FileSource&) = delete;
     FileSource& operator=(const FileSource&) = delete;
@@ -50,6 +54,9 @@ class FileSource : public ByteSource {
     std::size_t ReadAt(std::int64_t position, std::span<std::uint8_t> target) override;
 
  private:
+    // Takes an opened handle over, and closes it when it turns out not to be a regular file's.
+    FileSource(std::intptr_t handle, const QString& path);
+
     std::intptr_t handle_ = -1;
     std::int64_t size_ = 0;
     QString path_;

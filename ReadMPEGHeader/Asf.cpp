@@ -2,11 +2,11 @@
 
 #include <QDateTime>
 #include <algorithm>
-#include <limits>
 
 #include "CommonRUKTools/BufferedSource.h"
 #include "CommonRUKTools/Clock.h"
 #include "ReadMPEGHeader/AsfObjects.h"
+#include "ReadMPEGHeader/FieldValues.h"
 
 using namespace Qt::StringLiterals;
 
@@ -16,27 +16,6 @@ constexpr std::uint64_t kTicksPerSecond = 10'000'000;
 constexpr std::uint64_t kTicksPerMs = 10'000;
 constexpr std::uint64_t kSecondsFrom1601To1970 = 11'644'473'600;
 constexpr double kEndOfYear9999 = 2'958'466.0;
-
-quint16 Saturated(std::uint64_t value) {
-    return static_cast<quint16>(std::min<std::uint64_t>(value, std::numeric_limits<quint16>::max()));
-}
-
-quint8 ChannelModeOf(quint16 channels) {
-    switch (channels) {
-        case 1:
-            return 1;
-        case 2:
-            return 2;
-        case 4:
-            return 5;
-        case 6:
-            return 6;
-        case 8:
-            return 7;
-        default:
-            return 0;
-    }
-}
 
 std::uint64_t PlayTicks(const TASFInfo& info, AsfLength length) {
     if (length == AsfLength::AsStored) return info.PlayDuration;
@@ -91,11 +70,11 @@ TID3Tag TagFromAsf(const TASFInfo& info, AsfLength length) {
     if (!info.Year.isEmpty()) tag.Year = info.Year;
     tag.Comment = info.Comment;
     tag.MPEGLayer = FormatText(info);
-    tag.Length = Saturated(PlayTicks(info, length) / kTicksPerSecond);
+    tag.Length = Saturated<quint16>(PlayTicks(info, length) / kTicksPerSecond);
     tag.Genre = info.Genre;
-    tag.BitRate = Saturated(info.BitRate / 1000);
-    tag.SampleRate = Saturated(info.SampleRate);
-    tag.ChannelMode = ChannelModeOf(info.Channels);
+    tag.BitRate = Saturated<quint16>(info.BitRate / 1000);
+    tag.SampleRate = Saturated<quint16>(info.SampleRate);
+    tag.ChannelMode = ChannelModeByCount(info.Channels);
     tag.Emphasis = 1;
     tag.Private = info.Encrypted;
     tag.FrameSize = info.BlockAlign;

@@ -3,6 +3,7 @@
 #include <QString>
 #include <QStringList>
 
+#include "CommonRUKTools/FileSource.h"
 #include "ReadMPEGHeader/FrameListener.h"
 #include "ReadMPEGHeader/ID3Tag.h"
 
@@ -26,3 +27,16 @@ struct ReadOptions {
 // gefunden". Throws EStreamError when the file cannot be opened or read; then `tag` holds what was known so
 // far. Not re-entrant: the results in MpegResults.h are process-wide.
 QString ReadAudioFile(const QString& path, const ReadOptions& options, TID3Tag& tag);
+
+// The same for bytes that are open already; `path` only gives the name. Throws EMediumError when the medium
+// fails. A damaged tag or header is no failure: what it would have told is missing, and the diagnostics say
+// so.
+void ReadAudioStream(ByteSource& source, const QString& path, const ReadOptions& options, TID3Tag& tag);
+
+// What the last read could not make sense of, one remark a line; empty when all was well.
+struct TDebugData {
+    QString Text;
+};
+
+// Process-wide, as the results in MpegResults.h.
+const TDebugData& LastDebugData();

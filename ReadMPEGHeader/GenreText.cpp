@@ -23,6 +23,7 @@ bool IsInTable(quint8 number) {
 class GenreSearch {
  public:
     void Take(QStringView value) {
+        if (value.contains(u"(RX)")) remix_ = true;
         value = value.trimmed();
         while (value.startsWith(u'(') && !value.startsWith(u"((")) {
             const qsizetype end = value.indexOf(u')');
@@ -50,26 +51,21 @@ class GenreSearch {
     bool remix_ = false;
 };
 
-}  // namespace
-
-GenreText ParseGenreClassic(const QString& text) {
+GenreText ParseClassic(const QString& text) {
     GenreText result;
     result.Remix = text.contains(u"(RX)");
     if (text.size() < 2 || !text.startsWith(u'(')) return result;
     const QStringView rest = QStringView(text).mid(1);
-    const qsizetype end = rest.indexOf(u')');
-    result.Genre = ToGenreNumber(end < 0 ? rest : rest.left(end));
+    result.Genre = ToGenreNumber(rest.left(rest.indexOf(u')')));
     return result;
 }
 
-GenreText ParseGenreValues(const QStringList& values) {
+}  // namespace
+
+GenreText ParseGenre(TextRules rules, const QStringList& values) {
+    if (rules == TextRules::Classic) return ParseClassic(values.value(0));
     GenreSearch search;
-    bool marked = false;
-    for (const QString& value : values) {
+    for (const QString& value : values)
         search.Take(value);
-        marked = marked || value.contains(u"(RX)");
-    }
-    GenreText result = search.Result();
-    result.Remix = result.Remix || marked;
-    return result;
+    return search.Result();
 }

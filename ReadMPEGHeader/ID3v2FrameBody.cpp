@@ -53,6 +53,13 @@ QString FrameBody::Decode(ByteSpan bytes) {
     return CodePage::FromUtf8(StartsWith(bytes, "\xEF\xBB\xBF") ? bytes.subspan(3) : bytes);
 }
 
+std::uint32_t FrameBody::Number(std::size_t count) {
+    std::uint32_t value = 0;
+    for (std::size_t i = 0; i < count; ++i)
+        value = (value << 8) | U8();
+    return value;
+}
+
 std::uint32_t FrameBody::Counter() {
     std::uint64_t value = 0;
     for (const std::uint8_t byte : Rest())

@@ -27,6 +27,8 @@ class FrameBody {
     std::uint16_t U16() { return reader_.U16Be(); }
     std::uint32_t U24() { return reader_.U24Be(); }
     std::uint32_t U32() { return reader_.U32Be(); }
+    // Big-endian, `count` bytes (at most 4).
+    std::uint32_t Number(std::size_t count);
     // The rest as one big-endian number; the largest 32-bit number when it does not fit.
     std::uint32_t Counter();
     ByteSpan Rest() { return reader_.Take(reader_.Remaining()); }

@@ -3,21 +3,9 @@
 #include <QString>
 #include <string_view>
 
-#include "ReadMPEGHeader/CommentFields.h"
 #include "ReadMPEGHeader/FrameListener.h"
 #include "ReadMPEGHeader/ID3v2FrameBody.h"
 
 // What a listener is told of a frame: its text or a German description, and its number where it has one.
 // `id`: as in ID3v2.3; `shownId`: as it stands in the tag. A frame that is not known gives its size in bytes.
 FrameReport DescribeFrame(std::string_view id, const QString& shownId, FrameBody body);
-
-// The fields of "COMM", and of "USLT", which has the same.
-struct CommentFrame {
-    QString Language;
-    QString Description;
-    QString Text;
-};
-CommentFrame ReadCommentFrame(FrameBody& body);
-
-// The fields of "WXXX".
-CommentFields::Address ReadAddressFrame(FrameBody& body);

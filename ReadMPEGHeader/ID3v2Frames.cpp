@@ -6,6 +6,7 @@
 
 #include "ReadMPEGHeader/FileTypeText.h"
 #include "ReadMPEGHeader/GenreText.h"
+#include "ReadMPEGHeader/ID3v2FrameFields.h"
 #include "ReadMPEGHeader/ID3v2FrameTexts.h"
 
 using namespace Qt::StringLiterals;
@@ -121,9 +122,7 @@ void ID3v2Frames::TakeTrack(FrameBody& body) {
 
 void ID3v2Frames::TakeGenre(FrameBody& body) {
     body.ReadEncoding();
-    const QStringList values = body.Values();
-    const GenreText genre =
-        rules_ == TextRules::Classic ? ParseGenreClassic(values.value(0)) : ParseGenreValues(values);
+    const GenreText genre = ParseGenre(rules_, body.Values());
     if (genre.Genre) tag_.Genre = *genre.Genre;
     if (genre.Remix) tag_.Remix = true;
 }
@@ -166,5 +165,6 @@ void ID3v2Frames::TakePlayCount(FrameBody& body) {
 }
 
 void ID3v2Frames::TakeXruk(FrameBody& body) {
-    if (xruk_) *xruk_ = XrukFrame::Parse(body.Rest());
+    const auto frame = XrukFrame::Parse(body.Rest());
+    if (xruk_ && frame) *xruk_ = frame;
 }

@@ -16,7 +16,22 @@ class ID3v2Frames {
  public:
     // Everything given must live as long as this object; `xruk` may be missing.
     ID3v2Frames(TextRules rules, TID3Tag& tag, const FrameListener& listener, std::optional<XrukFrame>* xruk)
-        : rules_(rules), tag_(tag), listener_(listener), xruk_(xruk) {}
+        : rules_(rules), tag_(tag), listener_(listener), xruk_(xruk) {
+        if (xruk_) xruk_->reset();
+    }
+
+    // Runs `walk`, which hands over the frames, and completes the record with what it has found so far, also
+    // when it throws.
+    template <typename Walk>
+    void Fill(Walk walk) {
+        try {
+            walk();
+        } catch (...) {
+            Finish();
+            throw;
+        }
+        Finish();
+    }
 
     // False for a frame whose body changes nothing, so that it need not be read.
     bool NeedsBody(std::string_view id) const;
@@ -24,13 +39,12 @@ class ID3v2Frames {
     void Take(std::string_view id, const QString& shownId, ByteSpan body);
     // For a frame that cannot be decoded: the listener hears its size and the reason.
     void TakeUnreadable(const QString& shownId, std::int64_t size, const QString& reason);
-    // Completes the record; due after the last frame, also when reading failed.
-    void Finish();
 
  private:
     using Effect = void (ID3v2Frames::*)(FrameBody&);
     struct EffectRow;
     static Effect EffectOf(std::string_view id);
+    void Finish();
 
     void TakeTitle(FrameBody& body);
     void TakeArtist(FrameBody& body);

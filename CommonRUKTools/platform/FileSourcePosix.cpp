@@ -16,19 +16,48 @@ QString SystemMessage(const QString& text, const QString& path, int error) {
     return text + path + u": "_s + qt_error_string(error);
 }
 
+// The descriptor, -1 when the system refuses.
+int OpenForReading(const QString& path) {
+    // The system would cut the name at a zero character and open another file.
+    if (path.contains(QChar(u'\0'))) {
+        errno = ENOENT;
+        return -1;
+    }
+    // O_NONBLOCK: opening a pipe without a writer would wait for ever; for regular files it has no effect.
+    return ::open(QFile::encodeName(path).constData(), O_RDONLY | O_CLOEXEC | O_NONBLOCK);
+}
+
+[[noreturn]] void ThrowNotOpened(const QString& path, int error) {
+    throw EStreamError(SystemMessage(u"Kann die Datei nicht öffnen: "_s, path, error));
+}
+
 }  // namespace
 
-FileSource::FileSource(const QString& path) : path_(path) {
-    // O_NONBLOCK: opening a pipe without a writer would wait for ever; for regular files it has no effect.
-    const int file = ::open(QFile::encodeName(path).constData(), O_RDONLY | O_CLOEXEC | O_NONBLOCK);
-    if (file < 0) throw EStreamError(SystemMessage(u"Kann die Datei nicht öffnen: "_s, path, errno));
+FileSource::FileSource(std::intptr_t handle, const QString& path) : handle_(handle), path_(path) {
+    const int file = static_cast<int>(handle);
     struct stat status {};
     if (::fstat(file, &status) != 0 || !S_ISREG(status.st_mode)) {
         ::close(file);
         throw EStreamError(u"Keine gewöhnliche Datei: "_s + path);
     }
-    handle_ = file;
     size_ = status.st_size;
+}
+
+FileSource::FileSource(const QString& path)
+    : FileSource(
+          [&path] {
+              const int file = OpenForReading(path);
+              if (file < 0) ThrowNotOpened(path, errno);
+              return std::intptr_t{file};
+          }(),
+          path) {}
+
+std::unique_ptr<FileSource> FileSource::TryOpen(const QString& path) {
+    const int file = OpenForReading(path);
+    if (file >= 0) return std::unique_ptr<FileSource>(new FileSource(file, path));
+    const int error = errno;
+    if (error == ENOENT || error == ENOTDIR || !Exists(path)) return nullptr;
+    ThrowNotOpened(path, error);
 }
 
 FileSource::~FileSource() {
@@ -45,7 +74,7 @@ std::size_t FileSource::ReadAt(std::int64_t position, std::span<std::uint8_t> ta
         const auto at = static_cast<off_t>(position) + static_cast<off_t>(done);
         const auto count = ::pread(static_cast<int>(handle_), target.data() + done, target.size() - done, at);
         if (count < 0 && errno == EINTR) continue;
-        if (count < 0) throw EStreamError(SystemMessage(u"Kann die Datei nicht lesen: "_s, path_, errno));
+        if (count < 0) throw EMediumError(SystemMessage(u"Kann die Datei nicht lesen: "_s, path_, errno));
         if (count == 0) break;
         done += static_cast<std::size_t>(count);
         if (static_cast<std::int64_t>(at) + count >= size_)

@@ -11,19 +11,41 @@ const wchar_t* Wide(const QString& path) {
     return reinterpret_cast<const wchar_t*>(path.utf16());
 }
 
+HANDLE OpenForReading(const QString& path) {
+    return CreateFileW(Wide(path), GENERIC_READ, FILE_SHARE_READ, nullptr, OPEN_EXISTING, 0, nullptr);
+}
+
+[[noreturn]] void ThrowNotOpened(const QString& path) {
+    throw EStreamError(u"Kann die Datei nicht öffnen: "_s + path);
+}
+
 }  // namespace
 
-FileSource::FileSource(const QString& path) : path_(path) {
-    const HANDLE file =
-        CreateFileW(Wide(path), GENERIC_READ, FILE_SHARE_READ, nullptr, OPEN_EXISTING, 0, nullptr);
+FileSource::FileSource(std::intptr_t handle, const QString& path) : handle_(handle), path_(path) {
+    const HANDLE file = reinterpret_cast<HANDLE>(handle);
     LARGE_INTEGER size{};
-    if (file == INVALID_HANDLE_VALUE) throw EStreamError(u"Kann die Datei nicht öffnen: "_s + path);
     if (GetFileType(file) != FILE_TYPE_DISK || GetFileSizeEx(file, &size) == 0) {
         CloseHandle(file);
         throw EStreamError(u"Keine gewöhnliche Datei: "_s + path);
     }
-    handle_ = reinterpret_cast<std::intptr_t>(file);
     size_ = size.QuadPart;
+}
+
+FileSource::FileSource(const QString& path)
+    : FileSource(
+          [&path] {
+              const HANDLE file = OpenForReading(path);
+              if (file == INVALID_HANDLE_VALUE) ThrowNotOpened(path);
+              return reinterpret_cast<std::intptr_t>(file);
+          }(),
+          path) {}
+
+std::unique_ptr<FileSource> FileSource::TryOpen(const QString& path) {
+    const HANDLE file = OpenForReading(path);
+    if (file != INVALID_HANDLE_VALUE)
+        return std::unique_ptr<FileSource>(new FileSource(reinterpret_cast<std::intptr_t>(file), path));
+    if (!Exists(path)) return nullptr;
+    ThrowNotOpened(path);
 }
 
 FileSource::~FileSource() {
@@ -45,7 +67,7 @@ std::size_t FileSource::ReadAt(std::int64_t position, std::span<std::uint8_t> ta
         const auto wanted = static_cast<DWORD>(std::min<std::size_t>(target.size() - done, 1u << 30));
         if (ReadFile(reinterpret_cast<HANDLE>(handle_), target.data() + done, wanted, &count, &place) == 0) {
             if (GetLastError() == ERROR_HANDLE_EOF) break;
-            throw EStreamError(u"Kann die Datei nicht lesen: "_s + path_);
+            throw EMediumError(u"Kann die Datei nicht lesen: "_s + path_);
         }
         if (count == 0) break;
         done += count;

@@ -1,0 +1,6 @@
+#pragma once
+
+#include <QString>
+
+// German text of the picture type in an "APIC" frame.
+QString PictureTypeText(int type);

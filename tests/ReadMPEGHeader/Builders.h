@@ -1,0 +1,110 @@
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <string_view>
+#include <vector>
+
+#include "CommonRUKTools/ByteWriter.h"
+#include "ReadMPEGHeader/AudioFile.h"
+#include "tests/ReadMPEGHeader/Id3v2Builder.h"
+
+using Bytes = std::vector<std::uint8_t>;
+
+// A kind of MPEG frame: its header and the bytes that it takes with it.
+struct FrameKind {
+    std::array<std::uint8_t, 4> Header;
+    std::size_t Size;
+};
+
+inline constexpr FrameKind kStereo128 = {{0xFF, 0xFB, 0x90, 0x64}, 417};  // MPEG 1 Layer III, 44100 Hz
+inline constexpr FrameKind kMono64 = {{0xFF, 0xFB, 0x50, 0xC4}, 208};
+inline constexpr FrameKind kLsfStereo64 = {{0xFF, 0xF3, 0x80, 0x04}, 208};  // MPEG 2 Layer III, 22050 Hz
+inline constexpr FrameKind kLsfMono64 = {{0xFF, 0xF3, 0x80, 0xC4}, 208};
+
+// A tag with the two texts without which it does not count.
+inline Id3v2Builder TitledTag(std::string_view title, std::string_view artist, std::uint8_t version = 3) {
+    return Id3v2Builder(version).Text("TIT2", title).Text("TPE1", artist);
+}
+
+// Builds a sound file piece by piece.
+class Mp3Builder {
+ public:
+    const Bytes& Data() const { return file_.Bytes(); }
+    std::size_t Size() const { return file_.Size(); }
+
+    Mp3Builder& Raw(ByteSpan bytes) {
+        file_.Raw(bytes);
+        return *this;
+    }
+    Mp3Builder& Zeros(std::size_t count) {
+        file_.Zeros(count);
+        return *this;
+    }
+    Mp3Builder& ZerosUpTo(std::size_t size) { return Zeros(size - file_.Size()); }
+    // Bytes that hold no sync and no "ID3".
+    Mp3Builder& Noise(std::size_t count) {
+        for (std::size_t i = 0; i < count; ++i)
+            file_.U8(static_cast<std::uint8_t>(1 + i % 64));
+        return *this;
+    }
+    Mp3Builder& Frames(std::size_t count, const FrameKind& kind = kStereo128) {
+        for (std::size_t i = 0; i < count; ++i) {
+            Raw(kind.Header);
+            Noise(kind.Size - kind.Header.size());
+        }
+        return *this;
+    }
+    // A silent frame with `text` and big-endian numbers of 32 bits behind it at `offset`.
+    Mp3Builder& FrameWith(const FrameKind& kind, std::size_t offset, std::string_view text,
+                          std::initializer_list<std::uint32_t> numbers) {
+        const auto end = file_.Size() + kind.Size;
+        Raw(kind.Header).Zeros(offset - kind.Header.size());
+        file_.Raw(text);
+        for (const auto number : numbers)
+            file_.U32Be(number);
+        return ZerosUpTo(end);
+    }
+    Mp3Builder& Id3v1(std::string_view title, std::string_view artist, std::uint8_t genre = 255) {
+        file_.Raw("TAG");
+        file_.Block(title, 30);
+        file_.Block(artist, 30);
+        file_.Block("", 30);
+        file_.Block("1999", 4);
+        file_.Zeros(30);
+        file_.U8(genre);
+        return *this;
+    }
+    // A tag behind the audio and the mark that leads to it.
+    Mp3Builder& TrailingTag(ByteSpan tag) {
+        const auto position = static_cast<std::uint32_t>(file_.Size());
+        return Raw(tag).Trailer(position);
+    }
+    Mp3Builder& Trailer(std::uint32_t position) {
+        file_.Raw("ID32");
+        file_.U32Le(position);
+        return *this;
+    }
+
+ private:
+    ByteWriter file_;
+};
+
+inline ReadOptions InProfile(ReadProfile profile) {
+    ReadOptions options;
+    options.Profile = profile;
+    options.FileTime = 1;
+    return options;
+}
+
+inline TID3Tag Read(ByteSpan bytes, const ReadOptions& options = InProfile(ReadProfile::Classic),
+                    const QString& path = QStringLiteral("/music/Folder/name.mp3")) {
+    MemorySource source(bytes);
+    TID3Tag tag;
+    ReadAudioStream(source, path, options, tag);
+    return tag;
+}
+
+inline TID3Tag ReadModern(ByteSpan bytes) {
+    return Read(bytes, InProfile(ReadProfile::Modern));
+}
