@@ -1,7 +1,6 @@
 #include <algorithm>
 #include <string>
 
-#include "CommonRUKTools/Errors.h"
 #include "ReadMPEGHeader/ID3v2FrameCoding.h"
 #include "ReadMPEGHeader/ID3v2FrameIds.h"
 #include "ReadMPEGHeader/ID3v2Frames.h"
@@ -162,6 +161,5 @@ bool ReadID3v2Modern(ByteSource& stream, std::int64_t position, std::int64_t& en
     ID3v2Frames frames(header->Version == 4 ? TextRules::Id3v24 : TextRules::Id3v23, tag, listener, xruk);
     frames.Fill(
         [&] { ReadFrames(stream, firstFrame, std::min(lastFrameEnd, stream.Size()), *header, frames); });
-    if (endPosition > stream.Size()) throw EStreamError(u"Unerwartetes Ende der Datei"_s);
     return true;
 }

@@ -17,8 +17,9 @@
 bool ReadID3v2(ByteSource& stream, std::int64_t position, std::int64_t& endPosition, TID3Tag& tag,
                const FrameListener& listener, std::optional<XrukFrame>* xruk = nullptr);
 
-// The same for the layouts of ID3v2.2, 2.3 and 2.4 as their standards describe them: frame sizes of each
+// The same for the layouts of ID3v2.2 to 2.4 as their standards describe them: frame sizes of each
 // version, extended header, unsynchronisation, compressed frames, encodings 0 to 3, "TDRC" as year, genre by
-// number or name. Encrypted frames and frames of later versions only go to the listener.
+// number or name. Encrypted frames only go to the listener; a tag of another version is not read. Damage
+// costs the frames from there on and is no error, nor is a tag that ends beyond the file.
 bool ReadID3v2Modern(ByteSource& stream, std::int64_t position, std::int64_t& endPosition, TID3Tag& tag,
                      const FrameListener& listener, std::optional<XrukFrame>* xruk = nullptr);

@@ -244,7 +244,7 @@ TEST(ID3v2Modern, FramesBeforeADamagedOneAreKept) {
     const auto size = static_cast<std::int64_t>(cut.size());
     cut.resize(40);
     const auto outcome = ReadWith(ReadID3v2Modern, cut);
-    EXPECT_TRUE(outcome.Threw);
+    EXPECT_TRUE(outcome.Read);
     EXPECT_EQ(outcome.End, size);
     EXPECT_EQ(outcome.Tag.Title, u"da"_s);
 }

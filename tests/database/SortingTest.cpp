@@ -1,0 +1,275 @@
+#include "MusicManagment/database/Sorting.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <random>
+
+#include "tests/PrintQt.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+using Change = void (*)(TID3Tag&);
+
+TID3Tag PlainSong() {
+    TID3Tag song;
+    song.FileName = u"/m/song.mp3"_s;
+    song.Title = u"Title"_s;
+    song.Artist = u"Artist"_s;
+    song.Length = 100;
+    song.MainGenre = 5;
+    return song;
+}
+
+// Two songs that differ as told, and the order in which they stand.
+struct PairCase {
+    const char* Name;
+    SongOrder Order;
+    Change First;
+    Change Second;
+};
+
+unsigned Below(std::mt19937& random, std::size_t limit) {
+    return static_cast<unsigned>(random() % limit);
+}
+
+// Few different values, so that ties are many: umlauts, case, emptiness, other scripts, a text that the
+// collator ignores.
+QString SomeText(std::mt19937& random) {
+    static const QStringList texts{
+        u""_s,    u"a"_s,   u"A"_s,      u"ä"_s,  u"Ä"_s,      u"ae"_s,  u"AE"_s,     u"b"_s,       u"öl"_s,
+        u"Ol"_s,  u"oL"_s,  u"10"_s,     u"9"_s,  u"été"_s,    u"Ete"_s, u"Straße"_s, u"strasse"_s, u"\1"_s,
+        u"a b"_s, u"a-b"_s, u"Москва"_s, u"ZZ"_s, u"zz top"_s, u"ab"_s,  u"Zz Top"_s};
+    return texts[static_cast<qsizetype>(Below(random, static_cast<unsigned>(texts.size())))];
+}
+
+TID3Tag RandomSong(std::mt19937& random) {
+    TID3Tag song;
+    song.FileName = (Below(random, 4) == 0 ? u":1234ABCD:\\"_s : u"/"_s) + SomeText(random);
+    song.Title = SomeText(random) + SomeText(random);
+    // One artist has more songs than are sorted without keys.
+    song.Artist = Below(random, 4) != 0 ? u"Die Ärzte"_s : SomeText(random);
+    song.Album = SomeText(random);
+    song.Comment = SomeText(random);
+    song.Year = Below(random, 2) == 0 ? QString::number(1960 + Below(random, 5)) : SomeText(random);
+    song.Length = static_cast<quint16>(Below(random, 3));
+    song.MainGenre = static_cast<quint8>(Below(random, 2));
+    song.PlayCount = Below(random, 3);
+    song.Flags = Below(random, 16);
+    song.AddTime = static_cast<double>(Below(random, 5)) - 2.0;
+    return song;
+}
+
+std::vector<SongOrder> AllOrders() {
+    std::vector<SongOrder> orders;
+    for (int type = stTitle; type <= stCacheType; ++type)
+        for (int sub = sstGATL; sub <= sstPath; ++sub)
+            for (const bool backwards : {false, true})
+                orders.push_back({static_cast<TSortType>(type), static_cast<TSubSortType>(sub), backwards});
+    orders.push_back({.SortType = stFlags, .ShownFlag = sfDamaged});
+    return orders;
+}
+
+SongList ListOf(const std::vector<TID3Tag>& songs) {
+    SongList list;
+    for (const TID3Tag& song : songs)
+        list.Append(std::make_unique<TID3Tag>(song));
+    return list;
+}
+
+std::vector<TID3Tag> Contents(const SongList& list) {
+    std::vector<TID3Tag> songs;
+    for (const auto& entry : list)
+        songs.push_back(*entry);
+    return songs;
+}
+
+// The re-placing rule step by step, as a walk past every entry.
+SongIndex WalkedTarget(const SongOrder& order, const SongList& songs, SongIndex i) {
+    const auto n = static_cast<SongIndex>(songs.Count());
+    if (n == 1) return i;
+    const auto compare = [&](SongIndex other) { return CompareSongs(order, songs.At(i), songs.At(other)); };
+    SongIndex start = (n - 1) / 2;
+    if (i > 0) {
+        const bool belowPredecessor = compare(i - 1) < 0;
+        if (!belowPredecessor && (i == n - 1 || compare(i + 1) <= 0)) return i;
+        start = belowPredecessor ? i - 2 : i + 2;
+    }
+    if (start < 0) return 0;
+    if (start < n && compare(start) < 0) {
+        for (SongIndex at = start; at >= 0; --at)
+            if (at != i && compare(at) >= 0) return at + 1;
+        return 0;
+    }
+    for (SongIndex at = start; at < n; ++at)
+        if (at != i && compare(at) <= 0) return at;
+    return n;
+}
+
+class SongPairTest : public testing::TestWithParam<PairCase> {};
+
+}  // namespace
+
+TEST_P(SongPairTest, StandsInTheOrderOfItsKey) {
+    TID3Tag first = PlainSong();
+    TID3Tag second = PlainSong();
+    GetParam().First(first);
+    GetParam().Second(second);
+    SongOrder order = GetParam().Order;
+    EXPECT_LT(CompareSongs(order, first, second), 0);
+    EXPECT_GT(CompareSongs(order, second, first), 0);
+    EXPECT_EQ(CompareSongs(order, first, first), 0);
+    order.Backwards = true;
+    EXPECT_GT(CompareSongs(order, first, second), 0);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Keys, SongPairTest,
+    testing::Values(
+        PairCase{"TitleIgnoresCase",
+                 {stTitle},
+                 [](TID3Tag& s) { s.Title = u"ANNA"_s; },
+                 [](TID3Tag& s) { s.Title = u"berta"_s; }},
+        PairCase{"TitleUmlautStandsByItsLetter",
+                 {stTitle},
+                 [](TID3Tag& s) { s.Title = u"Ärger"_s; },
+                 [](TID3Tag& s) { s.Title = u"Bach"_s; }},
+        PairCase{"Artist",
+                 {stArtist},
+                 [](TID3Tag& s) { s.Artist = u"a"_s; },
+                 [](TID3Tag& s) { s.Artist = u"B"_s; }},
+        PairCase{
+            "Album", {stAlbum}, [](TID3Tag& s) { s.Album = u"a"_s; }, [](TID3Tag& s) { s.Album = u"B"_s; }},
+        PairCase{"Comment",
+                 {stComment},
+                 [](TID3Tag& s) { s.Comment = u""_s; },
+                 [](TID3Tag& s) { s.Comment = u"B"_s; }},
+        PairCase{"YearIsANumber",
+                 {stYear},
+                 [](TID3Tag& s) { s.Year = u"900"_s; },
+                 [](TID3Tag& s) { s.Year = u"1000"_s; }},
+        PairCase{"YearWithoutNumberIsZero",
+                 {stYear},
+                 [](TID3Tag& s) { s.Year = u"zzzz"_s; },
+                 [](TID3Tag& s) { s.Year = u"1"_s; }},
+        PairCase{"YearMayBeNegative",
+                 {stYear},
+                 [](TID3Tag& s) { s.Year = u"-5"_s; },
+                 [](TID3Tag& s) { s.Year = u"0"_s; }},
+        PairCase{"Length", {stLength}, [](TID3Tag& s) { s.Length = 9; }, [](TID3Tag& s) { s.Length = 10; }},
+        PairCase{"GenreByItsNumber",
+                 {stGenre},
+                 [](TID3Tag& s) { s.MainGenre = 13; },
+                 [](TID3Tag& s) { s.MainGenre = 14; }},
+        PairCase{"LocalPathBeforeCdPath",
+                 {stPath},
+                 [](TID3Tag& s) { s.FileName = u"/z"_s; },
+                 [](TID3Tag& s) { s.FileName = u":00000001:\\a"_s; }},
+        PairCase{"PathIgnoresCase",
+                 {stPath},
+                 [](TID3Tag& s) { s.FileName = u"/A/x"_s; },
+                 [](TID3Tag& s) { s.FileName = u"/a/y"_s; }},
+        PairCase{"PlayCountBeyondSignedRange",
+                 {stPlayCnt},
+                 [](TID3Tag& s) { s.PlayCount = 1; },
+                 [](TID3Tag& s) { s.PlayCount = 4'000'000'000; }},
+        PairCase{"AddTimeByLessThanADay",
+                 {stAddTime},
+                 [](TID3Tag& s) { s.AddTime = -0.5; },
+                 [](TID3Tag& s) { s.AddTime = 0.25; }},
+        PairCase{"FlagsAsAWhole",
+                 {stFlags},
+                 [](TID3Tag& s) { s.Flags = sfBurned | sfDamaged; },
+                 [](TID3Tag& s) { s.Flags = sfLengthCorrect; }},
+        PairCase{"OnlyTheShownFlagCounts",
+                 {.SortType = stFlags, .ShownFlag = sfDamaged},
+                 [](TID3Tag& s) { s.Flags = sfRemixed; },
+                 [](TID3Tag& s) { s.Flags = sfDamaged; }},
+        PairCase{"FileBeforeSongOfAnAbsentCd",
+                 {stCacheType},
+                 [](TID3Tag& s) { s.Title = u"z"_s; },
+                 [](TID3Tag& s) { s.FileName = u":00000001:\\a"_s; }},
+        PairCase{"TieGenreBeforeArtist",
+                 {stYear, sstGATL},
+                 [](TID3Tag& s) { s.Artist = u"z"_s; },
+                 [](TID3Tag& s) { s.MainGenre = 6; }},
+        PairCase{"TieWithoutGenre",
+                 {stYear, sstATL},
+                 [](TID3Tag& s) {
+                     s.Artist = u"a"_s;
+                     s.MainGenre = 6;
+                 },
+                 [](TID3Tag& s) { s.Artist = u"b"_s; }},
+        PairCase{"TieArtistBeforeTitle",
+                 {stYear, sstATL},
+                 [](TID3Tag& s) { s.Title = u"z"_s; },
+                 [](TID3Tag& s) { s.Artist = u"b"_s; }},
+        PairCase{"TieTitleBeforeLength",
+                 {stYear, sstATL},
+                 [](TID3Tag& s) { s.Length = 200; },
+                 [](TID3Tag& s) { s.Title = u"z"_s; }},
+        PairCase{"TieLengthLast",
+                 {stYear, sstGATL},
+                 [](TID3Tag& s) { s.FileName = u"/z"_s; },
+                 [](TID3Tag& s) { s.Length = 101; }},
+        PairCase{"TieByPathAlone",
+                 {stYear, sstPath},
+                 [](TID3Tag& s) { s.Title = u"z"_s; },
+                 [](TID3Tag& s) { s.FileName = u"/z"_s; }}),
+    [](const auto& pair) { return pair.param.Name; });
+
+TEST(SortingTest, SongsThatDifferOnlyInCaseAreEqual) {
+    TID3Tag a = PlainSong();
+    TID3Tag b = PlainSong();
+    b.Title = a.Title.toUpper();
+    b.Artist = a.Artist.toLower();
+    EXPECT_EQ(CompareSongs({stTitle, sstGATL}, a, b), 0);
+}
+
+TEST(SortingTest, FullSortAgreesWithAStableSortByComparisonInEveryOrder) {
+    std::mt19937 random(20);
+    std::vector<TID3Tag> songs(1000);
+    for (TID3Tag& song : songs)
+        song = RandomSong(random);
+    for (const SongOrder& order : AllOrders()) {
+        SCOPED_TRACE(testing::Message() << "type " << order.SortType << ", sub type " << order.SubSortType
+                                        << ", backwards " << order.Backwards);
+        SongList list = ListOf(songs);
+        auto entries = list.TakeAll();
+        SortSongs(order, entries);
+        list.PutAll(std::move(entries));
+        auto expected = songs;
+        std::stable_sort(expected.begin(), expected.end(), [&order](const TID3Tag& a, const TID3Tag& b) {
+            return CompareSongs(order, a, b) < 0;
+        });
+        ASSERT_TRUE(Contents(list) == expected);
+        EXPECT_TRUE(IsSorted(order, list));
+        list.Move(0, 999);
+        EXPECT_FALSE(IsSorted(order, list));
+    }
+}
+
+TEST(SortingTest, TargetIsTheOneThatTheWalkMeetsFirst) {
+    std::mt19937 random(4);
+    for (int round = 0; round < 1500; ++round) {
+        const SongOrder order{stPlayCnt, sstGATL, round % 2 == 1};
+        const auto values = 1 + Below(random, 5);
+        std::vector<TID3Tag> songs(1 + Below(random, 12));
+        for (TID3Tag& song : songs)
+            song.PlayCount = 1 + Below(random, values);
+        std::sort(songs.begin(), songs.end(),
+                  [&order](const TID3Tag& a, const TID3Tag& b) { return CompareSongs(order, a, b) < 0; });
+        for (std::size_t i = 0; i < songs.size(); ++i) {
+            for (quint32 count = 0; count <= values + 1; ++count) {
+                auto changed = songs;
+                changed[i].PlayCount = count;
+                const SongList list = ListOf(changed);
+                const auto index = static_cast<SongIndex>(i);
+                ASSERT_EQ(TargetPosition(order, list, index), WalkedTarget(order, list, index))
+                    << "round " << round << ", index " << i << ", new value " << count;
+            }
+        }
+    }
+}
