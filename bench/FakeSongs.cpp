@@ -35,7 +35,7 @@ QString Title(Random& random, int number) {
 
 QString Album(Random& random, int artist, int number) {
     const QString album = SongNames::Album(artist, number);
-    return random.Below(3) == 0 ? album : album + u" & "_s + SongNames::Album(number, artist);
+    return random.Below(6) == 0 ? album : album + u" & "_s + SongNames::Album(number, artist);
 }
 
 QString Comment(Random& random) {
@@ -77,7 +77,7 @@ void AddAlbum(Random& random, const FakeArtist& artist, int number, std::size_t 
     for (int track = 1; track <= tracks && songs.size() < wanted; ++track) {
         TID3Tag& song = songs.emplace_back();
         song.Title = Title(random, static_cast<int>(songs.size()));
-        song.FileName = folder + u"%1 - %2.mp3"_s.arg(track, 2, 10, u'0').arg(song.Title);
+        song.FileName = folder + u"%1 - %2.mp3"_s.arg(track, 2, 10, QChar(u'0')).arg(song.Title);
         song.Artist = artist.Name;
         song.Album = album;
         song.Year = year;
