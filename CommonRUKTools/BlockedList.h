@@ -7,8 +7,7 @@
 #include <vector>
 
 // A sequence with access by position in O(log blocks), and insertion and removal anywhere without moving the
-// whole sequence: it is kept in blocks of at most kBlockLimit items. With a million items an insertion moves
-// some 8 KiB.
+// whole sequence: it is kept in blocks of some 16 KiB.
 template <typename T>
 class BlockedList {
  public:
@@ -121,7 +120,8 @@ class BlockedList {
     }
 
  private:
-    static constexpr std::size_t kBlockLimit = 2048;
+    // Items of a block: few enough that moving half of them costs less than the search that came before.
+    static constexpr std::size_t kBlockLimit = std::max<std::size_t>(64, 16'384 / sizeof(T));
 
     std::size_t BlockOf(std::size_t index) const {
         assert(index < size_);

@@ -19,15 +19,18 @@ int SortedTextList::LowerBound(QStringView text) const {
 }
 
 int SortedTextList::IndexOf(QStringView text) const {
+    if (IsLastFound(text)) return lastFound_;
     const int row = LowerBound(text);
-    return row < Count() && At(row).Text == text ? row : -1;
+    if (row == Count() || At(row).Text != text) return -1;
+    return lastFound_ = row;
 }
 
 int SortedTextList::Insert(const QString& text, int number) {
+    if (IsLastFound(text)) return lastFound_;
     // Lists are mostly filled in their own order, from a file or a sorted collection.
     const bool behindLast = Count() > 0 && compare_(At(Count() - 1).Text, text) < 0;
-    const int row = behindLast ? Count() : LowerBound(text);
-    if (row < Count() && At(row).Text == text) return row;
-    rows_.insert(static_cast<std::size_t>(row), Row{text, number});
-    return row;
+    lastFound_ = behindLast ? Count() : LowerBound(text);
+    if (lastFound_ == Count() || At(lastFound_).Text != text)
+        rows_.insert(static_cast<std::size_t>(lastFound_), Row{text, number});
+    return lastFound_;
 }

@@ -34,7 +34,10 @@ class SortedTextList {
 
  private:
     int LowerBound(QStringView text) const;
+    bool IsLastFound(QStringView text) const { return lastFound_ < Count() && At(lastFound_).Text == text; }
 
     Comparison compare_;
     BlockedList<Row> rows_;
+    // Row found last, if it is still there: the songs of a folder mostly share artist and album.
+    mutable int lastFound_ = 0;
 };

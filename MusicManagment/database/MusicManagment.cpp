@@ -255,7 +255,7 @@ void TMusicDatabase::EnsureSorted() {
     maybeUnsorted_ = false;
 }
 
-void TMusicDatabase::ChangeOrder(const SongOrder& order) {
+void TMusicDatabase::SetOrder(const SongOrder& order) {
     if (order == order_) return;
     if (Busy()) throw EMusicDatabaseException(u"Umsortieren der Datenbank ist momentan nicht möglich."_s);
     order_ = order;
@@ -265,19 +265,19 @@ void TMusicDatabase::ChangeOrder(const SongOrder& order) {
 void TMusicDatabase::SetSortType(TSortType type) {
     SongOrder order = order_;
     order.SortType = type;
-    ChangeOrder(order);
+    SetOrder(order);
 }
 
 void TMusicDatabase::SetSubSortType(TSubSortType type) {
     SongOrder order = order_;
     order.SubSortType = type;
-    ChangeOrder(order);
+    SetOrder(order);
 }
 
 void TMusicDatabase::SetSortBackwards(bool backwards) {
     SongOrder order = order_;
     order.Backwards = backwards;
-    ChangeOrder(order);
+    SetOrder(order);
 }
 
 // --- Properties ---

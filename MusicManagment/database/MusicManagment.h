@@ -147,6 +147,9 @@ class TMusicDatabase : public QObject {
     void SetSortType(TSortType type);
     void SetSubSortType(TSubSortType type);
     void SetSortBackwards(bool backwards);
+    const SongOrder& Order() const { return order_; }
+    // All three in one sort.
+    void SetOrder(const SongOrder& order);
     bool FollowFocus() const { return followFocus_; }
     void SetFollowFocus(bool value) { followFocus_ = value; }
     bool MoveMP3sAfterGenreChange() const { return moveMP3sAfterGenreChange_; }
@@ -245,7 +248,6 @@ class TMusicDatabase : public QObject {
     void ReportProgress();
     bool Accepts(const TID3Tag& record);
     void RaiseClear();
-    void ChangeOrder(const SongOrder& order);
     SongOrder CurrentOrder() const;
     SongIndex Replace(SongIndex index);
 

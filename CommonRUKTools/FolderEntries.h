@@ -1,0 +1,45 @@
+#pragma once
+
+#include <QString>
+#include <cstdint>
+#include <memory>
+
+enum class EntryKind {
+    File,
+    Folder,
+    Other,  // a pipe, socket or device, or a link that leads nowhere
+};
+
+struct FolderEntry {
+    QString Name;
+    EntryKind Kind = EntryKind::Other;
+    // False when the name is no valid text: no path can be made of it, and Name only shows it, with each bad
+    // byte as "\xE4".
+    bool Reachable = true;
+};
+
+// What tells a folder from every other folder of the machine, by whatever path it was reached.
+struct FolderIdentity {
+    std::uint64_t Volume = 0;
+    std::uint64_t Number = 0;
+
+    auto operator<=>(const FolderIdentity&) const = default;
+};
+
+// The entries of one folder, one by one and in no order, without "." and "..". A symbolic link counts as what
+// it leads to.
+class FolderEntries {
+ public:
+    // Throws EStreamError when the folder cannot be opened.
+    explicit FolderEntries(const QString& folder);
+    ~FolderEntries();
+
+    FolderIdentity Identity() const;
+    // False at the end. Throws EStreamError when the folder cannot be read any further.
+    bool Next(FolderEntry& entry);
+
+ private:
+    struct Handle;
+    std::unique_ptr<Handle> handle_;
+    QString folder_;
+};

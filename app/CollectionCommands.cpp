@@ -1,0 +1,79 @@
+#include "app/CollectionCommands.h"
+
+#include <QDir>
+
+#include "CommonRUKTools/Dialogs.h"
+#include "MusicManagment/database/Intake.h"
+#include "MusicManagment/database/MusicManagment.h"
+
+using namespace Qt::StringLiterals;
+
+CollectionCommands::CollectionCommands(TMusicDatabase& database, StandardFiles files)
+    : database_(database), files_(std::move(files)) {}
+
+void CollectionCommands::New() {
+    if (KeepChanges()) database_.OpenDatabase(QString());
+}
+
+void CollectionCommands::Open() {
+    if (KeepChanges() && database_.OpenDatabaseFromDialog()) database_.EnsureSorted();
+}
+
+void CollectionCommands::OpenFile(const QString& path) {
+    if (KeepChanges() && database_.OpenDatabase(path)) database_.EnsureSorted();
+}
+
+void CollectionCommands::Save() {
+    SaveCurrent();
+}
+
+void CollectionCommands::SaveAs() {
+    database_.SaveDatabase(QString(), false, true);
+}
+
+void CollectionCommands::AddSongs() {
+    AddSongsFromDialog(database_);
+}
+
+void CollectionCommands::AddFolder() {
+    ::AddFolder(database_, QString(), true);
+}
+
+void CollectionCommands::AddPaths(const QStringList& paths) {
+    const IntakeResult result = ::AddPaths(database_, paths, true);
+    if (OnIntake) OnIntake(result);
+}
+
+bool CollectionCommands::KeepChanges() {
+    if (!database_.Modified()) return true;
+    if (StandardInUse()) return SaveCurrent();
+    const QString name = database_.FileName().isEmpty()
+                             ? u"Die neue Datenbank"_s
+                             : u"Die Datenbank "_s + QDir::toNativeSeparators(database_.FileName());
+    const QString question = name + u" enthält Änderungen. Sollen sie gespeichert werden?"_s;
+    const int answer = UserDialogs().Ask(question, {u"Ja"_s, u"Nein"_s, u"Abbrechen"_s}, 2);
+    if (answer == 0) return SaveCurrent();
+    return answer == 1;
+}
+
+bool CollectionCommands::MayClose() {
+    try {
+        return KeepChanges();
+    } catch (const EAbort&) {
+        return false;
+    } catch (const ERukException& error) {
+        const QString question =
+            error.Message() +
+            u"\n\nDie Änderungen in der Datenbank sind noch nicht gespeichert. Trotzdem beenden?"_s;
+        return UserDialogs().Ask(question, {u"Beenden"_s, u"Abbrechen"_s}, 1) == 0;
+    }
+}
+
+bool CollectionCommands::StandardInUse() const {
+    return database_.FileName() == files_.Database();
+}
+
+bool CollectionCommands::SaveCurrent() {
+    if (StandardInUse()) files_.MakeFolder();
+    return database_.SaveDatabase();
+}

@@ -1,0 +1,42 @@
+#pragma once
+
+#include <QStringList>
+#include <functional>
+
+#include "app/desktop/StandardFiles.h"
+
+class TMusicDatabase;
+struct IntakeResult;
+
+// What the user can do with the collection as a whole. Every command may throw what the database throws.
+class CollectionCommands {
+ public:
+    CollectionCommands(TMusicDatabase& database, StandardFiles files);
+
+    // Told what came of files and folders that were taken in without a report of the engine's own.
+    std::function<void(const IntakeResult&)> OnIntake;
+
+    void New();
+    void Open();
+    void OpenFile(const QString& path);
+    void Save();
+    void SaveAs();
+    void AddSongs();
+    void AddFolder();  // with its sub-folders
+    void AddPaths(const QStringList& paths);
+
+    // Before the collection goes: the standard database saves its changes, any other asks. False when the
+    // user wants to keep it open.
+    bool KeepChanges();
+    // The same before the program ends, where changes that cannot be saved are given up only on request.
+    bool MayClose();
+
+    const StandardFiles& Files() const { return files_; }
+
+ private:
+    bool StandardInUse() const;
+    bool SaveCurrent();
+
+    TMusicDatabase& database_;
+    StandardFiles files_;
+};

@@ -1,0 +1,61 @@
+#pragma once
+
+#include <QMainWindow>
+#include <QStringList>
+
+#include "MusicManagment/database/MusicManagment.h"
+#include "app/CollectionCommands.h"
+#include "app/desktop/ProgressDisplay.h"
+#include "app/models/CollectionTotals.h"
+#include "app/models/SongListModel.h"
+
+class EmptyState;
+class MainMenu;
+class QLabel;
+class QStackedWidget;
+class SongListWidget;
+
+// What the main window is started with.
+struct MainWindowOptions {
+    StandardFiles Files{};
+    QString SettingsFile{};
+    QStringList Arguments{};  // of the command line, without the program's name
+};
+
+// The program's main window: owns the collection and brings together what shows it and what works on it.
+class TTunesteadMainWnd : public QMainWindow {
+ public:
+    explicit TTunesteadMainWnd(MainWindowOptions options);
+    ~TTunesteadMainWnd() override;
+
+    TMusicDatabase& Database() { return database_; }
+
+ protected:
+    void closeEvent(QCloseEvent* event) override;
+    void dragEnterEvent(QDragEnterEvent* event) override;
+    void dragLeaveEvent(QDragLeaveEvent* event) override;
+    void dropEvent(QDropEvent* event) override;
+
+ private:
+    void SetUpDatabase();
+    void SetUpCentre();
+    void SetUpStatusBar();
+    void SetUpPlacement();
+    void StartOnce();
+    void RunningChanged(bool running);
+    void ListChanged();
+    void ShowIntake(const IntakeResult& result);
+    void OfferToStop();
+
+    const MainWindowOptions options_;
+    TMusicDatabase database_;
+    SongListModel songs_;
+    CollectionTotals totals_;
+    CollectionCommands commands_;
+    ProgressDisplay progress_;
+    std::unique_ptr<MainMenu> menu_;
+    QStackedWidget* centre_ = nullptr;
+    SongListWidget* list_ = nullptr;
+    EmptyState* empty_ = nullptr;
+    QLabel* summary_ = nullptr;
+};

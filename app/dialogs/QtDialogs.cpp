@@ -1,0 +1,158 @@
+#include "app/dialogs/QtDialogs.h"
+
+#include <QAbstractButton>
+#include <QApplication>
+#include <QDir>
+#include <QFileDialog>
+#include <QInputDialog>
+#include <QMessageBox>
+#include <QPushButton>
+
+#include "app/dialogs/FileFilters.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+constexpr auto kTitle = u"Tunestead";
+
+// The engine's texts are plain, whatever characters a file name brings along, and some come with the line
+// ends of another system.
+void SetText(QMessageBox& box, QString text) {
+    box.setTextFormat(Qt::PlainText);
+    box.setText(text.replace(u"\r\n"_s, u"\n"_s));
+}
+
+QMessageBox::Icon IconOf(MessageKind kind) {
+    switch (kind) {
+        case MessageKind::Information:
+            return QMessageBox::Information;
+        case MessageKind::Warning:
+            return QMessageBox::Warning;
+        case MessageKind::Error:
+            break;
+    }
+    return QMessageBox::Critical;
+}
+
+// Roles let the style arrange the buttons as its desktop does.
+QMessageBox::ButtonRole RoleOf(int button, int cancelButton) {
+    if (button == cancelButton) return QMessageBox::RejectRole;
+    return button == 0 ? QMessageBox::YesRole : QMessageBox::NoRole;
+}
+
+// Captions are set here and not left to Qt's translation, which may not be installed.
+void SetUpFileDialog(QFileDialog& dialog, const QString& accept) {
+    dialog.setLabelText(QFileDialog::Accept, accept);
+    dialog.setLabelText(QFileDialog::Reject, u"Abbrechen"_s);
+    dialog.setLabelText(QFileDialog::FileName, u"Dateiname:"_s);
+    dialog.setLabelText(QFileDialog::FileType, u"Dateityp:"_s);
+    dialog.setLabelText(QFileDialog::LookIn, u"Suchen in:"_s);
+}
+
+void ApplyOptions(QFileDialog& dialog, const FileDialogOptions& options) {
+    dialog.setWindowTitle(options.Title);
+    dialog.setOption(QFileDialog::HideNameFilterDetails);
+    const QStringList filters = NameFilters(options.Filter);
+    if (!filters.isEmpty()) dialog.setNameFilters(filters);
+    if (!options.DefaultExtension.isEmpty()) dialog.setDefaultSuffix(options.DefaultExtension);
+    const QFileInfo preset(options.Preset);
+    if (options.Preset.isEmpty()) return;
+    dialog.setDirectory(preset.isDir() ? preset.absoluteFilePath() : preset.absolutePath());
+    if (!preset.isDir()) dialog.selectFile(preset.fileName());
+}
+
+QStringList Choose(QFileDialog& dialog) {
+    return dialog.exec() == QDialog::Accepted ? dialog.selectedFiles() : QStringList();
+}
+
+}  // namespace
+
+QWidget* QtDialogs::Parent() const {
+    QWidget* active = QApplication::activeWindow();
+    return active != nullptr ? active : mainWindow_.data();
+}
+
+void QtDialogs::ShowMessage(MessageKind kind, const QString& text) {
+    QMessageBox box(Parent());
+    box.setWindowTitle(QString::fromUtf16(kTitle));
+    box.setIcon(IconOf(kind));
+    SetText(box, text);
+    box.addButton(u"OK"_s, QMessageBox::AcceptRole);
+    box.exec();
+}
+
+int QtDialogs::Ask(const QString& text, const QStringList& buttons, int cancelButton) {
+    QMessageBox box(Parent());
+    box.setWindowTitle(QString::fromUtf16(kTitle));
+    box.setIcon(QMessageBox::Question);
+    SetText(box, text);
+    QList<QAbstractButton*> made;
+    for (int i = 0; i < buttons.size(); ++i)
+        made << box.addButton(buttons[i], RoleOf(i, cancelButton));
+    if (cancelButton >= 0 && cancelButton < made.size()) box.setEscapeButton(made[cancelButton]);
+    if (auto* first = qobject_cast<QPushButton*>(made.value(0))) box.setDefaultButton(first);
+    box.exec();
+    const auto chosen = static_cast<int>(made.indexOf(box.clickedButton()));
+    return chosen >= 0 ? chosen : cancelButton;
+}
+
+std::optional<QString> QtDialogs::Input(const QString& caption, const QString& prompt,
+                                        const QStringList& choices, const QString& preset) {
+    QInputDialog dialog(Parent());
+    dialog.setWindowTitle(caption);
+    dialog.setLabelText(prompt);
+    dialog.setOkButtonText(u"OK"_s);
+    dialog.setCancelButtonText(u"Abbrechen"_s);
+    if (!choices.isEmpty()) {
+        dialog.setComboBoxItems(choices);
+        dialog.setComboBoxEditable(false);
+    }
+    dialog.setTextValue(preset);
+    if (dialog.exec() != QDialog::Accepted) return std::nullopt;
+    return dialog.textValue();
+}
+
+std::optional<QString> QtDialogs::OpenFile(const FileDialogOptions& options) {
+    QFileDialog dialog(Parent());
+    dialog.setFileMode(QFileDialog::ExistingFile);
+    SetUpFileDialog(dialog, u"Öffnen"_s);
+    ApplyOptions(dialog, options);
+    const QStringList files = Choose(dialog);
+    return files.isEmpty() ? std::nullopt : std::optional(files.first());
+}
+
+QStringList QtDialogs::OpenFiles(const FileDialogOptions& options) {
+    QFileDialog dialog(Parent());
+    dialog.setFileMode(QFileDialog::ExistingFiles);
+    SetUpFileDialog(dialog, u"Öffnen"_s);
+    ApplyOptions(dialog, options);
+    return Choose(dialog);
+}
+
+std::optional<QString> QtDialogs::SaveFile(const FileDialogOptions& options) {
+    QFileDialog dialog(Parent());
+    dialog.setAcceptMode(QFileDialog::AcceptSave);
+    dialog.setFileMode(QFileDialog::AnyFile);
+    dialog.setOption(QFileDialog::DontConfirmOverwrite);  // asked below, with buttons of our own
+    SetUpFileDialog(dialog, u"Speichern"_s);
+    ApplyOptions(dialog, options);
+    for (;;) {
+        const QStringList files = Choose(dialog);
+        if (files.isEmpty()) return std::nullopt;
+        if (!options.ConfirmOverwrite || !QFileInfo::exists(files.first())) return files.first();
+        const QString question = u"Die Datei "_s + QDir::toNativeSeparators(files.first()) +
+                                 u" ist schon vorhanden. Soll sie ersetzt werden?"_s;
+        if (Ask(question, {u"Ersetzen"_s, u"Abbrechen"_s}, 1) == 0) return files.first();
+    }
+}
+
+std::optional<QString> QtDialogs::ChooseFolder(const QString& caption) {
+    QFileDialog dialog(Parent(), caption);
+    dialog.setFileMode(QFileDialog::Directory);
+    dialog.setOption(QFileDialog::ShowDirsOnly);
+    SetUpFileDialog(dialog, u"Auswählen"_s);
+    dialog.setLabelText(QFileDialog::FileName, u"Ordner:"_s);
+    const QStringList folders = Choose(dialog);
+    return folders.isEmpty() ? std::nullopt : std::optional(folders.first());
+}

@@ -1,0 +1,26 @@
+#pragma once
+
+#include <QPointer>
+#include <QWidget>
+
+#include "CommonRUKTools/Dialogs.h"
+
+// Asks the user with windows. They belong to the window that is active, else to the main window.
+class QtDialogs : public Dialogs {
+ public:
+    void SetMainWindow(QWidget* window) { mainWindow_ = window; }
+
+    void ShowMessage(MessageKind kind, const QString& text) override;
+    int Ask(const QString& text, const QStringList& buttons, int cancelButton) override;
+    std::optional<QString> Input(const QString& caption, const QString& prompt, const QStringList& choices,
+                                 const QString& preset) override;
+    std::optional<QString> OpenFile(const FileDialogOptions& options) override;
+    QStringList OpenFiles(const FileDialogOptions& options) override;
+    std::optional<QString> SaveFile(const FileDialogOptions& options) override;
+    std::optional<QString> ChooseFolder(const QString& caption) override;
+
+ private:
+    QWidget* Parent() const;
+
+    QPointer<QWidget> mainWindow_;
+};

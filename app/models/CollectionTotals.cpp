@@ -1,0 +1,43 @@
+#include "app/models/CollectionTotals.h"
+
+#include <QLocale>
+
+#include "MusicManagment/database/MusicManagment.h"
+#include "ReadMPEGHeader/DisplayTexts.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+constexpr qint64 kSecondsPerDay = 86'400;
+
+QString PlayingTime(qint64 seconds) {
+    const qint64 days = seconds / kSecondsPerDay;
+    const QString clock = FormatLength(static_cast<int>(seconds % kSecondsPerDay), true);
+    if (days == 0) return clock;
+    return QLocale(QLocale::German).toString(days) + (days == 1 ? u" Tag "_s : u" Tage "_s) + clock;
+}
+
+}  // namespace
+
+void CollectionTotals::SongChanged(SongIndex index, TChangeType change) {
+    if (index >= 0 && change == ctInserted)
+        seconds_ += database_.Song(index).Length;
+    else
+        stale_ = true;
+}
+
+qint64 CollectionTotals::Seconds() {
+    if (!stale_) return seconds_;
+    seconds_ = 0;
+    for (const auto& song : database_.Songs())
+        seconds_ += song->Length;
+    stale_ = false;
+    return seconds_;
+}
+
+QString CollectionTotals::Text() {
+    const int count = database_.Count();
+    const QString songs = QLocale(QLocale::German).toString(count) + (count == 1 ? u" Song"_s : u" Songs"_s);
+    return songs + u", Spielzeit "_s + PlayingTime(Seconds());
+}

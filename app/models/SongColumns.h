@@ -1,0 +1,41 @@
+#pragma once
+
+#include <QString>
+#include <Qt>
+#include <optional>
+#include <span>
+
+#include "MusicManagment/database/SongTypes.h"
+#include "ReadMPEGHeader/ID3Tag.h"
+
+enum class SongColumnId {
+    Title,
+    Artist,
+    Album,
+    Year,
+    Length,
+    Genre,
+    Track,
+    BitRate,
+    SampleRate,
+    Format,
+    PlayCount,
+    Comment,
+    AddTime,
+    Path,
+};
+
+// A column of the song list.
+struct SongColumn {
+    SongColumnId Id;
+    const char16_t* Caption;
+    int Width;  // at first, in average characters
+    Qt::AlignmentFlag Alignment;
+    std::optional<TSortType> Sort;  // what a click on the header sorts by; some columns have no order
+    QString (*Text)(const TID3Tag& song);
+};
+
+// All columns, from left to right.
+std::span<const SongColumn> SongColumns();
+// The column that shows what songs are sorted by; -1 when none does.
+int ColumnOfSortType(TSortType type);

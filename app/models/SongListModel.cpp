@@ -1,0 +1,218 @@
+#include "app/models/SongListModel.h"
+
+#include <algorithm>
+#include <unordered_map>
+
+#include "CommonRUKTools/Clock.h"
+#include "app/models/SongColumns.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+// Milliseconds between two times at which the views are told.
+constexpr qint64 kSyncInterval = 250;
+// Telling the views of a large list takes its time; it gets at most the tenth part of a scan.
+constexpr qint64 kRestPerWork = 9;
+constexpr qint64 kLongestRest = 3000;
+// A journal of more pieces costs more than telling the views.
+constexpr std::size_t kJournalLimit = 4000;
+
+const SongColumn& ColumnOf(int section) {
+    return SongColumns()[static_cast<std::size_t>(section)];
+}
+
+int CellAlignment(const SongColumn& column) {
+    return (column.Alignment | Qt::AlignVCenter).toInt();
+}
+
+}  // namespace
+
+// While it lives all songs may change their rows; its end tells the views where each of theirs has gone.
+class SongListModel::Reordering {
+ public:
+    explicit Reordering(SongListModel& model) : model_(model) {
+        Q_EMIT model_.layoutAboutToBeChanged({}, VerticalSortHint);
+        before_ = model_.persistentIndexList();
+        for (const QModelIndex& index : std::as_const(before_)) {
+            songs_.push_back(model_.SongAt(index.row()));
+            rows_.emplace(songs_.back(), -1);
+        }
+        model_.reordering_ = true;
+    }
+    ~Reordering() {
+        model_.reordering_ = false;
+        FindRows();
+        QModelIndexList after;
+        after.reserve(before_.size());
+        for (qsizetype i = 0; i < before_.size(); ++i)
+            after << model_.index(rows_.at(songs_[static_cast<std::size_t>(i)]), before_[i].column());
+        model_.changePersistentIndexList(before_, after);
+        Q_EMIT model_.layoutChanged({}, VerticalSortHint);
+    }
+    Reordering(const Reordering&) = delete;
+    Reordering& operator=(const Reordering&) = delete;
+
+ private:
+    void FindRows() {
+        if (rows_.empty()) return;
+        int row = 0;
+        for (const auto& song : model_.database_.Songs()) {
+            const auto found = rows_.find(song.get());
+            if (found != rows_.end()) found->second = row;
+            ++row;
+        }
+    }
+
+    SongListModel& model_;
+    QModelIndexList before_;             // what the views hold on to
+    std::vector<const TID3Tag*> songs_;  // the song of each
+    std::unordered_map<const TID3Tag*, int> rows_;
+};
+
+SongListModel::SongListModel(TMusicDatabase& database) : database_(database) {
+    syncTimer_.setSingleShot(true);
+    QObject::connect(&syncTimer_, &QTimer::timeout, this, &SongListModel::SyncViews);
+    database_.SetSongListView(this);
+    Reset();
+}
+
+SongListModel::~SongListModel() {
+    database_.SetSongListView(nullptr);
+}
+
+// --- What views ask ---
+
+const TID3Tag* SongListModel::SongAt(int row) const {
+    const int place = journal_.Empty() ? row : journal_.NewRowOf(row);
+    return place >= 0 && place < database_.Count() ? &database_.Song(place) : nullptr;
+}
+
+int SongListModel::rowCount(const QModelIndex& parent) const {
+    return parent.isValid() ? 0 : rows_;
+}
+
+int SongListModel::columnCount(const QModelIndex& parent) const {
+    return parent.isValid() ? 0 : static_cast<int>(SongColumns().size());
+}
+
+QVariant SongListModel::data(const QModelIndex& index, int role) const {
+    if (!index.isValid()) return {};
+    const SongColumn& column = ColumnOf(index.column());
+    if (role == Qt::TextAlignmentRole) return CellAlignment(column);
+    if (role != Qt::DisplayRole) return {};
+    const TID3Tag* song = SongAt(index.row());
+    return song != nullptr ? column.Text(*song) : QString();
+}
+
+QVariant SongListModel::headerData(int section, Qt::Orientation orientation, int role) const {
+    if (orientation != Qt::Horizontal || section < 0 || section >= columnCount()) return {};
+    const SongColumn& column = ColumnOf(section);
+    if (role == Qt::TextAlignmentRole) return CellAlignment(column);
+    return role == Qt::DisplayRole ? QString::fromUtf16(column.Caption) : QVariant();
+}
+
+// --- Order ---
+
+void SongListModel::SetOrder(const SongOrder& order) {
+    // A run goes through the list by position and must not find it in another order.
+    if (database_.ProgressRunning())
+        throw EMusicDatabaseException(u"Umsortieren der Datenbank ist momentan nicht möglich."_s);
+    SyncViews();
+    const Reordering reordering(*this);
+    database_.SetOrder(order);
+}
+
+// --- What the database tells ---
+
+void SongListModel::SongChanged(SongIndex index, TChangeType change) {
+    if (reordering_) return;
+    if (index < 0) return Reset();
+    switch (change) {
+        case ctInserted:
+            journal_.Insert(index);
+            break;
+        case ctRemoved:
+            journal_.Remove(index);
+            break;
+        case ctChanged:
+            contentChanged_ = true;
+            break;
+    }
+    ScheduleSync();
+}
+
+void SongListModel::SongMoved(SongIndex from, SongIndex to) {
+    journal_.Move(from, to);
+    ScheduleSync();
+}
+
+void SongListModel::DatabaseCleared() {
+    Reset();
+}
+
+void SongListModel::PrepareMultiAdd(int) {}  // rows cost nothing here
+
+quint32 SongListModel::ShownFlag() const {
+    return 0;  // no column shows a single flag
+}
+
+// --- Telling the views ---
+
+void SongListModel::Reset() {
+    syncTimer_.stop();
+    beginResetModel();
+    rows_ = database_.Count();
+    journal_.Start(rows_);
+    contentChanged_ = false;
+    endResetModel();
+}
+
+void SongListModel::ScheduleSync() {
+    if (journal_.NewCount() != database_.Count()) return Reset();  // songs came without being told
+    if (journal_.Size() > kJournalLimit) return SyncViews();
+    if (syncTimer_.isActive()) return;
+    const qint64 rest = nextSync_ - CurrentClock().Ticks();
+    syncTimer_.start(static_cast<int>(std::clamp<qint64>(rest, 0, kLongestRest)));
+}
+
+void SongListModel::SyncViews() {
+    syncTimer_.stop();
+    const qint64 begin = CurrentClock().Ticks();
+    if (!journal_.Empty()) SyncRows();
+    if (contentChanged_ && rows_ > 0) Q_EMIT dataChanged(index(0, 0), index(rows_ - 1, columnCount() - 1));
+    contentChanged_ = false;
+    const qint64 end = CurrentClock().Ticks();
+    nextSync_ = end + std::max(kSyncInterval, (end - begin) * kRestPerWork);
+}
+
+// New rows first come at the end and removed rows last go from the end; between the two all rows take their
+// places in one step. So the views have one look at their whole list and not one for every song.
+void SongListModel::SyncRows() {
+    const int after = journal_.NewCount();
+    const bool onlyAppended = journal_.OldRowsStay();
+    if (onlyAppended) journal_.Start(after);
+    if (after > rows_) {
+        beginInsertRows({}, rows_, after - 1);
+        rows_ = after;
+        endInsertRows();
+    }
+    if (!onlyAppended) PlaceRows();
+    if (after < rows_) {
+        beginRemoveRows({}, after, rows_ - 1);
+        rows_ = after;
+        endRemoveRows();
+    }
+}
+
+void SongListModel::PlaceRows() {
+    Q_EMIT layoutAboutToBeChanged({}, VerticalSortHint);
+    const QModelIndexList before = persistentIndexList();
+    QModelIndexList after;
+    after.reserve(before.size());
+    for (const QModelIndex& old : before)
+        after << index(journal_.NewRowOf(old.row()), old.column());  // no index for a removed song
+    journal_.Start(journal_.NewCount());
+    changePersistentIndexList(before, after);
+    Q_EMIT layoutChanged({}, VerticalSortHint);
+}

@@ -1,0 +1,12 @@
+#include <gtest/gtest.h>
+
+#include <QApplication>
+
+#include "app/desktop/Translations.h"
+
+int main(int argc, char** argv) {
+    QApplication application(argc, argv);
+    InstallGerman(application);
+    testing::InitGoogleTest(&argc, argv);
+    return RUN_ALL_TESTS();
+}

@@ -1,0 +1,322 @@
+#include "app/MainWindow.h"
+
+#include <gtest/gtest.h>
+
+#include <QAction>
+#include <QDir>
+#include <QDropEvent>
+#include <QFile>
+#include <QLabel>
+#include <QMenuBar>
+#include <QMimeData>
+#include <QPushButton>
+#include <QTableView>
+#include <QTemporaryDir>
+#include <QTest>
+#include <QTimer>
+#include <QUrl>
+
+#include "app/dialogs/ProgressWindow.h"
+#include "tests/PrintQt.h"
+#include "tests/ReadMPEGHeader/Builders.h"
+#include "tests/app/ScriptedDialogs.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+constexpr int kYes = 0;
+constexpr int kNo = 1;
+
+// A main window over a data folder of its own, and songs to take in.
+class MainWindowTest : public testing::Test {
+ protected:
+    QString InData(const QString& name) const { return folder_.filePath(u"data/"_s + name); }
+    QString StandardDatabase() const { return InData(u"Tunestead3_Database.tsdb"_s); }
+    QString Music() const { return folder_.filePath(u"Musik"_s); }
+
+    void MakeSongs(int count, const QString& artist = u"Band"_s) const {
+        const QDir music(Music() + u'/' + artist);
+        music.mkpath(u"."_s);
+        for (int i = 0; i < count; ++i) {
+            const QByteArray title = "Lied " + QByteArray::number(100 + i);
+            Write(music.filePath(QString::fromLatin1(title) + u".mp3"_s),
+                  Mp3Builder().Frames(80).Id3v1(title.toStdString(), artist.toStdString()).Data());
+        }
+    }
+    static void Write(const QString& path, const Bytes& bytes) {
+        QDir().mkpath(QFileInfo(path).path());
+        QFile file(path);
+        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+        file.write(reinterpret_cast<const char*>(bytes.data()), static_cast<qint64>(bytes.size()));
+    }
+    static QByteArray Read(const QString& path) {
+        QFile file(path);
+        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
+    }
+
+    void Start(const QStringList& arguments = {}) {
+        window_.reset();  // only one at a time owns the data folder
+        window_ = std::make_unique<TTunesteadMainWnd>(
+            MainWindowOptions{{folder_.filePath(u"data"_s)}, folder_.filePath(u"settings.ini"_s), arguments});
+        window_->show();
+        Work();
+    }
+    // Lets everything happen that is due, also what comes of it.
+    static void Work() {
+        for (int i = 0; i < 5; ++i)
+            QApplication::processEvents();
+    }
+    void Drop(const QStringList& paths) {
+        QMimeData data;
+        QList<QUrl> urls;
+        for (const QString& path : paths)
+            urls << QUrl::fromLocalFile(path);
+        data.setUrls(urls);
+        QDragEnterEvent enter(QPoint(20, 20), Qt::CopyAction, &data, Qt::LeftButton, Qt::NoModifier);
+        QApplication::sendEvent(window_.get(), &enter);
+        EXPECT_TRUE(enter.isAccepted());
+        QDropEvent drop(QPointF(20, 20), Qt::CopyAction, &data, Qt::LeftButton, Qt::NoModifier);
+        QApplication::sendEvent(window_.get(), &drop);
+    }
+    // Runs as soon as the next long operation lets the interface work.
+    void DuringRun(std::function<void()> action) {
+        QTimer::singleShot(0, window_.get(), [this, action] {
+            EXPECT_TRUE(Database().ProgressRunning());
+            action();
+        });
+    }
+
+    TMusicDatabase& Database() { return window_->Database(); }
+    template <typename T>
+    T* Child(const QString& name) {
+        return window_->findChild<T*>(name);
+    }
+    bool ShowsList() { return Child<QTableView>(u"songList"_s)->isVisible(); }
+    bool ShowsEmptyState() { return Child<QWidget>(u"emptyState"_s)->isVisible(); }
+    bool ShowsProgress() {
+        const auto* progress = Child<QWidget>(u"progressWindow"_s);
+        return progress != nullptr && progress->isVisible();
+    }
+    QAction* Command(const QString& caption) {
+        for (QAction* action : window_->menuBar()->actions().first()->menu()->actions())
+            if (action->text().remove(u'&') == caption) return action;
+        return nullptr;
+    }
+
+    QTemporaryDir folder_;
+    ScriptedDialogs dialogs_;
+    std::unique_ptr<TTunesteadMainWnd> window_;
+};
+
+TEST_F(MainWindowTest, StartsEmptyAndLeavesNoFilesBehind) {
+    Start();
+    EXPECT_TRUE(ShowsEmptyState());
+    EXPECT_FALSE(ShowsList());
+    EXPECT_EQ(window_->windowTitle(), u"Tunestead v6.0"_s);
+    EXPECT_EQ(Child<QLabel>(u"summary"_s)->text(), u"0 Songs, Spielzeit 0:00"_s);
+    EXPECT_TRUE(window_->close());
+    EXPECT_FALSE(QFile::exists(StandardDatabase()));
+    EXPECT_TRUE(dialogs_.Messages.isEmpty() && dialogs_.Questions.isEmpty());
+}
+
+TEST_F(MainWindowTest, ADroppedFolderIsTakenInAndThereAtTheNextStart) {
+    MakeSongs(12);
+    Start();
+    Drop({Music()});
+    Work();
+    EXPECT_TRUE(ShowsList());
+    EXPECT_EQ(Child<QTableView>(u"songList"_s)->model()->rowCount(), 12);
+    EXPECT_EQ(Child<QLabel>(u"summary"_s)->text(), u"12 Songs, Spielzeit 0:24"_s);
+    EXPECT_TRUE(window_->close());
+
+    Start();
+    EXPECT_TRUE(ShowsList());
+    EXPECT_EQ(Database().Count(), 12);
+    EXPECT_EQ(Database().Song(0).Title, u"Lied 100"_s);
+}
+
+TEST_F(MainWindowTest, TheCommandLineTakesFoldersSongsAndCapitals) {
+    MakeSongs(3);
+    Write(folder_.filePath(u"EINZELN.MP3"_s), Mp3Builder().Frames(80).Data());
+    Write(folder_.filePath(u"brief.TXT"_s), {});
+    Start({Music(), folder_.filePath(u"EINZELN.MP3"_s), folder_.filePath(u"brief.TXT"_s),
+           folder_.filePath(u"fehlt.mp3"_s)});
+    EXPECT_EQ(Database().Count(), 4);
+    EXPECT_EQ(dialogs_.Messages,
+              QStringList({u"Unbekannter Dateityp: .TXT"_s,
+                           u"Datei nicht gefunden: "_s + folder_.filePath(u"fehlt.mp3"_s)}));
+}
+
+TEST_F(MainWindowTest, ADatabaseOnTheCommandLineIsLoadedWhenTheUserAgrees) {
+    MakeSongs(2);
+    const QString other = folder_.filePath(u"andere.TSDB"_s);
+    Start({Music()});
+    ASSERT_TRUE(Database().SaveDatabase(other, true));
+    Database().SetModified(false);
+
+    Start({other});
+    EXPECT_EQ(dialogs_.Questions, QStringList{u"Soll diese Datenbank nun geladen werden:\r\n"_s + other});
+    EXPECT_EQ(Database().Count(), 0);
+    dialogs_.Answers = {kYes};
+    Start({other});
+    EXPECT_EQ(Database().Count(), 2);
+    EXPECT_EQ(Database().FileName(), other);
+}
+
+TEST_F(MainWindowTest, CommandsRestWhileARunGoesAndTheStopButtonEndsIt) {
+    MakeSongs(60);
+    Start();
+    Drop({Music()});
+    DuringRun([this] {
+        EXPECT_TRUE(ShowsProgress());
+        EXPECT_FALSE(Command(u"Neue Datenbank"_s)->isEnabled());
+        EXPECT_TRUE(Command(u"Beenden"_s)->isEnabled());
+        EXPECT_TRUE(window_->windowTitle().startsWith(u"Tunestead v6.0 - "_s));
+        Child<QPushButton>(u"stop"_s)->click();
+    });
+    Work();
+    EXPECT_LT(Database().Count(), 60);
+    EXPECT_FALSE(ShowsProgress());
+    EXPECT_TRUE(Command(u"Neue Datenbank"_s)->isEnabled());
+    EXPECT_EQ(window_->windowTitle(), u"Tunestead v6.0"_s);
+}
+
+TEST_F(MainWindowTest, ClosingDuringARunAsksAndNeverCloses) {
+    MakeSongs(60);
+    for (const int answer : {kNo, kYes}) {
+        Start();
+        dialogs_.Questions.clear();
+        dialogs_.Answers = {answer};
+        Drop({Music()});
+        DuringRun([this] { EXPECT_FALSE(window_->close()); });
+        Work();
+        EXPECT_EQ(
+            dialogs_.Questions,
+            QStringList{u"Es wird noch eine Aktion ausgeführt. Brechen Sie diese zuerst ab, bevor Sie das "
+                        "Programm beenden. Aktion jetzt abbrechen?"_s});
+        EXPECT_TRUE(window_->isVisible());
+        EXPECT_EQ(Database().Count() == 60, answer == kNo);
+    }
+}
+
+TEST_F(MainWindowTest, ADropDuringARunIsRefused) {
+    MakeSongs(20);
+    Start();
+    Drop({Music()});
+    DuringRun([this] { Drop({Music()}); });
+    Work();
+    EXPECT_EQ(dialogs_.Messages,
+              QStringList{u"Hinzufügen von Songs zur Datenbank ist momentan nicht möglich."_s});
+    EXPECT_EQ(Database().Count(), 20);
+}
+
+TEST_F(MainWindowTest, ADamagedStandardDatabaseIsOnlyGivenUpWhenTheUserAgrees) {
+    Write(StandardDatabase(), {'T', 'S', 'D', 'B', ' ', 'B', 'y'});
+    const QByteArray before = Read(StandardDatabase());
+    const QString question =
+        u"Die Standard-Datenbank wurde nicht komplett importiert. Wenn Sie nun fortfahren, wird beim Beenden "
+        u"die "
+        "Standard-Datenbank auf der Festplatte mit der nur halb importierten überschrieben => Die noch nicht "
+        "importierten Songs gehen (in der Datenbank) verloren. Trotzdem fortfahren?"_s;
+
+    dialogs_.Answers = {kNo};
+    Start();
+    EXPECT_EQ(dialogs_.Messages, QStringList{u"Dies ist keine gültige Datenbank."_s});
+    EXPECT_EQ(dialogs_.Questions, QStringList{question});
+    EXPECT_FALSE(window_->isVisible());
+    EXPECT_EQ(Read(StandardDatabase()), before);
+
+    MakeSongs(1);
+    dialogs_.Answers = {kYes};
+    Start({Music()});
+    EXPECT_TRUE(window_->isVisible());
+    EXPECT_TRUE(window_->close());
+    EXPECT_NE(Read(StandardDatabase()), before);
+}
+
+TEST_F(MainWindowTest, AStoppedStartDoesNotSaveTheHalfOfTheSongs) {
+    MakeSongs(120);
+    Start({Music()});
+    ASSERT_TRUE(window_->close());
+    const QByteArray before = Read(StandardDatabase());
+
+    dialogs_.Answers = {kNo};
+    window_ = std::make_unique<TTunesteadMainWnd>(
+        MainWindowOptions{{folder_.filePath(u"data"_s)}, folder_.filePath(u"settings.ini"_s), {}});
+    window_->show();
+    DuringRun([this] { Database().RequestAbort(); });
+    Work();
+    EXPECT_EQ(dialogs_.Questions.size(), 1);
+    EXPECT_FALSE(window_->isVisible());
+    EXPECT_EQ(Read(StandardDatabase()), before);
+}
+
+TEST_F(MainWindowTest, AnotherDatabasesChangesAreOnlyLostWhenTheUserSaysSo) {
+    MakeSongs(3);
+    Start();
+    Command(u"Neue Datenbank"_s)->trigger();
+    Drop({Music()});
+    Work();
+    dialogs_.Answers = {2};
+    EXPECT_FALSE(window_->close());
+    dialogs_.Answers = {kYes};  // and the dialog for its name is cancelled
+    EXPECT_FALSE(window_->close());
+    EXPECT_EQ(Database().Count(), 3);
+
+    dialogs_.File = folder_.filePath(u"neu.tsdb"_s);
+    dialogs_.Answers = {kYes};
+    Command(u"Neue Datenbank"_s)->trigger();
+    EXPECT_EQ(Database().Count(), 0);
+    EXPECT_TRUE(QFile::exists(*dialogs_.File));
+    EXPECT_TRUE(ShowsEmptyState());
+
+    Command(u"Datenbank öffnen..."_s)->trigger();
+    EXPECT_EQ(Database().Count(), 3);
+    Database().RemoveEntry(0);
+    dialogs_.Answers = {kNo};
+    EXPECT_TRUE(window_->close());
+    EXPECT_FALSE(QFile::exists(StandardDatabase()));
+}
+
+TEST_F(MainWindowTest, ChangesThatCannotBeSavedHoldTheProgramUntilTheUserGivesThemUp) {
+    MakeSongs(1);
+    Write(folder_.filePath(u"data"_s), {});  // a file where the folder of the standard files belongs
+    Start({Music()});
+    EXPECT_FALSE(window_->close());
+    ASSERT_EQ(dialogs_.Questions.size(), 1);
+    EXPECT_TRUE(dialogs_.Questions.first().contains(u"Trotzdem beenden?"_s));
+    dialogs_.Answers = {0};
+    EXPECT_TRUE(window_->close());
+}
+
+TEST_F(MainWindowTest, EveryCommandHasItsKeys) {
+    Start();
+    const std::pair<QString, QString> shortcuts[] = {{u"Neue Datenbank"_s, u"Ctrl+Alt+N"_s},
+                                                     {u"Datenbank öffnen..."_s, u"Ctrl+Alt+O"_s},
+                                                     {u"Datenbank speichern"_s, u"Ctrl+Alt+S"_s},
+                                                     {u"Beenden"_s, u"Ctrl+Q"_s}};
+    for (const auto& [caption, keys] : shortcuts)
+        EXPECT_EQ(Command(caption)->shortcut(), QKeySequence(keys)) << caption.toStdString();
+    QStringList letters;
+    for (const QAction* action : window_->menuBar()->actions().first()->menu()->actions()) {
+        if (action->isSeparator()) continue;
+        const auto mark = action->text().indexOf(u'&');
+        ASSERT_GE(mark, 0);
+        letters << action->text().at(mark + 1).toLower();
+    }
+    EXPECT_EQ(letters.removeDuplicates(), 0);
+
+    QTest::keyClick(window_.get(), Qt::Key_Q, Qt::ControlModifier);
+    EXPECT_FALSE(window_->isVisible());
+}
+
+TEST_F(MainWindowTest, TheWindowKeepsItsSizeBetweenTwoStarts) {
+    Start();
+    window_->resize(640, 420);
+    window_->close();
+    Start();
+    EXPECT_EQ(window_->size(), QSize(640, 420));
+}
+
+}  // namespace
