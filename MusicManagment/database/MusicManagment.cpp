@@ -6,6 +6,7 @@
 #include <cmath>
 
 #include "CommonRUKTools/Clock.h"
+#include "CommonRUKTools/Collation.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/database/RecycleBin.h"
@@ -305,7 +306,7 @@ void TMusicDatabase::SetMP3MoveSubDirs(QStringList names) {
 void TMusicDatabase::SetCDNames(std::vector<CdName> names) {
     KeepLastOfEachSerial(names);
     std::stable_sort(names.begin(), names.end(), [](const CdName& a, const CdName& b) {
-        return QString::localeAwareCompare(a.Name, b.Name) < 0;
+        return Collation::CompareExactly(a.Name, b.Name) < 0;
     });
     cdNames_ = std::move(names);
 }
