@@ -125,6 +125,11 @@ TEST(AudioFile, AnOrdinarySongIsReadInBothProfiles) {
     }
 }
 
+TEST(AudioFile, ATagTellsTheLengthWhereNoSoundIsFound) {
+    const auto tag = TitledTag("Waterloo", "ABBA").Text("TLEN", "165000").Build();
+    EXPECT_EQ(Read(Mp3Builder().Raw(tag).Noise(500).Data()).Length, 165);
+}
+
 TEST(AudioFile, ResultsOfTheLastFileAreForgotten) {
     Read(Mp3Builder().Frames(10).Data());
     EXPECT_EQ(LastMpegResults().FrameSize, 417);
@@ -195,6 +200,7 @@ TEST(AudioFile, WaveFilesAreNotSearchedForFramesAndMayCarryATrailingTag) {
     EXPECT_EQ(plain.Length, 2);
     EXPECT_EQ(plain.Title, u"Waterloo"_s);
     EXPECT_EQ(plain.AddTime, 1);
+    EXPECT_EQ(LastMpegResults().FrameSize, -1);
     const auto tagged = Mp3Builder().Raw(wave).TrailingTag(TitledTag("T", "A").Build()).Data();
     EXPECT_EQ(Read(tagged).Title, u"T"_s);
     EXPECT_EQ(Read(tagged).MPEGLayer, u"Wave"_s);
