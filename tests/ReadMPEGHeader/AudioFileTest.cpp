@@ -193,8 +193,7 @@ TEST(AudioFile, WithoutAFrameTheExtensionDescribesTheFile) {
 }
 
 TEST(AudioFile, WaveFilesAreNotSearchedForFramesAndMayCarryATrailingTag) {
-    auto wave = WaveFile();
-    wave.insert(wave.end(), {0xFF, 0xFB, 0x90, 0x64});
+    auto wave = Mp3Builder().Raw(WaveFile()).Frames(2).Data();
     const auto plain = Read(wave, InProfile(ReadProfile::Classic), u"/m/ABBA - Waterloo.wav"_s);
     EXPECT_EQ(plain.MPEGLayer, u"Wave"_s);
     EXPECT_EQ(plain.Length, 2);
