@@ -103,6 +103,9 @@ TEST(AudioFile, WhatIsThereButCannotBeReadIsAnError) {
     WriteFile(folder.filePath(u"f"_s), {});
     EXPECT_EQ(ReadAudioFile(folder.filePath(u"f/g.mp3"_s), InProfile(ReadProfile::Classic), tag),
               u"Datei nicht gefunden"_s);
+    // The system would see the name of the file that is there.
+    EXPECT_EQ(ReadAudioFile(folder.filePath(u"f\0g"_s), InProfile(ReadProfile::Classic), tag),
+              u"Datei nicht gefunden"_s);
     BrokenMedium medium;
     EXPECT_THROW(ReadAudioStream(medium, u"/m/x.mp3"_s, InProfile(ReadProfile::Classic), tag), EMediumError);
 }
