@@ -103,6 +103,9 @@ TEST(AudioFile, WhatIsThereButCannotBeReadIsAnError) {
     WriteFile(folder.filePath(u"f"_s), {});
     EXPECT_EQ(ReadAudioFile(folder.filePath(u"f/g.mp3"_s), InProfile(ReadProfile::Classic), tag),
               u"Datei nicht gefunden"_s);
+    // The system would see the name of the file that is there.
+    EXPECT_EQ(ReadAudioFile(folder.filePath(u"f\0g"_s), InProfile(ReadProfile::Classic), tag),
+              u"Datei nicht gefunden"_s);
     BrokenMedium medium;
     EXPECT_THROW(ReadAudioStream(medium, u"/m/x.mp3"_s, InProfile(ReadProfile::Classic), tag), EMediumError);
 }
@@ -123,6 +126,11 @@ TEST(AudioFile, AnOrdinarySongIsReadInBothProfiles) {
         EXPECT_EQ(tag.FileName, path);
         EXPECT_EQ(LastMpegResults().FrameSize, 417);
     }
+}
+
+TEST(AudioFile, ATagTellsTheLengthWhereNoSoundIsFound) {
+    const auto tag = TitledTag("Waterloo", "ABBA").Text("TLEN", "165000").Build();
+    EXPECT_EQ(Read(Mp3Builder().Raw(tag).Noise(500).Data()).Length, 165);
 }
 
 TEST(AudioFile, ResultsOfTheLastFileAreForgotten) {
@@ -188,13 +196,13 @@ TEST(AudioFile, WithoutAFrameTheExtensionDescribesTheFile) {
 }
 
 TEST(AudioFile, WaveFilesAreNotSearchedForFramesAndMayCarryATrailingTag) {
-    auto wave = WaveFile();
-    wave.insert(wave.end(), {0xFF, 0xFB, 0x90, 0x64});
+    auto wave = Mp3Builder().Raw(WaveFile()).Frames(2).Data();
     const auto plain = Read(wave, InProfile(ReadProfile::Classic), u"/m/ABBA - Waterloo.wav"_s);
     EXPECT_EQ(plain.MPEGLayer, u"Wave"_s);
     EXPECT_EQ(plain.Length, 2);
     EXPECT_EQ(plain.Title, u"Waterloo"_s);
     EXPECT_EQ(plain.AddTime, 1);
+    EXPECT_EQ(LastMpegResults().FrameSize, -1);
     const auto tagged = Mp3Builder().Raw(wave).TrailingTag(TitledTag("T", "A").Build()).Data();
     EXPECT_EQ(Read(tagged).Title, u"T"_s);
     EXPECT_EQ(Read(tagged).MPEGLayer, u"Wave"_s);
