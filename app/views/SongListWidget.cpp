@@ -72,6 +72,8 @@ void SongListWidget::SetUpHeader() {
     verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
     QHeaderView* header = horizontalHeader();
     header->setHighlightSections(false);
+    // A header that knew the selection would look through all rows for columns that are selected whole.
+    header->setSelectionModel(new QItemSelectionModel(&model_, header));
     header->setSectionsMovable(true);
     header->setStretchLastSection(true);
     header->setSortIndicatorShown(true);
