@@ -22,17 +22,21 @@ struct IntakeResult {
 QString AcceptedExtensions();
 bool IsSongFile(const QString& path);
 
-// Lets the user pick files (unless some are given), adds them and reports. Throws EMusicDatabaseException
-// while another long operation runs.
+// Lets the user pick files (unless some are given), adds them and reports. What the user picks is read
+// whatever its extension. Each command here saves when AutoSave is -1, and throws EMusicDatabaseException
+// while another long operation runs or the database must not change.
 IntakeResult AddSongsFromDialog(TMusicDatabase& database, const QStringList& files = {});
 // The same for a folder; without one the user picks it.
 IntakeResult AddFolder(TMusicDatabase& database, const QString& folder, bool withSubfolders);
 // Files and folders together, as a drop or a command line gives them: one run and one result, without the
-// report.
+// report. A file without an accepted extension counts as unreadable. Relative and unclean paths are made
+// absolute and clean (AbsolutePath.h), so that a song is not taken in twice under two spellings; a symbolic
+// link is a song of its own beside its target.
 IntakeResult AddPaths(TMusicDatabase& database, const QStringList& paths, bool withSubfolders);
 
 // Adds every file of `list` inside a run that is already going; afterwards `list` holds only those taken in.
-// With `checkExisting` files that are in the collection are passed over. Returns how many were taken in.
+// With `checkExisting` files that are in the collection are passed over. Every 5th file is a progress point,
+// where the user can stop. Returns how many were taken in.
 int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
                 QStringList* newNames = nullptr, IntakeResult* result = nullptr);
 // Adds one file; -1 when it does not exist or could not be taken in.

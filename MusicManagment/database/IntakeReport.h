@@ -1,0 +1,7 @@
+#pragma once
+
+#include "MusicManagment/database/Intake.h"
+
+// Tells the user what came of an intake, and shows the details when asked to: they are written to a text file
+// in the temporary folder, which is opened with the program that the user has chosen for texts.
+void ReportIntake(const IntakeResult& result);
