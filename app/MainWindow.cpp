@@ -13,7 +13,7 @@
 
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/Intake.h"
-//TMP #include "MusicManagment/database/IntakeReport.h"
+#include "MusicManagment/database/IntakeReport.h"
 #include "app/CommandRunner.h"
 #include "app/MainMenu.h"
 #include "app/Startup.h"
@@ -104,6 +104,7 @@ void TTunesteadMainWnd::RunningChanged(bool running) {
     menu_->SetCommandsEnabled(!running);
     empty_->SetCommandsEnabled(!running);
     list_->SetSortingAllowed(!running);
+    if (!running) songs_.SyncViews();
 }
 
 void TTunesteadMainWnd::ListChanged() {
@@ -117,7 +118,7 @@ void TTunesteadMainWnd::ListChanged() {
 // A box only where there is something to worry about.
 void TTunesteadMainWnd::ShowIntake(const IntakeResult& result) {
     statusBar()->showMessage(IntakeMessage(result));
-    //TMP     if (result.Unreadable > 0) ReportIntake(result);
+    if (result.Unreadable > 0) ReportIntake(result);
 }
 
 // --- Files from other windows ---
