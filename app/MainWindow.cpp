@@ -6,6 +6,7 @@
 #include <QLabel>
 #include <QMenuBar>
 #include <QMimeData>
+#include <QScreen>
 #include <QStackedWidget>
 #include <QStatusBar>
 #include <QTimer>
@@ -89,9 +90,10 @@ void TTunesteadMainWnd::SetUpStatusBar() {
 
 void TTunesteadMainWnd::SetUpPlacement() {
     if (RestorePlacement(*this, options_.SettingsFile, QString::fromUtf16(kPlacement))) return;
-    constexpr int kWidth = 150;  // average characters
-    constexpr int kHeight = 36;  // lines
-    resize(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
+    constexpr int kWidth = 190;  // average characters
+    constexpr int kHeight = 42;  // lines
+    const QSize wanted(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
+    resize(wanted.boundedTo(screen()->availableSize() * 0.9));
 }
 
 void TTunesteadMainWnd::StartOnce() {
