@@ -289,6 +289,12 @@ void TMusicDatabase::SetModified(bool modified) {
     if (OnModifiedChange) OnModifiedChange(*this);
 }
 
+void TMusicDatabase::SetCompression(int level) {
+    if (level < clNone || level > clMax)
+        throw EMusicDatabaseException(QString::number(level) + u" ist keine gültige Kompressionsstufe."_s);
+    compression_ = static_cast<TCompressionLevel>(level);
+}
+
 void TMusicDatabase::SetMP3MoveRootDir(const QString& folder) {
     mp3MoveRootDir_ = WithTrailingSeparator(folder);
 }

@@ -337,6 +337,15 @@ TEST_F(MusicManagmentTest, ProgressCountsUnknownsAndPercentages) {
     EXPECT_FALSE(database_.Progress({}));
 }
 
+TEST_F(MusicManagmentTest, CompressionTakesItsLevelsOnly) {
+    EXPECT_EQ(database_.Compression(), clFastest);
+    database_.SetCompression(clMax);
+    for (const int level : {-1, 4, 9})
+        EXPECT_EQ(MessageOf([&] { database_.SetCompression(level); }),
+                  QString::number(level) + u" ist keine gültige Kompressionsstufe."_s);
+    EXPECT_EQ(database_.Compression(), clMax);
+}
+
 TEST_F(MusicManagmentTest, AutoSaveTakesIntervalsAndTheTwoStops) {
     EXPECT_EQ(MessageOf([&] { database_.SetAutoSave(-2); }), u"-2 ist kein gültiges AutoSave-Intervall."_s);
     EXPECT_EQ(database_.AutoSave(), 0);
