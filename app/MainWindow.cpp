@@ -6,6 +6,7 @@
 #include <QLabel>
 #include <QMenuBar>
 #include <QMimeData>
+#include <QScreen>
 #include <QStackedWidget>
 #include <QStatusBar>
 #include <QTimer>
@@ -13,7 +14,7 @@
 
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/Intake.h"
-//TMP #include "MusicManagment/database/IntakeReport.h"
+#include "MusicManagment/database/IntakeReport.h"
 #include "app/CommandRunner.h"
 #include "app/MainMenu.h"
 #include "app/Startup.h"
@@ -89,9 +90,10 @@ void TTunesteadMainWnd::SetUpStatusBar() {
 
 void TTunesteadMainWnd::SetUpPlacement() {
     if (RestorePlacement(*this, options_.SettingsFile, QString::fromUtf16(kPlacement))) return;
-    constexpr int kWidth = 150;  // average characters
-    constexpr int kHeight = 36;  // lines
-    resize(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
+    constexpr int kWidth = 190;  // average characters
+    constexpr int kHeight = 42;  // lines
+    const QSize wanted(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
+    resize(wanted.boundedTo(screen()->availableSize() * 0.9));
 }
 
 void TTunesteadMainWnd::StartOnce() {
@@ -104,6 +106,7 @@ void TTunesteadMainWnd::RunningChanged(bool running) {
     menu_->SetCommandsEnabled(!running);
     empty_->SetCommandsEnabled(!running);
     list_->SetSortingAllowed(!running);
+    if (!running) songs_.SyncViews();
 }
 
 void TTunesteadMainWnd::ListChanged() {
@@ -117,7 +120,7 @@ void TTunesteadMainWnd::ListChanged() {
 // A box only where there is something to worry about.
 void TTunesteadMainWnd::ShowIntake(const IntakeResult& result) {
     statusBar()->showMessage(IntakeMessage(result));
-    //TMP     if (result.Unreadable > 0) ReportIntake(result);
+    if (result.Unreadable > 0) ReportIntake(result);
 }
 
 // --- Files from other windows ---

@@ -17,18 +17,15 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
+// Milliseconds between two pictures. A run comes to thousands of points a second, and painting each would
+// take longer than the run.
+constexpr qint64 kShowInterval = 50;
+
 // A bar counts in int; greater numbers keep their proportion. A maximum of 0 shows a bar without an end.
 void SetBar(QProgressBar& bar, qint64 current, qint64 maximum) {
     const qint64 unit = maximum / std::numeric_limits<int>::max() + 1;
     bar.setRange(0, static_cast<int>(maximum / unit));
     bar.setValue(static_cast<int>(std::min(current, maximum) / unit));
-}
-
-// Room stays kept while the widget is hidden, so that the window does not change its height during a run.
-void KeepRoom(QWidget& widget) {
-    QSizePolicy policy = widget.sizePolicy();
-    policy.setRetainSizeWhenHidden(true);
-    widget.setSizePolicy(policy);
 }
 
 }  // namespace
@@ -53,14 +50,14 @@ TPrgForm::TPrgForm(QWidget* parent)
     connect(stop_, &QPushButton::clicked, this, &TPrgForm::reject);
     SetUpLayout();
     Reset();
+    constexpr int kWidth = 70;  // average characters
+    resize(kWidth * fontMetrics().averageCharWidth(), sizeHint().height());
 }
 
 void TPrgForm::SetUpLayout() {
     QFont bold = heading_->font();
     bold.setBold(true);
     heading_->setFont(bold);
-    KeepRoom(*subBar_);
-    KeepRoom(*subLabel_);
 
     auto* bottom = new QHBoxLayout;
     bottom->addWidget(remaining_, 1);
@@ -72,8 +69,6 @@ void TPrgForm::SetUpLayout() {
         layout->addWidget(widget);
     layout->addStretch();
     layout->addLayout(bottom);
-    constexpr int kWidth = 60;  // average characters
-    resize(kWidth * fontMetrics().averageCharWidth(), sizeHint().height());
 }
 
 void TPrgForm::Start() {
@@ -85,6 +80,13 @@ void TPrgForm::Start() {
 }
 
 void TPrgForm::ShowPoint(const ProgressPoint& point, int percent) {
+    const qint64 now = CurrentClock().Ticks();
+    const bool sameStage = point.Type == shownType_ && point.Max == shownMax_;
+    const bool last = point.Max > 0 && point.Cur >= point.Max;
+    if (sameStage && !last && now - shownAt_ < kShowInterval) return;
+    shownType_ = point.Type;
+    shownMax_ = point.Max;
+    shownAt_ = now;
     heading_->setText(ProgressHeading(point.Type));
     SetBar(*mainBar_, point.Cur, point.Max);
     mainLabel_->setText(ProgressLabel(point.Cur, point.Max, point.Description));
@@ -94,10 +96,11 @@ void TPrgForm::ShowPoint(const ProgressPoint& point, int percent) {
     SetBar(*subBar_, point.CurSub, point.MaxSub);
     subLabel_->setText(ProgressLabel(point.CurSub, point.MaxSub));
     setWindowTitle(ProgressTitle(percent));
-    ShowRemaining(estimate_.Estimate(point.Cur, point.Max, CurrentClock().Ticks()));
+    ShowRemaining(estimate_.Estimate(point.Cur, point.Max, now));
 }
 
 void TPrgForm::Reset() {
+    shownMax_ = -1;
     setWindowTitle(ProgressTitle(-1));
     heading_->setText(ProgressHeading(ptOther));
     SetBar(*mainBar_, 0, 0);

@@ -21,6 +21,7 @@ class TPrgForm : public QDialog {
 
     // Begins the estimate of the remaining time and shows the window.
     void Start();
+    // The first point of a stage and the last are always shown, those between a few times a second.
     void ShowPoint(const ProgressPoint& point, int percent);
     void Reset();
     void Finish();
@@ -39,4 +40,7 @@ class TPrgForm : public QDialog {
     QLabel* remaining_;
     QPushButton* stop_;
     RemainingTime estimate_;
+    TProgressType shownType_ = ptOther;
+    qint64 shownMax_ = -1;
+    qint64 shownAt_ = 0;  // ticks of the clock
 };

@@ -7,6 +7,7 @@
 #include <QInputDialog>
 #include <QMessageBox>
 #include <QPushButton>
+#include <QStandardPaths>
 
 #include "app/dialogs/FileFilters.h"
 
@@ -50,20 +51,10 @@ void SetUpFileDialog(QFileDialog& dialog, const QString& accept) {
     dialog.setLabelText(QFileDialog::LookIn, u"Suchen in:"_s);
 }
 
-void ApplyOptions(QFileDialog& dialog, const FileDialogOptions& options) {
-    dialog.setWindowTitle(options.Title);
-    dialog.setOption(QFileDialog::HideNameFilterDetails);
-    const QStringList filters = NameFilters(options.Filter);
-    if (!filters.isEmpty()) dialog.setNameFilters(filters);
-    if (!options.DefaultExtension.isEmpty()) dialog.setDefaultSuffix(options.DefaultExtension);
-    const QFileInfo preset(options.Preset);
-    if (options.Preset.isEmpty()) return;
-    dialog.setDirectory(preset.isDir() ? preset.absoluteFilePath() : preset.absolutePath());
-    if (!preset.isDir()) dialog.selectFile(preset.fileName());
-}
-
-QStringList Choose(QFileDialog& dialog) {
-    return dialog.exec() == QDialog::Accepted ? dialog.selectedFiles() : QStringList();
+// Songs mostly lie there.
+QString MusicFolder() {
+    const QString music = QStandardPaths::writableLocation(QStandardPaths::MusicLocation);
+    return QFileInfo(music).isDir() ? music : QDir::homePath();
 }
 
 }  // namespace
@@ -71,6 +62,27 @@ QStringList Choose(QFileDialog& dialog) {
 QWidget* QtDialogs::Parent() const {
     QWidget* active = QApplication::activeWindow();
     return active != nullptr ? active : mainWindow_.data();
+}
+
+void QtDialogs::ApplyOptions(QFileDialog& dialog, const FileDialogOptions& options) const {
+    if (!options.Title.isEmpty()) dialog.setWindowTitle(options.Title);
+    dialog.setOption(QFileDialog::HideNameFilterDetails);
+    const QStringList filters = NameFilters(options.Filter);
+    if (!filters.isEmpty()) dialog.setNameFilters(filters);
+    if (!options.DefaultExtension.isEmpty()) dialog.setDefaultSuffix(options.DefaultExtension);
+
+    const QFileInfo preset(options.Preset);
+    if (options.Preset.isEmpty())
+        dialog.setDirectory(folder_.isEmpty() ? MusicFolder() : folder_);
+    else
+        dialog.setDirectory(preset.isDir() ? preset.absoluteFilePath() : preset.absolutePath());
+    if (!options.Preset.isEmpty() && !preset.isDir()) dialog.selectFile(preset.fileName());
+}
+
+QStringList QtDialogs::Choose(QFileDialog& dialog) {
+    if (dialog.exec() != QDialog::Accepted) return {};
+    folder_ = dialog.directory().absolutePath();
+    return dialog.selectedFiles();
 }
 
 void QtDialogs::ShowMessage(MessageKind kind, const QString& text) {
@@ -152,6 +164,7 @@ std::optional<QString> QtDialogs::ChooseFolder(const QString& caption) {
     dialog.setFileMode(QFileDialog::Directory);
     dialog.setOption(QFileDialog::ShowDirsOnly);
     SetUpFileDialog(dialog, u"Auswählen"_s);
+    ApplyOptions(dialog, {});
     dialog.setLabelText(QFileDialog::FileName, u"Ordner:"_s);
     const QStringList folders = Choose(dialog);
     return folders.isEmpty() ? std::nullopt : std::optional(folders.first());

@@ -5,6 +5,8 @@
 
 #include "CommonRUKTools/Dialogs.h"
 
+class QFileDialog;
+
 // Asks the user with windows. They belong to the window that is active, else to the main window.
 class QtDialogs : public Dialogs {
  public:
@@ -21,6 +23,10 @@ class QtDialogs : public Dialogs {
 
  private:
     QWidget* Parent() const;
+    void ApplyOptions(QFileDialog& dialog, const FileDialogOptions& options) const;
+    // What was chosen; empty on cancel.
+    QStringList Choose(QFileDialog& dialog);
 
     QPointer<QWidget> mainWindow_;
+    QString folder_;  // where the last choice was made
 };

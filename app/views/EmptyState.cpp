@@ -37,6 +37,7 @@ EmptyState::EmptyState(QWidget* parent) : QWidget(parent) {
                             ThemeIcon(u"folder-music"_s, QStyle::SP_DirIcon), &EmptyState::OnAddFolder);
     addSongs_ = MakeButton(u"Songs zur Datenbank hinzufügen..."_s,
                            ThemeIcon(u"audio-x-generic"_s, QStyle::SP_FileIcon), &EmptyState::OnAddSongs);
+    setFocusProxy(addFolder_);
 
     auto* layout = new QVBoxLayout(this);
     layout->addStretch();

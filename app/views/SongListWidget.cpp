@@ -49,9 +49,7 @@ SongListWidget::SongListWidget(SongListModel& model, TMusicDatabase& database, Q
     SetUpLook();
     SetUpHeader();
     FitToFont();
-    for (int i = 0; i < model.columnCount(); ++i)
-        setColumnWidth(i,
-                       SongColumns()[static_cast<std::size_t>(i)].Width * fontMetrics().averageCharWidth());
+    SetColumnWidths();
     FollowModel();
     ShowSortIndicator();
 }
@@ -72,6 +70,8 @@ void SongListWidget::SetUpHeader() {
     verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
     QHeaderView* header = horizontalHeader();
     header->setHighlightSections(false);
+    // A header that knew the selection would look through all rows for columns that are selected whole.
+    header->setSelectionModel(new QItemSelectionModel(&model_, header));
     header->setSectionsMovable(true);
     header->setStretchLastSection(true);
     header->setSortIndicatorShown(true);
@@ -83,6 +83,16 @@ void SongListWidget::SetUpHeader() {
 void SongListWidget::FitToFont() {
     verticalHeader()->setMinimumSectionSize(0);
     verticalHeader()->setDefaultSectionSize(fontMetrics().height() + fontMetrics().height() / 3);
+}
+
+// A caption is never cut, whatever the font.
+void SongListWidget::SetColumnWidths() {
+    ensurePolished();
+    for (int i = 0; i < model_.columnCount(); ++i) {
+        const int wanted =
+            SongColumns()[static_cast<std::size_t>(i)].Width * fontMetrics().averageCharWidth();
+        setColumnWidth(i, std::max(wanted, horizontalHeader()->sectionSizeHint(i)));
+    }
 }
 
 void SongListWidget::changeEvent(QEvent* event) {
@@ -139,6 +149,7 @@ void SongListWidget::FollowModel() {
     connect(selectionModel(), &QItemSelectionModel::currentChanged, this, [this](const QModelIndex& current) {
         const TID3Tag* song = current.isValid() ? model_.SongAt(current.row()) : nullptr;
         if (song != nullptr) focusedPath_ = song->FileName;
+        viewport()->update();  // the focus shows in whole rows, the view would paint single cells
     });
     connect(&model_, &QAbstractItemModel::layoutAboutToBeChanged, this, &SongListWidget::KeepTopRow);
     connect(&model_, &QAbstractItemModel::layoutChanged, this, &SongListWidget::RestoreTopRow);

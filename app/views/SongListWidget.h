@@ -27,6 +27,7 @@ class SongListWidget : public QTableView {
     void SetUpLook();
     void SetUpHeader();
     void FitToFont();
+    void SetColumnWidths();
     void HeaderClicked(int section);
     void ShowSortIndicator();
     void FollowModel();

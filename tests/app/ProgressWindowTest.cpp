@@ -72,6 +72,14 @@ TEST_F(ProgressWindowTest, EachKindOfRunHasItsHeading) {
     }
 }
 
+TEST_F(ProgressWindowTest, PointsInQuickSuccessionAreNotAllPaintedButTheLastIs) {
+    window_.ShowPoint({1, 12, 0, 0, ptAddSongs, QString()}, 8);
+    window_.ShowPoint({2, 12, 0, 0, ptAddSongs, QString()}, 16);
+    EXPECT_EQ(Text(u"mainLabel"_s), u"1 von 12"_s);
+    window_.ShowPoint({12, 12, 0, 0, ptAddSongs, QString()}, 100);
+    EXPECT_EQ(Text(u"mainLabel"_s), u"12 von 12"_s);
+}
+
 TEST_F(ProgressWindowTest, NumbersBeyondABarKeepTheirProportion) {
     window_.ShowPoint({3'000'000'000, 6'000'000'000, 0, 0, ptCopySongs, QString()}, 50);
     const QProgressBar& bar = Bar(u"mainBar"_s);
