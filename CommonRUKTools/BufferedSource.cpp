@@ -11,7 +11,7 @@ constexpr std::size_t kTailSize = 256;
 }  // namespace
 
 std::size_t BufferedSource::ReadAt(std::int64_t position, std::span<std::uint8_t> target) {
-    if (position < 0 || position >= size_) return 0;
+    if (position < 0 || position >= size_ || target.empty()) return 0;
     const auto count = static_cast<std::size_t>(
         std::min<std::int64_t>(size_ - position, static_cast<std::int64_t>(target.size())));
     if (count > chunk_) return source_.ReadAt(position, target.first(count));
@@ -30,7 +30,8 @@ const BufferedSource::Window& BufferedSource::Fetch(std::int64_t position, std::
         return windows_[i];
     }
     if (tail_.Holds(position, count)) return tail_;
-    const auto left = static_cast<std::size_t>(std::min<std::int64_t>(size_ - position, chunk_));
+    const auto left =
+        static_cast<std::size_t>(std::min<std::int64_t>(size_ - position, static_cast<std::int64_t>(chunk_)));
     if (left <= kTailSize && kTailSize <= chunk_) {
         const auto size = std::min<std::int64_t>(size_, kTailSize);
         Fill(tail_, size_ - size, static_cast<std::size_t>(size));

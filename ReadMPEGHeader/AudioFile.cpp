@@ -104,7 +104,7 @@ class AudioFileReading {
 
     bool ReadAsf() {
         const auto info = ReadAsfHeader(stream_);
-        if (!info) return false;
+        if (!info) throw EStreamError(u"Der Kopf der Datei ist beschädigt"_s);
         wma_ = TagFromAsf(*info, profile_.WmaLength());
         if (wma_->AddTime == 0) wma_->AddTime = result_.AddTime;  // the header names no creation time
         hasTechnicalData_ = true;

@@ -24,6 +24,11 @@ bool IsLanguageByte(std::uint8_t byte) {
 
 }  // namespace
 
+void FrameBody::ReadEncoding() {
+    encoding_ = reader_.U8();
+    bigEndian_ = rules_ != TextRules::Classic && encoding_ == kUtf16Be;
+}
+
 bool FrameBody::IsWide() const {
     if (rules_ == TextRules::Classic) return encoding_ != 0;
     return encoding_ == kUtf16 || encoding_ == kUtf16Be;
@@ -40,11 +45,13 @@ std::size_t FrameBody::TextLength(bool wide) const {
 
 QString FrameBody::DecodeWide(ByteSpan bytes) {
     const bool littleMark = StartsWithMark(bytes, 0xFF, 0xFE);
-    if (littleMark) return CodePage::FromUtf16Le(bytes.subspan(2));
     // The classic rules know no other byte order; a mark that says otherwise changes nothing.
-    if (rules_ == TextRules::Classic) return CodePage::FromUtf16Le(bytes);
-    if (StartsWithMark(bytes, 0xFE, 0xFF)) return CodePage::FromUtf16Be(bytes.subspan(2));
-    return encoding_ == kUtf16Be ? CodePage::FromUtf16Be(bytes) : CodePage::FromUtf16Le(bytes);
+    const bool bigMark = rules_ != TextRules::Classic && StartsWithMark(bytes, 0xFE, 0xFF);
+    if (littleMark || bigMark) {
+        bigEndian_ = bigMark;
+        bytes = bytes.subspan(2);
+    }
+    return bigEndian_ ? CodePage::FromUtf16Be(bytes) : CodePage::FromUtf16Le(bytes);
 }
 
 QString FrameBody::Decode(ByteSpan bytes) {

@@ -35,7 +35,7 @@ class FrameBody {
     void Skip(std::size_t count) { reader_.Skip(count); }
 
     // The encoding of the texts that follow.
-    void ReadEncoding() { encoding_ = reader_.U8(); }
+    void ReadEncoding();
     // Up to the next zero character or the end of the frame; the zero is consumed.
     QString Text();
     // A text that is always single-byte (addresses, types, prices).
@@ -58,4 +58,5 @@ class FrameBody {
     TextRules rules_;
     std::size_t size_;
     std::uint8_t encoding_ = 0;
+    bool bigEndian_ = false;  // as the last byte-order mark said; not every text of a frame brings its own
 };

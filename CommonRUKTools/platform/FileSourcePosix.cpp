@@ -16,10 +16,14 @@ QString SystemMessage(const QString& text, const QString& path, int error) {
     return text + path + u": "_s + qt_error_string(error);
 }
 
+// The system would cut such a name at the zero character and find another file.
+bool IsNoName(const QString& path) {
+    return path.contains(QChar(u'\0'));
+}
+
 // The descriptor, -1 when the system refuses.
 int OpenForReading(const QString& path) {
-    // The system would cut the name at a zero character and open another file.
-    if (path.contains(QChar(u'\0'))) {
+    if (IsNoName(path)) {
         errno = ENOENT;
         return -1;
     }
@@ -65,7 +69,7 @@ FileSource::~FileSource() {
 }
 
 bool FileSource::Exists(const QString& path) {
-    return ::access(QFile::encodeName(path).constData(), F_OK) == 0;
+    return !IsNoName(path) && ::access(QFile::encodeName(path).constData(), F_OK) == 0;
 }
 
 std::size_t FileSource::ReadAt(std::int64_t position, std::span<std::uint8_t> target) {

@@ -11,7 +11,13 @@ const wchar_t* Wide(const QString& path) {
     return reinterpret_cast<const wchar_t*>(path.utf16());
 }
 
+// The system would cut such a name at the zero character and find another file.
+bool IsNoName(const QString& path) {
+    return path.contains(QChar(u'\0'));
+}
+
 HANDLE OpenForReading(const QString& path) {
+    if (IsNoName(path)) return INVALID_HANDLE_VALUE;
     return CreateFileW(Wide(path), GENERIC_READ, FILE_SHARE_READ, nullptr, OPEN_EXISTING, 0, nullptr);
 }
 
@@ -53,7 +59,7 @@ FileSource::~FileSource() {
 }
 
 bool FileSource::Exists(const QString& path) {
-    return GetFileAttributesW(Wide(path)) != INVALID_FILE_ATTRIBUTES;
+    return !IsNoName(path) && GetFileAttributesW(Wide(path)) != INVALID_FILE_ATTRIBUTES;
 }
 
 std::size_t FileSource::ReadAt(std::int64_t position, std::span<std::uint8_t> target) {

@@ -55,7 +55,7 @@ bool TMusicDatabase::SaveDatabase(const QString& fileName, bool keepName, bool a
 }
 
 bool TMusicDatabase::OpenDatabase(const QString& fileName, bool keepName) {
-    RefuseDuringRun(*this);
+    RefuseReadingNow(*this);
     if (fileName.isEmpty()) {
         Clear(true, keepName);
         return true;

@@ -17,3 +17,7 @@ bool WriteDatabase(TMusicDatabase& database, SafeFile& file);
 // the run. Throws EMusicDatabaseException with the reason when the file is damaged; the songs read so far are
 // kept.
 bool ReadDatabase(TMusicDatabase& database, ByteSource& stream);
+
+// For whoever changes something before the reading begins, which refuses in the same way: throws EAbort,
+// after telling the user, while a run is going, and EMusicDatabaseException while the songs must not change.
+void RefuseReadingNow(TMusicDatabase& database);

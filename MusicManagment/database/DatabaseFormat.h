@@ -35,7 +35,7 @@ inline constexpr std::array<GroupList, 4> kGroupLists = {
 struct SongText {
     QString TID3Tag::*Field;
     QStringView Word;  // its name in messages
-    bool Repeats;          // many songs have the same one
+    bool Repeats;      // many songs have the same one
 };
 inline constexpr std::array<SongText, 6> kSongTexts = {{{&TID3Tag::FileName, u"FileName", false},
                                                         {&TID3Tag::Title, u"Title", false},

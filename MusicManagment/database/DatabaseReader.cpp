@@ -276,8 +276,7 @@ void SettleForPart(TMusicDatabase& database) {
 }  // namespace
 
 bool ReadDatabase(TMusicDatabase& database, ByteSource& stream) {
-    RefuseDuringRun(database);
-    if (database.Busy()) throw EMusicDatabaseException(u"Lesen der Datenbank ist momentan nicht möglich."_s);
+    RefuseReadingNow(database);
     database.Clear(true, true);
     const Header header = ReadHeader(stream);
     bool finished = false;
@@ -294,4 +293,9 @@ bool ReadDatabase(TMusicDatabase& database, ByteSource& stream) {
     database.RaiseChange(-1, ctChanged);
     database.SetModified(false);
     return true;
+}
+
+void RefuseReadingNow(TMusicDatabase& database) {
+    RefuseDuringRun(database);
+    if (database.Busy()) throw EMusicDatabaseException(u"Lesen der Datenbank ist momentan nicht möglich."_s);
 }

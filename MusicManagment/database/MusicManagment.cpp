@@ -6,6 +6,7 @@
 #include <cmath>
 
 #include "CommonRUKTools/Clock.h"
+#include "CommonRUKTools/Collation.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/database/RecycleBin.h"
@@ -288,6 +289,12 @@ void TMusicDatabase::SetModified(bool modified) {
     if (OnModifiedChange) OnModifiedChange(*this);
 }
 
+void TMusicDatabase::SetCompression(int level) {
+    if (level < clNone || level > clMax)
+        throw EMusicDatabaseException(QString::number(level) + u" ist keine gültige Kompressionsstufe."_s);
+    compression_ = static_cast<TCompressionLevel>(level);
+}
+
 void TMusicDatabase::SetMP3MoveRootDir(const QString& folder) {
     mp3MoveRootDir_ = WithTrailingSeparator(folder);
 }
@@ -305,7 +312,7 @@ void TMusicDatabase::SetMP3MoveSubDirs(QStringList names) {
 void TMusicDatabase::SetCDNames(std::vector<CdName> names) {
     KeepLastOfEachSerial(names);
     std::stable_sort(names.begin(), names.end(), [](const CdName& a, const CdName& b) {
-        return QString::localeAwareCompare(a.Name, b.Name) < 0;
+        return Collation::CompareExactly(a.Name, b.Name) < 0;
     });
     cdNames_ = std::move(names);
 }

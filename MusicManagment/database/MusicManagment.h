@@ -132,8 +132,7 @@ class TMusicDatabase : public QObject {
     const SortedTextList& BannList() const { return bannList_; }
     const QString& Caption() const { return caption_; }
     int Compression() const { return compression_; }
-    // zlib level: 0 none, 1 fastest, -1 default, 9 best. Other values are refused with
-    // EMusicDatabaseException.
+    // A TCompressionLevel. Throws EMusicDatabaseException for any other number.
     void SetCompression(int level);
     bool Asynchronous() const { return asynchronous_; }
     void SetAsynchronous(bool value) { asynchronous_ = value; }

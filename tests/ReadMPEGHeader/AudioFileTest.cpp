@@ -9,6 +9,7 @@
 #include "CommonRUKTools/Errors.h"
 #include "ReadMPEGHeader/MpegResults.h"
 #include "tests/PrintQt.h"
+#include "tests/ReadMPEGHeader/AsfBuilder.h"
 #include "tests/ReadMPEGHeader/Builders.h"
 
 using namespace Qt::StringLiterals;
@@ -102,6 +103,9 @@ TEST(AudioFile, WhatIsThereButCannotBeReadIsAnError) {
     WriteFile(folder.filePath(u"f"_s), {});
     EXPECT_EQ(ReadAudioFile(folder.filePath(u"f/g.mp3"_s), InProfile(ReadProfile::Classic), tag),
               u"Datei nicht gefunden"_s);
+    // The system would see the name of the file that is there.
+    EXPECT_EQ(ReadAudioFile(folder.filePath(u"f\0g"_s), InProfile(ReadProfile::Classic), tag),
+              u"Datei nicht gefunden"_s);
     BrokenMedium medium;
     EXPECT_THROW(ReadAudioStream(medium, u"/m/x.mp3"_s, InProfile(ReadProfile::Classic), tag), EMediumError);
 }
@@ -122,6 +126,11 @@ TEST(AudioFile, AnOrdinarySongIsReadInBothProfiles) {
         EXPECT_EQ(tag.FileName, path);
         EXPECT_EQ(LastMpegResults().FrameSize, 417);
     }
+}
+
+TEST(AudioFile, ATagTellsTheLengthWhereNoSoundIsFound) {
+    const auto tag = TitledTag("Waterloo", "ABBA").Text("TLEN", "165000").Build();
+    EXPECT_EQ(Read(Mp3Builder().Raw(tag).Noise(500).Data()).Length, 165);
 }
 
 TEST(AudioFile, ResultsOfTheLastFileAreForgotten) {
@@ -187,19 +196,31 @@ TEST(AudioFile, WithoutAFrameTheExtensionDescribesTheFile) {
 }
 
 TEST(AudioFile, WaveFilesAreNotSearchedForFramesAndMayCarryATrailingTag) {
-    auto wave = WaveFile();
-    wave.insert(wave.end(), {0xFF, 0xFB, 0x90, 0x64});
+    auto wave = Mp3Builder().Raw(WaveFile()).Frames(2).Data();
     const auto plain = Read(wave, InProfile(ReadProfile::Classic), u"/m/ABBA - Waterloo.wav"_s);
     EXPECT_EQ(plain.MPEGLayer, u"Wave"_s);
     EXPECT_EQ(plain.Length, 2);
     EXPECT_EQ(plain.Title, u"Waterloo"_s);
     EXPECT_EQ(plain.AddTime, 1);
+    EXPECT_EQ(LastMpegResults().FrameSize, -1);
     const auto tagged = Mp3Builder().Raw(wave).TrailingTag(TitledTag("T", "A").Build()).Data();
     EXPECT_EQ(Read(tagged).Title, u"T"_s);
     EXPECT_EQ(Read(tagged).MPEGLayer, u"Wave"_s);
     // A RIFF file of another form stays what its name says.
     wave[8] = 'X';
     EXPECT_EQ(Read(wave, InProfile(ReadProfile::Classic), u"/m/a.avi"_s).MPEGLayer, u"Video (AVI)"_s);
+}
+
+TEST(AudioFile, OnlyAReadableWmaHeaderSuppressesTheFileName) {
+    const auto options = InProfile(ReadProfile::Classic);
+    const auto wma = AsfBuilder().Content(u"Waterloo"_s, u""_s, u""_s).Build();
+    EXPECT_EQ(Read(wma, options, u"/m/A - B.wma"_s).Title, u"Waterloo"_s);
+    EXPECT_EQ(Read(wma, options, u"/m/A - B.wma"_s).Artist, u""_s);
+    const Bytes damaged(wma.begin(), wma.begin() + 20);
+    const auto tag = Read(damaged, options, u"/m/A - B.wma"_s);
+    EXPECT_EQ(tag.Title, u"B"_s);
+    EXPECT_EQ(tag.MPEGLayer, u"Windows Media Audio"_s);
+    EXPECT_TRUE(LastDebugData().Text.startsWith(u"ASF"_s));
 }
 
 TEST(AudioFile, ATrailerThatLeadsNowhereIsIgnored) {

@@ -75,6 +75,11 @@ TEST(ID3v2Modern, EveryEncodingIsKnown) {
     }
 }
 
+TEST(ID3v2Modern, AByteOrderMarkHoldsForTheTextsBehindIt) {
+    const auto outcome = Read(Id3v2Builder(3).Frame("COMM", "\1eng\xFE\xFF\0\0\0G\0u\0t"s));
+    EXPECT_EQ(outcome.Tag.Comment, u"Gut"_s);
+}
+
 TEST(ID3v2Modern, ListsExistSinceVersion24) {
     EXPECT_EQ(ReadText(4, "TPE1", "A\0B\0"s).Artist, u"A, B"_s);
     EXPECT_EQ(ReadText(3, "TPE1", "A\0B"s).Artist, u"A"_s);

@@ -1,0 +1,73 @@
+#pragma once
+
+#include <QHash>
+#include <QString>
+#include <QStringList>
+#include <span>
+
+#include "CommonRUKTools/Errors.h"
+
+// The command line is not one that the program understands.
+class EUsageError : public ERukException {
+ public:
+    using ERukException::ERukException;
+};
+
+// An option of a command. A row of the help as well.
+struct OptionRow {
+    const char16_t* Name;   // with its dashes: "--db"
+    const char16_t* Value;  // what the help calls its value; empty for a switch
+    const char16_t* Help;
+    bool Required = false;
+};
+
+// What stands besides the options.
+struct OperandRow {
+    const char16_t* Name;  // empty: nothing may stand there; otherwise at least one must
+    const char16_t* Help;
+};
+
+// The words behind the command, sorted out.
+class Arguments {
+ public:
+    // "--name value", "--name=value" and operands in any order; behind "--" everything is an operand. Of an
+    // option that is given twice the last value counts. Throws EUsageError.
+    Arguments(const QStringList& words, std::span<const OptionRow> options, const OperandRow& operands);
+
+    bool Has(QStringView option) const { return values_.contains(option.toString()); }
+    // Empty when the option is not given.
+    QString Value(QStringView option) const { return values_.value(option.toString()); }
+    const QStringList& Operands() const { return operands_; }
+    bool WantsHelp() const { return wantsHelp_; }
+
+ private:
+    void TakeOption(const QString& word, QStringList& rest, std::span<const OptionRow> options);
+    void Check(std::span<const OptionRow> options, const OperandRow& operands) const;
+
+    QHash<QString, QString> values_;
+    QStringList operands_;
+    bool wantsHelp_ = false;
+};
+
+// A word that stands for a value on the command line.
+template <typename T>
+struct ChoiceRow {
+    const char16_t* Name;
+    T Value;
+};
+
+[[noreturn]] void ThrowUnknownChoice(QStringView option, const QString& word, const QStringList& choices);
+
+// The value of an option that allows only the words of a table; `otherwise` when the option is not given.
+// Throws EUsageError.
+template <typename T, std::size_t N>
+T ChoiceOf(const Arguments& arguments, QStringView option, const ChoiceRow<T> (&choices)[N], T otherwise) {
+    if (!arguments.Has(option)) return otherwise;
+    const QString word = arguments.Value(option);
+    QStringList names;
+    for (const auto& choice : choices) {
+        if (word == QStringView(choice.Name)) return choice.Value;
+        names << QString::fromUtf16(choice.Name);
+    }
+    ThrowUnknownChoice(option, word, names);
+}

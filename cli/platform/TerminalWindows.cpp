@@ -1,0 +1,44 @@
+#include <fcntl.h>
+#include <io.h>
+#include <windows.h>
+
+#include <atomic>
+
+#include "cli/platform/Terminal.h"
+
+namespace {
+
+std::atomic<bool> interrupted = false;
+
+BOOL WINAPI OnControl(DWORD) {
+    interrupted = true;
+    return TRUE;
+}
+
+}  // namespace
+
+void PrepareConsole() {
+    SetConsoleOutputCP(CP_UTF8);
+    _setmode(_fileno(stdout), _O_BINARY);
+}
+
+bool IsTerminal(std::FILE* stream) {
+    return _isatty(_fileno(stream)) != 0;
+}
+
+InterruptGuard::InterruptGuard() {
+    SetConsoleCtrlHandler(OnControl, TRUE);
+}
+
+InterruptGuard::~InterruptGuard() {
+    SetConsoleCtrlHandler(OnControl, FALSE);
+    interrupted = false;
+}
+
+bool InterruptRequested() {
+    return interrupted;
+}
+
+void RequestInterrupt() {
+    interrupted = true;
+}

@@ -1,0 +1,148 @@
+#include <gtest/gtest.h>
+
+#include <QJsonArray>
+
+#include "cli/platform/Terminal.h"
+#include "tests/PrintQt.h"
+#include "tests/cli/CommandRunner.h"
+
+using namespace Qt::StringLiterals;
+
+// scan, list, groups and save together: what one writes the others read.
+
+namespace {
+
+class CollectionCommandsTest : public CommandTest {
+ protected:
+    void SetUp() override {
+        PutWave(u"music/Zoe - Beta.wav"_s, 70);
+        PutWave(u"music/Anna - Gamma.wav"_s, 3);
+        PutWave(u"music/sub/Ötzi - Alpha.wav"_s, 200);
+        Put(Path(u"music/notes.txt"_s), AsBytes("no song"));
+    }
+
+    CommandResult Run(const QString& command, const QStringList& more) const {
+        return RunWords(QStringList{command, u"--db"_s, database_} + more);
+    }
+    CommandResult Scan(const QStringList& more = {}) const {
+        return Run(u"scan"_s, QStringList{Path(u"music"_s)} + more);
+    }
+    // The values of one key, in the order of the lines.
+    QStringList Listed(const QString& key, const QStringList& more) const {
+        QStringList values;
+        for (const auto& song : Run(u"list"_s, QStringList{u"--json"_s} + more).Objects())
+            values << song[key].toVariant().toString();
+        return values;
+    }
+    QByteArray DatabaseBytes() const {
+        QFile file(database_);
+        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
+    }
+
+    QString database_ = Path(u"songs.tsdb"_s);
+};
+
+}  // namespace
+
+TEST_F(CollectionCommandsTest, WhatIsScannedIsListedInTheWantedOrder) {
+    const auto scan = Scan();
+    EXPECT_EQ(scan.Status, esDone);
+    EXPECT_EQ(scan.Out, u"Es wurde(n) 3 neue(r) Song(s) in die Datenbank aufgenommen.\n"_s);
+    EXPECT_EQ(scan.Err, QString());
+    EXPECT_EQ(Listed(u"artist"_s, {}), (QStringList{u"Anna"_s, u"Ötzi"_s, u"Zoe"_s}));
+    EXPECT_EQ(Listed(u"index"_s, {}), (QStringList{u"0"_s, u"1"_s, u"2"_s}));
+    EXPECT_EQ(Listed(u"title"_s, {u"--sort"_s, u"stTitle"_s}),
+              (QStringList{u"Alpha"_s, u"Beta"_s, u"Gamma"_s}));
+    EXPECT_EQ(Listed(u"length"_s, {u"--sort=stLength"_s, u"--backwards"_s}),
+              (QStringList{u"200"_s, u"70"_s, u"3"_s}));
+    EXPECT_EQ(Listed(u"fileName"_s, {u"--subsort"_s, u"sstPath"_s}),
+              (QStringList{Path(u"music/Anna - Gamma.wav"_s), Path(u"music/sub/Ötzi - Alpha.wav"_s),
+                           Path(u"music/Zoe - Beta.wav"_s)}));
+    EXPECT_EQ(Run(u"list"_s, {}).Out,
+              u"0\tAnna\tGamma\t\t0:03\n1\tÖtzi\tAlpha\t\t3:20\n2\tZoe\tBeta\t\t1:10\n"_s);
+}
+
+TEST_F(CollectionCommandsTest, ASecondScanAddsOnlyWhatIsNew) {
+    const auto first = Scan({u"--json"_s, u"--no-subfolders"_s}).Objects().at(0);
+    EXPECT_EQ(first[u"added"_s], 2);
+    EXPECT_EQ(first[u"files"_s].toArray().size(), 2);
+    const auto second = Scan({u"--json"_s}).Objects().at(0);
+    EXPECT_EQ(second[u"added"_s], 1);
+    EXPECT_EQ(second[u"known"_s], 2);
+    EXPECT_EQ(second[u"banned"_s], 0);
+    EXPECT_EQ(second[u"unreadable"_s], 0);
+    EXPECT_EQ(second[u"files"_s].toArray(), QJsonArray{Path(u"music/sub/Ötzi - Alpha.wav"_s)});
+}
+
+TEST_F(CollectionCommandsTest, APathIsTakenWholeAndAMissingOneIsAFailure) {
+    const QString former = QDir::currentPath();
+    ASSERT_TRUE(QDir::setCurrent(folder_.path()));
+    const auto result = Run(u"scan"_s, {u"music/../music/Zoe - Beta.wav"_s, u"nowhere"_s});
+    QDir::setCurrent(former);
+    EXPECT_EQ(result.Status, esFailed);
+    EXPECT_TRUE(result.Err.contains(u"nowhere"_s)) << result.Err.toStdString();
+    const QString song = QFileInfo(Path(u"music/Zoe - Beta.wav"_s)).canonicalFilePath();
+    EXPECT_EQ(Listed(u"fileName"_s, {}), QStringList{song});
+}
+
+TEST_F(CollectionCommandsTest, AnInterruptedScanKeepsWhatItHas) {
+    ASSERT_EQ(Scan({u"--no-subfolders"_s}).Status, esDone);
+    RequestInterrupt();
+    const auto whileReading = Scan();
+    EXPECT_EQ(whileReading.Status, esFailed);
+    EXPECT_EQ(Listed(u"index"_s, {}).size(), 2);
+
+    ASSERT_TRUE(QFile::remove(database_));
+    RequestInterrupt();  // a new database is not read, so it is the intake that stops
+    const auto result = Scan();
+    EXPECT_EQ(result.Status, esFailed);
+    EXPECT_TRUE(result.Err.contains(u"Abgebrochen"_s));
+    EXPECT_TRUE(QFile::exists(database_));
+    EXPECT_EQ(Scan().Status, esDone);  // the next run knows nothing of it
+}
+
+TEST_F(CollectionCommandsTest, GroupsStandInTheOrderOfTheirLists) {
+    ASSERT_EQ(Scan().Status, esDone);
+    EXPECT_EQ(Run(u"groups"_s, {u"--by"_s, u"length"_s}).Out,
+              u"Unter einer Minute\t1\n1 bis 2 Minuten\t1\n3 bis 4 Minuten\t1\n"_s);
+    EXPECT_EQ(Run(u"groups"_s, {u"--by"_s, u"artist"_s}).Out, u"Anna\t1\nÖtzi\t1\nZoe\t1\n"_s);
+    EXPECT_EQ(Run(u"groups"_s, {u"--by"_s, u"year"_s, u"--json"_s}).Out,
+              u"{\"caption\":\"Unbekannt\",\"count\":3}\n"_s);
+    const auto genres = Run(u"groups"_s, {u"--by"_s, u"genre"_s, u"--json"_s}).Objects();
+    ASSERT_EQ(genres.size(), 20u);
+    EXPECT_EQ(genres[0][u"count"_s], 3);
+}
+
+TEST_F(CollectionCommandsTest, EachCompressionKeepsTheSongs) {
+    for (int i = 0; i < 40; ++i)
+        PutWave(u"music/Same Artist - Song %1.wav"_s.arg(i), 0);
+    ASSERT_EQ(Scan().Status, esDone);
+    const QString list = Run(u"list"_s, {u"--json"_s}).Out;
+    std::map<QString, qint64> sizes;
+    for (const auto& level : {u"none"_s, u"fastest"_s, u"default"_s, u"max"_s}) {
+        const QString target = Path(level);
+        ASSERT_EQ(Run(u"save"_s, {u"--out"_s, target, u"--compression"_s, level}).Status, esDone);
+        EXPECT_EQ(RunWords({u"list"_s, u"--json"_s, u"--db"_s, target}).Out, list);
+        sizes[level] = QFileInfo(target).size();
+    }
+    EXPECT_GT(sizes[u"none"_s], 2 * sizes[u"fastest"_s]);
+    EXPECT_GE(sizes[u"fastest"_s], sizes[u"max"_s]);
+    ASSERT_EQ(Run(u"save"_s, {u"--out"_s, Path(u"plain"_s)}).Status, esDone);
+    EXPECT_EQ(QFileInfo(Path(u"plain"_s)).size(), sizes[u"fastest"_s]);
+}
+
+TEST_F(CollectionCommandsTest, ADamagedDatabaseIsNeverWritten) {
+    Put(database_, AsBytes("this is no database"));
+    const QByteArray before = DatabaseBytes();
+    for (const auto& result : {Scan(), Run(u"list"_s, {}), Run(u"groups"_s, {u"--by"_s, u"album"_s}),
+                               Run(u"save"_s, {u"--out"_s, Path(u"out"_s)})}) {
+        EXPECT_EQ(result.Status, esFailed);
+        EXPECT_EQ(result.Out, QString());
+        EXPECT_TRUE(result.Err.contains(u"Dies ist keine gültige Datenbank."_s)) << result.Err.toStdString();
+    }
+    EXPECT_EQ(DatabaseBytes(), before);
+    EXPECT_FALSE(QFile::exists(Path(u"out"_s)));
+    database_ = Path(u"no folder/songs.tsdb"_s);
+    EXPECT_EQ(Scan().Status, esFailed);
+    EXPECT_EQ(RunWords({u"list"_s, u"--db"_s, Path(u"missing"_s)}).Status, esFailed);
+}

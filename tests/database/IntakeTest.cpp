@@ -1,0 +1,338 @@
+#include "MusicManagment/database/Intake.h"
+
+#include <gtest/gtest.h>
+
+#include "CommonRUKTools/Clock.h"
+#include "CommonRUKTools/Shell.h"
+#include "tests/PrintQt.h"
+#include "tests/ScriptedDialogs.h"
+#include "tests/database/RecordingTrash.h"
+#include "tests/database/SongFolder.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+constexpr char16_t kRefusal[] = u"Hinzufügen von Songs zur Datenbank ist momentan nicht möglich.";
+
+class IntakeTest : public testing::Test {
+ protected:
+    IntakeTest() {
+        database_.SetAsynchronous(false);
+        database_.OnStartProgress = [this](TMusicDatabase& database) { runs_ << database.Caption(); };
+        database_.OnProgress = [this](TMusicDatabase& database, const ProgressPoint& point) {
+            points_.push_back(point);
+            if (stopAt_ == static_cast<int>(points_.size())) database.RequestAbort();
+        };
+    }
+
+    QStringList Titles() const {
+        QStringList titles;
+        for (const auto& song : database_.Songs())
+            titles << song->Title;
+        return titles;
+    }
+    // Positions of the points of one type.
+    std::vector<qint64> Points(TProgressType type) const {
+        std::vector<qint64> positions;
+        for (const ProgressPoint& point : points_)
+            if (point.Type == type) positions.push_back(point.Cur);
+        return positions;
+    }
+    QStringList AddSongs(int count) const {
+        QStringList paths;
+        for (int i = 0; i < count; ++i)
+            paths << songs_.Add(u"Band - Title %1.wav"_s.arg(i, 3, 10, QChar(u'0')));
+        return paths;
+    }
+
+    SongFolder songs_;
+    ScriptedDialogs dialogs_;
+    TMusicDatabase database_;
+    QStringList runs_;  // captions at the start of each run
+    std::vector<ProgressPoint> points_;
+    int stopAt_ = -1;  // number of the progress point at which the user asks to stop
+};
+
+class RecordingShell : public Shell {
+ public:
+    RecordingShell() { SetShell(this); }
+    ~RecordingShell() override { SetShell(nullptr); }
+    bool OpenWithDefaultProgram(const QString& path) override {
+        Opened << path;
+        return Works;
+    }
+    QStringList Opened;
+    bool Works = true;
+};
+
+QString Contents(const QString& path) {
+    QFile file(path);
+    return file.open(QIODevice::ReadOnly) ? QString::fromUtf8(file.readAll()) : u"unreadable"_s;
+}
+
+}  // namespace
+
+TEST_F(IntakeTest, TheExtensionMakesASong) {
+    EXPECT_EQ(AcceptedExtensions(), u".mp3;.mp2;.wma;.wav;"_s);
+    for (const QString& name : {u"a.mp3"_s, u"a.MP2"_s, u"/x/a.b.Wma"_s, u"a.wAV"_s, u".mp3"_s})
+        EXPECT_TRUE(IsSongFile(name)) << name.toStdString();
+    for (const QString& name : {u"a.ogg"_s, u"a.mp"_s, u"a.mp33"_s, u"mp3"_s, u"a.mp3."_s, u"a"_s, u""_s})
+        EXPECT_FALSE(IsSongFile(name)) << name.toStdString();
+}
+
+TEST_F(IntakeTest, PickedFilesAreReadPlacedAndReported) {
+    dialogs_.Files.push_back({songs_.Add(u"Wir - Zuletzt.wav"_s, 3), songs_.Add(u"Wir - Anfang.wav"_s),
+                              songs_.Path(u"gone.mp3"_s)});
+    const IntakeResult result = AddSongsFromDialog(database_);
+    EXPECT_EQ(result.Added, 2);
+    EXPECT_EQ(result.NewFiles, songs_.Paths({u"Wir - Zuletzt.wav"_s, u"Wir - Anfang.wav"_s}));
+    EXPECT_EQ(result.UnreadableNames, QStringList{u"Datei nicht gefunden: "_s + songs_.Path(u"gone.mp3"_s)});
+    EXPECT_EQ(Titles(), (QStringList{u"Anfang"_s, u"Zuletzt"_s}));
+    EXPECT_EQ(database_.Song(1).Length, 3);
+    EXPECT_EQ(database_.Song(1).FileName, songs_.Path(u"Wir - Zuletzt.wav"_s));
+    EXPECT_EQ(database_.Artists().At(0).Number, 2);
+    EXPECT_TRUE(database_.Modified());
+    EXPECT_EQ(runs_, QStringList{u"MusicDatabase v6.0 - Nehme Songs in die Datenbank auf"_s});
+    EXPECT_FALSE(database_.ProgressRunning());
+
+    ASSERT_EQ(dialogs_.FileDialogs.size(), 1u);
+    EXPECT_EQ(dialogs_.FileDialogs[0].Title, u"Songs zur Datenbank hinzufügen"_s);
+    EXPECT_EQ(dialogs_.FileDialogs[0].Filter, u"Musik|*.mp3;*.mp2;*.wma;*.wav;|Alle Dateien|*.*"_s);
+    ASSERT_EQ(dialogs_.Questions.size(), 1u);
+    EXPECT_EQ(dialogs_.Questions[0].Text, u"Es wurde(n) 2 neue(r) Song(s) in die Datenbank aufgenommen."_s);
+    EXPECT_EQ(dialogs_.Questions[0].Buttons, (QStringList{u"OK"_s, u"Details"_s}));
+    EXPECT_TRUE(dialogs_.Messages.empty()) << "a file that cannot be read is passed over without a word";
+}
+
+TEST_F(IntakeTest, GivenFilesNeedNoDialogAndACancelledOneEndsTheCommand) {
+    EXPECT_EQ(AddSongsFromDialog(database_, AddSongs(1)).Added, 1);
+    EXPECT_TRUE(dialogs_.FileDialogs.empty());
+    runs_.clear();
+    dialogs_.Questions.clear();
+    EXPECT_EQ(AddSongsFromDialog(database_).Added, 0);
+    EXPECT_EQ(AddFolder(database_, QString(), true).Added, 0);
+    EXPECT_EQ(AddFolder(database_, QString(), false).Added, 0);
+    EXPECT_EQ(dialogs_.FolderCaptions,
+              (QStringList{u"Ordner zum Durchsuchen nach Songs auswählen (inkl. Unterordner):"_s,
+                           u"Ordner zum Durchsuchen nach Songs auswählen (ohne Unterordner):"_s}));
+    EXPECT_TRUE(runs_.isEmpty());
+    EXPECT_TRUE(dialogs_.Questions.empty());
+}
+
+TEST_F(IntakeTest, AFolderIsSearchedWithOrWithoutItsSubfolders) {
+    songs_.Add({u"A - 1.wav"_s, u"sub/A - 2.WAV"_s, u"sub/cover.jpg"_s, u"A - 3.ogg"_s});
+    dialogs_.Folders.push_back(songs_.Path());
+    EXPECT_EQ(AddFolder(database_, QString(), false).NewFiles, songs_.Paths({u"A - 1.wav"_s}));
+    const IntakeResult result = AddFolder(database_, songs_.Path() + u"/./"_s, true);
+    EXPECT_EQ(result.NewFiles, songs_.Paths({u"sub/A - 2.WAV"_s}));
+    EXPECT_EQ(result.Known, 1);
+    EXPECT_EQ(result.Unreadable, 0);
+    EXPECT_EQ(runs_.last(), u"MusicDatabase v6.0 - Dursuche Ordner nach neuen Songs"_s);
+    EXPECT_EQ(dialogs_.Questions.size(), 2u);
+
+    QStringList descriptions;
+    for (const ProgressPoint& point : points_)
+        if (point.Type == ptSearchFolders) descriptions << point.Description;
+    EXPECT_EQ(descriptions, (QStringList{u"Erstelle Cache-Liste"_s, songs_.Path(), u"Erstelle Cache-Liste"_s,
+                                         songs_.Path(), songs_.Path(u"sub"_s)}));
+    EXPECT_EQ(AddFolder(database_, songs_.Path(u"none"_s), true).Unreadable, 1);
+}
+
+TEST_F(IntakeTest, EveryFifthFileIsAProgressPoint) {
+    QStringList files = AddSongs(12);
+    const QStringList all = files;
+    EXPECT_EQ(AddFileList(database_, files, true), 12);
+    EXPECT_EQ(files, all);
+    EXPECT_EQ(Points(ptAddSongs), (std::vector<qint64>{0, 5, 10}));
+    EXPECT_EQ(points_[1].Max, 12);
+}
+
+TEST_F(IntakeTest, StoppingKeepsWhatWasTakenIn) {
+    stopAt_ = 2;
+    QStringList files = AddSongs(12);
+    const QStringList firstFive = files.first(5);
+    QStringList names{u"before"_s};
+    IntakeResult result;
+    EXPECT_EQ(AddFileList(database_, files, true, &names, &result), 5);
+    EXPECT_EQ(files, firstFive);
+    EXPECT_EQ(names, QStringList{u"before"_s} + firstFive);
+    EXPECT_TRUE(result.Stopped);
+    EXPECT_EQ(database_.Count(), 5);
+}
+
+TEST_F(IntakeTest, StoppingTheWalkReadsNoSong) {
+    AddSongs(3);
+    songs_.Add(u"sub/Band - Last.wav"_s);
+    stopAt_ = 3;  // the cache list, the folder, its sub-folder
+    const IntakeResult result = AddFolder(database_, songs_.Path(), true);
+    EXPECT_TRUE(result.Stopped);
+    EXPECT_EQ(database_.Count(), 0);
+    EXPECT_TRUE(Points(ptAddSongs).empty());
+    EXPECT_FALSE(database_.ProgressRunning());
+}
+
+TEST_F(IntakeTest, KnownFilesArePassedOverOnlyWhenAsked) {
+    QStringList files = AddSongs(2);
+    AddFileList(database_, files, true);
+    QStringList again = files + AddSongs(3);
+    IntakeResult result;
+    EXPECT_EQ(AddFileList(database_, again, true, nullptr, &result), 1);
+    EXPECT_EQ(result.Known, 4) << "two from before, and the first two of the three";
+    EXPECT_EQ(again, songs_.Paths({u"Band - Title 002.wav"_s}));
+    again = files;
+    EXPECT_EQ(AddFileList(database_, again, false), 2);
+    EXPECT_EQ(database_.Count(), 5);
+}
+
+TEST_F(IntakeTest, ASongHasOneSpelling) {
+    songs_.Add(u"sub/A - 1.wav"_s);
+    const QString here = QDir::currentPath();
+    ASSERT_TRUE(QDir::setCurrent(songs_.Path()));
+    const IntakeResult result =
+        AddPaths(database_,
+                 {u"sub/A - 1.wav"_s, u"./sub//A - 1.wav"_s, songs_.Path(u"sub/../sub/./A - 1.wav"_s), u"."_s,
+                  songs_.Path() + u"//sub/"_s},
+                 true);
+    QDir::setCurrent(here);
+    EXPECT_EQ(result.NewFiles, songs_.Paths({u"sub/A - 1.wav"_s}));
+    EXPECT_EQ(result.Unreadable, 0);
+    EXPECT_TRUE(database_.Contains(songs_.Path(u"sub/A - 1.wav"_s)));
+}
+
+TEST_F(IntakeTest, FilesAndFoldersTogetherAreOneRunWithoutReport) {
+    songs_.Add({u"b/A - 1.wav"_s, u"a/A - 2.wav"_s, u"A - 3.wav"_s, u"list.txt"_s});
+    const IntakeResult result = AddPaths(
+        database_, songs_.Paths({u"A - 3.wav"_s, u"b"_s, u"list.txt"_s, u"a"_s, u"gone"_s, u"gone.mp3"_s}),
+        true);
+    EXPECT_EQ(result.NewFiles, songs_.Paths({u"A - 3.wav"_s, u"b/A - 1.wav"_s, u"a/A - 2.wav"_s}));
+    EXPECT_EQ(result.UnreadableNames,
+              (QStringList{u"Keine Musikdatei: "_s + songs_.Path(u"list.txt"_s),
+                           u"Datei nicht gefunden: "_s + songs_.Path(u"gone"_s),
+                           u"Datei nicht gefunden: "_s + songs_.Path(u"gone.mp3"_s)}));
+    EXPECT_EQ(result.Unreadable, 3);
+    EXPECT_EQ(runs_.size(), 1);
+    EXPECT_TRUE(dialogs_.Questions.empty());
+}
+
+TEST_F(IntakeTest, NothingBeginsWhileTheDatabaseCannotChange) {
+    const QStringList files = AddSongs(1);
+    const auto expectRefusals = [&] {
+        const auto expectRefusal = [](auto command) {
+            try {
+                command();
+                FAIL() << "nothing was thrown";
+            } catch (const EMusicDatabaseException& error) {
+                EXPECT_EQ(error.Message(), QStringView(kRefusal));
+            }
+        };
+        expectRefusal([&] { AddSongsFromDialog(database_); });
+        expectRefusal([&] { AddFolder(database_, QString(), true); });
+        expectRefusal([&] { AddPaths(database_, files, true); });
+    };
+    {
+        const ProgressRun run(database_, u"other"_s);
+        expectRefusals();
+    }
+    database_.BeginBusy();
+    expectRefusals();
+    QStringList list = files;
+    EXPECT_THROW(AddFileList(database_, list, true), EMusicDatabaseException);
+    database_.EndBusy();
+    database_.SetReadOnly(true);
+    expectRefusals();
+    EXPECT_TRUE(dialogs_.FileDialogs.empty());
+    EXPECT_TRUE(dialogs_.FolderCaptions.isEmpty());
+    EXPECT_TRUE(dialogs_.Messages.empty());
+}
+
+TEST_F(IntakeTest, BannedSongsAreCountedAndThrownAwayWhenWanted) {
+    const RecordingTrash trash;
+    songs_.Add({u"Band - Ohrwurm.wav"_s, u"Band - Gut.wav"_s});
+    database_.BannList().Insert(u"Band - Ohrwurm"_s);
+    IntakeResult result = AddPaths(database_, {songs_.Path()}, true);
+    EXPECT_EQ(result.Added, 1);
+    EXPECT_EQ(result.Banned, 1);
+    EXPECT_EQ(result.Unreadable, 0);
+    EXPECT_TRUE(trash.Taken.isEmpty());
+    database_.SetAutoDelBannedFiles(true);
+    result = AddPaths(database_, {songs_.Path()}, true);
+    EXPECT_EQ(result.Banned, 1);
+    EXPECT_EQ(trash.Taken, songs_.Paths({u"Band - Ohrwurm.wav"_s}));
+}
+
+TEST_F(IntakeTest, DetailsNameTheSongsAndWhatWasUnreadable) {
+    const RecordingShell shell;
+    dialogs_.Buttons.push_back(1);
+    const QStringList files = AddSongs(2) + songs_.Paths({u"gone.mp3"_s});
+    AddSongsFromDialog(database_, files);
+    ASSERT_EQ(shell.Opened,
+              QStringList{QDir::temp().filePath(u"Tunestead - Änderungen in der Datenbank.txt"_s)});
+    EXPECT_EQ(Contents(shell.Opened[0]), u"Folgende(r) Song(s) (2) wurde(n) neu aufgenommen:\n"_s + files[0] +
+                                             u'\n' + files[1] +
+                                             u"\n\nNicht gelesen werden konnte(n) (1):\n"
+                                             "Datei nicht gefunden: "_s +
+                                             files[2] + u'\n');
+    EXPECT_EQ(IntakeDetails({}), u"Folgende(r) Song(s) (0) wurde(n) neu aufgenommen:\n"_s);
+    QFile::remove(shell.Opened[0]);
+}
+
+TEST_F(IntakeTest, DetailsThatCannotBeShownAreToldAndTheSongsStay) {
+    RecordingShell shell;
+    shell.Works = false;
+    dialogs_.Buttons.push_back(1);
+    EXPECT_EQ(AddSongsFromDialog(database_, AddSongs(1)).Added, 1);
+    ASSERT_EQ(dialogs_.Messages.size(), 1u);
+    EXPECT_TRUE(dialogs_.Messages[0].second.startsWith(u"Kann die Datei nicht anzeigen: "_s));
+    QFile::remove(shell.Opened[0]);
+}
+
+TEST_F(IntakeTest, EachCommandSavesWhenAskedTo) {
+    songs_.Add({u"1/A - 1.wav"_s, u"2/A - 2.wav"_s, u"3/A - 3.wav"_s});
+    database_.SetFileName(songs_.Path(u"songs.tsdb"_s));
+    AddFolder(database_, songs_.Path(u"1"_s), true);
+    EXPECT_FALSE(QFile::exists(database_.FileName()));
+    database_.SetAutoSave(-1);
+    AddFolder(database_, songs_.Path(u"1"_s), true);
+    EXPECT_FALSE(database_.Modified());
+    AddPaths(database_, songs_.Paths({u"2"_s}), true);
+    EXPECT_FALSE(database_.Modified());
+    AddSongsFromDialog(database_, songs_.Paths({u"3/A - 3.wav"_s}));
+    EXPECT_FALSE(database_.Modified());
+    TMusicDatabase reopened;
+    reopened.OpenDatabase(database_.FileName());
+    EXPECT_EQ(reopened.Count(), 3);
+}
+
+TEST_F(IntakeTest, OneFileIsAddedWithWhatIsKnownBetter) {
+    songs_.Add({u"A - M.wav"_s, u"A - A.wav"_s});
+    EXPECT_EQ(AddSongFile(database_, songs_.Path(u"A - M.wav"_s)), 0);
+    SongOverrides overrides;
+    overrides.Flags = sfRemixed;
+    overrides.PlayCount = 7;
+    overrides.AddTime = 1000.5;
+    overrides.Reserved = 12;
+    EXPECT_EQ(AddSongFile(database_, songs_.Path(u"A - A.wav"_s), overrides), 0);
+    EXPECT_EQ(database_.Song(0).Flags, sfRemixed);
+    EXPECT_EQ(database_.Song(0).PlayCount, 7u);
+    EXPECT_EQ(database_.Song(0).AddTime, 1000.5);
+    EXPECT_EQ(database_.Song(0).Reserved, 12);
+    EXPECT_EQ(database_.Song(1).Reserved, 0);
+    for (const QString& path : {songs_.Path(u"gone.mp3"_s), songs_.Path(), QString(), u":00000000:\\x.mp3"_s})
+        EXPECT_EQ(AddSongFile(database_, path), -1) << path.toStdString();
+    EXPECT_EQ(database_.Count(), 2);
+}
+
+TEST_F(IntakeTest, SongsAreDatedWithTheTimeOfTheirIntake) {
+    class FixedClock : public Clock {
+     public:
+        FixedClock() { SetClock(this); }
+        ~FixedClock() override { SetClock(nullptr); }
+        qint64 Ticks() const override { return 0; }
+        double Now() const override { return 45'000.25; }
+    } clock;
+    AddPaths(database_, AddSongs(6), true);
+    ASSERT_EQ(database_.Count(), 6);
+    for (const auto& song : database_.Songs())
+        EXPECT_EQ(song->AddTime, 45'000.25);
+}

@@ -1,0 +1,148 @@
+#include "MusicManagment/database/OldRecords.h"
+
+#include <gtest/gtest.h>
+
+#include <QDir>
+#include <QTemporaryDir>
+
+#include "MusicManagment/database/DatabaseFile.h"
+#include "MusicManagment/database/MusicManagment.h"
+#include "tests/PrintQt.h"
+#include "tests/ReadMPEGHeader/Builders.h"
+#include "tests/database/DatabaseBuilder.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+// The values that replace what the audio file says.
+struct Stored {
+    quint16 Length = 0;
+    quint8 Genre = 0;
+    quint16 Reserved = 4095;
+    quint32 PlayCount = 0;
+    double AddTime = 0;
+    quint32 Flags = 0xFFFFFFFF;
+};
+
+Bytes OldRecord(const QString& path, const Stored& stored, int minor) {
+    const QByteArray name = path.toUtf8();
+    ByteWriter record;
+    record.Block({name.constData(), static_cast<std::size_t>(name.size())}, 261);
+    while (record.Size() < 1287)
+        record.U8(0xEE);  // not looked at
+    record.U16Le(stored.Length);
+    record.U8(stored.Genre);
+    record.U8(0xEE);
+    record.U16Le(stored.Reserved);
+    record.U32Le(stored.PlayCount);
+    if (minor == 0) return record.Bytes();
+    record.F64Le(stored.AddTime);
+    record.U32Le(stored.Flags);
+    while (record.Size() < 1337)
+        record.U8(0xEE);
+    return record.Bytes();
+}
+
+class OldRecordsTest : public testing::TestWithParam<int> {
+ protected:
+    OldRecordsTest() {
+        Mp3Builder mp3;
+        mp3.Frames(100).Id3v1("Lied", "Gruppe");
+        QFile file(song_);
+        EXPECT_TRUE(file.open(QIODevice::WriteOnly));
+        file.write(reinterpret_cast<const char*>(mp3.Data().data()), static_cast<qint64>(mp3.Size()));
+    }
+    // A file of the version under test; in 1.2 with lists that know an artist "Liste" of three songs.
+    Bytes FileOf(const std::vector<Bytes>& records) const {
+        DatabaseBuilder builder(1, GetParam());
+        builder.SongCount(static_cast<int>(records.size())).Number(1).Block("/Ordner", 260);
+        if (GetParam() == 2)
+            builder.Number(1).Block("Liste", 512).Number(3).Zeros(3 * 4).Number(20).Zeros(20 * 4);
+        for (const Bytes& record : records)
+            builder.Raw(record);
+        return builder.File();
+    }
+    TID3Tag Fresh() const {
+        TID3Tag tag;
+        ReadAudioFile(song_, TMusicDatabase().AudioReadOptions(), tag);
+        return tag;
+    }
+    bool Load(TMusicDatabase& database, const std::vector<Bytes>& records) const {
+        const Bytes file = FileOf(records);
+        MemorySource source(file);
+        return ReadDatabase(database, source);
+    }
+
+    QTemporaryDir folder_;
+    QString song_ = folder_.filePath(u"Lied.mp3"_s);
+};
+
+}  // namespace
+
+TEST_P(OldRecordsTest, StoredValuesReplaceWhatTheAudioFileSays) {
+    TMusicDatabase database;
+    const Stored stored{300, 7, 12, 99, 40'000.25, 5};
+    ASSERT_TRUE(Load(database, {OldRecord(song_, stored, GetParam())}));
+    ASSERT_EQ(database.Count(), 1);
+    TID3Tag expected = Fresh();
+    EXPECT_EQ(expected.Title, u"Lied"_s);
+    expected.Length = 300;
+    expected.MainGenre = 7;
+    expected.Reserved = 12;
+    expected.PlayCount = 99;
+    expected.AddTime = GetParam() == 0 ? database.Song(0).AddTime : 40'000.25;
+    if (GetParam() > 0) expected.Flags = 5;
+    EXPECT_EQ(database.Song(0), expected);
+    EXPECT_EQ(database.UpdateFolders(), QStringList{u"/Ordner"_s});
+    EXPECT_FALSE(database.Modified());
+}
+
+TEST_P(OldRecordsTest, UnsetValuesKeepWhatTheAudioFileSays) {
+    TMusicDatabase database;
+    ASSERT_TRUE(Load(database, {OldRecord(song_, Stored(), GetParam())}));
+    TID3Tag expected = Fresh();
+    EXPECT_GT(expected.Length, 0);
+    expected.AddTime = database.Song(0).AddTime;
+    EXPECT_EQ(database.Song(0), expected);
+}
+
+TEST_P(OldRecordsTest, ListsComeFromTheFileOrAreCounted) {
+    TMusicDatabase database;
+    int inserted = 0;
+    database.OnOverviewInsert = [&](TMusicDatabase&, TOVType, int, const QString&, int) { ++inserted; };
+    ASSERT_TRUE(Load(database, {OldRecord(song_, Stored(), GetParam())}));
+    ASSERT_EQ(database.Artists().Count(), 1);
+    const bool fromFile = GetParam() == 2;
+    EXPECT_EQ(database.Artists().At(0).Text, fromFile ? u"Liste"_s : u"Gruppe"_s);
+    EXPECT_EQ(database.Artists().At(0).Number, fromFile ? 3 : 1);
+    EXPECT_EQ(inserted, fromFile ? 0 : 4);
+}
+
+TEST_P(OldRecordsTest, ASongWithoutItsFileGoesAndOneThatCannotBeReadStays) {
+    const QString unreadable = folder_.filePath(u"Ordner.mp3"_s);
+    ASSERT_TRUE(QDir().mkpath(unreadable));
+    TMusicDatabase database;
+    ASSERT_TRUE(Load(database, {OldRecord(folder_.filePath(u"weg.mp3"_s), Stored(), GetParam()),
+                                OldRecord(unreadable, Stored{200, 3, 1, 4}, GetParam()),
+                                OldRecord(QString(261, u'x'), Stored(), GetParam()),
+                                OldRecord(song_, Stored(), GetParam())}));
+    ASSERT_EQ(database.Count(), 2);
+    EXPECT_EQ(database.Song(0).FileName, unreadable);
+    EXPECT_EQ(database.Song(0).Length, 200);
+    EXPECT_EQ(database.Song(0).PlayCount, 4u);
+    EXPECT_EQ(database.Song(1).FileName, song_);
+    // Songs that went are not counted, wherever the lists came from.
+    EXPECT_EQ(database.Genres()[0], 1);
+    EXPECT_EQ(database.Genres()[3], 1);
+    EXPECT_EQ(database.Artists().IndexOf(u"Liste"), -1);
+}
+
+TEST_P(OldRecordsTest, BannedSongsAreRefusedWhereSongsAreChecked) {
+    TMusicDatabase database;
+    database.BannList().Insert(u"Gruppe - Lied"_s);
+    ASSERT_TRUE(Load(database, {OldRecord(song_, Stored(), GetParam())}));
+    EXPECT_EQ(database.Count(), GetParam() == 2 ? 1 : 0);
+}
+
+INSTANTIATE_TEST_SUITE_P(Versions, OldRecordsTest, testing::Values(0, 1, 2));
