@@ -14,28 +14,28 @@ namespace {
 
 struct Entry {
     const char16_t* Caption;  // nullptr: a separator
-    char16_t Key;             // the letter of the caption that chooses it in the open menu
     const char16_t* Shortcut;
     const char16_t* Icon;
-    QStyle::StandardPixmap Substitute;
     void (CollectionCommands::*Run)();
+    QStyle::StandardPixmap Substitute;
+    char16_t Key;  // the letter of the caption that chooses it in the open menu
 };
 
-constexpr Entry kSeparator{nullptr, 0, nullptr, nullptr, QStyle::SP_CustomBase, nullptr};
+constexpr Entry kSeparator{};
 
 constexpr Entry kDatabaseMenu[] = {
-    {u"Neue Datenbank", u'N', u"Ctrl+Alt+N", u"document-new", QStyle::SP_FileIcon, &CollectionCommands::New},
-    {u"Datenbank öffnen...", u'f', u"Ctrl+Alt+O", u"document-open", QStyle::SP_DialogOpenButton,
-     &CollectionCommands::Open},
-    {u"Datenbank speichern", u's', u"Ctrl+Alt+S", u"document-save", QStyle::SP_DialogSaveButton,
-     &CollectionCommands::Save},
-    {u"Datenbank speichern unter...", u'u', u"", u"document-save-as", QStyle::SP_DialogSaveButton,
-     &CollectionCommands::SaveAs},
+    {u"Neue Datenbank", u"Ctrl+Alt+N", u"document-new", &CollectionCommands::New, QStyle::SP_FileIcon, u'N'},
+    {u"Datenbank öffnen...", u"Ctrl+Alt+O", u"document-open", &CollectionCommands::Open,
+     QStyle::SP_DialogOpenButton, u'f'},
+    {u"Datenbank speichern", u"Ctrl+Alt+S", u"document-save", &CollectionCommands::Save,
+     QStyle::SP_DialogSaveButton, u's'},
+    {u"Datenbank speichern unter...", u"", u"document-save-as", &CollectionCommands::SaveAs,
+     QStyle::SP_DialogSaveButton, u'u'},
     kSeparator,
-    {u"Songs zur Datenbank hinzufügen...", u'h', u"", u"audio-x-generic", QStyle::SP_FileIcon,
-     &CollectionCommands::AddSongs},
-    {u"Ordner zur Datenbank hinzufügen...", u'O', u"", u"folder-music", QStyle::SP_DirIcon,
-     &CollectionCommands::AddFolder},
+    {u"Songs zur Datenbank hinzufügen...", u"", u"audio-x-generic", &CollectionCommands::AddSongs,
+     QStyle::SP_FileIcon, u'h'},
+    {u"Ordner zur Datenbank hinzufügen...", u"", u"folder-music", &CollectionCommands::AddFolder,
+     QStyle::SP_DirIcon, u'O'},
     kSeparator,
 };
 

@@ -1,5 +1,7 @@
 #include <QApplication>
 #include <QCommandLineParser>
+#include <algorithm>
+#include <string_view>
 
 #include "app/MainWindow.h"
 #include "app/desktop/Icons.h"
@@ -11,7 +13,14 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-QStringList FilesOfCommandLine(const QApplication& application) {
+void SetUp(QCoreApplication& application) {
+    QCoreApplication::setApplicationName(u"Tunestead"_s);
+    QCoreApplication::setApplicationVersion(QStringLiteral(TUNESTEAD_VERSION));
+    InstallGerman(application);
+}
+
+// Ends the program after showing help or version when that was asked for.
+QStringList FilesOfCommandLine(const QCoreApplication& application) {
     QCommandLineParser parser;
     parser.setApplicationDescription(u"Verwaltet eine Musiksammlung."_s);
     parser.addHelpOption();
@@ -22,14 +31,25 @@ QStringList FilesOfCommandLine(const QApplication& application) {
     return parser.positionalArguments();
 }
 
+// Help and version need no windows, and so no desktop.
+bool WantsTextOnly(int argc, char** argv) {
+    constexpr std::string_view kOptions[] = {"-h", "--help", "--help-all", "-v", "--version"};
+    return std::any_of(argv + 1, argv + argc,
+                       [&](const char* argument) { return std::ranges::count(kOptions, argument) > 0; });
+}
+
 }  // namespace
 
 int main(int argc, char** argv) {
+    if (argc > 1 && WantsTextOnly(argc, argv)) {
+        QCoreApplication application(argc, argv);
+        SetUp(application);
+        FilesOfCommandLine(application);
+        return 0;
+    }
     QApplication application(argc, argv);
-    QApplication::setApplicationName(u"Tunestead"_s);
-    QApplication::setApplicationVersion(QStringLiteral(TUNESTEAD_VERSION));
+    SetUp(application);
     QGuiApplication::setDesktopFileName(u"tunestead"_s);
-    InstallGerman(application);
     const QStringList files = FilesOfCommandLine(application);
 
     ChooseIconTheme();

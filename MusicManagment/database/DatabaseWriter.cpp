@@ -117,18 +117,6 @@ void BodyWriter::WriteSong(const TID3Tag& song) {
     FlushWhenFull();
 }
 
-// Nothing may change the songs while the interface works between two of them.
-class BusyGuard {
- public:
-    explicit BusyGuard(TMusicDatabase& database) : database_(database) { database_.BeginBusy(); }
-    ~BusyGuard() { database_.EndBusy(); }
-    BusyGuard(const BusyGuard&) = delete;
-    BusyGuard& operator=(const BusyGuard&) = delete;
-
- private:
-    TMusicDatabase& database_;
-};
-
 void WriteHeader(SafeFile& file, int songCount) {
     ByteWriter header;
     header.Raw(kMagic);

@@ -85,10 +85,18 @@ bool TakeIn(TMusicDatabase& database, const QString& path, const ReadOptions& op
     return false;
 }
 
-// The songs of a collection are found by an index over their paths, made at the first question.
+bool ReportCacheList(TMusicDatabase& database, std::size_t done) {
+    return database.Progress({.Cur = static_cast<qint64>(done),
+                              .Max = database.Count(),
+                              .Type = ptSearchFolders,
+                              .Description = u"Erstelle Cache-Liste"_s});
+}
+
+// The songs of a collection are found by an index over their paths. In a large one it takes its time, and the
+// user may do meanwhile whatever leaves the songs where they are.
 void MakePathIndex(TMusicDatabase& database) {
-    database.Progress({.Type = ptSearchFolders, .Description = u"Erstelle Cache-Liste"_s});
-    database.Contains(QString());
+    const BusyGuard unchanged(database);
+    database.Songs().IndexPaths([&database](std::size_t done) { return ReportCacheList(database, done); });
 }
 
 // Turns what the user gave into a list of song files.
@@ -148,7 +156,8 @@ IntakeResult AddGiven(TMusicDatabase& database, const std::vector<GivenPath>& gi
     const ProgressRun run(database, anyFolder ? FolderRunText() : FileRunText());
     IntakeResult result;
     Collector collector(database, withSubfolders, result);
-    if (anyFolder) MakePathIndex(database);
+    if (anyFolder) ReportCacheList(database, 0);
+    MakePathIndex(database);
     for (const GivenPath& path : given) {
         if (path.IsFolder)
             collector.AddFolder(path.Path);
@@ -163,6 +172,7 @@ IntakeResult AddGiven(TMusicDatabase& database, const std::vector<GivenPath>& gi
 IntakeResult AddChosenFiles(TMusicDatabase& database, QStringList files) {
     const ProgressRun run(database, FileRunText());
     IntakeResult result;
+    MakePathIndex(database);
     AddFileList(database, files, true, nullptr, &result);
     return result;
 }

@@ -44,12 +44,20 @@ void SongList::PutAll(std::vector<Entry> entries) {
     entries_.assign(std::move(entries));
 }
 
-const TID3Tag* SongList::Find(const QString& fileName) const {
-    if (!paths_) {
-        paths_ = std::make_unique<PathIndex>(entries_.size());
-        for (const Entry& entry : entries_)
-            paths_->insert(entry.get());
+void SongList::IndexPaths(const std::function<bool(std::size_t done)>& progress) const {
+    if (paths_) return;
+    constexpr std::size_t kStep = 1 << 14;
+    // Whoever asks for a song meanwhile finds no half index.
+    auto paths = std::make_unique<PathIndex>(entries_.size());
+    for (const Entry& entry : entries_) {
+        paths->insert(entry.get());
+        if (paths->size() % kStep == 0 && progress && progress(paths->size())) return;
     }
+    paths_ = std::move(paths);
+}
+
+const TID3Tag* SongList::Find(const QString& fileName) const {
+    IndexPaths(nullptr);
     const auto found = paths_->find(fileName);
     return found != paths_->end() ? *found : nullptr;
 }

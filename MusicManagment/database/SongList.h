@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <functional>
 #include <memory>
 #include <unordered_set>
 #include <vector>
@@ -32,6 +33,9 @@ class SongList {
     std::vector<Entry> TakeAll();
     void PutAll(std::vector<Entry> entries);
 
+    // Builds the index over the paths now if it is not there. Tells `progress` every few thousand songs how
+    // many are done; true from it gives up. The list must not change meanwhile.
+    void IndexPaths(const std::function<bool(std::size_t done)>& progress) const;
     // nullptr when no song has this path.
     const TID3Tag* Find(const QString& fileName) const;
     // List position of a record of this list; linear.

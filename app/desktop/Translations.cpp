@@ -1,13 +1,13 @@
 #include "app/desktop/Translations.h"
 
-#include <QApplication>
+#include <QCoreApplication>
 #include <QLibraryInfo>
 #include <QLocale>
 #include <QTranslator>
 
 using namespace Qt::StringLiterals;
 
-void InstallGerman(QApplication& application) {
+void InstallGerman(QCoreApplication& application) {
     QLocale::setDefault(QLocale(QLocale::German, QLocale::Germany));
     auto* translator = new QTranslator(&application);
     if (translator->load(u"qtbase_de"_s, QLibraryInfo::path(QLibraryInfo::TranslationsPath)))

@@ -13,7 +13,7 @@ constexpr qint64 kSecondsPerDay = 86'400;
 
 QString PlayingTime(qint64 seconds) {
     const qint64 days = seconds / kSecondsPerDay;
-    const QString clock = FormatLength(static_cast<int>(seconds % kSecondsPerDay), true);
+    QString clock = FormatLength(static_cast<int>(seconds % kSecondsPerDay), true);
     if (days == 0) return clock;
     return QLocale(QLocale::German).toString(days) + (days == 1 ? u" Tag "_s : u" Tage "_s) + clock;
 }
