@@ -1,71 +1,86 @@
 #include "app/MainMenu.h"
 
 #include <QAction>
+#include <QActionGroup>
 #include <QMenu>
 #include <QMenuBar>
 
-#include "app/CollectionCommands.h"
-#include "app/CommandRunner.h"
+#include "MusicManagment/database/Menu.h"
+#include "MusicManagment/database/MusicManagment.h"
+#include "app/MenuIcons.h"
 #include "app/desktop/Icons.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
 
-struct Entry {
-    const char16_t* Caption;  // nullptr: a separator
-    const char16_t* Shortcut;
-    const char16_t* Icon;
-    void (CollectionCommands::*Run)();
-    QStyle::StandardPixmap Substitute;
-    char16_t Key;  // the letter of the caption that chooses it in the open menu
-};
-
-constexpr Entry kSeparator{};
-
-constexpr Entry kDatabaseMenu[] = {
-    {u"Neue Datenbank", u"Ctrl+Alt+N", u"document-new", &CollectionCommands::New, QStyle::SP_FileIcon, u'N'},
-    {u"Datenbank öffnen...", u"Ctrl+Alt+O", u"document-open", &CollectionCommands::Open,
-     QStyle::SP_DialogOpenButton, u'f'},
-    {u"Datenbank speichern", u"Ctrl+Alt+S", u"document-save", &CollectionCommands::Save,
-     QStyle::SP_DialogSaveButton, u's'},
-    {u"Datenbank speichern unter...", u"", u"document-save-as", &CollectionCommands::SaveAs,
-     QStyle::SP_DialogSaveButton, u'u'},
-    kSeparator,
-    {u"Songs zur Datenbank hinzufügen...", u"", u"audio-x-generic", &CollectionCommands::AddSongs,
-     QStyle::SP_FileIcon, u'h'},
-    {u"Ordner zur Datenbank hinzufügen...", u"", u"folder-music", &CollectionCommands::AddFolder,
-     QStyle::SP_DirIcon, u'O'},
-    kSeparator,
-};
-
-QString WithKey(QString caption, char16_t key) {
-    return caption.insert(caption.indexOf(QChar(key)), u'&');
+// Marks the first letter that no other item of the menu is chosen by.
+QString WithKey(const QString& caption, QString& taken) {
+    QString text = caption;
+    text.replace(u'&', u"&&"_s);
+    for (qsizetype i = 0; i < caption.size(); ++i) {
+        const QChar letter = caption[i].toLower();
+        if (!letter.isLetter() || taken.contains(letter) || caption.contains(u'&')) continue;
+        taken += letter;
+        return text.insert(i, u'&');
+    }
+    return text;
 }
 
 }  // namespace
 
-MainMenu::MainMenu(QMenuBar& bar, CollectionCommands& commands, std::function<void()> exit) {
-    QMenu* menu = bar.addMenu(WithKey(u"Datenbank"_s, u'D'));
-    for (const Entry& entry : kDatabaseMenu) {
-        if (entry.Caption == nullptr) {
-            menu->addSeparator();
-            continue;
-        }
-        QAction* action = menu->addAction(ThemeIcon(QString::fromUtf16(entry.Icon), entry.Substitute),
-                                          WithKey(QString::fromUtf16(entry.Caption), entry.Key));
-        action->setShortcut(QKeySequence(QString::fromUtf16(entry.Shortcut)));
-        QObject::connect(action, &QAction::triggered, &bar,
-                         [&commands, run = entry.Run] { RunCommand([&] { (commands.*run)(); }); });
-        commands_ << action;
+MainMenu::MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(int id)> run,
+                   std::function<void()> exit)
+    : database_(database), run_(std::move(run)) {
+    QString keys;
+    QMenu* first = nullptr;
+    for (const auto& item : database_.Menu().Items()) {
+        QMenu* menu = bar.addMenu(WithKey(item->Caption(), keys));
+        AddItems(*menu, *item);
+        if (first == nullptr) first = menu;
+        if (item->Find(mcPlay) != nullptr) songMenu_ = menu;
     }
-    QAction* last = menu->addAction(ThemeIcon(u"application-exit"_s, QStyle::SP_DialogCloseButton),
-                                    WithKey(u"Beenden"_s, u'B'));
+    first->addSeparator();
+    QAction* last = first->addAction(ThemeIcon(u"application-exit"_s, QStyle::SP_DialogCloseButton), u"&Beenden"_s);
     last->setShortcut(QKeySequence(u"Ctrl+Q"_s));
     QObject::connect(last, &QAction::triggered, &bar, std::move(exit));
+    Update();
 }
 
-void MainMenu::SetCommandsEnabled(bool enabled) {
-    for (QAction* action : commands_)
-        action->setEnabled(enabled);
+void MainMenu::Update() {
+    TMenuExItem& menu = database_.Menu();
+    for (auto action = actions_.cbegin(); action != actions_.cend(); ++action) {
+        const TMenuExItem* item = menu.Find(action.key());
+        if (item == nullptr) continue;
+        (*action)->setEnabled(item->Enabled());
+        (*action)->setToolTip(item->Hint());
+        if (item->Checkable()) (*action)->setChecked(item->Checked());
+    }
+}
+
+void MainMenu::AddItems(QMenu& menu, const TMenuExItem& parent) {
+    menu.setToolTipsVisible(true);
+    QString keys = parent.Find(mcNew) != nullptr ? u"b"_s : QString();  // "Beenden" comes behind
+    auto* group = new QActionGroup(&menu);
+    for (const auto& item : parent.Items()) {
+        switch (item->Kind()) {
+            case TMenuExItem::ItemKind::Separator: menu.addSeparator(); break;
+            case TMenuExItem::ItemKind::Submenu: AddItems(*menu.addMenu(WithKey(item->Caption(), keys)), *item); break;
+            default: AddCommand(menu, *item);
+        }
+        if (item->Kind() == TMenuExItem::ItemKind::Radio) group->addAction(actions_[item->Id()]);
+        if (QAction* action = actions_.value(item->Id())) action->setText(WithKey(item->Caption(), keys));
+    }
+}
+
+void MainMenu::AddCommand(QMenu& menu, const TMenuExItem& item) {
+    QAction* action = menu.addAction(MenuIcon(item.Id()), item.Caption());
+    action->setShortcut(QKeySequence(item.Shortcut()));
+    action->setCheckable(item.Checkable());
+    if (item.IsDefault()) menu.setDefaultAction(action);
+    QObject::connect(action, &QAction::triggered, &menu, [this, id = item.Id()] {
+        run_(id);
+        Update();  // a click on a radio item that was refused leaves the old mark
+    });
+    actions_.insert(item.Id(), action);
 }

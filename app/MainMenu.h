@@ -1,21 +1,31 @@
 #pragma once
 
-#include <QList>
+#include <QHash>
 #include <functional>
 
-class CollectionCommands;
 class QAction;
+class QMenu;
 class QMenuBar;
+class TMenuExItem;
+class TMusicDatabase;
 
-// The main window's menu.
+// The main window's menu: the command menu of the database as the toolkit shows it, and "Beenden".
 class MainMenu {
  public:
-    // Commands are run through RunCommand; `exit` is the last item.
-    MainMenu(QMenuBar& bar, CollectionCommands& commands, std::function<void()> exit);
+    // `run` is given the number of the chosen command.
+    MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(int id)> run, std::function<void()> exit);
 
-    // Everything but the last item, which asks while an operation runs.
-    void SetCommandsEnabled(bool enabled);
+    // Enables, disables and marks the items as the database's menu says now.
+    void Update();
+    // Chosen for a song, from its context menu. The caller shows it.
+    QMenu& SongMenu() const { return *songMenu_; }
 
  private:
-    QList<QAction*> commands_;
+    void AddItems(QMenu& menu, const TMenuExItem& item);
+    void AddCommand(QMenu& menu, const TMenuExItem& item);
+
+    TMusicDatabase& database_;
+    std::function<void(int)> run_;
+    QHash<int, QAction*> actions_;  // by number
+    QMenu* songMenu_ = nullptr;
 };

@@ -60,7 +60,7 @@ constexpr MenuRow kEdit[] = {
 constexpr MenuRow kSong[] = {
     {kCommand, u"Abspielen", mcPlay, u"Return"},
     {kCommand, u"Zur PlayList hinzufügen", 402},
-    {kCommand, u"Mit externem Programm öffnen", 403, {}, Shown::Writable},
+    {kCommand, u"Mit externem Programm öffnen", mcOpenExternally, {}, Shown::Writable},
     {kCommand, u"In passendes Genre aufnehmen", 404, u"Alt+A", Shown::Writable},
     kLine,
 };
@@ -136,6 +136,19 @@ void AddSongMenu(TMenuExItem& root, bool readOnly) {
     song.Add(kCommand, u"Markierung verfolgen"_s, mcFollowFocus, u"Ctrl+Space"_s).SetCheckable(true);
 }
 
+// Commands whose operation is still to be built.
+constexpr int kLater[] = {mcFindOnline, mcRemoveFromDisk, mcBan, mcPlay, 402, 404, 501, 503, 504, 505,
+                          506,          507,              508,   509,    510, 512, 513, 514};
+
+void DisableLater(TMenuExItem& menu) {
+    for (const int id : kLater) {
+        TMenuExItem* item = menu.Find(id);
+        if (item == nullptr) continue;
+        item->SetEnabled(false);
+        item->SetHint(u"Kommt mit einer der nächsten Versionen"_s);
+    }
+}
+
 void SetChecked(TMenuExItem& menu, int id, bool checked) {
     if (TMenuExItem* item = menu.Find(id)) item->SetChecked(checked);
 }
@@ -175,6 +188,7 @@ std::unique_ptr<TMenuExItem> BuildDatabaseMenu(bool readOnly) {
 
 void UpdateDatabaseMenu(TMenuExItem& menu, const TMusicDatabase& database) {
     EnableAll(menu, !database.MenuLocked());
+    DisableLater(menu);
     for (int id = mcSortFirst; id <= mcSortLast; ++id)
         SetChecked(menu, id, id - mcSortFirst == database.SortType());
     for (int id = mcSubSortFirst; id <= mcSubSortLast; ++id)

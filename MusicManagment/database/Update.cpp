@@ -188,6 +188,18 @@ UpdateResult UpdateDatabase(TMusicDatabase& database, UpdateTags tags) {
     return result;
 }
 
+void RememberFolders(TMusicDatabase& database, const QStringList& folders) {
+    QStringList remembered = database.UpdateFolders();
+    for (const QString& folder : folders) {
+        if (remembered.contains(folder) || LiesBelow(folder, remembered)) continue;
+        remembered.removeIf([&folder](const QString& other) { return LiesBelow(other, {folder}); });
+        remembered << folder;
+    }
+    if (remembered == database.UpdateFolders()) return;
+    database.SetUpdateFolders(remembered);
+    database.SetModified(true);
+}
+
 IntakeResult SearchNewSongs(TMusicDatabase& database) {
     RequireFolders(database);
     const IntakeResult result = AddPaths(database, SplitFolders(database.UpdateFolders()).There, true);

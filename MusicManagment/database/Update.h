@@ -25,6 +25,9 @@ struct UpdateResult {
 // going or when there are no update folders.
 UpdateResult UpdateDatabase(TMusicDatabase& database, UpdateTags tags);
 
+// Remembers folders for later updates; one that lies below a remembered folder is not remembered twice.
+void RememberFolders(TMusicDatabase& database, const QStringList& folders);
+
 // Only searches the update folders for new songs, and reports.
 IntakeResult SearchNewSongs(TMusicDatabase& database);
 

@@ -1,0 +1,104 @@
+#include "app/SongCommands.h"
+
+#include "CommonRUKTools/Dialogs.h"
+#include "CommonRUKTools/Shell.h"
+#include "MusicManagment/database/CopySongs.h"
+#include "MusicManagment/database/Menu.h"
+#include "MusicManagment/database/MusicManagment.h"
+#include "app/views/SongListWidget.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+QString SongCount(std::size_t count) {
+    return count == 1 ? u"1 Song"_s : QString::number(count) + u" Songs"_s;
+}
+
+}  // namespace
+
+SongCommands::SongCommands(TMusicDatabase& database, SongListWidget& list) : database_(database), list_(list) {}
+
+bool SongCommands::Run(int id) {
+    if ((id >= mcSortFirst && id <= mcSortLast) || (id >= mcSubSortFirst && id <= mcSubSortLast) || id == mcReverse)
+        return SetOrder(id), true;
+    switch (id) {
+        case mcFind: list_.OnFind ? list_.OnFind() : void(); return true;
+        case mcFindNext: list_.FindNext(); return true;
+        case mcMarkAll: list_.MarkAll(); return true;
+        case mcInvertMarks: list_.InvertMarks(); return true;
+        case mcMarkByFilter: list_.MarkByFilter(); return true;
+        case mcRemoveFromDatabase: RemoveChosen(); return true;
+        case mcCopyTo: CopyChosen(); return true;
+        case mcOpenExternally: OpenExternally(); return true;
+        default: return false;
+    }
+}
+
+void SongCommands::UndoRemoval() {
+    if (removals_.empty()) return;
+    const int restored = RestoreSongs(database_, removals_.back());
+    removals_.pop_back();
+    Tell(SongCount(static_cast<std::size_t>(restored)) + u" wieder in die Datenbank aufgenommen."_s);
+    if (OnUndoChanged) OnUndoChanged(!removals_.empty());
+    database_.SaveAfterCommand();
+}
+
+std::vector<SongIndex> SongCommands::Chosen() const {
+    auto songs = list_.MarkedSongs();
+    if (songs.empty() && list_.FocusedSong() >= 0) songs.push_back(list_.FocusedSong());
+    return songs;
+}
+
+// Through the list, which keeps the focused song in sight.
+void SongCommands::SetOrder(int id) {
+    SongOrder order{database_.SortType(), database_.SubSortType(), database_.SortBackwards()};
+    if (id == mcReverse)
+        order.Backwards = !order.Backwards;
+    else if (id >= mcSubSortFirst)
+        order.SubSortType = static_cast<TSubSortType>(id - mcSubSortFirst);
+    else
+        order.SortType = static_cast<TSortType>(id - mcSortFirst);
+    list_.SetOrder(order);
+}
+
+void SongCommands::RemoveChosen() {
+    const auto songs = Chosen();
+    if (songs.empty()) return;
+    const QString question =
+        songs.size() == 1 ? u"Soll \""_s + database_.Song(songs[0]).Artist + u" - "_s + database_.Song(songs[0]).Title +
+                                u"\" aus der Datenbank entfernt werden? Die Datei bleibt erhalten."_s
+                          : u"Sollen "_s + SongCount(songs.size()) +
+                                u" aus der Datenbank entfernt werden? Die Dateien bleiben erhalten."_s;
+    if (UserDialogs().Ask(question, {u"Entfernen"_s, u"Abbrechen"_s}, 1) != 0) return;
+    RemovedSongs removed = RemoveSongs(database_, songs);
+    if (removed.empty()) return;
+    Tell(SongCount(removed.size()) + u" aus der Datenbank entfernt."_s);
+    removals_.push_back(std::move(removed));
+    if (OnUndoChanged) OnUndoChanged(true);
+    database_.SaveAfterCommand();
+}
+
+void SongCommands::CopyChosen() {
+    const auto songs = Chosen();
+    if (songs.empty()) return;
+    const auto folder = UserDialogs().ChooseFolder(u"Ordner auswählen, in den die Songs kopiert werden sollen:"_s);
+    if (!folder) return;
+    const CopyResult result = CopySongs(database_, songs, *folder);
+    Tell(SongCount(static_cast<std::size_t>(result.Copied)) + u" kopiert."_s);
+    if (!result.Failed.isEmpty())
+        UserDialogs().ShowMessage(MessageKind::Warning, u"Diese Dateien konnten nicht kopiert werden:\n"_s +
+                                                            result.Failed.join(u'\n'));
+}
+
+void SongCommands::OpenExternally() {
+    const SongIndex song = list_.FocusedSong();
+    if (song < 0) return;
+    const QString path = database_.Song(song).FileName;
+    if (!CurrentShell().OpenWithDefaultProgram(path))
+        throw EMusicDatabaseException(u"Kann kein Programm für diese Datei starten: "_s + path);
+}
+
+void SongCommands::Tell(const QString& sentence) const {
+    if (OnDone) OnDone(sentence);
+}
