@@ -23,7 +23,9 @@ struct FolderIdentity {
     std::uint64_t Volume = 0;
     std::uint64_t Number = 0;
 
-    auto operator<=>(const FolderIdentity&) const = default;
+    bool operator<(const FolderIdentity& other) const {
+        return Volume != other.Volume ? Volume < other.Volume : Number < other.Number;
+    }
 };
 
 // The entries of one folder, one by one and in no order, without "." and "..". A symbolic link counts as what

@@ -1,11 +1,13 @@
-// Files per second that are read from a warm cache, beside TagLib on the same files. The number of files is
-// TUNESTEAD_BENCH_SONGS, 10000 without it.
+// Files per second that are read from a warm cache, beside TagLib on the same files; and a whole run of the
+// command line program over their folder, with its save. The number of files is TUNESTEAD_BENCH_SONGS, 10000
+// without it.
 
 #include <benchmark/benchmark.h>
 #include <fileref.h>
 #include <tag.h>
 
 #include <QFile>
+#include <QProcess>
 #include <QTemporaryDir>
 
 #include "CommonRUKTools/Errors.h"
@@ -14,14 +16,18 @@
 
 namespace {
 
+const QTemporaryDir& Folder() {
+    static const QTemporaryDir folder;
+    return folder;
+}
+
 // Written once for all benchmarks of a run.
 const QStringList& Songs() {
-    static const QTemporaryDir folder;
     static const QStringList paths = [] {
         SongGenerator generator;
         const int wanted = qEnvironmentVariableIntValue("TUNESTEAD_BENCH_SONGS");
         if (wanted > 0) generator.Songs = wanted;
-        return generator.Write(folder.path());
+        return generator.Write(Folder().filePath(QStringLiteral("songs")));
     }();
     return paths;
 }
@@ -72,9 +78,27 @@ void BM_TagLib(benchmark::State& state) {
     ReadTagLib(state);
 }
 
-BENCHMARK(BM_Classic)->Unit(benchmark::kMillisecond);
-BENCHMARK(BM_Modern)->Unit(benchmark::kMillisecond);
-BENCHMARK(BM_TagLib)->Unit(benchmark::kMillisecond);
+// From the start of the program to its end: walk, read, sort in, save with the flush to the disk.
+void BM_ScanAndSave(benchmark::State& state) {
+    const qsizetype count = Songs().size();
+    const QString database = Folder().filePath(QStringLiteral("songs.tsdb"));
+    const QStringList arguments{QStringLiteral("scan"), QStringLiteral("--db"), database,
+                                Folder().filePath(QStringLiteral("songs"))};
+    for (auto _ : state) {
+        QFile::remove(database);
+        QProcess scan;
+        scan.setProcessChannelMode(QProcess::ForwardedErrorChannel);
+        scan.start(QStringLiteral(TUNESTEAD_CLI), arguments);
+        if (!scan.waitForFinished(-1) || scan.exitCode() != 0 || !QFile::exists(database))
+            state.SkipWithError("the scan failed");
+    }
+    state.SetItemsProcessed(state.iterations() * count);
+}
+
+BENCHMARK(BM_Classic)->Unit(benchmark::kMillisecond)->UseRealTime();
+BENCHMARK(BM_Modern)->Unit(benchmark::kMillisecond)->UseRealTime();
+BENCHMARK(BM_ScanAndSave)->Unit(benchmark::kMillisecond)->UseRealTime();
+BENCHMARK(BM_TagLib)->Unit(benchmark::kMillisecond)->UseRealTime();
 
 }  // namespace
 

@@ -209,7 +209,7 @@ IntakeResult AddSongsFromDialog(TMusicDatabase& database, const QStringList& fil
     RefuseWhenLocked(database);
     const QStringList chosen = files.isEmpty() ? AskForFiles() : files;
     if (chosen.isEmpty()) return {};
-    const IntakeResult result = AddChosenFiles(database, chosen);
+    IntakeResult result = AddChosenFiles(database, chosen);
     ReportIntake(result);
     database.SaveAfterCommand();
     return result;
@@ -219,7 +219,7 @@ IntakeResult AddFolder(TMusicDatabase& database, const QString& folder, bool wit
     RefuseWhenLocked(database);
     const QString chosen = folder.isEmpty() ? AskForFolder(withSubfolders) : folder;
     if (chosen.isEmpty()) return {};
-    const IntakeResult result = AddGiven(database, {{AbsolutePath(chosen), true, true}}, withSubfolders);
+    IntakeResult result = AddGiven(database, {{AbsolutePath(chosen), true, true}}, withSubfolders);
     ReportIntake(result);
     database.SaveAfterCommand();
     return result;
@@ -227,7 +227,7 @@ IntakeResult AddFolder(TMusicDatabase& database, const QString& folder, bool wit
 
 IntakeResult AddPaths(TMusicDatabase& database, const QStringList& paths, bool withSubfolders) {
     RefuseWhenLocked(database);
-    const IntakeResult result = AddGiven(database, LookAt(paths), withSubfolders);
+    IntakeResult result = AddGiven(database, LookAt(paths), withSubfolders);
     database.SaveAfterCommand();
     return result;
 }

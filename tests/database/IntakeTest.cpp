@@ -173,17 +173,17 @@ TEST_F(IntakeTest, StoppingTheWalkReadsNoSong) {
 }
 
 TEST_F(IntakeTest, TheCacheListOfALargeCollectionIsMadeInSteps) {
-    for (int i = 0; i < 40'000; ++i)
+    for (int i = 0; i < 20'000; ++i)
         database_.AddEntry(u":00000000:\\"_s + QString::number(i), {}, {.SkipChecks = true});
     const QStringList files = AddSongs(1);
     database_.OnProgress = [&](TMusicDatabase& database, const ProgressPoint& point) {
         points_.push_back(point);
         if (point.Type != ptSearchFolders) return;
         EXPECT_FALSE(database.RemoveEntry(0));
-        EXPECT_TRUE(database.Contains(u":00000000:\\39999"_s));
+        EXPECT_TRUE(database.Contains(u":00000000:\\19999"_s));
     };
     EXPECT_EQ(AddPaths(database_, files, true).Added, 1);
-    EXPECT_EQ(Points(ptSearchFolders), (std::vector<qint64>{16'384, 32'768}));
+    EXPECT_EQ(Points(ptSearchFolders), (std::vector<qint64>{16'384}));
     EXPECT_FALSE(database_.Busy());
 }
 
