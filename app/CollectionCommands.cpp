@@ -1,15 +1,44 @@
 #include "app/CollectionCommands.h"
 
 #include <QDir>
+#include <QFileInfo>
 
+#include "CommonRUKTools/AbsolutePath.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/Intake.h"
+#include "MusicManagment/database/Menu.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/Update.h"
 
 using namespace Qt::StringLiterals;
 
 CollectionCommands::CollectionCommands(TMusicDatabase& database, StandardFiles files)
     : database_(database), files_(std::move(files)) {}
+
+bool CollectionCommands::Run(int id) {
+    switch (id) {
+        case mcNew:
+            New();
+            return true;
+        case mcOpen:
+            Open();
+            return true;
+        case mcSave:
+            Save();
+            return true;
+        case mcSaveAs:
+            SaveAs();
+            return true;
+        case mcAddSongs:
+            AddSongs();
+            return true;
+        case mcAddFolder:
+            AddFolder();
+            return true;
+        default:
+            return false;
+    }
+}
 
 void CollectionCommands::New() {
     if (KeepChanges()) database_.OpenDatabase(QString());
@@ -36,10 +65,19 @@ void CollectionCommands::AddSongs() {
 }
 
 void CollectionCommands::AddFolder() {
-    ::AddFolder(database_, QString(), true);
+    if (database_.ProgressRunning()) return;
+    const auto folder =
+        UserDialogs().ChooseFolder(u"Ordner zum Durchsuchen nach Songs auswählen (inkl. Unterordner):"_s);
+    if (!folder) return;
+    ::AddFolder(database_, *folder, true);
+    RememberFolders(database_, {AbsolutePath(*folder)});
 }
 
 void CollectionCommands::AddPaths(const QStringList& paths) {
+    QStringList folders;
+    for (const QString& path : paths)
+        if (QFileInfo(path).isDir()) folders << AbsolutePath(path);
+    RememberFolders(database_, folders);
     const IntakeResult result = ::AddPaths(database_, paths, true);
     if (OnIntake) OnIntake(result);
 }

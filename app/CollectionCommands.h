@@ -16,6 +16,10 @@ class CollectionCommands {
     // Told what came of files and folders that were taken in without a report of the engine's own.
     std::function<void(const IntakeResult&)> OnIntake;
 
+    // The commands of the database's menu that are about the collection's file and its intake. False when the
+    // number is none of them.
+    bool Run(int id);
+
     void New();
     void Open();
     void OpenFile(const QString& path);

@@ -41,7 +41,8 @@ MainMenu::MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(i
         if (item->Find(mcPlay) != nullptr) songMenu_ = menu;
     }
     first->addSeparator();
-    QAction* last = first->addAction(ThemeIcon(u"application-exit"_s, QStyle::SP_DialogCloseButton), u"&Beenden"_s);
+    QAction* last =
+        first->addAction(ThemeIcon(u"application-exit"_s, QStyle::SP_DialogCloseButton), u"&Beenden"_s);
     last->setShortcut(QKeySequence(u"Ctrl+Q"_s));
     QObject::connect(last, &QAction::triggered, &bar, std::move(exit));
     Update();
@@ -64,9 +65,14 @@ void MainMenu::AddItems(QMenu& menu, const TMenuExItem& parent) {
     auto* group = new QActionGroup(&menu);
     for (const auto& item : parent.Items()) {
         switch (item->Kind()) {
-            case TMenuExItem::ItemKind::Separator: menu.addSeparator(); break;
-            case TMenuExItem::ItemKind::Submenu: AddItems(*menu.addMenu(WithKey(item->Caption(), keys)), *item); break;
-            default: AddCommand(menu, *item);
+            case TMenuExItem::ItemKind::Separator:
+                menu.addSeparator();
+                break;
+            case TMenuExItem::ItemKind::Submenu:
+                AddItems(*menu.addMenu(WithKey(item->Caption(), keys)), *item);
+                break;
+            default:
+                AddCommand(menu, *item);
         }
         if (item->Kind() == TMenuExItem::ItemKind::Radio) group->addAction(actions_[item->Id()]);
         if (QAction* action = actions_.value(item->Id())) action->setText(WithKey(item->Caption(), keys));

@@ -13,7 +13,8 @@ class TMusicDatabase;
 class MainMenu {
  public:
     // `run` is given the number of the chosen command.
-    MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(int id)> run, std::function<void()> exit);
+    MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(int id)> run,
+             std::function<void()> exit);
 
     // Enables, disables and marks the items as the database's menu says now.
     void Update();

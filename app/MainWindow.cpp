@@ -10,16 +10,19 @@
 #include <QStackedWidget>
 #include <QStatusBar>
 #include <QTimer>
+#include <QToolButton>
 #include <QUrl>
 
 #include "CommonRUKTools/Dialogs.h"
+#include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/database/Intake.h"
 #include "MusicManagment/database/IntakeReport.h"
+#include "MusicManagment/database/Settings.h"
 #include "app/CommandRunner.h"
 #include "app/MainMenu.h"
+#include "app/SongCommands.h"
 #include "app/Startup.h"
 #include "app/desktop/Icons.h"
-#include "app/desktop/WindowPlacement.h"
 #include "app/views/EmptyState.h"
 #include "app/views/SongListWidget.h"
 
@@ -27,7 +30,7 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr auto kPlacement = u"MainForm";
+constexpr QStringView kSettingsKey = u"\\Software\\RUK\\Tunestead3";
 
 QStringList LocalFiles(const QMimeData& data) {
     QStringList files;
@@ -49,7 +52,8 @@ TTunesteadMainWnd::TTunesteadMainWnd(MainWindowOptions options)
     SetUpDatabase();
     SetUpCentre();
     SetUpStatusBar();
-    menu_ = std::make_unique<MainMenu>(*menuBar(), commands_, [this] { close(); });
+    SetUpMenu();
+    LoadSettings();
     SetUpPlacement();
     ListChanged();
     QTimer::singleShot(0, this, &TTunesteadMainWnd::StartOnce);
@@ -86,10 +90,62 @@ void TTunesteadMainWnd::SetUpStatusBar() {
     summary_ = new QLabel(this);
     summary_->setObjectName(u"summary"_s);
     statusBar()->addPermanentWidget(summary_);
+    undo_ = new QToolButton(this);
+    undo_->setText(u"Entfernen rückgängig machen"_s);
+    undo_->setToolTip(u"Nimmt die zuletzt entfernten Songs wieder auf (Strg+Z)"_s);
+    undo_->setShortcut(QKeySequence::Undo);
+    undo_->setVisible(false);
+    connect(undo_, &QToolButton::clicked, this,
+            [this] { RunCommand([this] { songCommands_->UndoRemoval(); }); });
+    statusBar()->addPermanentWidget(undo_);
+}
+
+void TTunesteadMainWnd::SetUpMenu() {
+    songCommands_ = std::make_unique<SongCommands>(database_, *list_);
+    songCommands_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
+    songCommands_->OnUndoChanged = [this](bool possible) { undo_->setVisible(possible); };
+    database_.OnMenuItemClicked = [this](TMusicDatabase&, const TMenuExItem&, void*, qint64 id,
+                                         bool& proceed) { proceed = !RunOwnCommand(static_cast<int>(id)); };
+    menu_ = std::make_unique<MainMenu>(
+        *menuBar(), database_, [this](int id) { RunMenuCommand(id); }, [this] { close(); });
+    list_->OnContextMenu = [this](const QPoint& place) { menu_->SongMenu().popup(place); };
+}
+
+void TTunesteadMainWnd::RunMenuCommand(int id) {
+    RunCommand([this, id] { database_.ClickMenuItem(id); });
+}
+
+// Commands that need the window or the collection's file; everything else is the database's.
+bool TTunesteadMainWnd::RunOwnCommand(int id) {
+    return commands_.Run(id) || songCommands_->Run(id);
+}
+
+void TTunesteadMainWnd::LoadSettings() {
+    TRWReg settings(kSettingsKey.toString(), options_.SettingsFile);
+    LoadDatabaseSettings(database_, settings);
+    linkPath_ = settings.ReadString(u"LinkPath"_s).value_or(QString());
+    // Absent counts as the first start; written back at once, so that a crash does not make it the first
+    // again.
+    firstTime_ = settings.ReadBool(u"FirstTime"_s).value_or(true);
+    settings.WriteBool(u"FirstTime"_s, false);
+    if (const auto columns = settings.ReadBinary(u"SongListColumns"_s)) list_->RestoreColumns(*columns);
+    menu_->Update();
+}
+
+void TTunesteadMainWnd::StoreSettings() {
+    TRWReg settings(kSettingsKey.toString(), options_.SettingsFile);
+    SaveDatabaseSettings(database_, settings);
+    settings.WriteString(u"LinkPath"_s, linkPath_);
+    settings.WriteBinary(u"MainForm"_s, saveGeometry());
+    settings.WriteBinary(u"MainFormState"_s, saveState());
+    settings.WriteBinary(u"SongListColumns"_s, list_->SaveColumns());
+    settings.Flush();
 }
 
 void TTunesteadMainWnd::SetUpPlacement() {
-    if (RestorePlacement(*this, options_.SettingsFile, QString::fromUtf16(kPlacement))) return;
+    const TRWReg settings(kSettingsKey.toString(), options_.SettingsFile);
+    restoreState(settings.ReadBinary(u"MainFormState"_s).value_or(QByteArray()));
+    if (restoreGeometry(settings.ReadBinary(u"MainForm"_s).value_or(QByteArray()))) return;
     constexpr int kWidth = 190;  // average characters
     constexpr int kHeight = 42;  // lines
     const QSize wanted(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
@@ -103,7 +159,7 @@ void TTunesteadMainWnd::StartOnce() {
 // --- What follows the database ---
 
 void TTunesteadMainWnd::RunningChanged(bool running) {
-    menu_->SetCommandsEnabled(!running);
+    menu_->Update();
     empty_->SetCommandsEnabled(!running);
     list_->SetSortingAllowed(!running);
     if (!running) songs_.SyncViews();
@@ -152,7 +208,7 @@ void TTunesteadMainWnd::closeEvent(QCloseEvent* event) {
     event->ignore();
     if (database_.ProgressRunning()) return OfferToStop();
     if (!commands_.MayClose()) return;
-    StorePlacement(*this, options_.SettingsFile, QString::fromUtf16(kPlacement));
+    RunCommand([this] { StoreSettings(); });
     event->accept();
 }
 

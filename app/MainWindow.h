@@ -13,6 +13,8 @@ class EmptyState;
 class MainMenu;
 class QLabel;
 class QStackedWidget;
+class QToolButton;
+class SongCommands;
 class SongListWidget;
 
 // What the main window is started with.
@@ -41,6 +43,11 @@ class TTunesteadMainWnd : public QMainWindow {
     void SetUpCentre();
     void SetUpStatusBar();
     void SetUpPlacement();
+    void SetUpMenu();
+    void LoadSettings();
+    void StoreSettings();
+    void RunMenuCommand(int id);
+    bool RunOwnCommand(int id);
     void StartOnce();
     void RunningChanged(bool running);
     void ListChanged();
@@ -53,9 +60,13 @@ class TTunesteadMainWnd : public QMainWindow {
     CollectionTotals totals_;
     CollectionCommands commands_;
     ProgressDisplay progress_;
+    std::unique_ptr<SongCommands> songCommands_;
     std::unique_ptr<MainMenu> menu_;
     QStackedWidget* centre_ = nullptr;
     SongListWidget* list_ = nullptr;
     EmptyState* empty_ = nullptr;
     QLabel* summary_ = nullptr;
+    QToolButton* undo_ = nullptr;
+    QString linkPath_;        // folder of the program's shortcuts
+    bool firstTime_ = false;  // this is the program's first start
 };

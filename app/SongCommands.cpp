@@ -17,21 +17,40 @@ QString SongCount(std::size_t count) {
 
 }  // namespace
 
-SongCommands::SongCommands(TMusicDatabase& database, SongListWidget& list) : database_(database), list_(list) {}
+SongCommands::SongCommands(TMusicDatabase& database, SongListWidget& list)
+    : database_(database), list_(list) {}
 
 bool SongCommands::Run(int id) {
-    if ((id >= mcSortFirst && id <= mcSortLast) || (id >= mcSubSortFirst && id <= mcSubSortLast) || id == mcReverse)
+    if ((id >= mcSortFirst && id <= mcSortLast) || (id >= mcSubSortFirst && id <= mcSubSortLast) ||
+        id == mcReverse)
         return SetOrder(id), true;
     switch (id) {
-        case mcFind: list_.OnFind ? list_.OnFind() : void(); return true;
-        case mcFindNext: list_.FindNext(); return true;
-        case mcMarkAll: list_.MarkAll(); return true;
-        case mcInvertMarks: list_.InvertMarks(); return true;
-        case mcMarkByFilter: list_.MarkByFilter(); return true;
-        case mcRemoveFromDatabase: RemoveChosen(); return true;
-        case mcCopyTo: CopyChosen(); return true;
-        case mcOpenExternally: OpenExternally(); return true;
-        default: return false;
+        case mcFind:
+            if (OnFind) OnFind();
+            return true;
+        case mcFindNext:
+            list_.FindNext();
+            return true;
+        case mcMarkAll:
+            list_.MarkAll();
+            return true;
+        case mcInvertMarks:
+            list_.InvertMarks();
+            return true;
+        case mcMarkByFilter:
+            list_.MarkByFilter();
+            return true;
+        case mcRemoveFromDatabase:
+            RemoveChosen();
+            return true;
+        case mcCopyTo:
+            CopyChosen();
+            return true;
+        case mcOpenExternally:
+            OpenExternally();
+            return true;
+        default:
+            return false;
     }
 }
 
@@ -65,11 +84,12 @@ void SongCommands::SetOrder(int id) {
 void SongCommands::RemoveChosen() {
     const auto songs = Chosen();
     if (songs.empty()) return;
-    const QString question =
-        songs.size() == 1 ? u"Soll \""_s + database_.Song(songs[0]).Artist + u" - "_s + database_.Song(songs[0]).Title +
-                                u"\" aus der Datenbank entfernt werden? Die Datei bleibt erhalten."_s
-                          : u"Sollen "_s + SongCount(songs.size()) +
-                                u" aus der Datenbank entfernt werden? Die Dateien bleiben erhalten."_s;
+    const QString question = songs.size() == 1
+                                 ? u"Soll \""_s + database_.Song(songs[0]).Artist + u" - "_s +
+                                       database_.Song(songs[0]).Title +
+                                       u"\" aus der Datenbank entfernt werden? Die Datei bleibt erhalten."_s
+                                 : u"Sollen "_s + SongCount(songs.size()) +
+                                       u" aus der Datenbank entfernt werden? Die Dateien bleiben erhalten."_s;
     if (UserDialogs().Ask(question, {u"Entfernen"_s, u"Abbrechen"_s}, 1) != 0) return;
     RemovedSongs removed = RemoveSongs(database_, songs);
     if (removed.empty()) return;
@@ -82,7 +102,8 @@ void SongCommands::RemoveChosen() {
 void SongCommands::CopyChosen() {
     const auto songs = Chosen();
     if (songs.empty()) return;
-    const auto folder = UserDialogs().ChooseFolder(u"Ordner auswählen, in den die Songs kopiert werden sollen:"_s);
+    const auto folder =
+        UserDialogs().ChooseFolder(u"Ordner auswählen, in den die Songs kopiert werden sollen:"_s);
     if (!folder) return;
     const CopyResult result = CopySongs(database_, songs, *folder);
     Tell(SongCount(static_cast<std::size_t>(result.Copied)) + u" kopiert."_s);

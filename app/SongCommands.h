@@ -13,6 +13,8 @@ class SongCommands {
  public:
     SongCommands(TMusicDatabase& database, SongListWidget& list);
 
+    // Puts the cursor where searching begins.
+    std::function<void()> OnFind;
     // Told what came of a command, in a sentence for the status bar.
     std::function<void(const QString&)> OnDone;
     // Told when there is something to bring back, or nothing any more.

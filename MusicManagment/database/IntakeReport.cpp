@@ -52,7 +52,8 @@ QString IntakeDetails(const IntakeResult& result) {
 }
 
 void ShowReport(const QString& message, const QString& details) {
-    if (UserDialogs().Ask(message, {u"OK"_s, u"Details"_s}, kOkButton) == kDetailsButton) ShowDetails(details);
+    if (UserDialogs().Ask(message, {u"OK"_s, u"Details"_s}, kOkButton) == kDetailsButton)
+        ShowDetails(details);
 }
 
 void ReportIntake(const IntakeResult& result) {

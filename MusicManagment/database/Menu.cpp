@@ -137,8 +137,15 @@ void AddSongMenu(TMenuExItem& root, bool readOnly) {
 }
 
 // Commands whose operation is still to be built.
-constexpr int kLater[] = {mcFindOnline, mcRemoveFromDisk, mcBan, mcPlay, 402, 404, 501, 503, 504, 505,
-                          506,          507,              508,   509,    510, 512, 513, 514};
+constexpr int kLater[] = {mcFindOnline, mcRemoveFromDisk,
+                          mcBan,        mcPlay,
+                          402,          404,
+                          501,          503,
+                          504,          505,
+                          506,          507,
+                          508,          509,
+                          510,          512,
+                          513,          514};
 
 void DisableLater(TMenuExItem& menu) {
     for (const int id : kLater) {

@@ -37,7 +37,8 @@ std::vector<std::pair<QString, QString>> Values(const TID3Tag& info) {
 
 QString BuildNameFromPattern(const QString& pattern, const QString& path, const TID3Tag& info) {
     QString name = pattern;
-    for (const auto& [placeholder, value] : Values(info)) name.replace(placeholder, value);
+    for (const auto& [placeholder, value] : Values(info))
+        name.replace(placeholder, value);
     const qsizetype slash = path.lastIndexOf(u'/');
     const qsizetype dot = path.lastIndexOf(u'.');
     const QString extension = dot > slash ? path.mid(dot) : QString();
