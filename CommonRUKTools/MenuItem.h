@@ -4,6 +4,7 @@
 #include <QtGlobal>
 #include <functional>
 #include <memory>
+#include <utility>
 #include <vector>
 
 // A menu without a toolkit: a tree of captioned items that components build and the shell shows.
@@ -41,7 +42,8 @@ class TMenuExItem {
         return *items_.back();
     }
     // The item with this number in this tree; nullptr when there is none.
-    TMenuExItem* Find(int id);
+    const TMenuExItem* Find(int id) const;
+    TMenuExItem* Find(int id) { return const_cast<TMenuExItem*>(std::as_const(*this).Find(id)); }
 
  private:
     ItemKind kind_;
