@@ -203,8 +203,8 @@ void SortShortRun(std::vector<RunItem>& items, bool backwards) {
     });
 }
 
-// A sort key costs as much as several comparisons of short texts, so a run of a few songs goes without. The bound also
-// limits the loss with scripts that the collator compares slowly.
+// A sort key costs as much as several comparisons of short texts, so a run of a few songs goes without. The
+// bound also limits the loss with scripts that the collator compares slowly.
 constexpr std::size_t kShortRun = 16;
 
 // Orders songs that are equal up to here by the last text of the sub sort type, then by length.
