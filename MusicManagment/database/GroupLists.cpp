@@ -71,24 +71,6 @@ int CompareLengths(QStringView a, QStringView b) {
 
 constexpr TOVType kTextTypes[] = {ovArtist, ovAlbum, ovYear, ovLength};
 
-// The caption under which a song is counted in a text list.
-QString GroupCaption(TOVType type, const TID3Tag& song) {
-    switch (type) {
-        case ovArtist:
-            return song.Artist;
-        case ovAlbum:
-            return song.Album;
-        case ovYear:
-            return YearBucket(YearNumber(song.Year));
-        default:
-            return LengthBucket(song.Length);
-    }
-}
-
-std::size_t GenreRowOf(const TID3Tag& song) {
-    return song.MainGenre < kMainGenreCount ? song.MainGenre : 0;
-}
-
 // A number from a file, so that two of them can be added and songs counted on without an overflow.
 int PossibleCount(int count) {
     constexpr int kMost = 1 << 29;
@@ -110,6 +92,23 @@ QString YearBucket(int year) {
 
 QString LengthBucket(int seconds) {
     return LengthBuckets().TextOf(seconds);
+}
+
+QString GroupCaption(TOVType type, const TID3Tag& song) {
+    switch (type) {
+        case ovArtist:
+            return song.Artist;
+        case ovAlbum:
+            return song.Album;
+        case ovYear:
+            return YearBucket(YearNumber(song.Year));
+        default:
+            return LengthBucket(song.Length);
+    }
+}
+
+int GenreRowOf(const TID3Tag& song) {
+    return song.MainGenre < kMainGenreCount ? song.MainGenre : 0;
 }
 
 TYearList::TYearList() : SortedTextList(&CompareYears) {}
@@ -186,16 +185,16 @@ void GroupLists::CountDown(TOVType type, const QString& caption, GroupListener* 
 }
 
 void GroupLists::CountGenre(const TID3Tag& song, int change, GroupListener* listener) {
-    const std::size_t row = GenreRowOf(song);
-    int& count = genres_[row];
+    const int row = GenreRowOf(song);
+    int& count = genres_[static_cast<std::size_t>(row)];
     count = std::max(0, count + change);
-    if (listener != nullptr) listener->RowUpdated(ovGenre, static_cast<int>(row), count);
+    if (listener != nullptr) listener->RowUpdated(ovGenre, row, count);
 }
 
 void GroupTally::Add(const TID3Tag& song) {
     for (const TOVType type : kTextTypes)
         ++captions_[type][GroupCaption(type, song)];
-    ++genres_[GenreRowOf(song)];
+    ++genres_[static_cast<std::size_t>(GenreRowOf(song))];
 }
 
 void GroupTally::WriteTo(GroupLists& lists) const {

@@ -17,6 +17,10 @@ int YearNumber(const QString& year);
 // Captions of the buckets, for example "In den 80ern" and "2 bis 3 Minuten".
 QString YearBucket(int year);
 QString LengthBucket(int seconds);
+// The caption under which a song is counted in a text list.
+QString GroupCaption(TOVType type, const TID3Tag& song);
+// The row of the genres in which it is counted.
+int GenreRowOf(const TID3Tag& song);
 
 // Sorted lists whose order is that of the buckets; texts that are no bucket come last.
 class TYearList : public SortedTextList {

@@ -1,0 +1,93 @@
+#include "app/views/PropertyForm.h"
+
+#include "MusicManagment/database/MusicManagment.h"
+#include "app/views/PropertyTree.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+constexpr int kReadDelay = 150;  // milliseconds after the last change
+constexpr int kBusyDelay = 500;  // until the next try while a long operation reads files itself
+
+}  // namespace
+
+TPropertyForm::TPropertyForm(const TMusicDatabase& database, QWidget* parent)
+    : QDockWidget(u"Datei-Eigenschaften"_s, parent), database_(database), tree_(new PropertyTree(this)) {
+    setObjectName(u"PropertyForm"_s);
+    setAccessibleName(windowTitle());
+    tree_->setObjectName(u"properties"_s);
+    tree_->setAccessibleName(windowTitle());
+    setWidget(tree_);
+    readTimer_.setSingleShot(true);
+    connect(&readTimer_, &QTimer::timeout, this, &TPropertyForm::ReadFile);
+}
+
+void TPropertyForm::ShowSong(const TID3Tag* song) {
+    const std::optional<TID3Tag> shown = song != nullptr ? std::optional(*song) : std::nullopt;
+    if (shown == song_) return;
+    song_ = shown;
+    Reload();
+}
+
+void TPropertyForm::Reload() {
+    details_.reset();
+    stale_ = true;
+    if (isVisible()) Refresh();
+}
+
+void TPropertyForm::Refresh() {
+    stale_ = false;
+    ShowRows();
+    if (song_)
+        readTimer_.start(kReadDelay);
+    else
+        readTimer_.stop();
+}
+
+void TPropertyForm::ReadFile() {
+    readTimer_.stop();
+    if (!song_) return;
+    // The results of a reading are process-wide, and the operation is not done with those of its own.
+    if (database_.ProgressRunning()) return readTimer_.start(kBusyDelay);
+    details_ = ReadFileDetails(song_->FileName, database_.AudioReadOptions());
+    ShowRows();
+}
+
+void TPropertyForm::showEvent(QShowEvent* event) {
+    QDockWidget::showEvent(event);
+    if (stale_) Refresh();
+}
+
+void TPropertyForm::hideEvent(QHideEvent* event) {
+    QDockWidget::hideEvent(event);
+    if (!readTimer_.isActive()) return;
+    readTimer_.stop();
+    stale_ = true;
+}
+
+// --- Rows ---
+
+std::vector<PropertyRow> TPropertyForm::FrameRows() const {
+    if (!details_) return {};
+    std::vector<PropertyRow> rows = details_->Frames;
+    if (!details_->Error.isEmpty()) rows.insert(rows.begin(), {u"Fehler"_s, details_->Error});
+    return rows;
+}
+
+std::vector<PropertyGroup> TPropertyForm::Groups() const {
+    if (!song_) return {};
+    PropertyGroup file{u"Datei"_s, PathProperties(*song_)};
+    const std::vector<PropertyRow> pending = {{u"Größe"_s, u"…"_s}, {u"Änderungsdatum"_s, u"…"_s}};
+    const auto& onDisk = details_ ? details_->File : pending;
+    file.Rows.insert(file.Rows.end(), onDisk.begin(), onDisk.end());
+    return {file,
+            {u"Tags"_s, TagProperties(*song_)},
+            {u"Technische Daten"_s, TechnicalProperties(*song_)},
+            {u"Sammlung"_s, CollectionProperties(*song_)},
+            {u"ID3v2-Frames"_s, FrameRows()}};
+}
+
+void TPropertyForm::ShowRows() {
+    tree_->SetGroups(Groups());
+}

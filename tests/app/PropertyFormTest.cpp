@@ -1,0 +1,171 @@
+#include "app/views/PropertyForm.h"
+
+#include <gtest/gtest.h>
+
+#include <QClipboard>
+#include <QFile>
+#include <QLineEdit>
+#include <QPlainTextEdit>
+#include <QTemporaryDir>
+#include <QTest>
+
+#include "MusicManagment/database/MusicManagment.h"
+#include "app/views/PropertyTree.h"
+#include "app/views/TagForm.h"
+#include "tests/PrintQt.h"
+#include "tests/ReadMPEGHeader/Builders.h"
+#include "tests/app/Songs.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+class PropertyFormTest : public testing::Test {
+ protected:
+    PropertyFormTest() {
+        database_.SetModernTags(true);
+        form_.resize(400, 600);
+    }
+
+    QString WriteSong(const QString& name, const Bytes& bytes) const {
+        QFile file(folder_.filePath(name));
+        EXPECT_TRUE(file.open(QIODevice::WriteOnly));
+        file.write(reinterpret_cast<const char*>(bytes.data()), static_cast<qint64>(bytes.size()));
+        return file.fileName();
+    }
+    TID3Tag TaggedSong() const {
+        const auto tag = TitledTag("Lied", "Band").Text("TALB", "Das Album").Text("TYER", "1999").Build();
+        const QString path = WriteSong(u"lied.mp3"_s, Mp3Builder().Raw(tag).Frames(80).Data());
+        return database_.GetEntry(-1, path);
+    }
+    void Show(const TID3Tag& song) {
+        form_.show();
+        form_.ShowSong(&song);
+    }
+    QStringList Lines() const { return form_.Properties().AllText().split(u'\n'); }
+
+    QTemporaryDir folder_;
+    TMusicDatabase database_;
+    mutable TPropertyForm form_{database_};
+};
+
+TEST_F(PropertyFormTest, ShowsWhatIsKnownAtOnceAndTheFileLater) {
+    TID3Tag song = TaggedSong();
+    song.AddTime = 45292.5;
+    song.PlayCount = 12;
+    song.Flags = sfBurned;
+    song.MainGenre = 8;
+    Show(song);
+    const QString bitRate = u"Bitrate: 128 KBit/s"_s;
+    for (const QString& line :
+         {u"Datei"_s, u"Name: lied.mp3"_s, u"Ordner: "_s + folder_.path(), u"Größe: …"_s, u"Tags"_s,
+          u"Titel: Lied"_s, u"Artist: Band"_s, u"Album: Das Album"_s, u"Jahr: 1999"_s, u"Technische Daten"_s,
+          u"Format: MPEG 1.0 Layer III"_s, bitRate, u"Sammlung"_s, u"Hauptgenre: Rock/Pop"_s,
+          u"Beliebtheit: 12"_s, u"Flags: Auf CD gebrannt"_s, u"Hinzugefügt am: 01.01.2024 12:00"_s})
+        EXPECT_TRUE(Lines().contains(line)) << line.toStdString();
+    EXPECT_FALSE(Lines().contains(u"ID3v2-Frames"_s));
+    EXPECT_TRUE(form_.ReadPending());
+
+    form_.ReadFile();
+    EXPECT_FALSE(form_.ReadPending());
+    const QString size = QLocale(QLocale::German).toString(QFileInfo(song.FileName).size());
+    EXPECT_EQ(Lines().filter(u"Größe: "_s).filter(size + u" Bytes"_s).size(), 1);
+    for (const QString& line : {u"ID3v2-Frames"_s, u"TIT2: Lied"_s, u"TPE1: Band"_s, u"TALB: Das Album"_s})
+        EXPECT_TRUE(Lines().contains(line)) << line.toStdString();
+}
+
+TEST_F(PropertyFormTest, ReadsNothingWhileItCannotBeSeen) {
+    const TID3Tag song = TaggedSong();
+    form_.ShowSong(&song);
+    EXPECT_FALSE(form_.ReadPending());
+    form_.show();
+    EXPECT_TRUE(form_.ReadPending());
+    form_.hide();
+    EXPECT_FALSE(form_.ReadPending());
+    form_.show();
+    EXPECT_TRUE(form_.ReadPending());
+    form_.ReadFile();
+    form_.ShowSong(&song);  // the same again
+    EXPECT_FALSE(form_.ReadPending());
+    form_.ShowSong(nullptr);
+    EXPECT_FALSE(form_.ReadPending());
+    EXPECT_EQ(form_.Properties().topLevelItemCount(), 0);
+}
+
+TEST_F(PropertyFormTest, WaitsForTheEndOfALongOperation) {
+    Show(TaggedSong());
+    {
+        const ProgressRun run(database_, u"Test"_s);
+        form_.ReadFile();
+        EXPECT_TRUE(form_.ReadPending());
+        EXPECT_FALSE(Lines().contains(u"TIT2: Lied"_s));
+    }
+    form_.ReadFile();
+    EXPECT_TRUE(Lines().contains(u"TIT2: Lied"_s));
+}
+
+TEST_F(PropertyFormTest, AnUnreadableFileIsToldInALine) {
+    Show(CdSong(u"Lied"_s));
+    EXPECT_TRUE(Lines().contains(u"Name: Lied.mp3"_s));
+    EXPECT_TRUE(Lines().contains(u"Ordner: :00000001:"_s));
+    form_.ReadFile();
+    EXPECT_TRUE(Lines().contains(u"Fehler: CD nicht eingelegt"_s));
+    EXPECT_TRUE(Lines().filter(u"Größe"_s).isEmpty());
+
+    TID3Tag song;
+    song.FileName = folder_.path();  // a folder can be opened by nobody as a song
+    Show(song);
+    form_.ReadFile();
+    EXPECT_EQ(Lines().filter(u"Fehler: "_s).size(), 1);
+}
+
+TEST_F(PropertyFormTest, ChosenLinesAreCopied) {
+    Show(TaggedSong());
+    PropertyTree& tree = form_.Properties();
+    QTreeWidgetItem* tags = tree.topLevelItem(1);
+    tags->child(0)->setSelected(true);
+    tags->child(2)->setSelected(true);
+    QTest::keyClick(&tree, Qt::Key_C, Qt::ControlModifier);
+    EXPECT_EQ(QGuiApplication::clipboard()->text(), u"Titel: Lied\nAlbum: Das Album"_s);
+
+    tree.clearSelection();
+    tags->setSelected(true);
+    tree.CopyChosen();
+    EXPECT_TRUE(QGuiApplication::clipboard()->text().startsWith(u"Tags\nTitel: Lied\nArtist: Band\n"_s));
+
+    tree.CopyAll();
+    EXPECT_EQ(QGuiApplication::clipboard()->text(), tree.AllText());
+}
+
+TEST_F(PropertyFormTest, FoldedHeadingsStayFolded) {
+    Show(TaggedSong());
+    form_.Properties().topLevelItem(1)->setExpanded(false);
+    TID3Tag other = TaggedSong();
+    other.Title = u"Anderes"_s;
+    Show(other);
+    EXPECT_TRUE(form_.Properties().topLevelItem(0)->isExpanded());
+    EXPECT_FALSE(form_.Properties().topLevelItem(1)->isExpanded());
+}
+
+TEST(TagForm, ShowsTheTagAndNothingWithoutASong) {
+    TID3Tag song = CdSong(u"Lied"_s);
+    song.Year = u"0000"_s;
+    song.Track = 7;
+    song.Genre = 17;
+    song.Remix = true;
+    song.Comment = u"Zeile 1\nZeile 2"_s;
+    TID3TagForm form;
+    form.ShowSong(&song);
+    const auto text = [&](const QString& name) { return form.findChild<QLineEdit*>(name)->text(); };
+    EXPECT_EQ(text(u"title"_s), u"Lied"_s);
+    EXPECT_EQ(text(u"year"_s), QString());
+    EXPECT_EQ(text(u"track"_s), u"7"_s);
+    EXPECT_EQ(text(u"genre"_s), u"Rock (Remix)"_s);
+    EXPECT_EQ(form.findChild<QPlainTextEdit*>()->toPlainText(), song.Comment);
+
+    form.ShowSong(nullptr);
+    for (const QLineEdit* field : form.findChildren<QLineEdit*>())
+        EXPECT_EQ(field->text(), QString()) << field->objectName().toStdString();
+}
+
+}  // namespace
