@@ -12,6 +12,7 @@
 #include <QTimer>
 #include <QToolButton>
 #include <QUrl>
+#include <QVBoxLayout>
 
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/RWReg.h"
@@ -24,6 +25,7 @@
 #include "app/Startup.h"
 #include "app/desktop/Icons.h"
 #include "app/views/EmptyState.h"
+#include "app/views/FilterField.h"
 #include "app/views/SongListWidget.h"
 
 using namespace Qt::StringLiterals;
@@ -44,6 +46,7 @@ QStringList LocalFiles(const QMimeData& data) {
 TTunesteadMainWnd::TTunesteadMainWnd(MainWindowOptions options)
     : options_(std::move(options)),
       songs_(database_),
+      shown_(songs_),
       totals_(database_),
       commands_(database_, options_.Files),
       progress_(database_, *this) {
@@ -80,9 +83,18 @@ void TTunesteadMainWnd::SetUpCentre() {
     empty_ = new EmptyState(centre_);
     empty_->OnAddFolder = [this] { RunCommand([this] { commands_.AddFolder(); }); };
     empty_->OnAddSongs = [this] { RunCommand([this] { commands_.AddSongs(); }); };
-    list_ = new SongListWidget(songs_, database_, centre_);
+    listPage_ = new QWidget(centre_);
+    list_ = new SongListWidget(shown_, database_, listPage_);
+    filter_ = new FilterField(shown_, listPage_);
+    filter_->OnLeave = [this] { list_->Enter(); };
+    listPage_->setFocusProxy(list_);
+    auto* layout = new QVBoxLayout(listPage_);
+    layout->setContentsMargins(0, 0, 0, 0);
+    layout->setSpacing(0);
+    layout->addWidget(filter_);
+    layout->addWidget(list_, 1);
     centre_->addWidget(empty_);
-    centre_->addWidget(list_);
+    centre_->addWidget(listPage_);
     setCentralWidget(centre_);
 }
 
@@ -167,7 +179,7 @@ void TTunesteadMainWnd::RunningChanged(bool running) {
 
 void TTunesteadMainWnd::ListChanged() {
     summary_->setText(totals_.Text());
-    QWidget* wanted = songs_.rowCount() > 0 ? static_cast<QWidget*>(list_) : empty_;
+    QWidget* wanted = songs_.rowCount() > 0 ? listPage_ : empty_;
     if (centre_->currentWidget() == wanted) return;
     centre_->setCurrentWidget(wanted);
     wanted->setFocus();
@@ -177,6 +189,31 @@ void TTunesteadMainWnd::ListChanged() {
 void TTunesteadMainWnd::ShowIntake(const IntakeResult& result) {
     statusBar()->showMessage(IntakeMessage(result));
     if (result.Unreadable > 0) ReportIntake(result);
+}
+
+// --- Finding and marking ---
+
+void TTunesteadMainWnd::FocusFilter() {
+    filter_->Activate();
+}
+
+void TTunesteadMainWnd::FindNext() {
+    const QString text = filter_->SearchText();
+    if (text.isEmpty()) return FocusFilter();
+    if (!list_->FocusNext(SongFilter::Parse(text)))
+        statusBar()->showMessage(u"Kein Song passt zu „%1“."_s.arg(text));
+}
+
+void TTunesteadMainWnd::MarkAll() {
+    list_->MarkAll();
+}
+
+void TTunesteadMainWnd::InvertMarks() {
+    list_->InvertMarks();
+}
+
+void TTunesteadMainWnd::MarkByFilter() {
+    list_->MarkByFilter();
 }
 
 // --- Files from other windows ---

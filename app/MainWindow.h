@@ -7,9 +7,11 @@
 #include "app/CollectionCommands.h"
 #include "app/desktop/ProgressDisplay.h"
 #include "app/models/CollectionTotals.h"
+#include "app/models/FilteredSongs.h"
 #include "app/models/SongListModel.h"
 
 class EmptyState;
+class FilterField;
 class MainMenu;
 class QLabel;
 class QStackedWidget;
@@ -31,6 +33,13 @@ class TTunesteadMainWnd : public QMainWindow {
     ~TTunesteadMainWnd() override;
 
     TMusicDatabase& Database() { return database_; }
+
+    // What the commands for finding and marking do.
+    void FocusFilter();
+    void FindNext();
+    void MarkAll();
+    void InvertMarks();
+    void MarkByFilter();
 
  protected:
     void closeEvent(QCloseEvent* event) override;
@@ -57,12 +66,15 @@ class TTunesteadMainWnd : public QMainWindow {
     const MainWindowOptions options_;
     TMusicDatabase database_;
     SongListModel songs_;
+    FilteredSongs shown_;
     CollectionTotals totals_;
     CollectionCommands commands_;
     ProgressDisplay progress_;
     std::unique_ptr<SongCommands> songCommands_;
     std::unique_ptr<MainMenu> menu_;
     QStackedWidget* centre_ = nullptr;
+    QWidget* listPage_ = nullptr;
+    FilterField* filter_ = nullptr;
     SongListWidget* list_ = nullptr;
     EmptyState* empty_ = nullptr;
     QLabel* summary_ = nullptr;

@@ -8,6 +8,7 @@
 #include "MusicManagment/database/SongTypes.h"
 #include "ReadMPEGHeader/ID3Tag.h"
 
+// The numbers stand in the settings: columns to come get the next ones.
 enum class SongColumnId {
     Title,
     Artist,
@@ -15,13 +16,16 @@ enum class SongColumnId {
     Year,
     Length,
     Genre,
+    Id3Genre,
     Track,
     BitRate,
     SampleRate,
+    Channels,
     Format,
     PlayCount,
     Comment,
     AddTime,
+    Flags,
     Path,
 };
 
@@ -31,6 +35,7 @@ struct SongColumn {
     const char16_t* Caption;
     int Width;  // at first, in average characters
     Qt::AlignmentFlag Alignment;
+    bool Shown;                     // at first
     std::optional<TSortType> Sort;  // what a click on the header sorts by; some columns have no order
     QString (*Text)(const TID3Tag& song);
 };

@@ -84,8 +84,13 @@ SongListModel::~SongListModel() {
 // --- What views ask ---
 
 const TID3Tag* SongListModel::SongAt(int row) const {
+    const SongIndex place = IndexAt(row);
+    return place >= 0 ? &database_.Song(place) : nullptr;
+}
+
+SongIndex SongListModel::IndexAt(int row) const {
     const int place = journal_.Empty() ? row : journal_.NewRowOf(row);
-    return place >= 0 && place < database_.Count() ? &database_.Song(place) : nullptr;
+    return place < database_.Count() ? place : -1;
 }
 
 int SongListModel::rowCount(const QModelIndex& parent) const {

@@ -17,6 +17,8 @@ class SongListModel : public QAbstractTableModel, public SongListView {
 
     // The song in a row; nullptr when it has been removed since the views were told.
     const TID3Tag* SongAt(int row) const;
+    // Its position in the database; -1 when it has been removed.
+    SongIndex IndexAt(int row) const;
     // Sorts the database; what is selected stays selected. Throws EMusicDatabaseException while a long
     // operation runs.
     void SetOrder(const SongOrder& order);

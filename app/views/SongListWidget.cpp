@@ -1,15 +1,21 @@
 #include "app/views/SongListWidget.h"
 
 #include <QApplication>
+#include <QContextMenuEvent>
 #include <QHeaderView>
 #include <QScopedValueRollback>
 #include <QScrollBar>
 #include <QStyledItemDelegate>
+#include <algorithm>
 
+#include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "app/CommandRunner.h"
+#include "app/models/FilteredSongs.h"
 #include "app/models/SongColumns.h"
-#include "app/models/SongListModel.h"
+#include "app/views/ColumnLayout.h"
+#include "app/views/ColumnMenu.h"
+#include "app/views/SongMarks.h"
 
 using namespace Qt::StringLiterals;
 
@@ -40,16 +46,16 @@ class WaitCursor {
 
 }  // namespace
 
-SongListWidget::SongListWidget(SongListModel& model, TMusicDatabase& database, QWidget* parent)
-    : QTableView(parent), model_(model), database_(database) {
+SongListWidget::SongListWidget(FilteredSongs& songs, TMusicDatabase& database, QWidget* parent)
+    : QTableView(parent), songs_(songs), database_(database) {
     setObjectName(u"songList"_s);
     setAccessibleName(u"Songs"_s);
-    setModel(&model);
+    setModel(&songs);
     setItemDelegate(new RowDelegate(this));
     SetUpLook();
     SetUpHeader();
     FitToFont();
-    SetColumnWidths();
+    ResetColumns();
     FollowModel();
     ShowSortIndicator();
 }
@@ -71,28 +77,21 @@ void SongListWidget::SetUpHeader() {
     QHeaderView* header = horizontalHeader();
     header->setHighlightSections(false);
     // A header that knew the selection would look through all rows for columns that are selected whole.
-    header->setSelectionModel(new QItemSelectionModel(&model_, header));
+    header->setSelectionModel(new QItemSelectionModel(&songs_, header));
     header->setSectionsMovable(true);
     header->setStretchLastSection(true);
     header->setSortIndicatorShown(true);
     header->setSectionsClickable(true);
     connect(header, &QHeaderView::sectionClicked, this, &SongListWidget::HeaderClicked);
+    header->setContextMenuPolicy(Qt::CustomContextMenu);
+    header->setResizeContentsPrecision(0);  // a column is fitted to the rows in sight
+    connect(header, &QHeaderView::customContextMenuRequested, this, &SongListWidget::ShowColumnMenu);
 }
 
 // All rows have one height, which the header then need not keep for each.
 void SongListWidget::FitToFont() {
     verticalHeader()->setMinimumSectionSize(0);
     verticalHeader()->setDefaultSectionSize(fontMetrics().height() + fontMetrics().height() / 3);
-}
-
-// A caption is never cut, whatever the font.
-void SongListWidget::SetColumnWidths() {
-    ensurePolished();
-    for (int i = 0; i < model_.columnCount(); ++i) {
-        const int wanted =
-            SongColumns()[static_cast<std::size_t>(i)].Width * fontMetrics().averageCharWidth();
-        setColumnWidth(i, std::max(wanted, horizontalHeader()->sectionSizeHint(i)));
-    }
 }
 
 void SongListWidget::changeEvent(QEvent* event) {
@@ -102,9 +101,9 @@ void SongListWidget::changeEvent(QEvent* event) {
 
 // In a list of rows Home and End go to the first and the last row.
 QModelIndex SongListWidget::moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) {
-    if (model_.rowCount() == 0) return {};
-    if (action == MoveHome) return model_.index(0, 0);
-    if (action == MoveEnd) return model_.index(model_.rowCount() - 1, 0);
+    if (songs_.rowCount() == 0) return {};
+    if (action == MoveHome) return songs_.index(0, 0);
+    if (action == MoveEnd) return songs_.index(songs_.rowCount() - 1, 0);
     return QTableView::moveCursor(action, modifiers);
 }
 
@@ -114,7 +113,7 @@ void SongListWidget::SetOrder(const SongOrder& order) {
     {
         const WaitCursor wait;
         const QScopedValueRollback sorting(sorting_, true);
-        model_.SetOrder(order);
+        songs_.Songs().SetOrder(order);
     }
     ShowSortIndicator();
     if (!database_.FollowFocus() || !currentIndex().isValid()) return;
@@ -143,17 +142,132 @@ void SongListWidget::ShowSortIndicator() {
                                          order.Backwards ? Qt::DescendingOrder : Qt::AscendingOrder);
 }
 
+// --- Columns ---
+
+QByteArray SongListWidget::SaveColumns() const {
+    return SaveColumnLayout(*horizontalHeader());
+}
+
+bool SongListWidget::RestoreColumns(const QByteArray& saved) {
+    return RestoreColumnLayout(*horizontalHeader(), saved);
+}
+
+// A caption is never cut, whatever the font.
+void SongListWidget::ResetColumns() {
+    ensurePolished();
+    QHeaderView& header = *horizontalHeader();
+    for (int i = 0; i < songs_.columnCount(); ++i) {
+        const SongColumn& column = SongColumns()[static_cast<std::size_t>(i)];
+        header.showSection(i);
+        header.moveSection(header.visualIndex(i), i);
+        header.resizeSection(
+            i, std::max(column.Width * fontMetrics().averageCharWidth(), header.sectionSizeHint(i)));
+        header.setSectionHidden(i, !column.Shown);
+    }
+}
+
+void SongListWidget::ShowColumnMenu(const QPoint& position) {
+    QHeaderView& header = *horizontalHeader();
+    auto* menu = new ColumnMenu(header, header.logicalIndexAt(position), this);
+    menu->setAttribute(Qt::WA_DeleteOnClose);
+    menu->OnFit = [this](int section) { resizeColumnToContents(section); };
+    menu->OnReset = [this] { ResetColumns(); };
+    menu->popup(header.viewport()->mapToGlobal(position));
+}
+
+// --- Focus and marks ---
+
+std::vector<SongIndex> SongListWidget::MarkedSongs() const {
+    std::vector<SongIndex> marked;
+    for (const auto& [first, last] : MarkedRows(*selectionModel()))
+        for (int row = first; row <= last; ++row)
+            if (const SongIndex index = songs_.IndexAt(row); index >= 0) marked.push_back(index);
+    std::ranges::sort(marked);
+    return marked;
+}
+
+SongIndex SongListWidget::FocusedSong() const {
+    return currentIndex().isValid() ? songs_.IndexAt(currentIndex().row()) : -1;
+}
+
+void SongListWidget::MarkAll() {
+    MarkRows(*selectionModel(), Complement({}, songs_.rowCount()));
+}
+
+void SongListWidget::InvertMarks() {
+    MarkRows(*selectionModel(), Complement(MarkedRows(*selectionModel()), songs_.rowCount()));
+}
+
+void SongListWidget::MarkByFilter() {
+    const auto text =
+        UserDialogs().Input(u"Mit Filter markieren"_s, u"Songs markieren, auf die passt:"_s, {}, markFilter_);
+    if (!text || text->trimmed().isEmpty()) return;
+    markFilter_ = *text;
+    const SongFilter filter = SongFilter::Parse(*text);
+    std::vector<int> rows;
+    for (int row = 0; row < songs_.rowCount(); ++row) {
+        const TID3Tag* song = songs_.SongAt(row);
+        if (song != nullptr && filter.Matches(*song)) rows.push_back(row);
+    }
+    MarkRows(*selectionModel(), RangesOf(rows));
+}
+
+bool SongListWidget::FocusNext(const SongFilter& filter) {
+    const int count = songs_.rowCount();
+    const int start = currentIndex().row() + 1;  // the first one when none has the focus
+    for (int i = 0; i < count; ++i) {
+        const int row = (start + i) % count;
+        const TID3Tag* song = songs_.SongAt(row);
+        if (song == nullptr || !filter.Matches(*song)) continue;
+        FocusRow(row);
+        return true;
+    }
+    return false;
+}
+
+void SongListWidget::Enter() {
+    setFocus(Qt::OtherFocusReason);
+    if (!currentIndex().isValid() && songs_.rowCount() > 0) FocusRow(0);
+}
+
+// In a column that is in sight, so that the list does not move sideways.
+QModelIndex SongListWidget::InSight(int row) const {
+    return songs_.index(row, std::max(0, horizontalHeader()->logicalIndexAt(viewport()->width() / 2)));
+}
+
+void SongListWidget::FocusRow(int row) {
+    setCurrentIndex(InSight(row));
+}
+
+void SongListWidget::keyboardSearch(const QString& letters) {
+    const int section = std::max(0, ColumnOfSortType(database_.SortType()));
+    const int row = typeAhead_.Next(songs_, SongColumns()[static_cast<std::size_t>(section)],
+                                    currentIndex().row(), letters);
+    if (row >= 0) FocusRow(row);
+}
+
+void SongListWidget::contextMenuEvent(QContextMenuEvent* event) {
+    if (!OnContextMenu) return;
+    QPoint position = event->globalPos();
+    if (event->reason() == QContextMenuEvent::Keyboard && currentIndex().isValid()) {
+        scrollTo(currentIndex());
+        position = viewport()->mapToGlobal(visualRect(currentIndex()).bottomLeft());
+    }
+    OnContextMenu(position);
+}
+
 // --- What stays when the list changes under the user's eyes ---
 
 void SongListWidget::FollowModel() {
     connect(selectionModel(), &QItemSelectionModel::currentChanged, this, [this](const QModelIndex& current) {
-        const TID3Tag* song = current.isValid() ? model_.SongAt(current.row()) : nullptr;
+        const TID3Tag* song = current.isValid() ? songs_.SongAt(current.row()) : nullptr;
         if (song != nullptr) focusedPath_ = song->FileName;
         viewport()->update();  // the focus shows in whole rows, the view would paint single cells
     });
-    connect(&model_, &QAbstractItemModel::layoutAboutToBeChanged, this, &SongListWidget::KeepTopRow);
-    connect(&model_, &QAbstractItemModel::layoutChanged, this, &SongListWidget::RestoreTopRow);
-    connect(&model_, &QAbstractItemModel::modelReset, this, &SongListWidget::RestoreFocus);
+    connect(&songs_, &QAbstractItemModel::layoutAboutToBeChanged, this, &SongListWidget::KeepTopRow);
+    connect(&songs_, &QAbstractItemModel::layoutChanged, this, &SongListWidget::RestoreTopRow);
+    connect(&songs_, &QAbstractItemModel::modelReset, this, &SongListWidget::RestoreFocus);
+    songs_.OnFilterChange = [this] { FilterChanged(); };
 }
 
 // Songs that come in above the visible ones do not push them out of sight; a list at its top stays there.
@@ -172,12 +286,28 @@ void SongListWidget::RestoreTopRow() {
 void SongListWidget::RestoreFocus() {
     ShowSortIndicator();
     const SongIndex index = focusedPath_.isEmpty() ? -1 : database_.IndexOf(focusedPath_);
-    if (index < 0 || index >= model_.rowCount()) {
+    if (index < 0 || index >= songs_.Songs().rowCount()) {
         focusedPath_.clear();
         return;
     }
-    setCurrentIndex(model_.index(index, 0));
+    const int row = songs_.RowOfSource(index);
+    if (row < 0) return;
+    FocusRow(row);
     if (!database_.FollowFocus()) return;
     executeDelayedItemsLayout();
     scrollTo(currentIndex(), PositionAtCenter);
+}
+
+// A song that the filter has hidden gets the focus back when it is shown again, unless another one has it.
+void SongListWidget::FilterChanged() {
+    if (!currentIndex().isValid() && !focusedPath_.isEmpty()) {
+        songs_.Songs().SyncViews();
+        const int row = songs_.RowOfSource(database_.IndexOf(focusedPath_));
+        selectionModel()->setCurrentIndex(InSight(row), QItemSelectionModel::NoUpdate);
+    }
+    executeDelayedItemsLayout();
+    if (currentIndex().isValid())
+        scrollTo(currentIndex(), PositionAtCenter);
+    else
+        scrollToTop();
 }

@@ -2,16 +2,21 @@
 
 #include <QPersistentModelIndex>
 #include <QTableView>
+#include <functional>
+#include <vector>
 
+#include "MusicManagment/database/SongFilter.h"
 #include "MusicManagment/database/Sorting.h"
+#include "app/views/TypeAhead.h"
 
-class SongListModel;
+class FilteredSongs;
 class TMusicDatabase;
 
-// The list of songs. A click on a column's header sorts by it, a second one backwards.
+// The list of songs. A click on a column's header sorts by it, a second one backwards. The song that has the
+// focus and the marked (selected) songs are two things; of both only shown songs count.
 class SongListWidget : public QTableView {
  public:
-    SongListWidget(SongListModel& model, TMusicDatabase& database, QWidget* parent = nullptr);
+    SongListWidget(FilteredSongs& songs, TMusicDatabase& database, QWidget* parent = nullptr);
 
     // Sorts the database; the focused song stays in sight when the database wants that. Throws
     // EMusicDatabaseException while a long operation runs.
@@ -19,24 +24,55 @@ class SongListWidget : public QTableView {
     // Whether a click on a header sorts.
     void SetSortingAllowed(bool allowed);
 
+    // Positions in the database, ascending.
+    std::vector<SongIndex> MarkedSongs() const;
+    // -1 when no song has the focus.
+    SongIndex FocusedSong() const;
+    void MarkAll();
+    void InvertMarks();
+    // Asks for a filter and marks the shown songs that it lets through, and no others.
+    void MarkByFilter();
+    // Goes to the next shown song that the filter lets through, round the end of the list; false when there
+    // is none.
+    bool FocusNext(const SongFilter& filter);
+    // Takes the keys; a list in which no song has the focus gives it to its first.
+    void Enter();
+
+    // Which columns are shown, in which order and how wide, for the settings.
+    QByteArray SaveColumns() const;
+    // False when these are no saved columns; nothing has changed then.
+    bool RestoreColumns(const QByteArray& saved);
+    void ResetColumns();
+
+    // Where the menu of the marked songs is asked for, on the screen.
+    std::function<void(const QPoint&)> OnContextMenu;
+
+    void keyboardSearch(const QString& letters) override;
+
  protected:
     QModelIndex moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) override;
     void changeEvent(QEvent* event) override;
+    void contextMenuEvent(QContextMenuEvent* event) override;
 
  private:
     void SetUpLook();
     void SetUpHeader();
     void FitToFont();
-    void SetColumnWidths();
     void HeaderClicked(int section);
+    void ShowColumnMenu(const QPoint& position);
     void ShowSortIndicator();
+    QModelIndex InSight(int row) const;
+    void FocusRow(int row);
     void FollowModel();
     void KeepTopRow();
     void RestoreTopRow();
     void RestoreFocus();
+    void FilterChanged();
 
-    SongListModel& model_;
+    FilteredSongs& songs_;
     TMusicDatabase& database_;
+    TypeAhead typeAhead_;
+    QString markFilter_;
     QString focusedPath_;
     QPersistentModelIndex topRow_;
     bool sorting_ = false;

@@ -150,6 +150,9 @@ TEST_F(SongListModelTest, ShowsASongInGermanTexts) {
     song.Album = u"Das Album"_s;
     song.Year = u"1999"_s;
     song.MainGenre = 8;
+    song.Genre = 17;
+    song.ChannelMode = 3;
+    song.Flags = sfBurned | sfRemixed;
     song.Track = 7;
     song.BitRate = 192;
     song.SampleRate = 44100;
@@ -167,21 +170,25 @@ TEST_F(SongListModelTest, ShowsASongInGermanTexts) {
     model_.SyncViews();
 
     const QStringList captions = {
-        u"Titel"_s,   u"Artist"_s,     u"Album"_s,  u"Jahr"_s,        u"Länge"_s,     u"Genre"_s, u"Track"_s,
-        u"Bitrate"_s, u"Abtastrate"_s, u"Format"_s, u"Beliebtheit"_s, u"Kommentar"_s, u"Datum"_s, u"Pfad"_s};
+        u"Titel"_s,       u"Artist"_s,    u"Album"_s,   u"Jahr"_s,       u"Länge"_s,  u"Genre"_s,
+        u"ID3-Genre"_s,   u"Track"_s,     u"Bitrate"_s, u"Abtastrate"_s, u"Kanäle"_s, u"Format"_s,
+        u"Beliebtheit"_s, u"Kommentar"_s, u"Datum"_s,   u"Flags"_s,      u"Pfad"_s};
     const QStringList first = {u"[CD] Lied"_s,
                                u"Die Band"_s,
                                u"Das Album"_s,
                                u"1999"_s,
                                u"3:05"_s,
                                u"Rock/Pop"_s,
+                               u"Rock"_s,
                                u"7"_s,
                                u"192 KBit/s"_s,
                                u"44.1 kHz"_s,
+                               u"Joint Stereo"_s,
                                u"MPEG 1.0 Layer III"_s,
                                u"12"_s,
                                u"gut"_s,
                                u"01.01.2024 12:00"_s,
+                               u"Auf CD gebrannt, Remixed"_s,
                                u":00000001:\\Lied.mp3"_s};
     QStringList shownCaptions;
     QStringList shown;
@@ -193,7 +200,9 @@ TEST_F(SongListModelTest, ShowsASongInGermanTexts) {
     EXPECT_EQ(shown, first);
     EXPECT_EQ(Shown(model_, 1), u"Z"_s);
     EXPECT_EQ(Shown(model_, 1, SongColumnId::Year), QString());
-    EXPECT_EQ(Shown(model_, 1, SongColumnId::Track), QString());
+    for (const SongColumnId column :
+         {SongColumnId::Track, SongColumnId::Id3Genre, SongColumnId::Channels, SongColumnId::Flags})
+        EXPECT_EQ(Shown(model_, 1, column), QString());
 }
 
 }  // namespace

@@ -6,6 +6,7 @@
 #include <QScrollBar>
 #include <QTest>
 
+#include "app/models/FilteredSongs.h"
 #include "app/models/SongColumns.h"
 #include "app/models/SongListModel.h"
 #include "tests/PrintQt.h"
@@ -34,17 +35,18 @@ class SongListWidgetTest : public testing::Test {
         QTest::mouseClick(header->viewport(), Qt::LeftButton, {}, QPoint(x, header->height() / 2));
         QApplication::processEvents();
     }
-    void Focus(int row) { list_.setCurrentIndex(model_.index(row, 0)); }
-    QString FocusedTitle() const { return model_.SongAt(list_.currentIndex().row())->Title; }
+    void Focus(int row) { list_.setCurrentIndex(shown_.index(row, 0)); }
+    QString FocusedTitle() const { return shown_.SongAt(list_.currentIndex().row())->Title; }
     bool FocusVisible() const {
         return list_.viewport()->rect().contains(list_.visualRect(list_.currentIndex()).center());
     }
-    QString FirstTitle() const { return model_.SongAt(0)->Title; }
-    QString TopTitle() const { return model_.SongAt(list_.rowAt(0))->Title; }
+    QString FirstTitle() const { return shown_.SongAt(0)->Title; }
+    QString TopTitle() const { return shown_.SongAt(list_.rowAt(0))->Title; }
 
     TMusicDatabase database_;
     SongListModel model_{database_};
-    SongListWidget list_{model_, database_};
+    FilteredSongs shown_{model_};
+    SongListWidget list_{shown_, database_};
 };
 
 TEST_F(SongListWidgetTest, ClicksOnAHeaderSortForwardsThenBackwards) {

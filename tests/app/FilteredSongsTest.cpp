@@ -1,0 +1,219 @@
+#include "app/models/FilteredSongs.h"
+
+#include <gtest/gtest.h>
+
+#include <QAbstractItemModelTester>
+#include <QItemSelectionModel>
+#include <QSignalSpy>
+#include <random>
+
+#include "tests/PrintQt.h"
+#include "tests/app/Songs.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+class FilteredSongsTest : public testing::Test {
+ protected:
+    FilteredSongsTest() { database_.SetSortType(stTitle); }
+
+    void AddSongs(const QStringList& titles) {
+        for (const QString& title : titles)
+            AddSong(database_, title);
+        songs_.SyncViews();
+    }
+    QStringList Shown() const {
+        QStringList titles;
+        for (int row = 0; row < shown_.rowCount(); ++row)
+            titles << shown_.SongAt(row)->Title;
+        return titles;
+    }
+    // What must be shown, found in the simplest way.
+    QStringList Expected(const QString& text, const FilteredSongs::Restriction& restriction) const {
+        const SongFilter filter = SongFilter::Parse(text);
+        QStringList titles;
+        for (const auto& song : database_.Songs())
+            if (filter.Matches(*song) && (!restriction || restriction(*song))) titles << song->Title;
+        return titles;
+    }
+
+    TMusicDatabase database_;
+    SongListModel songs_{database_};
+    FilteredSongs shown_{songs_};
+    QAbstractItemModelTester tester_{&shown_, QAbstractItemModelTester::FailureReportingMode::Fatal};
+};
+
+TEST_F(FilteredSongsTest, NarrowsAndWidensWithTheText) {
+    AddSongs({u"Anna"_s, u"Berta"_s, u"Bernd"_s, u"Carl"_s});
+    struct Step {
+        QString Text;
+        QStringList Shown;
+    };
+    const Step steps[] = {{u"b"_s, {u"Bernd"_s, u"Berta"_s}},
+                          {u"be"_s, {u"Bernd"_s, u"Berta"_s}},
+                          {u"bert"_s, {u"Berta"_s}},
+                          {u"bertx"_s, {}},
+                          {u"-b"_s, {u"Anna"_s, u"Carl"_s}},
+                          {u"-be"_s, {u"Anna"_s, u"Carl"_s}},
+                          {u"-ber"_s, {u"Anna"_s, u"Carl"_s}},
+                          {u"-bert"_s, {u"Anna"_s, u"Bernd"_s, u"Carl"_s}},
+                          {u"länge:<6"_s, {}},
+                          {u"länge:<61"_s, {u"Anna"_s, u"Bernd"_s, u"Berta"_s, u"Carl"_s}},
+                          {u"titel"_s, {}},
+                          {u"titel:"_s, {u"Anna"_s, u"Bernd"_s, u"Berta"_s, u"Carl"_s}},
+                          {u"\"n d"_s, {}},
+                          {u"\"n d\""_s, {}},
+                          {u"na"_s, {u"Anna"_s}},
+                          {u""_s, {u"Anna"_s, u"Bernd"_s, u"Berta"_s, u"Carl"_s}}};
+    for (const auto& [text, expected] : steps) {
+        shown_.SetText(text);
+        EXPECT_EQ(Shown(), expected) << text.toStdString();
+        EXPECT_EQ(shown_.Filtering(), !text.isEmpty());
+    }
+}
+
+TEST_F(FilteredSongsTest, AChangeOfTheFilterIsToldInOneStep) {
+    for (int i = 0; i < 1000; ++i)
+        AddSong(database_, u"Lied %1"_s.arg(1000 + i));
+    songs_.SyncViews();
+    QSignalSpy inserted(&shown_, &QAbstractItemModel::rowsInserted);
+    QSignalSpy removed(&shown_, &QAbstractItemModel::rowsRemoved);
+    QSignalSpy laidOut(&shown_, &QAbstractItemModel::layoutChanged);
+    shown_.SetText(u"7"_s);
+    EXPECT_EQ(shown_.rowCount(), 271);
+    EXPECT_EQ(removed.count() + laidOut.count(), 2);
+    shown_.SetText(QString());
+    EXPECT_EQ(shown_.rowCount(), 1000);
+    EXPECT_EQ(inserted.count() + laidOut.count(), 3);
+}
+
+TEST_F(FilteredSongsTest, FocusAndSelectionStayWithTheSongsThatAreShown) {
+    AddSongs({u"Anna"_s, u"Berta"_s, u"Bernd"_s, u"Carl"_s, u"Dora"_s});
+    QItemSelectionModel selection(&shown_);
+    const auto rows = QItemSelectionModel::Select | QItemSelectionModel::Rows;
+    for (const int row : {0, 2, 4})
+        selection.select(shown_.index(row, 0), rows);
+    selection.setCurrentIndex(shown_.index(4, 0), QItemSelectionModel::NoUpdate);
+    const auto selected = [&] {
+        QStringList titles;
+        for (const QModelIndex& index : selection.selectedRows())
+            titles << shown_.SongAt(index.row())->Title;
+        return titles;
+    };
+
+    shown_.SetText(u"-anna"_s);
+    EXPECT_EQ(selected(), QStringList({u"Berta"_s, u"Dora"_s}));
+    EXPECT_EQ(shown_.SongAt(selection.currentIndex().row())->Title, u"Dora"_s);
+    shown_.SetText(QString());
+    EXPECT_EQ(selected(), QStringList({u"Berta"_s, u"Dora"_s}));
+    songs_.SetOrder({stTitle, sstGATL, true, 0});
+    shown_.SetText(u"d"_s);
+    songs_.SetOrder({stTitle, sstGATL, false, 0});
+    EXPECT_EQ(selected(), QStringList{u"Dora"_s});
+    EXPECT_EQ(shown_.SongAt(selection.currentIndex().row())->Title, u"Dora"_s);
+}
+
+TEST_F(FilteredSongsTest, AnEmptyResultKeepsTheHeadings) {
+    AddSongs({u"Anna"_s});
+    shown_.SetText(u"xyz"_s);
+    EXPECT_EQ(shown_.rowCount(), 0);
+    EXPECT_EQ(shown_.headerData(0, Qt::Horizontal).toString(), u"Titel"_s);
+}
+
+// Against the simplest way to filter: random edits of the collection, its order and the filter.
+class RandomFilteringTest : public FilteredSongsTest, public testing::WithParamInterface<unsigned> {
+ protected:
+    int Pick(int count) { return std::uniform_int_distribution<int>(0, count - 1)(random_); }
+    QString RandomTitle() {
+        QString title;
+        for (int i = 0; i < 4; ++i)
+            title += QChar(u'a' + Pick(3));
+        return title + QString::number(next_++);
+    }
+    void EditCollection() {
+        const int row = Pick(std::max(1, database_.Count()));
+        switch (database_.Count() < 3 ? 0 : Pick(5)) {
+            case 0:
+            case 1:
+                AddSong(database_, RandomTitle());
+                break;
+            case 2:
+                database_.RemoveEntry(row);
+                break;
+            case 3: {  // to another place
+                TID3Tag song = database_.Song(row);
+                song.Title = RandomTitle();
+                database_.UpdateEntry(row, song);
+                break;
+            }
+            default: {  // where it is, but perhaps no longer or newly let through
+                TID3Tag song = database_.Song(row);
+                song.Comment = song.Comment.isEmpty() ? u"abc"_s : QString();
+                database_.UpdateEntry(row, song);
+            }
+        }
+    }
+    void Wholesale() {
+        switch (Pick(4)) {
+            case 0:
+                songs_.SetOrder({stTitle, sstGATL, Pick(2) == 0, 0});
+                break;
+            case 1:
+                database_.SetSortBackwards(Pick(2) == 0);  // told as a reset
+                break;
+            case 2:
+                restriction_ = Pick(2) == 0 ? FilteredSongs::Restriction()
+                                            : [](const TID3Tag& song) { return song.Title.contains(u'b'); };
+                shown_.SetRestriction(restriction_);
+                break;
+            default:
+                if (Pick(8) == 0) database_.Clear();
+        }
+    }
+    void EditText() {
+        static const QStringList kPieces = {u"a"_s,  u"b"_s,       u"c"_s, u" "_s,         u" -"_s,
+                                            u"\""_s, u" titel:"_s, u"1"_s, u" länge:<6"_s, u".."_s};
+        if (Pick(4) == 0) text_.chop(Pick(6));
+        if (Pick(10) == 0) text_.clear();
+        text_ += kPieces[Pick(static_cast<int>(kPieces.size()))];
+        shown_.SetText(text_);
+    }
+
+    std::mt19937 random_{GetParam()};
+    QString text_;
+    FilteredSongs::Restriction restriction_;
+    int next_ = 0;
+};
+
+TEST_P(RandomFilteringTest, ShowsWhatTheFilterLetsThroughAndHoldsOnToSongs) {
+    for (int i = 0; i < 40; ++i)
+        AddSong(database_, RandomTitle());
+    songs_.SyncViews();
+    int kept = 0;
+    for (int round = 0; round < 400; ++round) {
+        QPersistentModelIndex held;
+        const TID3Tag* song = nullptr;
+        if (shown_.rowCount() > 0) {
+            held = shown_.index(Pick(shown_.rowCount()), 1);
+            song = shown_.SongAt(held.row());
+        }
+        const int edits = Pick(4);
+        for (int i = 0; i < edits; ++i)
+            EditCollection();
+        if (Pick(3) == 0) Wholesale();
+        if (Pick(2) == 0) EditText();
+        songs_.SyncViews();
+        ASSERT_EQ(Shown(), Expected(text_, restriction_)) << text_.toStdString();
+        if (held.isValid()) {
+            ++kept;
+            ASSERT_EQ(shown_.SongAt(held.row()), song);
+            ASSERT_EQ(&database_.Song(shown_.IndexAt(held.row())), song);
+        }
+    }
+    EXPECT_GT(kept, 50);
+}
+
+INSTANTIATE_TEST_SUITE_P(Seeds, RandomFilteringTest, testing::Values(1U, 2U, 3U));
+
+}  // namespace
