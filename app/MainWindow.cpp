@@ -23,6 +23,7 @@
 #include "app/MainMenu.h"
 #include "app/SongCommands.h"
 #include "app/Startup.h"
+#include "app/ToolWindows.h"
 #include "app/desktop/Icons.h"
 #include "app/views/EmptyState.h"
 #include "app/views/FilterField.h"
@@ -55,6 +56,7 @@ TTunesteadMainWnd::TTunesteadMainWnd(MainWindowOptions options)
     SetUpDatabase();
     SetUpCentre();
     SetUpStatusBar();
+    SetUpToolWindows();
     SetUpMenu();
     LoadSettings();
     SetUpPlacement();
@@ -101,7 +103,17 @@ void TTunesteadMainWnd::SetUpCentre() {
 void TTunesteadMainWnd::SetUpStatusBar() {
     summary_ = new QLabel(this);
     summary_->setObjectName(u"summary"_s);
+    marked_ = new QLabel(this);
+    marked_->setObjectName(u"marked"_s);
+    statusBar()->addPermanentWidget(marked_);
     statusBar()->addPermanentWidget(summary_);
+    // Marking with the keyboard changes the marks many times a second.
+    constexpr int kMarkedDelay = 80;  // milliseconds
+    markedTimer_.setSingleShot(true);
+    markedTimer_.setInterval(kMarkedDelay);
+    connect(&markedTimer_, &QTimer::timeout, this, [this] { ShowMarked(); });
+    connect(list_->selectionModel(), &QItemSelectionModel::selectionChanged, &markedTimer_,
+            [this] { markedTimer_.start(); });
     undo_ = new QToolButton(this);
     undo_->setText(u"Entfernen rückgängig machen"_s);
     undo_->setToolTip(u"Nimmt die zuletzt entfernten Songs wieder auf (Strg+Z)"_s);
@@ -120,7 +132,20 @@ void TTunesteadMainWnd::SetUpMenu() {
                                          bool& proceed) { proceed = !RunOwnCommand(static_cast<int>(id)); };
     menu_ = std::make_unique<MainMenu>(
         *menuBar(), database_, [this](int id) { RunMenuCommand(id); }, [this] { close(); });
+    songCommands_->OnFind = [this] { filter_->Activate(); };
+    songCommands_->OnFindNext = [this] { FindNext(); };
+    toolWindows_->AddTo(*menuBar()->addMenu(u"&Fenster"_s));
     list_->OnContextMenu = [this](const QPoint& place) { menu_->SongMenu().popup(place); };
+}
+
+void TTunesteadMainWnd::SetUpToolWindows() {
+    toolWindows_ = std::make_unique<ToolWindows>(*this, database_);
+    toolWindows_->OnSelectionChanged = [this](const GroupSelection& selection) {
+        if (selection.IsEmpty()) return shown_.SetRestriction({});
+        shown_.SetRestriction([selection](const TID3Tag& song) { return selection.Matches(song); });
+    };
+    connect(list_->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
+            [this](const QModelIndex& song) { toolWindows_->ShowSong(shown_.SongAt(song.row())); });
 }
 
 void TTunesteadMainWnd::RunMenuCommand(int id) {
@@ -129,7 +154,7 @@ void TTunesteadMainWnd::RunMenuCommand(int id) {
 
 // Commands that need the window or the collection's file; everything else is the database's.
 bool TTunesteadMainWnd::RunOwnCommand(int id) {
-    return commands_.Run(id) || songCommands_->Run(id);
+    return commands_.Run(id) || songCommands_->Run(id) || toolWindows_->Run(id);
 }
 
 void TTunesteadMainWnd::LoadSettings() {
@@ -191,29 +216,21 @@ void TTunesteadMainWnd::ShowIntake(const IntakeResult& result) {
     if (result.Unreadable > 0) ReportIntake(result);
 }
 
-// --- Finding and marking ---
-
-void TTunesteadMainWnd::FocusFilter() {
-    filter_->Activate();
-}
-
 void TTunesteadMainWnd::FindNext() {
     const QString text = filter_->SearchText();
-    if (text.isEmpty()) return FocusFilter();
+    if (text.isEmpty()) return filter_->Activate();
     if (!list_->FocusNext(SongFilter::Parse(text)))
         statusBar()->showMessage(u"Kein Song passt zu „%1“."_s.arg(text));
 }
 
-void TTunesteadMainWnd::MarkAll() {
-    list_->MarkAll();
-}
-
-void TTunesteadMainWnd::InvertMarks() {
-    list_->InvertMarks();
-}
-
-void TTunesteadMainWnd::MarkByFilter() {
-    list_->MarkByFilter();
+void TTunesteadMainWnd::ShowMarked() {
+    const auto songs = list_->MarkedSongs();
+    qint64 seconds = 0;
+    for (const SongIndex song : songs)
+        seconds += database_.Song(song).Length;
+    marked_->setText(songs.size() < 2
+                         ? QString()
+                         : u"Markiert: "_s + TotalsText(static_cast<qint64>(songs.size()), seconds));
 }
 
 // --- Files from other windows ---

@@ -2,6 +2,7 @@
 
 #include <QMainWindow>
 #include <QStringList>
+#include <QTimer>
 
 #include "MusicManagment/database/MusicManagment.h"
 #include "app/CollectionCommands.h"
@@ -18,6 +19,7 @@ class QStackedWidget;
 class QToolButton;
 class SongCommands;
 class SongListWidget;
+class ToolWindows;
 
 // What the main window is started with.
 struct MainWindowOptions {
@@ -34,13 +36,6 @@ class TTunesteadMainWnd : public QMainWindow {
 
     TMusicDatabase& Database() { return database_; }
 
-    // What the commands for finding and marking do.
-    void FocusFilter();
-    void FindNext();
-    void MarkAll();
-    void InvertMarks();
-    void MarkByFilter();
-
  protected:
     void closeEvent(QCloseEvent* event) override;
     void dragEnterEvent(QDragEnterEvent* event) override;
@@ -53,6 +48,9 @@ class TTunesteadMainWnd : public QMainWindow {
     void SetUpStatusBar();
     void SetUpPlacement();
     void SetUpMenu();
+    void SetUpToolWindows();
+    void FindNext();
+    void ShowMarked();
     void LoadSettings();
     void StoreSettings();
     void RunMenuCommand(int id);
@@ -72,12 +70,15 @@ class TTunesteadMainWnd : public QMainWindow {
     ProgressDisplay progress_;
     std::unique_ptr<SongCommands> songCommands_;
     std::unique_ptr<MainMenu> menu_;
+    std::unique_ptr<ToolWindows> toolWindows_;
     QStackedWidget* centre_ = nullptr;
     QWidget* listPage_ = nullptr;
     FilterField* filter_ = nullptr;
     SongListWidget* list_ = nullptr;
     EmptyState* empty_ = nullptr;
     QLabel* summary_ = nullptr;
+    QLabel* marked_ = nullptr;
+    QTimer markedTimer_;
     QToolButton* undo_ = nullptr;
     QString linkPath_;        // folder of the program's shortcuts
     bool firstTime_ = false;  // this is the program's first start

@@ -29,7 +29,7 @@ bool SongCommands::Run(int id) {
             if (OnFind) OnFind();
             return true;
         case mcFindNext:
-            list_.FindNext();
+            if (OnFindNext) OnFindNext();
             return true;
         case mcMarkAll:
             list_.MarkAll();
@@ -71,7 +71,7 @@ std::vector<SongIndex> SongCommands::Chosen() const {
 
 // Through the list, which keeps the focused song in sight.
 void SongCommands::SetOrder(int id) {
-    SongOrder order{database_.SortType(), database_.SubSortType(), database_.SortBackwards()};
+    SongOrder order = database_.Order();
     if (id == mcReverse)
         order.Backwards = !order.Backwards;
     else if (id >= mcSubSortFirst)

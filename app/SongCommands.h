@@ -15,6 +15,8 @@ class SongCommands {
 
     // Puts the cursor where searching begins.
     std::function<void()> OnFind;
+    // Goes to the next song that was searched for.
+    std::function<void()> OnFindNext;
     // Told what came of a command, in a sentence for the status bar.
     std::function<void(const QString&)> OnDone;
     // Told when there is something to bring back, or nothing any more.

@@ -37,7 +37,10 @@ qint64 CollectionTotals::Seconds() {
 }
 
 QString CollectionTotals::Text() {
-    const int count = database_.Count();
-    const QString songs = QLocale(QLocale::German).toString(count) + (count == 1 ? u" Song"_s : u" Songs"_s);
-    return songs + u", Spielzeit "_s + PlayingTime(Seconds());
+    return TotalsText(database_.Count(), Seconds());
+}
+
+QString TotalsText(qint64 songs, qint64 seconds) {
+    const QString count = QLocale(QLocale::German).toString(songs) + (songs == 1 ? u" Song"_s : u" Songs"_s);
+    return count + u", Spielzeit "_s + PlayingTime(seconds);
 }

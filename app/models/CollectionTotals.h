@@ -6,6 +6,9 @@
 
 class TMusicDatabase;
 
+// "2 Songs, Spielzeit 7:05"
+QString TotalsText(qint64 songs, qint64 seconds);
+
 // How long all songs together play. Follows insertions song by song; after any other change the songs are
 // added up anew when the sum is asked for.
 class CollectionTotals {
@@ -14,7 +17,6 @@ class CollectionTotals {
 
     void SongChanged(SongIndex index, TChangeType change);
     qint64 Seconds();
-    // "2 Songs, Spielzeit 7:05"
     QString Text();
 
  private:

@@ -1,0 +1,59 @@
+#include "app/ToolWindows.h"
+
+#include <QMainWindow>
+#include <QMenu>
+
+#include "MusicManagment/database/Menu.h"
+#include "MusicManagment/database/MusicManagment.h"
+#include "app/views/MusicOverview.h"
+#include "app/views/OverviewForm.h"
+#include "app/views/PropertyForm.h"
+#include "app/views/TagForm.h"
+
+ToolWindows::ToolWindows(QMainWindow& window, TMusicDatabase& database)
+    : database_(database),
+      overview_(new TOverviewForm(database, &window)),
+      properties_(new TPropertyForm(database, &window)),
+      tag_(new TID3TagForm(&window)) {
+    window.addDockWidget(Qt::LeftDockWidgetArea, overview_);
+    window.addDockWidget(Qt::RightDockWidgetArea, properties_);
+    window.tabifyDockWidget(properties_, tag_);
+    properties_->raise();
+    // A first look at the program is a look at the songs; these two are for those who want to know more.
+    properties_->hide();
+    tag_->hide();
+    database_.JoinSettings(overview_->Overview());
+    overview_->Overview().OnSelectionChanged = [this](const GroupSelection& selection) {
+        if (OnSelectionChanged) OnSelectionChanged(selection);
+    };
+    overview_->Overview().OnTypeChanged = [this](TOVType type) { MarkType(type); };
+    MarkType(overview_->Overview().OVType());
+}
+
+ToolWindows::~ToolWindows() {
+    database_.LeaveSettings(overview_->Overview());
+}
+
+void ToolWindows::ShowSong(const TID3Tag* song) {
+    properties_->ShowSong(song);
+    tag_->ShowSong(song);
+}
+
+bool ToolWindows::Run(int id) {
+    if (id < mcListArtists || id > mcListGenres) return false;
+    overview_->show();
+    overview_->raise();
+    overview_->Overview().SetOVType(static_cast<TOVType>(id - mcListArtists));
+    return true;
+}
+
+void ToolWindows::AddTo(QMenu& menu) {
+    for (QDockWidget* window : {static_cast<QDockWidget*>(overview_), static_cast<QDockWidget*>(properties_),
+                                static_cast<QDockWidget*>(tag_)})
+        menu.addAction(window->toggleViewAction());
+}
+
+void ToolWindows::MarkType(TOVType type) {
+    for (int id = mcListArtists; id <= mcListGenres; ++id)
+        if (TMenuExItem* item = database_.Menu().Find(id)) item->SetChecked(id - mcListArtists == type);
+}

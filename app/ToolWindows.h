@@ -1,0 +1,40 @@
+#pragma once
+
+#include <functional>
+
+#include "MusicManagment/database/SongTypes.h"
+#include "ReadMPEGHeader/ID3Tag.h"
+#include "app/models/GroupSelection.h"
+
+class QMainWindow;
+class QMenu;
+class TID3TagForm;
+class TMusicDatabase;
+class TOverviewForm;
+class TPropertyForm;
+
+// The windows that dock at the main window, and what they follow.
+class ToolWindows {
+ public:
+    // The windows belong to `window`; the settings of theirs join those of the database.
+    ToolWindows(QMainWindow& window, TMusicDatabase& database);
+    ~ToolWindows();
+
+    // Told when other groups are chosen in the overview.
+    std::function<void(const GroupSelection&)> OnSelectionChanged;
+
+    // Shows a song in the windows that are about one; nullptr for none.
+    void ShowSong(const TID3Tag* song);
+    // The commands of the database's menu that the overview serves. False when the number is none of them.
+    bool Run(int id);
+    // Adds the items that show and hide the windows.
+    void AddTo(QMenu& menu);
+
+ private:
+    void MarkType(TOVType type);
+
+    TMusicDatabase& database_;
+    TOverviewForm* overview_;
+    TPropertyForm* properties_;
+    TID3TagForm* tag_;
+};
