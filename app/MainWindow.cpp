@@ -134,7 +134,7 @@ void TTunesteadMainWnd::SetUpMenu() {
         *menuBar(), database_, [this](int id) { RunMenuCommand(id); }, [this] { close(); });
     songCommands_->OnFind = [this] { filter_->Activate(); };
     songCommands_->OnFindNext = [this] { FindNext(); };
-    toolWindows_->AddTo(*menuBar()->addMenu(u"&Fenster"_s));
+    toolWindows_->AddTo(*menuBar()->addMenu(u"Fe&nster"_s));
     list_->OnContextMenu = [this](const QPoint& place) { menu_->SongMenu().popup(place); };
 }
 
