@@ -8,11 +8,12 @@
 #include "ReadMPEGHeader/FrameListener.h"
 #include "ReadMPEGHeader/ID3Tag.h"
 #include "ReadMPEGHeader/ID3v2FrameBody.h"
+#include "ReadMPEGHeader/ID3v2FrameWalk.h"
 #include "ReadMPEGHeader/XrukFrame.h"
 
 // Takes the frames of one tag in their order: fills the record and tells the listener. Ids are those of
 // ID3v2.3 and 2.4, four characters.
-class ID3v2Frames {
+class ID3v2Frames : public ID3v2FrameSink {
  public:
     // Everything given must live as long as this object; `xruk` may be missing.
     ID3v2Frames(TextRules rules, TID3Tag& tag, const FrameListener& listener, std::optional<XrukFrame>* xruk)
@@ -34,11 +35,10 @@ class ID3v2Frames {
     }
 
     // False for a frame whose body changes nothing, so that it need not be read.
-    bool NeedsBody(std::string_view id) const;
-    // `shownId`: as it stands in the tag.
-    void Take(std::string_view id, const QString& shownId, ByteSpan body);
+    bool NeedsBody(std::string_view id) const override;
+    void Take(std::string_view id, const QString& shownId, ByteSpan body) override;
     // For a frame that cannot be decoded: the listener hears its size and the reason.
-    void TakeUnreadable(const QString& shownId, std::int64_t size, const QString& reason);
+    void TakeUnreadable(const QString& shownId, std::int64_t size, const QString& reason) override;
 
  private:
     using Effect = void (ID3v2Frames::*)(FrameBody&);

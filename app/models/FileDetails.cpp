@@ -4,7 +4,10 @@
 #include <QFileInfo>
 #include <QLocale>
 
+#include "CommonRUKTools/BufferedSource.h"
 #include "CommonRUKTools/Errors.h"
+#include "ReadMPEGHeader/CoverArt.h"
+#include "app/models/CoverImage.h"
 
 using namespace Qt::StringLiterals;
 
@@ -37,6 +40,13 @@ std::vector<PropertyRow> FileProperties(const QString& path) {
             {u"Änderungsdatum"_s, file.lastModified().toString(u"dd.MM.yyyy hh:mm:ss"_s)}};
 }
 
+QImage CoverOf(const QString& path) {
+    FileSource file(path);
+    BufferedSource stream(file);
+    const auto bytes = ReadCoverArt(stream);
+    return bytes ? DecodeCover(*bytes) : QImage();
+}
+
 }  // namespace
 
 FileDetails ReadFileDetails(const QString& path, ReadOptions options) {
@@ -48,6 +58,7 @@ FileDetails ReadFileDetails(const QString& path, ReadOptions options) {
     TID3Tag unused;
     try {
         details.Error = ReadAudioFile(path, options, unused);
+        if (details.Error.isEmpty()) details.Cover = CoverOf(path);
     } catch (const EStreamError& error) {
         details.Error = error.Message();
     }

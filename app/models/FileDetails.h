@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QImage>
 #include <QString>
 #include <vector>
 
@@ -10,6 +11,7 @@
 struct FileDetails {
     std::vector<PropertyRow> File{};    // size and time of the last change
     std::vector<PropertyRow> Frames{};  // of the ID3v2 tag: id and text
+    QImage Cover{};                     // reduced; null when the file has none that can be shown
     QString Error{};                    // why the file could not be read; empty when it could
 };
 

@@ -30,8 +30,7 @@ QString ShownCaption(const QString& caption) {
 
 // A caption that only stands in for a missing one must not look like a name.
 QVariant StandInLook(int role) {
-    if (role == Qt::ForegroundRole)
-        return QGuiApplication::palette().color(QPalette::Disabled, QPalette::Text);
+    if (role == Qt::ForegroundRole) return QGuiApplication::palette().color(QPalette::PlaceholderText);
     if (role != Qt::FontRole) return {};
     QFont font;
     font.setItalic(true);

@@ -4,8 +4,10 @@
 #include <QEvent>
 #include <QHeaderView>
 #include <QLineEdit>
+#include <QScrollBar>
 #include <QTreeView>
 #include <QVBoxLayout>
+#include <limits>
 
 #include "CommonRUKTools/RWReg.h"
 
@@ -18,6 +20,13 @@ constexpr auto kTypeValue = u"OVType";
 // In the order of TOVType.
 constexpr const char16_t* kTypeCaptions[kOverviewTypeCount] = {u"Artisten", u"Alben", u"Jahre", u"Längen",
                                                                u"Genre"};
+
+// The widest bucket; genres are wider and, like names, shortened where they do not fit.
+int WidestBucket(const QFontMetrics& metrics) {
+    const QString farFuture = YearBucket(std::numeric_limits<int>::max());
+    const QString tenMinutes = LengthBucket(600);
+    return std::max(metrics.horizontalAdvance(farFuture), metrics.horizontalAdvance(tenMinutes));
+}
 
 }  // namespace
 
@@ -82,13 +91,16 @@ void TMusicOverview::SetUpList() {
     connect(&model_, &QAbstractItemModel::modelReset, this, &TMusicOverview::FollowSelection);
 }
 
-// The numbers of a large collection fit, and so does the caption over them.
+// Numbers and the captions of buckets are never cut, whatever the font.
 void TMusicOverview::FitToFont() {
     ensurePolished();
-    const int number = list_->fontMetrics().horizontalAdvance(u" 1.000.000 "_s);
+    const int number = list_->fontMetrics().horizontalAdvance(u" 100.000 "_s);
     QHeaderView* header = list_->header();
-    header->resizeSection(OverviewModel::SongsColumn,
-                          std::max(number, header->sectionSizeHint(OverviewModel::SongsColumn)));
+    const int songs = std::max(number, header->sectionSizeHint(OverviewModel::SongsColumn));
+    header->resizeSection(OverviewModel::SongsColumn, songs);
+    const int frame =
+        4 * list_->fontMetrics().averageCharWidth() + list_->verticalScrollBar()->sizeHint().width();
+    list_->setMinimumWidth(WidestBucket(list_->fontMetrics()) + songs + frame);
 }
 
 void TMusicOverview::changeEvent(QEvent* event) {

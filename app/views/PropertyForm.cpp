@@ -1,6 +1,9 @@
 #include "app/views/PropertyForm.h"
 
+#include <QVBoxLayout>
+
 #include "MusicManagment/database/MusicManagment.h"
+#include "app/views/CoverView.h"
 #include "app/views/PropertyTree.h"
 
 using namespace Qt::StringLiterals;
@@ -13,12 +16,20 @@ constexpr int kBusyDelay = 500;  // until the next try while a long operation re
 }  // namespace
 
 TPropertyForm::TPropertyForm(const TMusicDatabase& database, QWidget* parent)
-    : QDockWidget(u"Datei-Eigenschaften"_s, parent), database_(database), tree_(new PropertyTree(this)) {
+    : QDockWidget(u"Datei-Eigenschaften"_s, parent),
+      database_(database),
+      tree_(new PropertyTree(this)),
+      cover_(new CoverView(this)) {
     setObjectName(u"PropertyForm"_s);
     setAccessibleName(windowTitle());
     tree_->setObjectName(u"properties"_s);
     tree_->setAccessibleName(windowTitle());
-    setWidget(tree_);
+    auto* content = new QWidget(this);
+    auto* layout = new QVBoxLayout(content);
+    layout->setContentsMargins(0, 0, 0, 0);
+    layout->addWidget(tree_, 1);
+    layout->addWidget(cover_);
+    setWidget(content);
     readTimer_.setSingleShot(true);
     connect(&readTimer_, &QTimer::timeout, this, &TPropertyForm::ReadFile);
 }
@@ -49,7 +60,10 @@ void TPropertyForm::ReadFile() {
     readTimer_.stop();
     if (!song_) return;
     // The results of a reading are process-wide, and the operation is not done with those of its own.
-    if (database_.ProgressRunning()) return readTimer_.start(kBusyDelay);
+    if (database_.ProgressRunning()) {
+        cover_->SetImage({});
+        return readTimer_.start(kBusyDelay);
+    }
     details_ = ReadFileDetails(song_->FileName, database_.AudioReadOptions());
     ShowRows();
 }
@@ -90,4 +104,6 @@ std::vector<PropertyGroup> TPropertyForm::Groups() const {
 
 void TPropertyForm::ShowRows() {
     tree_->SetGroups(Groups());
+    // The last cover stays until the next has been read: it is mostly the same, and would flicker.
+    if (details_ || !song_) cover_->SetImage(details_ ? details_->Cover : QImage());
 }

@@ -6,8 +6,8 @@
 
 #include "app/models/FileDetails.h"
 
+class CoverView;
 class PropertyTree;
-class QLabel;
 class TMusicDatabase;
 
 // The tool window that shows everything known of the focused song. The song's file is read only while the
@@ -38,6 +38,7 @@ class TPropertyForm : public QDockWidget {
 
     const TMusicDatabase& database_;
     PropertyTree* tree_;
+    CoverView* cover_;
     std::optional<TID3Tag> song_;
     std::optional<FileDetails> details_;  // of the song's file, once it has been read
     bool stale_ = false;                  // something changed while the window was hidden

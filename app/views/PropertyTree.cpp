@@ -122,8 +122,9 @@ void PropertyTree::contextMenuEvent(QContextMenuEvent* event) {
 void PropertyTree::FitToFont() {
     ensurePolished();
     const int widest = fontMetrics().horizontalAdvance(u"Änderungsdatum"_s);
-    const int frame = 4 * fontMetrics().averageCharWidth();
-    header()->resizeSection(kNameColumn, indentation() + widest + frame);
+    const int frame = 3 * fontMetrics().averageCharWidth();
+    const int indent = 2 * indentation();  // of a row under its heading
+    header()->resizeSection(kNameColumn, indent + widest + frame);
 }
 
 void PropertyTree::changeEvent(QEvent* event) {

@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <QBuffer>
 #include <QClipboard>
 #include <QFile>
 #include <QLineEdit>
@@ -10,6 +11,7 @@
 #include <QTest>
 
 #include "MusicManagment/database/MusicManagment.h"
+#include "app/views/CoverView.h"
 #include "app/views/PropertyTree.h"
 #include "app/views/TagForm.h"
 #include "tests/PrintQt.h"
@@ -72,6 +74,31 @@ TEST_F(PropertyFormTest, ShowsWhatIsKnownAtOnceAndTheFileLater) {
     EXPECT_EQ(Lines().filter(u"Größe: "_s).filter(size + u" Bytes"_s).size(), 1);
     for (const QString& line : {u"ID3v2-Frames"_s, u"TIT2: Lied"_s, u"TPE1: Band"_s, u"TALB: Das Album"_s})
         EXPECT_TRUE(Lines().contains(line)) << line.toStdString();
+}
+
+TEST_F(PropertyFormTest, ShowsTheCoverReduced) {
+    QByteArray png;
+    QBuffer buffer(&png);
+    QImage picture(1200, 300, QImage::Format_RGB32);
+    picture.fill(Qt::red);
+    ASSERT_TRUE(picture.save(&buffer, "PNG"));
+    const auto withCover = [&](const QString& name, const QByteArray& bytes) {
+        auto tag = TitledTag("Lied", "Band");
+        tag.Frame("APIC", std::string("\0image/png\0\3\0", 13) + bytes.toStdString());
+        return database_.GetEntry(-1, WriteSong(name, Mp3Builder().Raw(tag.Build()).Frames(80).Data()));
+    };
+    const auto& cover = *static_cast<CoverView*>(form_.findChild<QWidget*>(u"cover"_s));
+    Show(withCover(u"a.mp3"_s, png));
+    EXPECT_FALSE(cover.isVisible());
+    form_.ReadFile();
+    EXPECT_TRUE(cover.isVisible());
+    EXPECT_EQ(cover.Image().size(), QSize(600, 150));
+    EXPECT_EQ(cover.Image().pixelColor(300, 75), QColor(Qt::red));
+
+    Show(withCover(u"b.mp3"_s, png.first(png.size() / 2).replace(8, 30, QByteArray(30, 'x'))));
+    form_.ReadFile();
+    EXPECT_FALSE(cover.isVisible());
+    EXPECT_TRUE(Lines().contains(u"TIT2: Lied"_s));
 }
 
 TEST_F(PropertyFormTest, ReadsNothingWhileItCannotBeSeen) {
