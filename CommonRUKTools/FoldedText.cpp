@@ -51,8 +51,9 @@ bool IsAscii(QStringView text) {
 }
 
 // Whether one of the `kBlock` characters from `at` may begin the needle. Says so too often, never too seldom,
-// and has no branches, so that compilers look at all of them at once: `at[kBlock]` is looked at as well.
-bool MayBegin(const char16_t* at, char16_t first, char16_t second) {
+// and has no branches, so that compilers look at all of them at once. `next` is where the needle's second
+// character would stand for the first of them.
+bool MayBegin(const char16_t* at, const char16_t* next, char16_t first, char16_t second) {
     constexpr unsigned kCaseBit = 0x20;
     const auto matches = [](unsigned text, unsigned wanted) {
         return static_cast<unsigned>((text | kCaseBit) == (wanted | kCaseBit)) |
@@ -60,7 +61,7 @@ bool MayBegin(const char16_t* at, char16_t first, char16_t second) {
     };
     unsigned found = 0;
     for (qsizetype i = 0; i < kBlock; ++i)
-        found |= matches(at[i], first) & matches(at[i + 1], second);
+        found |= matches(at[i], first) & matches(next[i], second);
     return found != 0;
 }
 
@@ -73,12 +74,13 @@ bool StandsAt(const FoldTable& table, const QChar* at, QStringView needle) {
 // Texts and needles are short; where the needle cannot begin, whole blocks are passed over.
 bool ContainsSimple(const FoldTable& table, QStringView text, QStringView needle) {
     const char16_t first = needle[0].unicode();
-    const char16_t second = needle[needle.size() > 1 ? 1 : 0].unicode();
+    const qsizetype step = needle.size() > 1 ? 1 : 0;  // a needle of one letter is its own second
+    const char16_t second = needle[step].unicode();
     const qsizetype places = text.size() - needle.size() + 1;
     for (qsizetype i = 0; i < places;) {
-        const bool whole = needle.size() > 1 && i + kBlock < text.size();
+        const bool whole = i + kBlock < text.size();
         const qsizetype end = std::min(i + kBlock, places);
-        if (whole && !MayBegin(text.utf16() + i, first, second)) {
+        if (whole && !MayBegin(text.utf16() + i, text.utf16() + i + step, first, second)) {
             i = end;
             continue;
         }

@@ -2,7 +2,7 @@
 
 #include <QStringList>
 #include <algorithm>
-#include <array>
+#include <functional>
 #include <numeric>
 
 using namespace Qt::StringLiterals;
@@ -25,19 +25,17 @@ bool Narrows(const QString& before, const QString& after) {
     return std::equal(old.begin(), old.end(), now.begin(), &WordNarrows);
 }
 
-// The songs and their texts lie scattered in memory, and waiting for it takes most of the time of a filter.
-// Songs that are asked for in blocks are on their way while others are tested.
-constexpr std::size_t kBlock = 32;
-constexpr std::size_t kCacheLine = 64;
+struct Candidate {
+    const TID3Tag* Song;
+    int Row;
+};
 
-void Fetch(const void* begin, std::size_t size) {
-    for (std::size_t offset = 0; offset < size; offset += kCacheLine)
-        __builtin_prefetch(static_cast<const char*>(begin) + offset);
-}
-
-void FetchTexts(const TID3Tag& song) {
-    for (const QString* text : {&song.Title, &song.Artist, &song.Album, &song.Comment, &song.FileName})
-        Fetch(text->constData(), static_cast<std::size_t>(text->size()) * sizeof(QChar));
+// Songs lie in memory in the order in which they came. To go through them in that order is several times
+// faster than to jump from one to the next of the list.
+void SortByMemory(std::vector<Candidate>& candidates) {
+    const std::less<const TID3Tag*> isBefore;
+    if (!std::ranges::is_sorted(candidates, isBefore, &Candidate::Song))
+        std::ranges::sort(candidates, isBefore, &Candidate::Song);
 }
 
 }  // namespace
@@ -69,28 +67,23 @@ bool FilteredSongs::Passes(const TID3Tag& song) const {
     return (!restriction_ || restriction_(song)) && filter_.Matches(song);
 }
 
-void FilteredSongs::AppendPassing(std::span<const int> candidates, Rows& rows) const {
-    std::array<const TID3Tag*, kBlock> songs{};
-    while (!candidates.empty()) {
-        const auto block = candidates.first(std::min(kBlock, candidates.size()));
-        candidates = candidates.subspan(block.size());
-        for (std::size_t i = 0; i < block.size(); ++i) {
-            songs[i] = songs_.SongAt(block[i]);
-            Fetch(songs[i], sizeof(TID3Tag));
-        }
-        for (std::size_t i = 0; i < block.size(); ++i)
-            if (songs[i] != nullptr) FetchTexts(*songs[i]);
-        for (std::size_t i = 0; i < block.size(); ++i)
-            if (songs[i] != nullptr && Passes(*songs[i])) rows.push_back(block[i]);
-    }
+FilteredSongs::Rows FilteredSongs::Passing(const Rows& rows) const {
+    std::vector<Candidate> candidates;
+    candidates.reserve(rows.size());
+    for (const int row : rows)
+        if (const TID3Tag* song = songs_.SongAt(row)) candidates.push_back({song, row});
+    SortByMemory(candidates);
+    Rows passing;
+    for (const auto& [song, row] : candidates)
+        if (Passes(*song)) passing.push_back(row);
+    std::ranges::sort(passing);
+    return passing;
 }
 
 FilteredSongs::Rows FilteredSongs::Passing(int first, int last) const {
-    Rows candidates(static_cast<std::size_t>(last - first + 1));
-    std::iota(candidates.begin(), candidates.end(), first);
-    Rows rows;
-    AppendPassing(candidates, rows);
-    return rows;
+    Rows rows(static_cast<std::size_t>(last - first + 1));
+    std::iota(rows.begin(), rows.end(), first);
+    return Passing(rows);
 }
 
 FilteredSongs::Rows FilteredSongs::AllPassing() const {
@@ -100,7 +93,7 @@ FilteredSongs::Rows FilteredSongs::AllPassing() const {
 void FilteredSongs::ApplyFilter(bool narrower) {
     Rows rows;
     if (filtering_ && narrower)
-        AppendPassing(shown_, rows);
+        rows = Passing(shown_);
     else if (Wanted())
         rows = AllPassing();
     if (filtering_ != Wanted() || rows != shown_) Show(std::move(rows));

@@ -2,7 +2,6 @@
 
 #include <QAbstractProxyModel>
 #include <functional>
-#include <span>
 #include <vector>
 
 #include "MusicManagment/database/SongFilter.h"
@@ -58,7 +57,7 @@ class FilteredSongs : public QAbstractProxyModel {
 
     bool Wanted() const { return !filter_.IsEmpty() || restriction_; }
     bool Passes(const TID3Tag& song) const;
-    void AppendPassing(std::span<const int> candidates, Rows& rows) const;
+    Rows Passing(const Rows& rows) const;
     Rows Passing(int first, int last) const;
     Rows AllPassing() const;
     void ApplyFilter(bool narrower);
