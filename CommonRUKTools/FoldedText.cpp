@@ -41,16 +41,51 @@ bool HasOthers(const FoldTable& table, QStringView text) {
     return std::any_of(text.begin(), text.end(), [&table](QChar c) { return Fold(table, c) == kNotOne; });
 }
 
-// Where the needle's first character stands, the rest is compared; texts and needles are short.
+constexpr qsizetype kBlock = 16;
+
+bool IsAscii(QStringView text) {
+    char16_t all = 0;
+    for (const QChar character : text)
+        all |= character.unicode();
+    return all < 0x80;
+}
+
+// Whether one of the `kBlock` characters from `at` may begin the needle. Says so too often, never too seldom,
+// and has no branches, so that compilers look at all of them at once. `next` is where the needle's second
+// character would stand for the first of them.
+bool MayBegin(const char16_t* at, const char16_t* next, char16_t first, char16_t second) {
+    constexpr unsigned kCaseBit = 0x20;
+    const auto matches = [](unsigned text, unsigned wanted) {
+        return static_cast<unsigned>((text | kCaseBit) == (wanted | kCaseBit)) |
+               static_cast<unsigned>(text >= 0x80);
+    };
+    unsigned found = 0;
+    for (qsizetype i = 0; i < kBlock; ++i)
+        found |= matches(at[i], first) & matches(next[i], second);
+    return found != 0;
+}
+
+bool StandsAt(const FoldTable& table, const QChar* at, QStringView needle) {
+    for (qsizetype i = 0; i < needle.size(); ++i)
+        if (Fold(table, at[i]) != needle[i].unicode()) return false;
+    return true;
+}
+
+// Texts and needles are short; where the needle cannot begin, whole blocks are passed over.
 bool ContainsSimple(const FoldTable& table, QStringView text, QStringView needle) {
     const char16_t first = needle[0].unicode();
-    const QChar* const last = text.data() + (text.size() - needle.size());
-    for (const QChar* at = text.data(); at <= last; ++at) {
-        if (Fold(table, *at) != first) continue;
-        qsizetype i = 1;
-        while (i < needle.size() && Fold(table, at[i]) == needle[i].unicode())
-            ++i;
-        if (i == needle.size()) return true;
+    const qsizetype step = needle.size() > 1 ? 1 : 0;  // a needle of one letter is its own second
+    const char16_t second = needle[step].unicode();
+    const qsizetype places = text.size() - needle.size() + 1;
+    for (qsizetype i = 0; i < places;) {
+        const bool whole = i + kBlock < text.size();
+        const qsizetype end = std::min(i + kBlock, places);
+        if (whole && !MayBegin(text.utf16() + i, text.utf16() + i + step, first, second)) {
+            i = end;
+            continue;
+        }
+        for (; i < end; ++i)
+            if (Fold(table, text[i]) == first && StandsAt(table, text.data() + i, needle)) return true;
     }
     return false;
 }
@@ -77,5 +112,5 @@ bool ContainsFolded(QStringView text, QStringView needle) {
     if (needle.isEmpty()) return true;
     const FoldTable& table = Table();
     if (text.size() >= needle.size() && ContainsSimple(table, text, needle)) return true;
-    return HasOthers(table, text) && FoldText(text).contains(needle);
+    return !IsAscii(text) && HasOthers(table, text) && FoldText(text).contains(needle);
 }

@@ -56,8 +56,9 @@ class FilteredSongs : public QAbstractProxyModel {
     void DataChanged(const QModelIndex& topLeft, const QModelIndex& bottomRight);
 
     bool Wanted() const { return !filter_.IsEmpty() || restriction_; }
-    bool Passes(int sourceRow) const;
-    void AppendPassing(int first, int last, Rows& rows) const;
+    bool Passes(const TID3Tag& song) const;
+    Rows Passing(const Rows& rows) const;
+    Rows Passing(int first, int last) const;
     Rows AllPassing() const;
     void ApplyFilter(bool narrower);
     void Show(Rows rows);

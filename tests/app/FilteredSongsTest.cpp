@@ -211,7 +211,7 @@ TEST_P(RandomFilteringTest, ShowsWhatTheFilterLetsThroughAndHoldsOnToSongs) {
             ASSERT_EQ(&database_.Song(shown_.IndexAt(held.row())), song);
         }
     }
-    EXPECT_GT(kept, 50);
+    EXPECT_GT(kept, 20);  // the others were removed, hidden or forgotten in a reset
 }
 
 INSTANTIATE_TEST_SUITE_P(Seeds, RandomFilteringTest, testing::Values(1U, 2U, 3U));

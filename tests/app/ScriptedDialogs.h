@@ -16,6 +16,7 @@ class ScriptedDialogs : public Dialogs {
     QStringList Questions;
     std::deque<int> Answers;      // buttons of the questions to come
     std::optional<QString> File;  // what every file and folder dialog gives
+    std::optional<QString> Text;  // what every input gives
 
     void ShowMessage(MessageKind, const QString& text) override { Messages << text; }
     int Ask(const QString& text, const QStringList&, int cancelButton) override {
@@ -27,7 +28,7 @@ class ScriptedDialogs : public Dialogs {
     }
     std::optional<QString> Input(const QString&, const QString&, const QStringList&,
                                  const QString&) override {
-        return std::nullopt;
+        return Text;
     }
     std::optional<QString> OpenFile(const FileDialogOptions&) override { return File; }
     QStringList OpenFiles(const FileDialogOptions&) override {

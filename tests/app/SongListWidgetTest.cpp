@@ -2,10 +2,13 @@
 
 #include <gtest/gtest.h>
 
+#include <QContextMenuEvent>
 #include <QHeaderView>
+#include <QMenu>
 #include <QScrollBar>
 #include <QTest>
 
+#include "CommonRUKTools/Clock.h"
 #include "app/models/FilteredSongs.h"
 #include "app/models/SongColumns.h"
 #include "app/models/SongListModel.h"
@@ -39,6 +42,12 @@ class SongListWidgetTest : public testing::Test {
     QString FocusedTitle() const { return shown_.SongAt(list_.currentIndex().row())->Title; }
     bool FocusVisible() const {
         return list_.viewport()->rect().contains(list_.visualRect(list_.currentIndex()).center());
+    }
+    QStringList MarkedTitles() const {
+        QStringList titles;
+        for (const SongIndex index : list_.MarkedSongs())
+            titles << database_.Song(index).Title;
+        return titles;
     }
     QString FirstTitle() const { return shown_.SongAt(0)->Title; }
     QString TopTitle() const { return shown_.SongAt(list_.rowAt(0))->Title; }
@@ -125,6 +134,175 @@ TEST_F(SongListWidgetTest, ARefusedSortIsToldAndLeavesTheArrow) {
     database_.EndBusy();
     EXPECT_EQ(dialogs.Messages, QStringList{u"Umsortieren der Datenbank ist momentan nicht möglich."_s});
     EXPECT_EQ(list_.horizontalHeader()->sortIndicatorSection(), static_cast<int>(SongColumnId::Title));
+}
+
+// --- Focus and marks ---
+
+TEST_F(SongListWidgetTest, MarksAndFocusAreTwoThings) {
+    EXPECT_TRUE(list_.MarkedSongs().empty());
+    Focus(7);
+    list_.MarkAll();
+    EXPECT_EQ(list_.MarkedSongs().size(), 300U);
+    EXPECT_EQ(list_.MarkedSongs().front(), 0);
+    EXPECT_EQ(list_.MarkedSongs().back(), 299);
+    list_.InvertMarks();
+    EXPECT_TRUE(list_.MarkedSongs().empty());
+    EXPECT_EQ(list_.FocusedSong(), 7);
+}
+
+TEST_F(SongListWidgetTest, OnlyShownSongsAreMarked) {
+    ScriptedDialogs dialogs;
+    shown_.SetText(u"11"_s);
+    dialogs.Text = u"-5"_s;
+    list_.MarkByFilter();
+    EXPECT_EQ(MarkedTitles().join(u','),
+              u"Lied 110,Lied 111,Lied 112,Lied 113,Lied 114,Lied 116,Lied 117,Lied 118,Lied 119,Lied 211,"
+              "Lied 311"_s);
+    list_.InvertMarks();
+    EXPECT_EQ(MarkedTitles(), QStringList{u"Lied 115"_s});
+
+    dialogs.Text = std::nullopt;  // cancelled
+    list_.MarkByFilter();
+    EXPECT_EQ(MarkedTitles(), QStringList{u"Lied 115"_s});
+    shown_.SetText(QString());
+    EXPECT_EQ(MarkedTitles(), QStringList{u"Lied 115"_s});
+    list_.MarkAll();
+    shown_.SetText(u"399"_s);
+    EXPECT_EQ(list_.MarkedSongs(), std::vector<SongIndex>{299});
+}
+
+TEST_F(SongListWidgetTest, MarksAreToldWhereSongsStandNow) {
+    Focus(10);
+    AddSong(database_, u"Aa"_s);
+    EXPECT_EQ(list_.FocusedSong(), 11);
+    EXPECT_EQ(list_.MarkedSongs(), std::vector<SongIndex>{11});
+    database_.RemoveEntry(11);
+    EXPECT_EQ(list_.FocusedSong(), -1);
+    EXPECT_TRUE(list_.MarkedSongs().empty());
+}
+
+TEST_F(SongListWidgetTest, AHiddenSongGetsTheFocusBackUnlessAnotherHasIt) {
+    Focus(250);
+    shown_.SetText(u"-350"_s);
+    EXPECT_EQ(list_.FocusedSong(), -1);
+    shown_.SetText(QString());
+    EXPECT_EQ(list_.FocusedSong(), 250);
+    EXPECT_TRUE(FocusVisible());
+
+    shown_.SetText(u"-350"_s);
+    list_.Enter();
+    EXPECT_EQ(list_.FocusedSong(), 0);
+    shown_.SetText(QString());
+    EXPECT_EQ(list_.FocusedSong(), 0);
+}
+
+TEST_F(SongListWidgetTest, FindingGoesOnFromTheFocusRoundTheEnd) {
+    const SongFilter filter = SongFilter::Parse(u"99"_s);
+    for (const SongIndex expected : {99, 199, 299, 99}) {
+        EXPECT_TRUE(list_.FocusNext(filter));
+        EXPECT_EQ(list_.FocusedSong(), expected);
+    }
+    EXPECT_FALSE(list_.FocusNext(SongFilter::Parse(u"Walzer"_s)));
+    EXPECT_EQ(list_.FocusedSong(), 99);
+    EXPECT_TRUE(FocusVisible());
+}
+
+TEST_F(SongListWidgetTest, LettersFindTheTextOfTheSortColumn) {
+    struct HandClock : Clock {
+        HandClock() { SetClock(this); }
+        ~HandClock() override { SetClock(nullptr); }
+        qint64 Ticks() const override { return Time; }
+        double Now() const override { return 40'000; }
+        qint64 Time = 100'000;
+    } clock;
+    AddSong(database_, u"Ärger"_s);
+    AddSong(database_, u"Alle"_s);
+    model_.SyncViews();
+    const auto type = [&](const QString& text) {
+        clock.Time += 10'000;
+        QTest::keyClicks(&list_, text);
+        return FocusedTitle();
+    };
+    EXPECT_EQ(type(u"a"_s), u"Alle"_s);
+    EXPECT_EQ(type(u"a"_s), u"Ärger"_s);
+    EXPECT_EQ(type(u"a"_s), u"Alle"_s);
+    EXPECT_EQ(type(u"ar"_s), u"Ärger"_s);
+    EXPECT_EQ(type(u"lied 2"_s), u"Lied 200"_s);
+    EXPECT_EQ(type(u"ll"_s), u"Lied 202"_s);      // the same letter again: the next but one
+    EXPECT_EQ(type(u"lied x"_s), u"Lied 203"_s);  // the first letter has gone on, the last finds nothing
+    database_.SetSortType(stLength);
+    model_.SyncViews();
+    EXPECT_EQ(type(u"14:1"_s), u"Lied 150"_s);
+}
+
+// --- Columns ---
+
+TEST_F(SongListWidgetTest, ColumnsAreKeptAndRefused) {
+    QHeaderView* header = list_.horizontalHeader();
+    const QByteArray atFirst = list_.SaveColumns();
+    const int album = static_cast<int>(SongColumnId::Album);
+    const int title = static_cast<int>(SongColumnId::Title);
+    header->moveSection(header->visualIndex(album), 0);
+    header->resizeSection(album, 333);
+    header->hideSection(static_cast<int>(SongColumnId::Year));
+    const QByteArray changed = list_.SaveColumns();
+
+    list_.ResetColumns();
+    EXPECT_EQ(list_.SaveColumns(), atFirst);
+    EXPECT_TRUE(list_.RestoreColumns(changed));
+    EXPECT_EQ(list_.SaveColumns(), changed);
+    EXPECT_EQ(header->visualIndex(album), 0);
+    EXPECT_EQ(header->sectionSize(album), 333);
+    EXPECT_TRUE(header->isSectionHidden(static_cast<int>(SongColumnId::Year)));
+
+    for (qsizetype length = 0; length < changed.size(); ++length)
+        EXPECT_EQ(list_.RestoreColumns(changed.left(length)), length > 4 && (length - 4) % 9 == 0) << length;
+    EXPECT_TRUE(list_.RestoreColumns(changed));
+    QByteArray broken = changed;
+    broken[7] = 99;  // a column that there is not
+    EXPECT_FALSE(list_.RestoreColumns(broken));
+    EXPECT_EQ(list_.SaveColumns(), changed);
+
+    header->hideSection(title);
+    EXPECT_TRUE(list_.RestoreColumns(list_.SaveColumns()));
+    EXPECT_FALSE(header->isSectionHidden(title));
+}
+
+TEST_F(SongListWidgetTest, TheMenuOfTheHeaderChoosesColumns) {
+    QHeaderView* header = list_.horizontalHeader();
+    const auto choose = [&](const QString& caption) {
+        Q_EMIT header->customContextMenuRequested(QPoint(5, 5));
+        auto* menu = list_.findChild<QMenu*>(u"columnMenu"_s);
+        for (QAction* action : menu->actions()) {
+            if (action->text().remove(u'&') != caption) continue;
+            action->trigger();
+            delete menu;
+            return true;
+        }
+        return false;
+    };
+    const int channels = static_cast<int>(SongColumnId::Channels);
+    EXPECT_TRUE(header->isSectionHidden(channels));
+    EXPECT_TRUE(choose(u"Kanäle"_s));
+    EXPECT_FALSE(header->isSectionHidden(channels));
+    EXPECT_TRUE(choose(u"Titel"_s));
+    EXPECT_FALSE(header->isSectionHidden(0));
+
+    const int before = header->sectionSize(0);
+    EXPECT_TRUE(choose(u"Spaltenbreite anpassen"_s));
+    EXPECT_LT(header->sectionSize(0), before);
+    EXPECT_TRUE(choose(u"Alle Spalten zurücksetzen"_s));
+    EXPECT_EQ(header->sectionSize(0), before);
+    EXPECT_TRUE(header->isSectionHidden(channels));
+}
+
+TEST_F(SongListWidgetTest, TheMenuKeyAsksForTheMenuAtTheFocusedSong) {
+    QPoint asked;
+    list_.OnContextMenu = [&](const QPoint& position) { asked = position; };
+    Focus(200);
+    QContextMenuEvent event(QContextMenuEvent::Keyboard, QPoint(0, 0), QPoint(0, 0));
+    QApplication::sendEvent(list_.viewport(), &event);
+    EXPECT_EQ(list_.rowAt(list_.viewport()->mapFromGlobal(asked).y()), 200);
 }
 
 }  // namespace
