@@ -22,16 +22,11 @@ ToolWindows::ToolWindows(QMainWindow& window, TMusicDatabase& database)
     // A first look at the program is a look at the songs; these two are for those who want to know more.
     properties_->hide();
     tag_->hide();
-    database_.JoinSettings(overview_->Overview());
     overview_->Overview().OnSelectionChanged = [this](const GroupSelection& selection) {
         if (OnSelectionChanged) OnSelectionChanged(selection);
     };
     overview_->Overview().OnTypeChanged = [this](TOVType type) { MarkType(type); };
     MarkType(overview_->Overview().OVType());
-}
-
-ToolWindows::~ToolWindows() {
-    database_.LeaveSettings(overview_->Overview());
 }
 
 void ToolWindows::ShowSong(const TID3Tag* song) {

@@ -16,9 +16,8 @@ class TPropertyForm;
 // The windows that dock at the main window, and what they follow.
 class ToolWindows {
  public:
-    // The windows belong to `window`; the settings of theirs join those of the database.
+    // The windows belong to `window`.
     ToolWindows(QMainWindow& window, TMusicDatabase& database);
-    ~ToolWindows();
 
     // Told when other groups are chosen in the overview.
     std::function<void(const GroupSelection&)> OnSelectionChanged;
