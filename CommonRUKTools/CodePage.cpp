@@ -1,6 +1,5 @@
 #include "CommonRUKTools/CodePage.h"
 
-#include <QStringConverter>
 #include <array>
 #include <cstring>
 #include <memory>
@@ -17,6 +16,12 @@ constexpr std::array<char16_t, 32> kCodes1252 = {
     0x20AC, 0x0081, 0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021, 0x02C6, 0x2030, 0x0160,
     0x2039, 0x0152, 0x008D, 0x017D, 0x008F, 0x0090, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022,
     0x2013, 0x2014, 0x02DC, 0x2122, 0x0161, 0x203A, 0x0153, 0x009D, 0x017E, 0x0178};
+
+#ifdef Q_OS_WIN
+constexpr auto kSystem = QStringConverter::System;
+#else
+constexpr auto kSystem = QStringConverter::Utf8;
+#endif
 
 struct LegacyPage {
     QString name = u"windows-1252"_s;
@@ -68,6 +73,7 @@ bool IsValidFrom(ByteSpan bytes, std::size_t start) {
         const auto length = SequenceLength(bytes.subspan(i));
         if (length == 0) return false;
         i += length;
+        i += AsciiPrefix(bytes.subspan(i));
     }
     return true;
 }
@@ -164,11 +170,19 @@ QString FromSystem(ByteSpan bytes) {
 }
 
 QByteArray ToSystem(QStringView text) {
-#ifdef Q_OS_WIN
-    return QStringEncoder(QStringConverter::System).encode(text);
-#else
-    return text.toUtf8();
-#endif
+    return QStringEncoder(kSystem, QStringConverter::Flag::Stateless).encode(text);
+}
+
+SystemEncoder::SystemEncoder() : encoder_(kSystem, QStringConverter::Flag::Stateless) {}
+
+std::size_t SystemEncoder::Space(qsizetype length) const {
+    return static_cast<std::size_t>(encoder_.requiredSpace(length));
+}
+
+std::size_t SystemEncoder::Write(QStringView text, std::span<std::uint8_t> target) {
+    Q_ASSERT(target.size() >= Space(text.size()));
+    auto* begin = reinterpret_cast<char*>(target.data());
+    return static_cast<std::size_t>(encoder_.appendToBuffer(begin, text) - begin);
 }
 
 QString FromLegacy(ByteSpan bytes) {
@@ -205,17 +219,20 @@ QString FromUtf8(ByteSpan bytes) {
 }
 
 QByteArray CutSystem(QByteArray text, qsizetype limit) {
+    const ByteSpan cut = CutSystem(AsBytes({text.constData(), static_cast<std::size_t>(text.size())}),
+                                   static_cast<std::size_t>(limit));
+    text.truncate(static_cast<qsizetype>(cut.size()));
+    return text;
+}
+
+ByteSpan CutSystem(ByteSpan text, std::size_t limit) {
     if (text.size() <= limit) return text;
 #ifndef Q_OS_WIN
-    const auto continues = [&text](qsizetype at) {
-        return (static_cast<unsigned char>(text[at]) & 0xC0) == 0x80;
-    };
-    const qsizetype whole = limit;
-    while (limit > 0 && whole - limit < 4 && continues(limit))
+    const std::size_t whole = limit;
+    while (limit > 0 && whole - limit < 4 && (text[limit] & 0xC0) == 0x80)
         --limit;
 #endif
-    text.truncate(limit);
-    return text;
+    return text.first(limit);
 }
 
 }  // namespace CodePage

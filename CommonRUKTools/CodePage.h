@@ -2,7 +2,10 @@
 
 #include <QByteArray>
 #include <QString>
+#include <QStringConverter>
 #include <QStringView>
+#include <cstdint>
+#include <span>
 
 #include "CommonRUKTools/ByteReader.h"
 
@@ -23,6 +26,18 @@ bool IsValidUtf8(ByteSpan bytes);
 QString FromSystem(ByteSpan bytes);
 // UTF-8 on Linux; on Windows the ANSI code page, with '?' for what it cannot hold.
 QByteArray ToSystem(QStringView text);
+// The same for many texts, into memory of the caller.
+class SystemEncoder {
+ public:
+    SystemEncoder();
+    // Bytes that a text of so many code units takes at most.
+    std::size_t Space(qsizetype length) const;
+    // Returns how many bytes it wrote; `target` must have the space for the text.
+    std::size_t Write(QStringView text, std::span<std::uint8_t> target);
+
+ private:
+    QStringEncoder encoder_;
+};
 
 // Valid UTF-8 with at least one multi-byte sequence is taken as UTF-8, anything else as the legacy code page.
 QString FromLegacy(ByteSpan bytes);
@@ -38,5 +53,6 @@ QString FromUtf8(ByteSpan bytes);
 
 // At most `limit` bytes of a system text; a multi-byte character is not split.
 QByteArray CutSystem(QByteArray text, qsizetype limit);
+ByteSpan CutSystem(ByteSpan text, std::size_t limit);
 
 }  // namespace CodePage

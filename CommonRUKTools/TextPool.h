@@ -1,8 +1,8 @@
 #pragma once
 
-#include <QByteArray>
-#include <QHash>
 #include <QString>
+#include <cstdint>
+#include <vector>
 
 #include "CommonRUKTools/ByteReader.h"
 
@@ -14,6 +14,22 @@ class TextPool {
     QString Get(ByteSpan bytes);
 
  private:
-    QHash<QByteArray, QString> texts_;  // by the bytes in the file
-    std::size_t held_ = 0;              // bytes, roughly
+    struct Entry {
+        std::size_t Start;  // in bytes_
+        std::size_t Size;
+        QString Text;
+    };
+    // A place of the hash table; the hash in it spares most looks at entries.
+    struct Place {
+        std::uint32_t Hash = 0;
+        std::uint32_t Number = 0;  // of the entry, plus 1; 0 free
+    };
+
+    Place& Find(ByteSpan bytes, std::uint32_t hash);
+    void Forget();
+    void Grow();
+
+    std::vector<Place> places_;  // a power of two, at most half of them taken
+    std::vector<Entry> entries_;
+    std::vector<std::uint8_t> bytes_;  // of all entries, as they stand in the file
 };

@@ -1,6 +1,7 @@
 // Database files. An input is a file as it is, or, where it begins with 'B', a body that is put behind a
 // header and compressed first, so that the search is not held up by zlib's own checks:
 //   'B', version (index), song count (8 bit), body
+// make_database_seeds.py writes inputs to start from.
 
 #include <zlib.h>
 

@@ -1,6 +1,7 @@
 #include <algorithm>
 #include <array>
 #include <cstring>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -9,6 +10,7 @@
 #include "MusicManagment/database/DatabaseFile.h"
 #include "MusicManagment/database/DatabaseFormat.h"
 #include "MusicManagment/database/InflateStream.h"
+#include "MusicManagment/database/ListGuards.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/OldRecords.h"
 #include "MusicManagment/database/PackedRecord.h"
@@ -67,20 +69,32 @@ Header ReadHeader(ByteSource& source) {
 
 // --- Texts and years that many songs share ---
 
-// Keeps the text of the song before, which most often is the text of this one too.
-class RepeatingText {
+// Keeps the texts seen last, which most often are those of the next song too: an artist's songs come from a
+// few albums.
+class RecentTexts {
  public:
     QString Get(ByteSpan bytes, TextPool& pool) {
-        if (bytes.size() != bytes_.size() || !StartsWith(bytes, bytes_)) {
-            text_ = pool.Get(bytes);
-            bytes_.assign(AsText(bytes));
+        if (bytes.empty()) return {};
+        Entry& entry = entries_[Place(bytes)];
+        if (bytes.size() != entry.Bytes.size() || !StartsWith(bytes, entry.Bytes)) {
+            entry.Text = pool.Get(bytes);
+            entry.Bytes.assign(AsText(bytes));
         }
-        return text_;
+        return entry.Text;
     }
 
  private:
-    std::string bytes_;
-    QString text_;
+    struct Entry {
+        std::string Bytes;
+        QString Text;
+    };
+    static constexpr std::size_t kEntries = 64;
+
+    static std::size_t Place(ByteSpan bytes) {
+        return (bytes.size() + bytes.back() + 3u * bytes[bytes.size() / 2]) % kEntries;
+    }
+
+    std::array<Entry, kEntries> entries_;
 };
 
 class YearTexts {
@@ -162,7 +176,7 @@ class BodyReader {
     InflateStream stream_;
     TextPool pool_;
     YearTexts years_;
-    std::array<RepeatingText, kSongTexts.size()> repeating_;
+    std::array<RecentTexts, kSongTexts.size()> recent_;
     bool endIsKnown_ = true;
     int refused_ = 0;
 };
@@ -218,11 +232,11 @@ bool BodyReader::ReadSongs() {
 }
 
 void BodyReader::ReadSong() {
-    TID3Tag song;
+    auto song = std::make_unique<TID3Tag>();
     ByteReader numbers(Take(kPackedRecordSize));
-    song.Year = years_.Get(ReadPackedRecord(numbers, song));
-    ReadTexts(song);
-    database_.AddEntry(QString(), std::move(song), {.SkipChecks = true, .KeepModified = true});
+    song->Year = years_.Get(ReadPackedRecord(numbers, *song));
+    ReadTexts(*song);
+    database_.AddEntry(std::move(song), {.SkipChecks = true, .KeepModified = true});
 }
 
 void BodyReader::ReadTexts(TID3Tag& song) {
@@ -231,7 +245,7 @@ void BodyReader::ReadTexts(TID3Tag& song) {
         const std::uint32_t length = TakeNumber();
         if (length > kLongestText) ThrowTooLong(text, length);
         const ByteSpan bytes = Take(length);
-        song.*text.Field = text.Repeats ? repeating_[i].Get(bytes, pool_) : CodePage::FromSystem(bytes);
+        song.*text.Field = text.Repeats ? recent_[i].Get(bytes, pool_) : CodePage::FromSystem(bytes);
     }
 }
 
@@ -241,18 +255,6 @@ void BodyReader::ReadOldSong() {
     if (bytes.size() < size) throw EMusicDatabaseException(u"Fehler in der Datenbank"_s);
     if (!AddOldSong(database_, bytes, header_.Version, header_.HasLists())) ++refused_;
 }
-
-// While songs come from a file they keep its order.
-class LoadingGuard {
- public:
-    explicit LoadingGuard(TMusicDatabase& database) : database_(database) { database_.BeginLoading(); }
-    ~LoadingGuard() { database_.EndLoading(); }
-    LoadingGuard(const LoadingGuard&) = delete;
-    LoadingGuard& operator=(const LoadingGuard&) = delete;
-
- private:
-    TMusicDatabase& database_;
-};
 
 // False when the user stopped the run.
 bool ReadBody(TMusicDatabase& database, ByteSource& source, const Header& header) {

@@ -1,8 +1,14 @@
+#include <algorithm>
+#include <array>
+#include <span>
+#include <vector>
+
 #include "CommonRUKTools/ByteWriter.h"
 #include "CommonRUKTools/CodePage.h"
 #include "MusicManagment/database/DatabaseFile.h"
 #include "MusicManagment/database/DatabaseFormat.h"
 #include "MusicManagment/database/DeflateStream.h"
+#include "MusicManagment/database/ListGuards.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/PackedRecord.h"
 
@@ -10,9 +16,6 @@ using namespace Qt::StringLiterals;
 using namespace DatabaseFormat;
 
 namespace {
-
-// Bytes that are gathered before they are compressed.
-constexpr std::size_t kGathered = std::size_t{64} * 1024;
 
 int ZlibLevel(int compression) {
     switch (compression) {
@@ -25,6 +28,29 @@ int ZlibLevel(int compression) {
     }
 }
 
+// The bytes of the text of the song before: a text that many songs share mostly is that one, and the same in
+// memory.
+class RepeatingText {
+ public:
+    bool IsKnown(const QString& text) const {
+        return text.constData() == text_.constData() && text.size() == text_.size();
+    }
+    void Set(const QString& text, ByteSpan bytes) {
+        text_ = text;
+        bytes_.assign(bytes.begin(), bytes.end());
+    }
+    ByteSpan Bytes() const { return bytes_; }
+
+ private:
+    QString text_;  // holds the characters, so that no other text can have their address
+    std::vector<std::uint8_t> bytes_;
+};
+
+void StoreU32Le(std::uint32_t value, std::span<std::uint8_t> target) {
+    for (std::size_t i = 0; i < 4; ++i)
+        target[i] = static_cast<std::uint8_t>(value >> (8 * i));
+}
+
 class BodyWriter {
  public:
     BodyWriter(TMusicDatabase& database, SafeFile& file)
@@ -33,7 +59,6 @@ class BodyWriter {
     // False when the user stopped the run; what was written then is a valid body too.
     bool Write() {
         const bool finished = WriteUpdateFolders() && WriteLists() && WriteSongs();
-        Flush();
         stream_.Finish();
         return finished;
     }
@@ -45,18 +70,12 @@ class BodyWriter {
     bool WriteSongs();
     void WriteSong(const TID3Tag& song);
 
-    void WriteBlock(const QString& text, std::size_t size) {
-        const QByteArray bytes = CodePage::CutSystem(CodePage::ToSystem(text), static_cast<qsizetype>(size));
-        gathered_.Block({bytes.constData(), static_cast<std::size_t>(bytes.size())}, size);
-        FlushWhenFull();
-    }
-    void WriteNumber(int number) { gathered_.U32Le(static_cast<std::uint32_t>(number)); }
-    void FlushWhenFull() {
-        if (gathered_.Size() >= kGathered) Flush();
-    }
-    void Flush() {
-        stream_.Write(gathered_.Bytes());
-        gathered_.Clear();
+    ByteSpan WriteText(const QString& text);
+    void WriteRepeating(const QString& text, RepeatingText& known);
+    void WriteBlock(const QString& text, std::size_t size);
+    void WriteNumber(int number) {
+        StoreU32Le(static_cast<std::uint32_t>(number), stream_.Space(4));
+        stream_.Add(4);
     }
 
     // Lets the interface work between rows; true when the user asked to stop.
@@ -67,7 +86,8 @@ class BodyWriter {
 
     TMusicDatabase& database_;
     DeflateStream stream_;
-    ByteWriter gathered_;
+    CodePage::SystemEncoder encoder_;
+    std::array<RepeatingText, kSongTexts.size()> repeating_;
     int written_ = 0;
 };
 
@@ -108,13 +128,42 @@ bool BodyWriter::WriteSongs() {
 }
 
 void BodyWriter::WriteSong(const TID3Tag& song) {
-    WritePackedRecord(gathered_, song);
-    for (const SongText& text : kSongTexts) {
-        const QByteArray bytes = CodePage::CutSystem(CodePage::ToSystem(song.*text.Field), kLongestText);
-        WriteNumber(static_cast<int>(bytes.size()));
-        gathered_.Raw(std::string_view(bytes.constData(), static_cast<std::size_t>(bytes.size())));
+    stream_.Write(PackedRecord(song));
+    for (std::size_t i = 0; i < kSongTexts.size(); ++i) {
+        const QString& text = song.*kSongTexts[i].Field;
+        if (kSongTexts[i].Repeats)
+            WriteRepeating(text, repeating_[i]);
+        else
+            WriteText(text);
     }
-    FlushWhenFull();
+}
+
+// Converts the text into the very bytes that are compressed next, and returns them.
+ByteSpan BodyWriter::WriteText(const QString& text) {
+    const auto space = stream_.Space(4 + encoder_.Space(text.size()));
+    const auto converted = space.subspan(4, encoder_.Write(text, space.subspan(4)));
+    const ByteSpan bytes = CodePage::CutSystem(ByteSpan(converted), kLongestText);
+    StoreU32Le(static_cast<std::uint32_t>(bytes.size()), space);
+    stream_.Add(4 + bytes.size());
+    return bytes;
+}
+
+void BodyWriter::WriteRepeating(const QString& text, RepeatingText& known) {
+    if (!known.IsKnown(text)) {
+        known.Set(text, WriteText(text));
+        return;
+    }
+    WriteNumber(static_cast<int>(known.Bytes().size()));
+    stream_.Write(known.Bytes());
+}
+
+void BodyWriter::WriteBlock(const QString& text, std::size_t size) {
+    const auto space = stream_.Space(std::max(size, encoder_.Space(text.size())));
+    const auto converted = space.first(encoder_.Write(text, space));
+    const std::size_t length = CodePage::CutSystem(ByteSpan(converted), size).size();
+    std::fill(space.begin() + static_cast<std::ptrdiff_t>(length),
+              space.begin() + static_cast<std::ptrdiff_t>(size), std::uint8_t{0});
+    stream_.Add(size);
 }
 
 void WriteHeader(SafeFile& file, int songCount) {

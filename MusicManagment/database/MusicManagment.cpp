@@ -147,19 +147,22 @@ bool TMusicDatabase::Accepts(const TID3Tag& record, const AddOptions& options) {
 }
 
 SongIndex TMusicDatabase::AddEntry(const QString& fileName, TID3Tag record, const AddOptions& options) {
-    if (Busy() || (readOnly_ && !Loading())) return -1;
     if (!fileName.isEmpty()) record.FileName = fileName;
-    if (record.MainGenre > kHighestGenre) record.MainGenre = 0;
+    return AddEntry(std::make_unique<TID3Tag>(std::move(record)), options);
+}
+
+SongIndex TMusicDatabase::AddEntry(std::unique_ptr<TID3Tag> entry, const AddOptions& options) {
+    if (Busy() || (readOnly_ && !Loading())) return -1;
+    if (entry->MainGenre > kHighestGenre) entry->MainGenre = 0;
     if (options.CountOnly) {
         if (!options.KeepModified) SetModified(true);
-        groups_.Add(record, groupEvents_.get());
+        groups_.Add(*entry, groupEvents_.get());
         return -1;
     }
-    if (!Accepts(record, options)) return -1;
+    if (!Accepts(*entry, options)) return -1;
 
     if (!options.KeepModified) SetModified(true);
     if (!Loading()) EnsureSorted();
-    auto entry = std::make_unique<TID3Tag>(std::move(record));
     entry->AddTime = ValidAddTime(entry->AddTime);
     entry->MainGenre = ValidMainGenre(entry->MainGenre);
     const TID3Tag& added = *entry;

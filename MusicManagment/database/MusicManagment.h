@@ -89,6 +89,8 @@ class TMusicDatabase : public QObject {
     // Adds an entry, its path first taken from `fileName`. Returns its place, or -1 when it was only counted
     // or refused (database busy or read-only, file missing, song banned).
     SongIndex AddEntry(const QString& fileName, TID3Tag record, const AddOptions& options = {});
+    // The same for an entry that holds its path.
+    SongIndex AddEntry(std::unique_ptr<TID3Tag> entry, const AddOptions& options);
     // Reads the file and adds it; -1 when it does not exist or was refused. Throws EStreamError when it
     // cannot be read.
     SongIndex AddSong(const QString& path, const SongOverrides& overrides = {},
@@ -216,7 +218,10 @@ class TMusicDatabase : public QObject {
         ++loading_;
         maybeUnsorted_ = true;
     }
-    void EndLoading() { --loading_; }
+    void EndLoading() {
+        --loading_;
+        maybeUnsorted_ = true;  // whatever happened between two songs
+    }
 
     // What the automatic save does at each tick of its timer.
     void AutoSaveTick();

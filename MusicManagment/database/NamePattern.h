@@ -4,7 +4,7 @@
 
 #include "ReadMPEGHeader/ID3Tag.h"
 
-// The name that a pattern such as "%ARTIST% - %TITLE%" gives a song: the folder and the extension of `path` are kept, the
-// place-holders are replaced one after the other (a value that itself holds a later place-holder is expanded too, on
-// purpose), and the result is made a valid file name.
+// The name that a pattern such as "%ARTIST% - %TITLE%" gives a song: the folder and the extension of `path`
+// are kept, the place-holders are replaced one after the other (a value that itself holds a later
+// place-holder is expanded too, on purpose), and the result is made a valid file name.
 QString BuildNameFromPattern(const QString& pattern, const QString& path, const TID3Tag& info);

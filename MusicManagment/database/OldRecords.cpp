@@ -60,10 +60,11 @@ bool AddOldSong(TMusicDatabase& database, ByteSpan bytes, int version, bool isCo
     const QString path = TextUpToZero(bytes.first(kFileNameField));
     const SongOverrides values = StoredValues(bytes, version);
     try {
-        return database.AddSong(path, values, options) >= 0;
+        if (database.AddSong(path, values, options) >= 0) return true;
+        if (!IsCdPath(path)) return false;
     } catch (const EStreamError&) {
-        // A file that is there but cannot be read now (rights, a bad sector) costs its tags, not its place in
-        // the collection.
-        return database.AddEntry(path, RecordOf(values), options) >= 0;
+        // The file is there but cannot be read now: rights, a bad sector. The song stays, as below.
     }
+    // Such a song, and one on a CD that is not inserted, loses its tags but not its place in the collection.
+    return database.AddEntry(path, RecordOf(values), options) >= 0;
 }

@@ -1,7 +1,9 @@
 #pragma once
 
+#include <array>
+#include <cstdint>
+
 #include "CommonRUKTools/ByteReader.h"
-#include "CommonRUKTools/ByteWriter.h"
 #include "ReadMPEGHeader/ID3Tag.h"
 
 // The numbers of a song as database files and playlists store them: 39 bytes without gaps, little-endian.
@@ -12,4 +14,4 @@ inline constexpr std::size_t kPackedRecordSize = 39;
 quint16 ReadPackedRecord(ByteReader& stream, TID3Tag& song);
 
 // A year that is no number is stored as 0, one outside 0 to 65535 as the nearest of these.
-void WritePackedRecord(ByteWriter& stream, const TID3Tag& song);
+std::array<std::uint8_t, kPackedRecordSize> PackedRecord(const TID3Tag& song);

@@ -7,6 +7,7 @@
 #include "MusicManagment/database/GroupLists.h"
 #include "ReadMPEGHeader/DisplayTexts.h"
 #include "ReadMPEGHeader/Genres.h"
+#include "app/models/SongProperties.h"
 
 using namespace Qt::StringLiterals;
 
@@ -14,16 +15,6 @@ namespace {
 
 QString Title(const TID3Tag& song) {
     return IsCdPath(song.FileName) ? u"[CD] "_s + song.Title : song.Title;
-}
-
-// A year that was not there is stored as "0000", and read from a database as "0".
-QString Year(const TID3Tag& song) {
-    const bool onlyZeros = std::ranges::all_of(song.Year, [](QChar c) { return c == u'0'; });
-    return onlyZeros ? QString() : song.Year;
-}
-
-QString Track(const TID3Tag& song) {
-    return song.Track != 0 ? QString::number(song.Track) : QString();
 }
 
 QString AddTime(const TID3Tag& song) {
@@ -49,13 +40,13 @@ constexpr SongColumn kColumns[] = {
      [](const TID3Tag& song) { return song.Artist; }},
     {SongColumnId::Album, u"Album", 24, Qt::AlignLeft, true, stAlbum,
      [](const TID3Tag& song) { return song.Album; }},
-    {SongColumnId::Year, u"Jahr", 7, Qt::AlignRight, true, stYear, &Year},
+    {SongColumnId::Year, u"Jahr", 7, Qt::AlignRight, true, stYear, &ShownYear},
     {SongColumnId::Length, u"Länge", 9, Qt::AlignRight, true, stLength,
      [](const TID3Tag& song) { return FormatLength(song.Length, true); }},
     {SongColumnId::Genre, u"Genre", 18, Qt::AlignLeft, true, stGenre,
      [](const TID3Tag& song) { return MainGenreLongName(song.MainGenre); }},
     {SongColumnId::Id3Genre, u"ID3-Genre", 18, Qt::AlignLeft, false, std::nullopt, &Id3Genre},
-    {SongColumnId::Track, u"Track", 7, Qt::AlignRight, true, std::nullopt, &Track},
+    {SongColumnId::Track, u"Track", 7, Qt::AlignRight, true, std::nullopt, &ShownTrack},
     {SongColumnId::BitRate, u"Bitrate", 14, Qt::AlignRight, true, std::nullopt,
      [](const TID3Tag& song) { return FormatBitRate(song.BitRate); }},
     {SongColumnId::SampleRate, u"Abtastrate", 12, Qt::AlignRight, true, std::nullopt,

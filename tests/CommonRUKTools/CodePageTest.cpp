@@ -39,3 +39,13 @@ TEST(CodePage, ACutNeverSplitsACharacter) {
     EXPECT_EQ(CodePage::CutSystem("a\xC3\xB6", 3), QByteArray("a\xC3\xB6"));
     EXPECT_EQ(CodePage::CutSystem("\xF0\x9F\x8E\xB5", 3), QByteArray(""));
 }
+
+TEST(CodePage, ManyTextsAreEncodedLikeOne) {
+    CodePage::SystemEncoder encoder;
+    // The second ends in half a surrogate pair, which must not wait for the next text.
+    for (const QString& text : {u"Für Elise 🎵"_s, QString(QChar(0xD83C)), u"abc"_s, QString()}) {
+        std::vector<std::uint8_t> bytes(encoder.Space(text.size()));
+        const std::size_t size = encoder.Write(text, bytes);
+        EXPECT_EQ(QByteArrayView(bytes.data(), static_cast<qsizetype>(size)), CodePage::ToSystem(text));
+    }
+}

@@ -208,6 +208,20 @@ TEST_F(DatabaseFileTest, SongsKeepTheOrderOfTheFileUntilOneIsPlaced) {
     EXPECT_EQ(database.Song(3).FileName, u"c"_s);
 }
 
+TEST_F(DatabaseFileTest, TheOrderIsLookedAtAgainWhateverHappenedWhileLoading) {
+    DatabaseBuilder builder;
+    builder.EmptyLists();
+    for (int i = 0; i < 51; ++i)
+        builder.Song({std::to_string(i), "", i == 50 ? "A" : "B"});
+    TMusicDatabase database;
+    database.OnProgress = [](TMusicDatabase& sender, const ProgressPoint&) { sender.EnsureSorted(); };
+    Load(database, builder.SongCount(51).File());
+    database.OnProgress = nullptr;
+    EXPECT_EQ(database.Song(50).Artist, u"A"_s);
+    database.EnsureSorted();
+    EXPECT_EQ(database.Song(0).Artist, u"A"_s);
+}
+
 // Only as many numbers as there are genres are in the list, whatever its count says.
 TEST_F(DatabaseFileTest, AGenreListMayClaimMoreOrFewerRows) {
     TMusicDatabase database;

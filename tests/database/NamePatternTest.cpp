@@ -22,9 +22,11 @@ TID3Tag Song() {
 }  // namespace
 
 TEST(NamePattern, FolderAndExtensionAreKept) {
-    EXPECT_EQ(BuildNameFromPattern(u"%ARTIST% - %TITLE%"_s, u"/a.b/x.MP3"_s, Song()), u"/a.b/AC-DC - Was ist_.MP3"_s);
+    EXPECT_EQ(BuildNameFromPattern(u"%ARTIST% - %TITLE%"_s, u"/a.b/x.MP3"_s, Song()),
+              u"/a.b/AC-DC - Was ist_.MP3"_s);
     EXPECT_EQ(BuildNameFromPattern(u"%TRACKNR% %LENGTHV% %LENGTHF%"_s, u"x"_s, Song()), u"7 45 s 0-45"_s);
-    EXPECT_EQ(BuildNameFromPattern(u"%MAINGENRE%|%ID3GENRE%"_s, u"x.mp3"_s, Song()), u"Rock-Pop-Undefiniert.mp3"_s);
+    EXPECT_EQ(BuildNameFromPattern(u"%MAINGENRE%|%ID3GENRE%"_s, u"x.mp3"_s, Song()),
+              u"Rock-Pop-Undefiniert.mp3"_s);
 }
 
 TEST(NamePattern, ValuesAreExpandedOneAfterTheOther) {

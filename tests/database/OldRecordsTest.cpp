@@ -119,21 +119,24 @@ TEST_P(OldRecordsTest, ListsComeFromTheFileOrAreCounted) {
     EXPECT_EQ(inserted, fromFile ? 0 : 4);
 }
 
-TEST_P(OldRecordsTest, ASongWithoutItsFileGoesAndOneThatCannotBeReadStays) {
+TEST_P(OldRecordsTest, ASongWithoutItsFileGoesAndOneThatCannotBeReadNowStays) {
     const QString unreadable = folder_.filePath(u"Ordner.mp3"_s);
     ASSERT_TRUE(QDir().mkpath(unreadable));
     TMusicDatabase database;
     ASSERT_TRUE(Load(database, {OldRecord(folder_.filePath(u"weg.mp3"_s), Stored(), GetParam()),
                                 OldRecord(unreadable, Stored{200, 3, 1, 4}, GetParam()),
                                 OldRecord(QString(261, u'x'), Stored(), GetParam()),
-                                OldRecord(song_, Stored(), GetParam())}));
-    ASSERT_EQ(database.Count(), 2);
+                                OldRecord(song_, Stored(), GetParam()),
+                                OldRecord(u":0123ABCD:\\a.mp3"_s, Stored{60}, GetParam())}));
+    ASSERT_EQ(database.Count(), 3);
     EXPECT_EQ(database.Song(0).FileName, unreadable);
     EXPECT_EQ(database.Song(0).Length, 200);
     EXPECT_EQ(database.Song(0).PlayCount, 4u);
     EXPECT_EQ(database.Song(1).FileName, song_);
+    EXPECT_EQ(database.Song(2).FileName, u":0123ABCD:\\a.mp3"_s);
+    EXPECT_EQ(database.Song(2).Length, 60);
     // Songs that went are not counted, wherever the lists came from.
-    EXPECT_EQ(database.Genres()[0], 1);
+    EXPECT_EQ(database.Genres()[0], 2);
     EXPECT_EQ(database.Genres()[3], 1);
     EXPECT_EQ(database.Artists().IndexOf(u"Liste"), -1);
 }

@@ -26,7 +26,8 @@ class UpdateTest : public testing::Test {
     }
     QStringList Titles() const {
         QStringList titles;
-        for (const auto& song : database_.Songs()) titles << song->Title;
+        for (const auto& song : database_.Songs())
+            titles << song->Title;
         return titles;
     }
 
@@ -71,7 +72,8 @@ TEST_F(UpdateTest, AnUnpluggedDiskNeverEmptiesTheCollection) {
     QDir(songs_.Path(u"music"_s)).removeRecursively();
     result = UpdateDatabase(database_, UpdateTags::Keep);
     EXPECT_EQ(database_.Count(), 2);
-    for (const auto& question : dialogs_.Questions) EXPECT_FALSE(question.Buttons.contains(u"Entfernen"_s));
+    for (const auto& question : dialogs_.Questions)
+        EXPECT_FALSE(question.Buttons.contains(u"Entfernen"_s));
 }
 
 TEST_F(UpdateTest, ChangedTagsAreTakenOverAndTheCollectionsFieldsStay) {
