@@ -46,6 +46,12 @@ FilterField::FilterField(FilteredSongs& songs, QWidget* parent)
     ShowCount();
 }
 
+// The line goes after this object and tells of losing the focus.
+FilterField::~FilterField() {
+    edit_->disconnect(this);
+    edit_->removeEventFilter(this);
+}
+
 void FilterField::SetUpEdit() {
     edit_->setObjectName(u"filterEdit"_s);
     edit_->setAccessibleName(u"Filter"_s);

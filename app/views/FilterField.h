@@ -12,6 +12,7 @@ class QLineEdit;
 class FilterField : public QWidget {
  public:
     explicit FilterField(FilteredSongs& songs, QWidget* parent = nullptr);
+    ~FilterField() override;
 
     // The user goes on to the list.
     std::function<void()> OnLeave;

@@ -7,6 +7,7 @@
 #include <QDropEvent>
 #include <QFile>
 #include <QLabel>
+#include <QLineEdit>
 #include <QMenuBar>
 #include <QMimeData>
 #include <QPushButton>
@@ -317,6 +318,34 @@ TEST_F(MainWindowTest, TheWindowKeepsItsSizeBetweenTwoStarts) {
     window_->close();
     Start();
     EXPECT_EQ(window_->size(), QSize(640, 420));
+}
+
+TEST_F(MainWindowTest, FindsSongsFromTheFilterLineAndGoesOn) {
+    MakeSongs(12);
+    Start({Music()});
+    auto* edit = Child<QLineEdit>(u"filterEdit"_s);
+    auto* list = Child<QTableView>(u"songList"_s);
+    window_->FindNext();  // nothing to look for yet
+    QTest::keyClicks(edit, u"lied 11"_s);
+    EXPECT_EQ(list->model()->rowCount(), 2);
+    QTest::keyClick(edit, Qt::Key_Escape);
+    EXPECT_EQ(list->model()->rowCount(), 12);
+
+    QStringList found;
+    for (int i = 0; i < 3; ++i) {
+        window_->FindNext();
+        found << list->currentIndex().siblingAtColumn(0).data().toString();
+    }
+    found.removeDuplicates();
+    found.sort();
+    EXPECT_EQ(found, QStringList({u"Lied 110"_s, u"Lied 111"_s}));
+    dialogs_.Text = u"titel:105"_s;
+    window_->MarkByFilter();
+    EXPECT_EQ(list->selectionModel()->selectedRows().size(), 1);
+    window_->InvertMarks();
+    EXPECT_EQ(list->selectionModel()->selectedRows().size(), 11);
+    window_->MarkAll();
+    EXPECT_EQ(list->selectionModel()->selectedRows().size(), 12);
 }
 
 }  // namespace
