@@ -10,6 +10,7 @@
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/FolderWalk.h"
 #include "MusicManagment/database/IntakeReport.h"
+#include "MusicManagment/database/ListGuards.h"
 
 using namespace Qt::StringLiterals;
 

@@ -11,14 +11,6 @@ ProgressRun::~ProgressRun() {
     database_.EndProgress(lockMenu_);
 }
 
-BusyGuard::BusyGuard(TMusicDatabase& database) : database_(database) {
-    database_.BeginBusy();
-}
-
-BusyGuard::~BusyGuard() {
-    database_.EndBusy();
-}
-
 void RefuseDuringRun(TMusicDatabase& database) {
     if (database.ProgressRunning()) const ProgressRun refused(database, QString());
 }

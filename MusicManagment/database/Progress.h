@@ -30,18 +30,6 @@ class ProgressRun {
     bool lockMenu_;
 };
 
-// Nothing may change the songs while the interface works between two of them.
-class BusyGuard {
- public:
-    explicit BusyGuard(TMusicDatabase& database);
-    ~BusyGuard();
-    BusyGuard(const BusyGuard&) = delete;
-    BusyGuard& operator=(const BusyGuard&) = delete;
-
- private:
-    TMusicDatabase& database_;
-};
-
 // For a command that empties or creates something before its own run begins. Throws EAbort, after telling the
 // user, when a run is going.
 void RefuseDuringRun(TMusicDatabase& database);

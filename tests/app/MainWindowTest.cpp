@@ -17,6 +17,7 @@
 #include <QTimer>
 #include <QUrl>
 
+#include "MusicManagment/database/Menu.h"
 #include "app/dialogs/ProgressWindow.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
@@ -325,7 +326,7 @@ TEST_F(MainWindowTest, FindsSongsFromTheFilterLineAndGoesOn) {
     Start({Music()});
     auto* edit = Child<QLineEdit>(u"filterEdit"_s);
     auto* list = Child<QTableView>(u"songList"_s);
-    window_->FindNext();  // nothing to look for yet
+    Database().ClickMenuItem(mcFindNext);  // nothing to look for yet
     QTest::keyClicks(edit, u"lied 11"_s);
     EXPECT_EQ(list->model()->rowCount(), 2);
     QTest::keyClick(edit, Qt::Key_Escape);
@@ -333,18 +334,18 @@ TEST_F(MainWindowTest, FindsSongsFromTheFilterLineAndGoesOn) {
 
     QStringList found;
     for (int i = 0; i < 3; ++i) {
-        window_->FindNext();
+        Database().ClickMenuItem(mcFindNext);
         found << list->currentIndex().siblingAtColumn(0).data().toString();
     }
     found.removeDuplicates();
     found.sort();
     EXPECT_EQ(found, QStringList({u"Lied 110"_s, u"Lied 111"_s}));
     dialogs_.Text = u"titel:105"_s;
-    window_->MarkByFilter();
+    Database().ClickMenuItem(mcMarkByFilter);
     EXPECT_EQ(list->selectionModel()->selectedRows().size(), 1);
-    window_->InvertMarks();
+    Database().ClickMenuItem(mcInvertMarks);
     EXPECT_EQ(list->selectionModel()->selectedRows().size(), 11);
-    window_->MarkAll();
+    Database().ClickMenuItem(mcMarkAll);
     EXPECT_EQ(list->selectionModel()->selectedRows().size(), 12);
 }
 
