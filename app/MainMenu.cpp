@@ -48,12 +48,17 @@ MainMenu::MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(i
     Update();
 }
 
+void MainMenu::SetRunning(bool running) {
+    running_ = running;
+    Update();
+}
+
 void MainMenu::Update() {
     TMenuExItem& menu = database_.Menu();
     for (auto action = actions_.cbegin(); action != actions_.cend(); ++action) {
         const TMenuExItem* item = menu.Find(action.key());
         if (item == nullptr) continue;
-        (*action)->setEnabled(item->Enabled());
+        (*action)->setEnabled(item->Enabled() && !running_);
         (*action)->setToolTip(item->Hint());
         if (item->Checkable()) (*action)->setChecked(item->Checked());
     }

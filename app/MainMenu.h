@@ -16,6 +16,8 @@ class MainMenu {
     MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(int id)> run,
              std::function<void()> exit);
 
+    // While a long operation runs every command of the database rests.
+    void SetRunning(bool running);
     // Enables, disables and marks the items as the database's menu says now.
     void Update();
     // Chosen for a song, from its context menu. The caller shows it.
@@ -29,4 +31,5 @@ class MainMenu {
     std::function<void(int)> run_;
     QHash<int, QAction*> actions_;  // by number
     QMenu* songMenu_ = nullptr;
+    bool running_ = false;
 };

@@ -196,7 +196,7 @@ void TTunesteadMainWnd::StartOnce() {
 // --- What follows the database ---
 
 void TTunesteadMainWnd::RunningChanged(bool running) {
-    menu_->Update();
+    menu_->SetRunning(running);
     empty_->SetCommandsEnabled(!running);
     list_->SetSortingAllowed(!running);
     if (!running) songs_.SyncViews();
