@@ -6,7 +6,7 @@
 #include "CommonRUKTools/FileSource.h"
 #include "ReadMPEGHeader/ID3Tag.h"
 
-// What the header of a WMA (ASF) file tells: Advanced Systems Format (ASF) Specification, revision 01.20.03.
+// What the header of a WMA (ASF) file tells: Advanced Systems Format (ASF), revision 01.20.03.
 struct TASFInfo {
     QString Title;
     QString Artist;
