@@ -3,42 +3,14 @@
 #include <QDir>
 #include <QTemporaryDir>
 
-#include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/DatabaseFile.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "tests/PrintQt.h"
+#include "tests/ScriptedDialogs.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
-
-// Answers file dialogs with one name, or cancels them, and keeps what was asked and shown.
-class ScriptedDialogs : public Dialogs {
- public:
-    ScriptedDialogs() { SetUserDialogs(this); }
-    ~ScriptedDialogs() override { SetUserDialogs(nullptr); }
-
-    void ShowMessage(MessageKind, const QString& text) override { Shown << text; }
-    int Ask(const QString&, const QStringList&, int cancelButton) override { return cancelButton; }
-    std::optional<QString> Input(const QString&, const QString&, const QStringList&,
-                                 const QString&) override {
-        return std::nullopt;
-    }
-    std::optional<QString> OpenFile(const FileDialogOptions& options) override { return Answered(options); }
-    QStringList OpenFiles(const FileDialogOptions&) override { return {}; }
-    std::optional<QString> SaveFile(const FileDialogOptions& options) override { return Answered(options); }
-    std::optional<QString> ChooseFolder(const QString&) override { return std::nullopt; }
-
-    std::optional<QString> Answer;
-    std::vector<FileDialogOptions> Asked;
-    QStringList Shown;
-
- private:
-    std::optional<QString> Answered(const FileDialogOptions& options) {
-        Asked.push_back(options);
-        return Answer;
-    }
-};
 
 class DatabaseCommandsTest : public testing::Test {
  protected:
@@ -86,23 +58,23 @@ TEST_F(DatabaseCommandsTest, SavingAsksForANameOnlyWhenItMustOrIsTold) {
     TMusicDatabase database;
     EXPECT_FALSE(database.SaveDatabase());  // no name yet, and the user cancels
     EXPECT_TRUE(FilesThere().isEmpty());
-    ASSERT_EQ(dialogs_.Asked.size(), 1u);
-    EXPECT_EQ(dialogs_.Asked[0].Title, u"Datenbank speichern unter"_s);
-    EXPECT_EQ(dialogs_.Asked[0].DefaultExtension, u"tsdb"_s);
-    EXPECT_EQ(dialogs_.Asked[0].Filter, u"Tunestead DataBases|*.tsdb|Alle Dateien|*.*"_s);
-    EXPECT_TRUE(dialogs_.Asked[0].ConfirmOverwrite);
+    ASSERT_EQ(dialogs_.FileDialogs.size(), 1u);
+    EXPECT_EQ(dialogs_.FileDialogs[0].Title, u"Datenbank speichern unter"_s);
+    EXPECT_EQ(dialogs_.FileDialogs[0].DefaultExtension, u"tsdb"_s);
+    EXPECT_EQ(dialogs_.FileDialogs[0].Filter, u"Tunestead DataBases|*.tsdb|Alle Dateien|*.*"_s);
+    EXPECT_TRUE(dialogs_.FileDialogs[0].ConfirmOverwrite);
 
-    dialogs_.Answer = Path(u"a.tsdb"_s);
+    dialogs_.Files.push_back({Path(u"a.tsdb"_s)});
     EXPECT_TRUE(database.SaveDatabase());
     EXPECT_EQ(database.FileName(), Path(u"a.tsdb"_s));
     EXPECT_TRUE(database.SaveDatabase());  // by its name now
     EXPECT_TRUE(database.SaveDatabase(Path(u"b.tsdb"_s), true));
     EXPECT_EQ(database.FileName(), Path(u"a.tsdb"_s));
-    EXPECT_EQ(dialogs_.Asked.size(), 2u);
+    EXPECT_EQ(dialogs_.FileDialogs.size(), 2u);
 
-    dialogs_.Answer = Path(u"c.tsdb"_s);
+    dialogs_.Files.push_back({Path(u"c.tsdb"_s)});
     EXPECT_TRUE(database.SaveDatabase(Path(u"b.tsdb"_s), false, true));
-    EXPECT_EQ(dialogs_.Asked[2].Preset, Path(u"b.tsdb"_s));
+    EXPECT_EQ(dialogs_.FileDialogs[2].Preset, Path(u"b.tsdb"_s));
     EXPECT_EQ(database.FileName(), Path(u"c.tsdb"_s));
     EXPECT_EQ(FilesThere(), (QStringList{u"a.tsdb"_s, u"b.tsdb"_s, u"c.tsdb"_s}));
 }
@@ -237,12 +209,12 @@ TEST_F(DatabaseCommandsTest, OpeningFollowsTheDialogAndTheNameRules) {
     AddSongs(database, 3);
     database.SaveDatabase(Path(u"a.tsdb"_s));
     EXPECT_FALSE(database.OpenDatabaseFromDialog());
-    EXPECT_EQ(dialogs_.Asked.at(0).Title, u"Datenbank öffnen"_s);
-    EXPECT_EQ(dialogs_.Asked[0].Filter, u"Tunestead DataBases|*.tsdb|Alle Dateien|*.*"_s);
+    EXPECT_EQ(dialogs_.FileDialogs.at(0).Title, u"Datenbank öffnen"_s);
+    EXPECT_EQ(dialogs_.FileDialogs[0].Filter, u"Tunestead DataBases|*.tsdb|Alle Dateien|*.*"_s);
     EXPECT_EQ(database.Count(), 3);
 
     TMusicDatabase other;
-    dialogs_.Answer = Path(u"a.tsdb"_s);
+    dialogs_.Files.push_back({Path(u"a.tsdb"_s)});
     EXPECT_TRUE(other.OpenDatabaseFromDialog());
     EXPECT_EQ(other.Count(), 3);
     EXPECT_EQ(other.FileName(), Path(u"a.tsdb"_s));
@@ -284,6 +256,6 @@ TEST_F(DatabaseCommandsTest, NothingIsTouchedWhileAnotherRunIsGoing) {
     database.EndBusy();
     EXPECT_EQ(database.Count(), 3);
     EXPECT_EQ(database.FileName(), Path(u"a.tsdb"_s));
-    EXPECT_EQ(dialogs_.Shown.count(), 3);
+    EXPECT_EQ(dialogs_.Messages.size(), 3u);
     EXPECT_EQ(FilesThere(), QStringList{u"a.tsdb"_s});
 }

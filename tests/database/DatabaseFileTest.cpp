@@ -128,6 +128,25 @@ TEST_F(DatabaseFileTest, AnEmptyDatabaseIsTheHeaderAndEmptyLists) {
     EXPECT_EQ(Inflated(ByteSpan(file).subspan(17)), DatabaseBuilder().EmptyLists().Body());
 }
 
+TEST_F(DatabaseFileTest, TheCompressionLevelStandsInTheStreamAndAllAreRead) {
+    // The two highest bits of the second byte of a zlib stream: 0 fastest, 2 default, 3 best.
+    const std::pair<TCompressionLevel, int> cases[] = {
+        {clNone, 0}, {clFastest, 0}, {clDefault, 2}, {clMax, 3}};
+    std::size_t previousSize = 1 << 20;
+    for (const auto& [level, mark] : cases) {
+        TMusicDatabase database;
+        AddMany(database, 300);
+        database.SetCompression(level);
+        const Bytes file = SavedFile(database);
+        EXPECT_EQ(file[18] >> 6, mark);
+        EXPECT_LT(file.size(), previousSize);
+        previousSize = file.size();
+        TMusicDatabase loaded;
+        Load(loaded, file);
+        EXPECT_EQ(loaded.Count(), 300);
+    }
+}
+
 TEST_F(DatabaseFileTest, EachFieldOfARecordHasItsPlace) {
     TMusicDatabase database;
     Add(database, FullSong());
