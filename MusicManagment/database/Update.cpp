@@ -202,7 +202,7 @@ void RememberFolders(TMusicDatabase& database, const QStringList& folders) {
 
 IntakeResult SearchNewSongs(TMusicDatabase& database) {
     RequireFolders(database);
-    const IntakeResult result = AddPaths(database, SplitFolders(database.UpdateFolders()).There, true);
+    IntakeResult result = AddPaths(database, SplitFolders(database.UpdateFolders()).There, true);
     ShowReport(IntakeMessage(result), IntakeDetails(result));
     database.SaveAfterCommand();
     return result;
