@@ -21,14 +21,14 @@ QString FrameText(const FrameReport& frame) {
     QString text = frame.Text.left(kLongestText);
     if (frame.Text.size() > kLongestText) text += u'…';
     if (!frame.Number) return text;
-    const QString number = QString::number(*frame.Number);
+    QString number = QString::number(*frame.Number);
     if (text.isEmpty() || text == number) return number;
     return text + u" ["_s + number + u']';
 }
 
 QString SizeText(qint64 bytes) {
     const QLocale german(QLocale::German);
-    const QString exact = german.toString(bytes) + u" Bytes"_s;
+    QString exact = german.toString(bytes) + u" Bytes"_s;
     if (bytes < 1024) return exact;
     return german.formattedDataSize(bytes, 2, QLocale::DataSizeTraditionalFormat) + u" ("_s + exact + u')';
 }

@@ -22,8 +22,8 @@ const SongColumn& ColumnOf(int section) {
     return SongColumns()[static_cast<std::size_t>(section)];
 }
 
-int CellAlignment(const SongColumn& column) {
-    return (column.Alignment | Qt::AlignVCenter).toInt();
+QVariant CellAlignment(const SongColumn& column) {
+    return QVariant::fromValue(column.Alignment | Qt::AlignVCenter);
 }
 
 }  // namespace
