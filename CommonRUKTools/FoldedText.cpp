@@ -1,5 +1,6 @@
 #include "CommonRUKTools/FoldedText.h"
 
+#include <QVarLengthArray>
 #include <algorithm>
 #include <array>
 #include <memory>
@@ -35,6 +36,26 @@ const FoldTable& Table() {
 
 char16_t Fold(const FoldTable& table, QChar character) {
     return table[character.unicode()];
+}
+
+// Texts of songs fit in without asking for memory.
+using Folded = QVarLengthArray<QChar, 512>;
+
+Folded FoldAll(const FoldTable& table, QStringView text) {
+    Folded folded;
+    for (const QChar character : text) {
+        const char16_t simple = Fold(table, character);
+        if (simple != kNotOne) {
+            folded.append(QChar(simple));
+        } else if (character == u'ß' || character == u'ẞ') {
+            folded.append(u's');
+            folded.append(u's');
+        } else {
+            for (const QChar part : FoldCharacter(character))
+                folded.append(part);
+        }
+    }
+    return folded;
 }
 
 bool HasOthers(const FoldTable& table, QStringView text) {
@@ -93,24 +114,15 @@ bool ContainsSimple(const FoldTable& table, QStringView text, QStringView needle
 }  // namespace
 
 QString FoldText(QStringView text) {
-    const FoldTable& table = Table();
-    QString folded;
-    folded.reserve(text.size());
-    for (const QChar character : text) {
-        const char16_t simple = Fold(table, character);
-        if (simple != kNotOne)
-            folded += QChar(simple);
-        else if (character == u'ß' || character == u'ẞ')
-            folded += QStringView(u"ss");
-        else
-            folded += FoldCharacter(character);
-    }
-    return folded;
+    const Folded folded = FoldAll(Table(), text);
+    return QString(folded.data(), folded.size());
 }
 
 bool ContainsFolded(QStringView text, QStringView needle) {
     if (needle.isEmpty()) return true;
     const FoldTable& table = Table();
     if (text.size() >= needle.size() && ContainsSimple(table, text, needle)) return true;
-    return !IsAscii(text) && HasOthers(table, text) && FoldText(text).contains(needle);
+    if (IsAscii(text) || !HasOthers(table, text)) return false;
+    const Folded folded = FoldAll(table, text);
+    return std::search(folded.begin(), folded.end(), needle.begin(), needle.end()) != folded.end();
 }

@@ -5,6 +5,8 @@
 #include <functional>
 #include <numeric>
 
+#include "app/models/PassingSongs.h"
+
 using namespace Qt::StringLiterals;
 
 namespace {
@@ -23,19 +25,6 @@ bool Narrows(const QString& before, const QString& after) {
     const QStringList now = after.simplified().split(u' ', Qt::SkipEmptyParts);
     if (now.size() < old.size()) return false;
     return std::equal(old.begin(), old.end(), now.begin(), &WordNarrows);
-}
-
-struct Candidate {
-    const TID3Tag* Song;
-    int Row;
-};
-
-// Songs lie in memory in the order in which they came. To go through them in that order is several times
-// faster than to jump from one to the next of the list.
-void SortByMemory(std::vector<Candidate>& candidates) {
-    const std::less<const TID3Tag*> isBefore;
-    if (!std::ranges::is_sorted(candidates, isBefore, &Candidate::Song))
-        std::ranges::sort(candidates, isBefore, &Candidate::Song);
 }
 
 }  // namespace
@@ -68,15 +57,20 @@ bool FilteredSongs::Passes(const TID3Tag& song) const {
 }
 
 FilteredSongs::Rows FilteredSongs::Passing(const Rows& rows) const {
-    std::vector<Candidate> candidates;
-    candidates.reserve(rows.size());
-    for (const int row : rows)
-        if (const TID3Tag* song = songs_.SongAt(row)) candidates.push_back({song, row});
-    SortByMemory(candidates);
+    std::vector<const TID3Tag*> songs;
+    Rows there;
+    songs.reserve(rows.size());
+    there.reserve(rows.size());
+    for (const int row : rows) {
+        const TID3Tag* song = songs_.SongAt(row);
+        if (song == nullptr) continue;
+        songs.push_back(song);
+        there.push_back(row);
+    }
+    const auto passed = TestSongs(songs, [this](const TID3Tag& song) { return Passes(song); });
     Rows passing;
-    for (const auto& [song, row] : candidates)
-        if (Passes(*song)) passing.push_back(row);
-    std::ranges::sort(passing);
+    for (std::size_t place = 0; place < there.size(); ++place)
+        if (passed[place]) passing.push_back(there[place]);
     return passing;
 }
 

@@ -19,7 +19,7 @@ class FilteredSongs : public QAbstractProxyModel {
     // What the user has typed, see SongFilter.
     void SetText(const QString& text);
     const QString& Text() const { return text_; }
-    // What else songs must fulfil to be shown; an empty function for nothing.
+    // What else songs must fulfil to be shown; an empty function for nothing. Several threads ask it at once.
     void SetRestriction(Restriction restriction);
     bool Filtering() const { return filtering_; }
     // After each change of the text or the restriction.
