@@ -31,21 +31,35 @@ QString WithKey(const QString& caption, QString& taken) {
 
 MainMenu::MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(int id)> run,
                    std::function<void()> exit)
-    : database_(database), run_(std::move(run)) {
+    : bar_(bar), database_(database), run_(std::move(run)), exit_(std::move(exit)) {
+    Build();
+    Update();
+}
+
+// Before the menus of others, which stay when these are built anew.
+void MainMenu::Build() {
+    qDeleteAll(std::exchange(menus_, {}));
+    actions_.clear();
+    readOnly_ = database_.ReadOnly();
+    QAction* next = bar_.actions().value(0);
     QString keys;
-    QMenu* first = nullptr;
     for (const auto& item : database_.Menu().Items()) {
-        QMenu* menu = bar.addMenu(WithKey(item->Caption(), keys));
+        auto* menu = new QMenu(WithKey(item->Caption(), keys), &bar_);
+        bar_.insertMenu(next, menu);
+        menus_ << menu;
         AddItems(*menu, *item);
-        if (first == nullptr) first = menu;
         if (item->Find(mcPlay) != nullptr) songMenu_ = menu;
     }
-    first->addSeparator();
+    AddExit();
+}
+
+void MainMenu::AddExit() {
+    QMenu& first = *menus_.first();
+    first.addSeparator();
     QAction* last =
-        first->addAction(ThemeIcon(u"application-exit"_s, QStyle::SP_DialogCloseButton), u"&Beenden"_s);
+        first.addAction(ThemeIcon(u"application-exit"_s, QStyle::SP_DialogCloseButton), u"&Beenden"_s);
     last->setShortcut(QKeySequence(u"Ctrl+Q"_s));
-    QObject::connect(last, &QAction::triggered, &bar, std::move(exit));
-    Update();
+    QObject::connect(last, &QAction::triggered, &first, [this] { exit_(); });
 }
 
 void MainMenu::SetRunning(bool running) {
@@ -54,6 +68,7 @@ void MainMenu::SetRunning(bool running) {
 }
 
 void MainMenu::Update() {
+    if (readOnly_ != database_.ReadOnly()) Build();
     TMenuExItem& menu = database_.Menu();
     for (auto action = actions_.cbegin(); action != actions_.cend(); ++action) {
         const TMenuExItem* item = menu.Find(action.key());
@@ -66,7 +81,7 @@ void MainMenu::Update() {
 
 void MainMenu::AddItems(QMenu& menu, const TMenuExItem& parent) {
     menu.setToolTipsVisible(true);
-    QString keys = parent.Find(mcNew) != nullptr ? u"b"_s : QString();  // "Beenden" comes behind
+    QString keys = menus_.first() == &menu ? u"b"_s : QString();  // "Beenden" comes behind
     auto* group = new QActionGroup(&menu);
     for (const auto& item : parent.Items()) {
         switch (item->Kind()) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QHash>
+#include <QList>
 #include <functional>
 
 class QAction;
@@ -18,17 +19,24 @@ class MainMenu {
 
     // While a long operation runs every command of the database rests.
     void SetRunning(bool running);
-    // Enables, disables and marks the items as the database's menu says now.
+    // Enables, disables and marks the items as the database's menu says now; builds them anew when the
+    // database has become writable or has ceased to be.
     void Update();
     // Chosen for a song, from its context menu. The caller shows it.
     QMenu& SongMenu() const { return *songMenu_; }
 
  private:
+    void Build();
+    void AddExit();
     void AddItems(QMenu& menu, const TMenuExItem& item);
     void AddCommand(QMenu& menu, const TMenuExItem& item);
 
+    QMenuBar& bar_;
     TMusicDatabase& database_;
     std::function<void(int)> run_;
+    std::function<void()> exit_;
+    QList<QMenu*> menus_;
+    bool readOnly_ = false;         // as the menus were built for
     QHash<int, QAction*> actions_;  // by number
     QMenu* songMenu_ = nullptr;
     bool running_ = false;

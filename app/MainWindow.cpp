@@ -132,6 +132,10 @@ void TTunesteadMainWnd::SetUpMenu() {
                                          bool& proceed) { proceed = !RunOwnCommand(static_cast<int>(id)); };
     menu_ = std::make_unique<MainMenu>(
         *menuBar(), database_, [this](int id) { RunMenuCommand(id); }, [this] { close(); });
+    database_.OnMenuChanged = [this](TMusicDatabase&) {
+        toolWindows_->MarkMenu();
+        menu_->Update();
+    };
     songCommands_->OnFind = [this] { filter_->Activate(); };
     songCommands_->OnFindNext = [this] { FindNext(); };
     toolWindows_->AddTo(*menuBar()->addMenu(u"Fe&nster"_s));

@@ -25,8 +25,8 @@ ToolWindows::ToolWindows(QMainWindow& window, TMusicDatabase& database)
     overview_->Overview().OnSelectionChanged = [this](const GroupSelection& selection) {
         if (OnSelectionChanged) OnSelectionChanged(selection);
     };
-    overview_->Overview().OnTypeChanged = [this](TOVType type) { MarkType(type); };
-    MarkType(overview_->Overview().OVType());
+    overview_->Overview().OnTypeChanged = [this](TOVType) { MarkMenu(); };
+    MarkMenu();
 }
 
 void ToolWindows::ShowSong(const TID3Tag* song) {
@@ -48,7 +48,8 @@ void ToolWindows::AddTo(QMenu& menu) {
         menu.addAction(window->toggleViewAction());
 }
 
-void ToolWindows::MarkType(TOVType type) {
+void ToolWindows::MarkMenu() {
+    const TOVType type = overview_->Overview().OVType();
     for (int id = mcListArtists; id <= mcListGenres; ++id)
         if (TMenuExItem* item = database_.Menu().Find(id)) item->SetChecked(id - mcListArtists == type);
 }

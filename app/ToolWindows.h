@@ -26,12 +26,12 @@ class ToolWindows {
     void ShowSong(const TID3Tag* song);
     // The commands of the database's menu that the overview serves. False when the number is none of them.
     bool Run(int id);
+    // Marks the overview's grouping in the database's menu.
+    void MarkMenu();
     // Adds the items that show and hide the windows.
     void AddTo(QMenu& menu);
 
  private:
-    void MarkType(TOVType type);
-
     TMusicDatabase& database_;
     TOverviewForm* overview_;
     TPropertyForm* properties_;

@@ -335,6 +335,7 @@ void TMusicDatabase::SetReadOnly(bool value) {
     if (value == readOnly_) return;
     readOnly_ = value;
     menu_.reset();
+    if (OnMenuChanged) OnMenuChanged(*this);
 }
 
 // --- Command menu ---

@@ -249,6 +249,7 @@ class TMusicDatabase : public QObject {
 
     // --- Events ---
     TNotifyEvent OnModifiedChange;
+    TNotifyEvent OnMenuChanged;  // the menu has gone, the next call builds another
     TChangeEvent OnChange;
     TNotifyEvent OnClear;
     std::function<void(TMusicDatabase&, int count)> OnPrepareMultiAdd;

@@ -101,8 +101,9 @@ class MainWindowTest : public testing::Test {
         return progress != nullptr && progress->isVisible();
     }
     QAction* Command(const QString& caption) {
-        for (QAction* action : window_->menuBar()->actions().first()->menu()->actions())
-            if (action->text().remove(u'&') == caption) return action;
+        for (const QAction* menu : window_->menuBar()->actions())
+            for (QAction* action : menu->menu()->actions())
+                if (action->text().remove(u'&') == caption) return action;
         return nullptr;
     }
 
@@ -311,6 +312,27 @@ TEST_F(MainWindowTest, EveryCommandHasItsKeys) {
 
     QTest::keyClick(window_.get(), Qt::Key_Q, Qt::ControlModifier);
     EXPECT_FALSE(window_->isVisible());
+}
+
+TEST_F(MainWindowTest, TheMenuFollowsADatabaseThatBecomesReadOnly) {
+    Start();
+    const auto menus = [this] {
+        QStringList captions;
+        for (const QAction* action : window_->menuBar()->actions())
+            captions << action->text().remove(u'&');
+        return captions;
+    };
+    const QStringList all = menus();
+    EXPECT_EQ(all.first(), u"Datenbank"_s);
+    Command(u"Alben auflisten"_s)->trigger();
+    Database().SetReadOnly(true);
+    EXPECT_FALSE(menus().contains(u"Datenbank"_s));
+    EXPECT_FALSE(menus().contains(u"Extras"_s));
+    EXPECT_EQ(menus().last(), all.last());
+    EXPECT_NE(Command(u"Beenden"_s), nullptr);
+    EXPECT_TRUE(Command(u"Alben auflisten"_s)->isChecked());
+    Database().SetReadOnly(false);
+    EXPECT_EQ(menus(), all);
 }
 
 TEST_F(MainWindowTest, TheWindowKeepsItsSizeBetweenTwoStarts) {
