@@ -203,7 +203,9 @@ void TTunesteadMainWnd::RunningChanged(bool running) {
     menu_->SetRunning(running);
     empty_->SetCommandsEnabled(!running);
     list_->SetSortingAllowed(!running);
-    if (!running) songs_.SyncViews();
+    if (running) return;
+    songs_.SyncViews();
+    if (std::exchange(ending_, false)) QTimer::singleShot(0, this, [this] { End(); });
 }
 
 void TTunesteadMainWnd::ListChanged() {
@@ -268,6 +270,15 @@ void TTunesteadMainWnd::closeEvent(QCloseEvent* event) {
     if (!commands_.MayClose()) return;
     RunCommand([this] { StoreSettings(); });
     event->accept();
+}
+
+void TTunesteadMainWnd::End() {
+    ending_ = database_.ProgressRunning();
+    if (!ending_) {
+        close();
+        return;
+    }
+    database_.RequestAbort();
 }
 
 void TTunesteadMainWnd::OfferToStop() {

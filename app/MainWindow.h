@@ -35,6 +35,8 @@ class TTunesteadMainWnd : public QMainWindow {
     ~TTunesteadMainWnd() override;
 
     TMusicDatabase& Database() { return database_; }
+    // Closes the window; a long operation is stopped first, without a question.
+    void End();
 
  protected:
     void closeEvent(QCloseEvent* event) override;
@@ -80,6 +82,7 @@ class TTunesteadMainWnd : public QMainWindow {
     QLabel* marked_ = nullptr;
     QTimer markedTimer_;
     QToolButton* undo_ = nullptr;
+    bool ending_ = false;     // as soon as the long operation has stopped
     QString linkPath_;        // folder of the program's shortcuts
     bool firstTime_ = false;  // this is the program's first start
 };

@@ -6,6 +6,7 @@
 #include "app/MainWindow.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/StandardFiles.h"
+#include "app/desktop/Termination.h"
 #include "app/desktop/Translations.h"
 #include "app/dialogs/QtDialogs.h"
 
@@ -59,6 +60,7 @@ int main(int argc, char** argv) {
     {
         TTunesteadMainWnd window({LocateStandardFiles(), UserSettingsFile(), files});
         dialogs.SetMainWindow(&window);
+        const Termination termination([&window] { window.End(); });
         window.show();
         result = QApplication::exec();
     }

@@ -203,6 +203,20 @@ TEST_F(MainWindowTest, ClosingDuringARunAsksAndNeverCloses) {
     }
 }
 
+TEST_F(MainWindowTest, TheSystemEndsTheProgramAlsoDuringARunAndNothingIsLost) {
+    MakeSongs(60);
+    Start();
+    Drop({Music()});
+    DuringRun([this] { window_->End(); });
+    Work();
+    EXPECT_FALSE(window_->isVisible());
+    EXPECT_TRUE(dialogs_.Questions.isEmpty());
+    const int taken = Database().Count();
+    EXPECT_LT(taken, 60);
+    Start();
+    EXPECT_EQ(Database().Count(), taken);
+}
+
 TEST_F(MainWindowTest, ADropDuringARunIsRefused) {
     MakeSongs(20);
     Start();
