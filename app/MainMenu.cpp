@@ -27,6 +27,13 @@ QString WithKey(const QString& caption, QString& taken) {
     return text;
 }
 
+// The keys of the items that are no commands of the database and come behind these.
+QString KeysOfOwnItems(const TMenuExItem& parent) {
+    if (parent.Find(mcNew) != nullptr) return u"b"_s;         // "Beenden"
+    if (parent.Find(mcSearchNew) != nullptr) return u"ei"_s;  // AddSettings
+    return {};
+}
+
 }  // namespace
 
 MainMenu::MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(int id)> run,
@@ -39,6 +46,7 @@ MainMenu::MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(i
         AddItems(*menu, *item);
         if (first == nullptr) first = menu;
         if (item->Find(mcPlay) != nullptr) songMenu_ = menu;
+        if (item->Find(mcSearchNew) != nullptr) extrasMenu_ = menu;
     }
     first->addSeparator();
     QAction* last =
@@ -48,12 +56,28 @@ MainMenu::MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(i
     Update();
 }
 
+void MainMenu::AddSettings(std::function<void()> options, std::function<void()> wizard) {
+    if (extrasMenu_ == nullptr) return;
+    extrasMenu_->addSeparator();
+    QAction* first = extrasMenu_->addAction(ThemeIcon(u"configure"_s, QStyle::SP_FileDialogDetailedView),
+                                            u"&Einstellungen..."_s);
+    first->setShortcut(QKeySequence(u"Ctrl+,"_s));
+    QAction* second = extrasMenu_->addAction(ThemeIcon(u"tools-wizard"_s, QStyle::SP_FileDialogInfoView),
+                                             u"E&inrichtungsassistent..."_s);
+    QObject::connect(first, &QAction::triggered, extrasMenu_, std::move(options));
+    QObject::connect(second, &QAction::triggered, extrasMenu_, std::move(wizard));
+    settings_ = {first, second};
+    Update();
+}
+
 void MainMenu::SetRunning(bool running) {
     running_ = running;
     Update();
 }
 
 void MainMenu::Update() {
+    for (QAction* action : settings_)
+        action->setEnabled(!running_);
     TMenuExItem& menu = database_.Menu();
     for (auto action = actions_.cbegin(); action != actions_.cend(); ++action) {
         const TMenuExItem* item = menu.Find(action.key());
@@ -66,7 +90,7 @@ void MainMenu::Update() {
 
 void MainMenu::AddItems(QMenu& menu, const TMenuExItem& parent) {
     menu.setToolTipsVisible(true);
-    QString keys = parent.Find(mcNew) != nullptr ? u"b"_s : QString();  // "Beenden" comes behind
+    QString keys = KeysOfOwnItems(parent);
     auto* group = new QActionGroup(&menu);
     for (const auto& item : parent.Items()) {
         switch (item->Kind()) {

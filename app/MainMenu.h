@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QHash>
+#include <QList>
 #include <functional>
 
 class QAction;
@@ -16,6 +17,8 @@ class MainMenu {
     MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(int id)> run,
              std::function<void()> exit);
 
+    // Adds the items for the options and the set-up to the end of the menu "Extras".
+    void AddSettings(std::function<void()> options, std::function<void()> wizard);
     // While a long operation runs every command of the database rests.
     void SetRunning(bool running);
     // Enables, disables and marks the items as the database's menu says now.
@@ -30,6 +33,8 @@ class MainMenu {
     TMusicDatabase& database_;
     std::function<void(int)> run_;
     QHash<int, QAction*> actions_;  // by number
+    QList<QAction*> settings_;
     QMenu* songMenu_ = nullptr;
+    QMenu* extrasMenu_ = nullptr;
     bool running_ = false;
 };
