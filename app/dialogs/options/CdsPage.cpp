@@ -106,6 +106,7 @@ std::optional<QString> CdsPage::FaultOfRow(int row, int& column) const {
 
 void CdsPage::Apply(TMusicDatabase& database, TRWReg&) {
     std::vector<CdName> cds;
+    cds.reserve(static_cast<std::size_t>(table_->rowCount()));
     for (int row = 0; row < table_->rowCount(); ++row)
         cds.push_back({TextAt(*table_, row, cName), SerialOf(TextAt(*table_, row, cSerial))});
     database.SetCDNames(std::move(cds));
