@@ -17,6 +17,8 @@ class MainMenu {
     MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(int id)> run,
              std::function<void()> exit);
 
+    // Adds the items for the options and the set-up, to the end of the menu "Extras" where there is one.
+    void AddSettings(std::function<void()> options, std::function<void()> wizard);
     // While a long operation runs every command of the database rests.
     void SetRunning(bool running);
     // Enables, disables and marks the items as the database's menu says now; builds them anew when the
@@ -27,6 +29,7 @@ class MainMenu {
 
  private:
     void Build();
+    void BuildSettings(QMenu& menu);
     void AddExit();
     void AddItems(QMenu& menu, const TMenuExItem& item);
     void AddCommand(QMenu& menu, const TMenuExItem& item);
@@ -35,9 +38,12 @@ class MainMenu {
     TMusicDatabase& database_;
     std::function<void(int)> run_;
     std::function<void()> exit_;
+    std::function<void()> options_;
+    std::function<void()> wizard_;
     QList<QMenu*> menus_;
     bool readOnly_ = false;         // as the menus were built for
     QHash<int, QAction*> actions_;  // by number
+    QList<QAction*> settings_;
     QMenu* songMenu_ = nullptr;
     bool running_ = false;
 };

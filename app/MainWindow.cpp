@@ -21,6 +21,7 @@
 #include "MusicManagment/database/Settings.h"
 #include "app/CommandRunner.h"
 #include "app/MainMenu.h"
+#include "app/SettingsCommands.h"
 #include "app/SongCommands.h"
 #include "app/Startup.h"
 #include "app/ToolWindows.h"
@@ -136,6 +137,11 @@ void TTunesteadMainWnd::SetUpMenu() {
         toolWindows_->MarkMenu();
         menu_->Update();
     };
+    settingsCommands_ =
+        std::make_unique<SettingsCommands>(*this, database_, kSettingsKey.toString(), options_.SettingsFile);
+    settingsCommands_->OnApplied = [this] { menu_->Update(); };
+    menu_->AddSettings([this] { RunCommand([this] { settingsCommands_->ShowOptions(); }); },
+                       [this] { RunCommand([this] { settingsCommands_->ShowWizard(); }); });
     songCommands_->OnFind = [this] { filter_->Activate(); };
     songCommands_->OnFindNext = [this] { FindNext(); };
     toolWindows_->AddTo(*menuBar()->addMenu(u"Fe&nster"_s));
@@ -194,7 +200,11 @@ void TTunesteadMainWnd::SetUpPlacement() {
 }
 
 void TTunesteadMainWnd::StartOnce() {
-    if (!Startup(database_, commands_).Run(options_.Arguments)) close();
+    if (!Startup(database_, commands_).Run(options_.Arguments)) {
+        close();
+        return;
+    }
+    if (firstTime_ && options_.OfferWizard) RunCommand([this] { settingsCommands_->OfferWizard(); });
 }
 
 // --- What follows the database ---

@@ -17,6 +17,7 @@ class MainMenu;
 class QLabel;
 class QStackedWidget;
 class QToolButton;
+class SettingsCommands;
 class SongCommands;
 class SongListWidget;
 class ToolWindows;
@@ -25,7 +26,8 @@ class ToolWindows;
 struct MainWindowOptions {
     StandardFiles Files{};
     QString SettingsFile{};
-    QStringList Arguments{};  // of the command line, without the program's name
+    QStringList Arguments{};   // of the command line, without the program's name
+    bool OfferWizard = false;  // at the first start
 };
 
 // The program's main window: owns the collection and brings together what shows it and what works on it.
@@ -71,6 +73,7 @@ class TTunesteadMainWnd : public QMainWindow {
     CollectionCommands commands_;
     ProgressDisplay progress_;
     std::unique_ptr<SongCommands> songCommands_;
+    std::unique_ptr<SettingsCommands> settingsCommands_;
     std::unique_ptr<MainMenu> menu_;
     std::unique_ptr<ToolWindows> toolWindows_;
     QStackedWidget* centre_ = nullptr;
