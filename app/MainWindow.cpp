@@ -4,6 +4,7 @@
 #include <QCloseEvent>
 #include <QDragEnterEvent>
 #include <QLabel>
+#include <QMenu>
 #include <QMenuBar>
 #include <QMimeData>
 #include <QScreen>
@@ -19,13 +20,16 @@
 #include "MusicManagment/database/Intake.h"
 #include "MusicManagment/database/IntakeReport.h"
 #include "MusicManagment/database/Settings.h"
+#include "app/ArrangementCommands.h"
 #include "app/CommandRunner.h"
+#include "app/HelpMenu.h"
 #include "app/MainMenu.h"
 #include "app/SettingsCommands.h"
 #include "app/SongCommands.h"
-#include "app/Startup.h"
 #include "app/ToolWindows.h"
 #include "app/desktop/Icons.h"
+#include "app/desktop/RaiseWindow.h"
+#include "app/desktop/SingleInstance.h"
 #include "app/views/EmptyState.h"
 #include "app/views/FilterField.h"
 #include "app/views/SongListWidget.h"
@@ -51,7 +55,9 @@ TTunesteadMainWnd::TTunesteadMainWnd(MainWindowOptions options)
       shown_(songs_),
       totals_(database_),
       commands_(database_, options_.Files),
-      progress_(database_, *this) {
+      progress_(database_, *this),
+      installation_(options_.Setup, options_.Files, options_.SettingsFile),
+      startup_(database_, commands_, installation_) {
     setWindowIcon(ProgramIcon());
     setAcceptDrops(true);
     SetUpDatabase();
@@ -61,6 +67,7 @@ TTunesteadMainWnd::TTunesteadMainWnd(MainWindowOptions options)
     SetUpMenu();
     LoadSettings();
     SetUpPlacement();
+    SetUpStart();
     ListChanged();
     QTimer::singleShot(0, this, &TTunesteadMainWnd::StartOnce);
 }
@@ -144,7 +151,11 @@ void TTunesteadMainWnd::SetUpMenu() {
                        [this] { RunCommand([this] { settingsCommands_->ShowWizard(); }); });
     songCommands_->OnFind = [this] { filter_->Activate(); };
     songCommands_->OnFindNext = [this] { FindNext(); };
-    toolWindows_->AddTo(*menuBar()->addMenu(u"Fe&nster"_s));
+    QMenu* windows = menuBar()->addMenu(u"Fe&nster"_s);
+    toolWindows_->AddTo(*windows);
+    arrangement_ = std::make_unique<ArrangementCommands>(*this, *list_);
+    arrangement_->AddTo(*windows);
+    AddHelpMenu(*menuBar(), *this);
     list_->OnContextMenu = [this](const QPoint& place) { menu_->SongMenu().popup(place); };
 }
 
@@ -199,12 +210,34 @@ void TTunesteadMainWnd::SetUpPlacement() {
     resize(wanted.boundedTo(screen()->availableSize() * 0.9));
 }
 
+// --- Starting ---
+
+void TTunesteadMainWnd::SetUpStart() {
+    startup_.LinkFolder = linkPath_;
+    startup_.OpenArrangement = [this](const QString& path) { arrangement_->Load(path); };
+    requests_.IsReady = [this] {
+        return started_ && !database_.ProgressRunning() && QApplication::activeModalWidget() == nullptr;
+    };
+    requests_.Act = [this](const QStringList& arguments) {
+        if (!startup_.ActOn(arguments)) close();
+    };
+}
+
 void TTunesteadMainWnd::StartOnce() {
-    if (!Startup(database_, commands_).Run(options_.Arguments)) {
+    const bool goesOn = startup_.Run(options_.Arguments);
+    started_ = true;
+    if (!goesOn) {
         close();
         return;
     }
     if (firstTime_ && options_.OfferWizard) RunCommand([this] { settingsCommands_->OfferWizard(); });
+}
+
+bool TTunesteadMainWnd::TakeOver(const StartRequest& request) {
+    if (!isVisible()) return false;
+    RaiseWindow(*this, request.ActivationToken);
+    if (!request.Arguments.isEmpty()) requests_.Add(request.Arguments);
+    return true;
 }
 
 // --- What follows the database ---
@@ -278,7 +311,7 @@ void TTunesteadMainWnd::closeEvent(QCloseEvent* event) {
     event->ignore();
     if (database_.ProgressRunning()) return OfferToStop();
     if (!commands_.MayClose()) return;
-    RunCommand([this] { StoreSettings(); });
+    if (!installation_.Removed().Settings) RunCommand([this] { StoreSettings(); });
     event->accept();
 }
 
