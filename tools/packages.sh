@@ -3,7 +3,7 @@
 build_packages=(g++ cmake ninja-build ccache qt6-base-dev libgl1-mesa-dev zlib1g-dev)
 desktop_packages=(libqt6svg6 qt6-translations-l10n breeze-icon-theme xdg-utils fonts-dejavu-core)
 test_packages=(libgtest-dev libbenchmark-dev libtag1-dev libsqlite3-dev pkg-config clang-format clang-tidy jq
-    desktop-file-utils)
+    desktop-file-utils appstream shared-mime-info man-db)
 
 # Installs those of the named packages that are missing.
 install_packages() {

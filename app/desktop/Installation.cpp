@@ -65,15 +65,13 @@ Installation::Installation(InstallationPlaces places, ToolRunner run)
     : places_(std::move(places)), run_(std::move(run)) {}
 
 QStringList Installation::Install(const QString& linkFolder) {
-    for (const File& file : Files())
-        Write(file.Path, file.Contents);
+    QStringList complaints = WriteFiles();
     if (!linkFolder.isEmpty()) {
         Write(Shortcut(linkFolder), DesktopEntry());
         // Desktops start a shortcut outside of the menu's folders only when it is executable.
         QFile shortcut(Shortcut(linkFolder));
         shortcut.setPermissions(shortcut.permissions() | QFile::ExeOwner);
     }
-    QStringList complaints = UpdateCaches();
     // Types of the system (.m3u, .pls and songs) keep the program that the user has chosen for them.
     complaints << run_(u"xdg-mime"_s, QStringList{u"default"_s, kEntryName} + OwnMimeTypes());
     complaints.removeAll(QString());
@@ -88,7 +86,7 @@ QStringList Installation::Refresh() {
     const auto files = Files();
     const auto isCurrent = [](const File& file) { return Contents(file.Path) == file.Contents; };
     if (std::ranges::all_of(files, isCurrent)) return {};
-    return Install({});
+    return WriteFiles();
 }
 
 QStringList Installation::Remove(const QString& linkFolder) {
@@ -98,9 +96,13 @@ QStringList Installation::Remove(const QString& linkFolder) {
     if (!linkFolder.isEmpty() && !InstalledProgram(Contents(Shortcut(linkFolder))).isEmpty())
         RemoveFile(Shortcut(linkFolder));
     RemoveDefaults();
-    QStringList complaints = UpdateCaches();
-    complaints.removeAll(QString());
-    return complaints;
+    return UpdateCaches();
+}
+
+QStringList Installation::WriteFiles() const {
+    for (const File& file : Files())
+        Write(file.Path, file.Contents);
+    return UpdateCaches();
 }
 
 QByteArray Installation::DesktopEntry() const {
@@ -128,6 +130,7 @@ QStringList Installation::UpdateCaches() const {
     // A cache where there was none would hide the icons that others put there later without renewing it.
     if (QFileInfo::exists(icons + u"/icon-theme.cache"_s))
         complaints << run_(u"gtk-update-icon-cache"_s, {u"-q"_s, u"-f"_s, u"-t"_s, icons});
+    complaints.removeAll(QString());
     return complaints;
 }
 
@@ -136,5 +139,9 @@ void Installation::RemoveDefaults() const {
     const QString path = places_.ConfigFolder + u"/mimeapps.list"_s;
     const QByteArray before = Contents(path);
     const QByteArray after = WithoutDefaults(before, kEntryName, OwnMimeTypes());
-    if (after != before) Write(path, after);
+    if (after == before) return;
+    if (after.contains('='))
+        Write(path, after);
+    else
+        RemoveFile(path);  // the headings that xdg-mime made are all that is left
 }

@@ -27,7 +27,7 @@ class Installation {
     // With a folder for shortcuts one is put there too. Throws EStreamError.
     QStringList Install(const QString& linkFolder);
     // Renews what an earlier version of this program has installed; does nothing where it is not installed,
-    // and where another copy that still exists is. Throws EStreamError.
+    // and where another copy that still exists is. The user's choice of programs stays. Throws EStreamError.
     QStringList Refresh();
     // Removes what Install() has written. Throws EStreamError when a file cannot be removed.
     QStringList Remove(const QString& linkFolder);
@@ -41,6 +41,7 @@ class Installation {
     QByteArray DesktopEntry() const;
     std::vector<File> Files() const;
     QString DesktopFile() const;
+    QStringList WriteFiles() const;
     QStringList UpdateCaches() const;
     void RemoveDefaults() const;
 

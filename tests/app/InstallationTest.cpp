@@ -90,6 +90,11 @@ TEST_F(InstallationTest, RemovingLeavesWhatWasThereBefore) {
     EXPECT_EQ(Files(), before);
     EXPECT_EQ(Read(u"config/mimeapps.list"_s), defaults + "application/x-tunestead-desktop=other.desktop;\n");
     installation_.Remove(In(u"links"_s));  // nothing left to remove
+
+    Write(u"config/mimeapps.list"_s,
+          "\n[Default Applications]\napplication/x-tunestead-database=tunestead.desktop\n");
+    installation_.Remove({});
+    EXPECT_FALSE(Files().contains(u"config/mimeapps.list"_s));
 }
 
 TEST_F(InstallationTest, AShortcutThatTheUserMadeStays) {
@@ -114,6 +119,7 @@ TEST_F(InstallationTest, OnlyAnOutdatedInstallationOfThisProgramIsRenewed) {
     EXPECT_EQ(Read(installed_[2]), "<older/>");
     installation_.Refresh();
     EXPECT_EQ(Read(installed_[2]), current);
+    EXPECT_EQ(runs_.size(), 2) << "the user's choice of programs stays";
 
     QFile::remove(In(u"bin/tunestead"_s));  // the program has moved
     Of(u"copy/tunestead"_s).Refresh();
