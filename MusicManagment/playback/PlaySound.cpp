@@ -1,6 +1,6 @@
 #include "MusicManagment/playback/PlaySound.h"
 
-#include <QCoreApplication>
+#include <QEventLoop>
 #include <QThread>
 #include <algorithm>
 #include <limits>
@@ -17,9 +17,9 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr unsigned long kWaitRound = 250;  // ms
-constexpr qint64 kStep = 10000;            // ms, of the menu's commands back and forward
-constexpr int kLongestInterval = 10000;    // ms, of a stored timer interval
+constexpr int kWaitRound = 250;          // ms
+constexpr qint64 kStep = 10000;          // ms, of the menu's commands back and forward
+constexpr int kLongestInterval = 10000;  // ms, of a stored timer interval
 
 }  // namespace
 
@@ -45,23 +45,23 @@ void TPlaySound::Play() {
     if (!current_ || EndFadesOfPlaying() || !FileSource::Exists(fileName_)) return;
     current_->Play();
     if (fading_) fading_->Play();
-    Raise(OnPlayingStarted);
-    Feedback(fbStarted);
-    AnnounceSong();
     StartTimers();
+    AnnounceSong();
 }
 
 // A song that plays already only gets its full volume back.
 bool TPlaySound::EndFadesOfPlaying() {
-    auto* current = dynamic_cast<FadingBackend*>(current_.get());
+    FadingBackend* current = AsFading(current_.get());
     if (current == nullptr || current_->GetStatus() != psPlaying) return false;
     current->CancelFades();
     current->SetVolume(100);
-    if (auto* fading = dynamic_cast<FadingBackend*>(fading_.get())) fading->CutFadeOut();
+    if (FadingBackend* fading = AsFading(fading_.get())) fading->CutFadeOut();
     return true;
 }
 
 void TPlaySound::AnnounceSong() {
+    Raise(OnPlayingStarted);
+    Feedback(fbStarted);
     if (panel_ != nullptr) {
         panel_->ShowSong(fileName_);
         panel_->Redraw();
@@ -78,7 +78,7 @@ void TPlaySound::Stop(StopMode mode) {
         return;
     }
     if (!current_) return;
-    auto* fading = dynamic_cast<FadingBackend*>(current_.get());
+    FadingBackend* fading = AsFading(current_.get());
     // A fade-out runs on the timer, which rests unless the song plays.
     if (mode == StopMode::Fade && fading != nullptr && settings_.FMODCrossoverTime >= kShortestFade &&
         !fading->IsFadingOut() && current_->GetStatus() == psPlaying) {
@@ -87,13 +87,14 @@ void TPlaySound::Stop(StopMode mode) {
         return;
     }
     FinishStop();
-    if (timers_.TicksExist()) RunTick(TickKind::Last);
-    StopTimers();
+    if (timers_.TicksExist() && !timers_.Ticking()) RunTick(TickKind::Last);
 }
 
+// The timers rest before anybody is told, who may start another song.
 void TPlaySound::FinishStop() {
     current_->Stop();
     fading_.reset();
+    StopTimers();
     Raise(OnPlayingStopped);
     Feedback(fbStopped);
     StateChanged();
@@ -108,15 +109,15 @@ void TPlaySound::PauseResume() {
     if (current_->GetStatus() == psPaused) {
         current_->Play();
         if (fading_) fading_->Play();
+        StartTimers();
         Raise(OnPlayingResumed);
         Feedback(fbResumed);
-        StartTimers();
     } else {
         current_->PauseResume();
         if (fading_) fading_->PauseResume();
+        StopTimers();
         Raise(OnPlayingPaused);
         Feedback(fbPaused);
-        StopTimers();
     }
     StateChanged();
 }
@@ -160,7 +161,8 @@ quint32 TPlaySound::GetLength() {
 
 TPSStatus TPlaySound::GetStatus() {
     if (!playExtern_) return current_ ? current_->GetStatus() : psClosed;
-    const qint64 answer = ExternalRuns() ? external_->Send(ecGetStatus) : psClosed;
+    if (!ExternalRuns()) return psClosed;
+    const qint64 answer = external_->Send(ecGetStatus);
     return answer >= psClosed && answer <= psSeeking ? static_cast<TPSStatus>(answer) : psClosed;
 }
 
@@ -182,8 +184,13 @@ void TPlaySound::SetStatus(TPSStatus status) {
 
 void TPlaySound::WaitForEnd(WaitMode mode) {
     for (TPSStatus status = GetStatus(); status != psClosed && status != psStopped; status = GetStatus()) {
-        QThread::msleep(kWaitRound);
-        if (mode == WaitMode::KeepInterfaceAlive) QCoreApplication::processEvents();
+        if (mode == WaitMode::Block) {
+            QThread::msleep(kWaitRound);
+            continue;
+        }
+        QEventLoop messages;
+        QTimer::singleShot(kWaitRound, &messages, &QEventLoop::quit);
+        messages.exec();
     }
 }
 
@@ -242,9 +249,17 @@ TMenuExItem& TPlaySound::Menu() {
     return *menu_;
 }
 
+// How the user's wish for another song is carried out.
+SongChange TPlaySound::ChangeOnDemand() const {
+    return Crossover() >= coAllChanges ? SongChange::CrossFade : SongChange::Hard;
+}
+
+// How the user's wish to stop is carried out.
+StopMode TPlaySound::StopOnDemand() const {
+    return Crossover() == coAlways ? StopMode::Fade : StopMode::AtOnce;
+}
+
 bool TPlaySound::ClickMenuItem(int id) {
-    const TCrossover mode = Crossover();
-    const SongChange change = mode >= coAllChanges ? SongChange::CrossFade : SongChange::Hard;
     switch (id) {
         case plPlay:
             Play();
@@ -253,13 +268,13 @@ bool TPlaySound::ClickMenuItem(int id) {
             PauseResume();
             return true;
         case plStop:
-            Stop(mode == coAlways ? StopMode::Fade : StopMode::AtOnce);
+            Stop(StopOnDemand());
             return true;
         case plPrevious:
-            if (playList_) playList_->PlayPrevious(change);
+            if (playList_) playList_->PlayPrevious(ChangeOnDemand());
             return true;
         case plNext:
-            if (playList_) playList_->PlayNext(change);
+            if (playList_) playList_->PlayNext(ChangeOnDemand());
             return true;
         case plBack:
             MoveBy(-kStep);

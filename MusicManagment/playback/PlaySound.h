@@ -71,6 +71,9 @@ class TPlaySound : public TPlaySoundContainer,
     void SetCOFileName(const QString& path);
     // As the controller or else the panel wants it; asked anew for every decision.
     TCrossover Crossover() const;
+    // What it means for a user who wants another song, or wants to stop.
+    SongChange ChangeOnDemand() const;
+    StopMode StopOnDemand() const;
 
     // --- Properties ---
     bool AutoPlay() const override { return autoPlay_; }

@@ -23,7 +23,7 @@ bool TPlaySound::PlayWithCrossFade(const QString& path) {
         RestartAutoStop();
         return true;
     }
-    if (dynamic_cast<FadingBackend*>(current_.get()) == nullptr || !CanFade()) return false;
+    if (AsFading(current_.get()) == nullptr || !CanFade()) return false;
     if (!FileSource::Exists(path) || ChooseEngine(path, settings_) != TEngine::FMOD) return false;
     try {
         return CrossFadeTo(MakeBackend(TEngine::FMOD, path), path);
@@ -36,7 +36,7 @@ bool TPlaySound::PlayWithCrossFade(const QString& path) {
 // The new song is opened beside the current one and takes its place only once it plays, so that whatever goes
 // wrong leaves the current one alone.
 bool TPlaySound::CrossFadeTo(Backend next, const QString& path) {
-    auto* fadingIn = dynamic_cast<FadingBackend*>(next.get());
+    FadingBackend* fadingIn = AsFading(next.get());
     if (fadingIn == nullptr) return false;
     fadingIn->SetFadeTime(settings_.FMODCrossoverTime);
     fadingIn->StartFadeIn();
@@ -44,9 +44,9 @@ bool TPlaySound::CrossFadeTo(Backend next, const QString& path) {
     fadingIn->FadeStep();  // no moment at full volume before the first tick
 
     fading_ = std::exchange(current_, std::move(next));
-    auto& fadingOut = dynamic_cast<FadingBackend&>(*fading_);
-    fadingOut.SetFadeTime(settings_.FMODCrossoverTime);
-    fadingOut.StartFadeOut();
+    FadingBackend* fadingOut = AsFading(fading_.get());
+    fadingOut->SetFadeTime(settings_.FMODCrossoverTime);
+    fadingOut->StartFadeOut();
 
     // A song that is faded in counts as well, though its name does not go through SetFileName.
     if (path != fileName_) playCount_.Arm();
@@ -54,8 +54,6 @@ bool TPlaySound::CrossFadeTo(Backend next, const QString& path) {
     coFileName_.clear();
     if (playList_) playList_->RedrawView();
     StartTimers();
-    Raise(OnPlayingStarted);
-    Feedback(fbStarted);
     AnnounceSong();
     return true;
 }
@@ -82,7 +80,7 @@ void TPlaySound::SetCOFileName(const QString& path) {
         return;
     }
     Backend song = MakeBackend(TEngine::FMOD, path);
-    if (auto* fading = dynamic_cast<FadingBackend*>(song.get())) {
+    if (FadingBackend* fading = AsFading(song.get())) {
         fading->SetFadeTime(settings_.FMODCrossoverTime);
         fading->StartFadeOut();
     }

@@ -57,7 +57,7 @@ qint64 TPlaySound::HandleFeedback(int code, quint32 parameter) {
             Raise(OnPlayingResumed);
             break;
         case fbCrossoverQuery:
-            return controller_ != nullptr ? coAutoChange : Crossover() & kModeMask;
+            return controller_ != nullptr ? 1 : Crossover() & kModeMask;
         default:
             break;
     }

@@ -89,7 +89,8 @@ bool TPlaySound::CreateBackendsAfter(TEngine failed, const QString& message) {
 
 void TPlaySound::SetExternalPlayer(std::unique_ptr<ExternalPlayer> player) {
     if (playExtern_) SetPlayExtern(false);
-    external_ = player ? std::make_unique<ExternalLink>(std::move(player), *this) : nullptr;
+    FeedbackReceiver& receiver = *this;
+    external_ = player ? std::make_unique<ExternalLink>(std::move(player), receiver) : nullptr;
 }
 
 void TPlaySound::SetPlayExtern(bool value) {

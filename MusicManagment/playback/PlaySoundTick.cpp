@@ -58,20 +58,19 @@ void TPlaySound::ReportPosition(quint32 position, quint32 length) {
 
 // True when a fading stop has come to its end.
 bool TPlaySound::FinishFades() {
-    auto* current = dynamic_cast<FadingBackend*>(current_.get());
+    FadingBackend* current = AsFading(current_.get());
     if (current != nullptr && current->FadeStep()) {
         FinishStop();
-        StopTimers();
         return true;
     }
-    auto* fading = dynamic_cast<FadingBackend*>(fading_.get());
+    FadingBackend* fading = AsFading(fading_.get());
     if (fading != nullptr && fading->FadeStep()) fading_.reset();
     return false;
 }
 
 // The current song fades out only when it was asked to stop; no other song may follow it then.
 bool TPlaySound::IsStopping() const {
-    const auto* fading = dynamic_cast<const FadingBackend*>(current_.get());
+    const FadingBackend* fading = AsFading(current_.get());
     return fading != nullptr && fading->IsFadingOut();
 }
 
@@ -79,7 +78,7 @@ bool TPlaySound::HasEnded(quint32 position, quint32 length) {
     const TPSStatus status = current_->GetStatus();
     if (length == 0 && status == psPlaying) return false;  // not known yet
     // Damaged files end before their time. Only this engine's status is sure enough to go by.
-    const bool endedEarly = status == psStopped && dynamic_cast<FadingBackend*>(current_.get()) != nullptr;
+    const bool endedEarly = status == psStopped && AsFading(current_.get()) != nullptr;
     return endedEarly || IsInLast(kEndZone, position, length);
 }
 
@@ -94,7 +93,8 @@ void TPlaySound::CheckCrossFade(quint32 position, quint32 length) {
     if (!IsInLast(settings_.FMODCrossoverTime, position, length) || Crossover() == coNone) return;
     crossFadeStarted_ = true;
     Raise(OnCrossover);
-    AskForNextSong(SongChange::CrossFadeOnly);
+    if (AsFading(current_.get()) != nullptr && settings_.FMODCrossoverTime >= kShortestFade)
+        AskForNextSong(SongChange::CrossFadeOnly);
     Feedback(fbCrossover);
 }
 
@@ -103,6 +103,10 @@ void TPlaySound::HandleEndOfSong() {
     Raise(OnReachedEndOfSong);
     AskForNextSong(SongChange::Hard);
     Feedback(fbEndOfSong);
+    if (!current_ || current_->GetStatus() != psStopped) return;
+    // Nothing has followed.
+    StopTimers();
+    StateChanged();
 }
 
 void TPlaySound::HandleAutoStop() {
@@ -116,12 +120,15 @@ void TPlaySound::HandleAutoStop() {
 // --- Counting ---
 
 void TPlaySound::CountSongWhenDue() {
+    if (database_ && database_->Busy()) return;  // a later tick counts
     if (!playCount_.Due(CurrentClock().Ticks())) return;
     CountSong();
     Feedback(fbSongCounted, 1);
 }
 
 void TPlaySound::CountSong() {
+    if (!database_ || database_->Busy()) return;
+    database_->EnsureSorted();
     const SongIndex song = SongInDatabase();
     if (song < 0) return;
     TID3Tag record = database_->Song(song);
