@@ -92,9 +92,9 @@ void TPlaySound::Stop(StopMode mode) {
 
 // The timers rest before anybody is told, who may start another song.
 void TPlaySound::FinishStop() {
+    StopTimers();
     current_->Stop();
     fading_.reset();
-    StopTimers();
     Raise(OnPlayingStopped);
     Feedback(fbStopped);
     StateChanged();

@@ -25,8 +25,10 @@ void TPlaySound::RunHandler(void (TPlaySound::*handler)()) {
     } catch (const EAbort&) {
         return;  // the user has been told
     } catch (const ERukException& error) {
-        // What a tick throws the next one throws again, and the message box lets them run.
+        // What a tick throws the next one throws again: the song is over. The message box lets timers run, so
+        // that the next song need not wait for the user.
         timers_.StopTicks();
+        if (handler == &TPlaySound::Tick) timers_.StartEnd();
         UserDialogs().ShowMessage(MessageKind::Error, error.Message());
     }
 }
