@@ -108,7 +108,8 @@ class ScriptedFadingBackend : public ScriptedBackend, public FadingBackend {
     void StartFadeOut() override { fadeOutEnd_ = CurrentClock().Ticks() + FadeTime; }
     bool FadeStep() override {
         const qint64 now = CurrentClock().Ticks();
-        if (fadeInEnd_ > 0) Volume = static_cast<int>(100 - (fadeInEnd_ - now) * 100 / FadeTime);
+        if (fadeInEnd_ > 0)
+            Volume = static_cast<int>(100 - std::max<qint64>(fadeInEnd_ - now, 0) * 100 / FadeTime);
         if (now > fadeInEnd_) fadeInEnd_ = 0;
         if (fadeOutEnd_ == 0) return false;
         Volume = static_cast<int>((fadeOutEnd_ - now) * 100 / FadeTime);
