@@ -16,7 +16,7 @@ TEST(CommandLine, WrongUsageIsNamedWithWhereTheHelpIs) {
     };
     const Case cases[] = {
         {u""_s, u"Es fehlt ein Befehl."_s, u"tunestead-cli --help"_s},
-        {u"play x"_s, u"Unbekannter Befehl: play"_s, u"tunestead-cli --help"_s},
+        {u"play x"_s, u"Unbekannter Befehl: sing"_s, u"tunestead-cli --help"_s},
         {u"--verbose"_s, u"Unbekannter Befehl: --verbose"_s, u"tunestead-cli --help"_s},
         {u"info"_s, u"DATEI fehlt."_s, u"tunestead-cli info --help"_s},
         {u"info --nix=3 a"_s, u"Unbekannte Option: --nix"_s, u"tunestead-cli info --help"_s},
