@@ -50,9 +50,9 @@ TEST_F(CrossFadeTest, OneToneFallsAsTheOtherRises) {
     for (int i = 0; i < 16; ++i) {
         const std::size_t from = HeardFrames() + Mixer::kBlock;
         EXPECT_FALSE(Tick());
-        const int percent = 100 * i * kStep / static_cast<int>(kFade);
-        EXPECT_NEAR(AmplitudeOf(kOld, *heard, from, Frames(0.2)), 0.0045 * (100 - percent), 0.002) << i;
-        EXPECT_NEAR(AmplitudeOf(kNew, *heard, from, Frames(0.2)), 0.0045 * percent, 0.002) << i;
+        const int left = 100 * (16 - i) * kStep / static_cast<int>(kFade);
+        EXPECT_NEAR(AmplitudeOf(kOld, *heard, from, Frames(0.2)), 0.0045 * left, 0.002) << i;
+        EXPECT_NEAR(AmplitudeOf(kNew, *heard, from, Frames(0.2)), 0.0045 * (100 - left), 0.002) << i;
     }
     EXPECT_FALSE(Tick());  // the end itself
     EXPECT_EQ(oldSound.GetStatus(), psPlaying);
