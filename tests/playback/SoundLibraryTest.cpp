@@ -247,7 +247,7 @@ TEST_F(SoundLibraryTest, LostDeviceIsOpenedAgainWhenItIsBack) {
     EXPECT_EQ(playing.FSOUND_GetError(), FMOD_ERR_PLAY);
     lost = false;
     EXPECT_EQ(play(), -1);  // not asked for at every call
-    clock.ticks += 2000;
+    clock.ticks += 5000;
     EXPECT_GE(play(), 0);
     EXPECT_EQ(playing.FSOUND_Stream_GetTime(stream), 0);
     while (playing.FramesPlayed() == played)
