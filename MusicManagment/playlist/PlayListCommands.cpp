@@ -37,7 +37,7 @@ void TPlayList::SetPlayListFileName(const QString& fileName) {
     try {
         Replace(ReadPlayList(fileName), fileName);
     } catch (const EUnknownPlayListVersion&) {
-        Clear();
+        Replace({}, {});  // without a name, so that nothing empty is saved over a list
         throw;
     }
 }
