@@ -51,6 +51,7 @@ void TPlayList::Replace(std::vector<PlayListEntry> entries, const QString& fileN
 
 std::vector<EntryToSave> TPlayList::EntriesForSaving() const {
     std::vector<EntryToSave> entries;
+    entries.reserve(static_cast<std::size_t>(Count()));
     for (int index = 0; index < Count(); ++index)
         entries.push_back({&Entry(index), ResolvedPath(NameAt(index), {.Ask = false})});
     return entries;
