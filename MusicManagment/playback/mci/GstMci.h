@@ -1,0 +1,42 @@
+#pragma once
+
+#include <map>
+#include <memory>
+
+#include "MusicManagment/playback/mci/MciInterface.h"
+
+enum class MciSound {
+    Audible,
+    Silent,  // in real time all the same
+};
+
+// Silent when the environment variable TUNESTEAD_AUDIO says "null".
+MciSound MciSoundOfEnvironment();
+
+// The media control interface on GStreamer: a device is a player of its own, with its own way to the
+// loudspeaker.
+class GstMci : public MciInterface {
+ public:
+    explicit GstMci(MciSound sound = MciSoundOfEnvironment());
+    ~GstMci() override;
+
+    // Whether GStreamer has a part that is needed for playing, as "playbin" or "wavparse".
+    static bool HasPart(const char* name);
+
+    quint32 SendCommand(quint32 device, MciCommand command, quint32 flags,
+                        MciParameters& parameters) override;
+    QString ErrorString(quint32 error) override;
+
+ private:
+    class Device;
+
+    quint32 Open(MciParameters& parameters);
+    // Keeps the text for ErrorString; an empty one is no error.
+    quint32 Result(const QString& text);
+
+    MciSound sound_;
+    std::map<quint32, std::unique_ptr<Device>> devices_;
+    quint32 lastDevice_ = 0;
+    quint32 lastError_ = 0;
+    QString lastErrorText_;
+};
