@@ -5,6 +5,7 @@
 
 #include "CommonRUKTools/AbsolutePath.h"
 #include "CommonRUKTools/Dialogs.h"
+#include "CommonRUKTools/RWReg.h"
 #include "app/MainWindow.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/Installation.h"
@@ -115,7 +116,7 @@ int Start(QtDialogs& dialogs, const StartRequest& request) {
 #endif
     return RunWindow(dialogs, instance,
                      {.Files = files,
-                      .SettingsFile = UserSettingsFile(),
+                      .SettingsFile = TRWReg::DefaultFile(),
                       .Arguments = request.Arguments,
                       .Setup = setup,
                       .OfferWizard = true});

@@ -187,7 +187,7 @@ class RefusingTrash : public Trash {
 
 TEST_F(InstallationTest, TheUserSaysWhatGoesWithTheProgram) {
     const StandardFiles files{In(u"data/tunestead"_s)};
-    const QString settings = In(u"config/tunestead.ini"_s);
+    const QString settings = In(u"config/tunestead.conf"_s);
     ScriptedDialogs dialogs;
     RefusingTrash trash;
     InstallationSteps steps(&installation_, files, settings);
@@ -197,7 +197,7 @@ TEST_F(InstallationTest, TheUserSaysWhatGoesWithTheProgram) {
     EXPECT_TRUE(dialogs.Messages[0].contains(complaint_));
     Write(u"data/tunestead/Tunestead3_Database.tsdb"_s, "songs");
     Write(u"data/tunestead/Tunestead3_BannList.str"_s, "A - 1");
-    Write(u"config/tunestead.ini"_s, "[settings]");
+    Write(u"config/tunestead.conf"_s, "[settings]");
     const QStringList before = Files();
 
     dialogs.Answers = {kNo};
@@ -216,7 +216,7 @@ TEST_F(InstallationTest, TheUserSaysWhatGoesWithTheProgram) {
     EXPECT_EQ(dialogs.Questions.value(1), u"Soll die Datenbank ebenfalls entfernt werden?"_s);
     EXPECT_EQ(dialogs.Questions.size(), 4);
     EXPECT_EQ(trash.Taken, QStringList{files.Database()});
-    EXPECT_EQ(Files(), QStringList({u"config/tunestead.ini"_s, u"data/tunestead/Tunestead3_BannList.str"_s}));
+    EXPECT_EQ(Files(), QStringList({u"config/tunestead.conf"_s, u"data/tunestead/Tunestead3_BannList.str"_s}));
     EXPECT_TRUE(steps.Removed().Program && steps.Removed().Database);
     EXPECT_FALSE(steps.Removed().Lists || steps.Removed().Settings);
 }
