@@ -1,0 +1,193 @@
+#pragma once
+
+#include <QObject>
+#include <QPointer>
+#include <QSet>
+#include <QString>
+#include <QStringList>
+#include <functional>
+#include <memory>
+#include <random>
+#include <vector>
+
+#include "CommonRUKTools/MenuItem.h"
+#include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/Settings.h"
+#include "MusicManagment/playlist/EntryList.h"
+#include "MusicManagment/playlist/PlayListTypes.h"
+
+class PlayListView;
+class SongPlayer;
+
+// How one entry is played.
+struct PlayOptions {
+    SongChange Change = SongChange::Hard;
+    SongIndex DatabaseHint = -1;  // where the song probably stands in the database
+    bool Record = true;           // put it into the history
+};
+
+// The songs to play: which of them comes next, which have been played in this round, which the user wants
+// next. Single-threaded. Positions are 0 to Count() - 1.
+class TPlayList : public QObject, public SettingsClient {
+ public:
+    explicit TPlayList(QObject* parent = nullptr);
+    ~TPlayList() override;
+
+    // --- Entries, in display order ---
+    int Count() const { return entries_.Count(); }
+    const PlayListEntry& Entry(int index) const { return entries_.At(index); }
+    // The first entry with this name; an empty name means the current song. -1 when it is not listed.
+    int IndexOf(const QString& name = QString()) const;
+    // Playing time of all entries with a record, in seconds.
+    qint64 TotalSeconds() const { return entries_.TotalSeconds(); }
+
+    // Each inserts before `position`, which is brought into the range 0 to Count(). The first takes a song of
+    // the database; throws EPlayListException without a database, and for a song that it does not have.
+    void InsertSong(int position, SongIndex song);
+    void Insert(int position, PlayListEntry entry);
+    // What a drop brings (Drop.cpp): songs, folders with the songs in them, playlists with their entries. Of
+    // songs the record is taken from the database or read from the file. Returns how many entries were
+    // inserted. Throws EPlayListException or EStreamError for a playlist that cannot be read.
+    int InsertFiles(int position, const QStringList& paths);
+
+    void Remove(int index);
+    // Any order, duplicates allowed.
+    void Remove(std::vector<int> indices);
+    // Begins an empty list and a new round.
+    void Clear();
+    // Brings these entries, in their order, before the entry that stands at `before` now. Returns where the
+    // first of them is then.
+    int Move(std::vector<int> indices, int before);
+    // Reads the entry's record anew from the database or the file.
+    void RefreshRecord(int index, SongIndex databaseHint = -1);
+    // Removes each entry whose file is not there now; returns how many.
+    int RemoveUnavailable();
+
+    // --- Queue: names that are played before the order goes on, the next one first ---
+    const QStringList& Queue() const { return queue_; }
+    // Puts entries at the end; one that waits already keeps its place.
+    void Enqueue(int index);
+    void Dequeue(int index);
+    // 0 is played next; -1 not queued.
+    int QueuePosition(int index) const;
+
+    // --- Playing (Next.cpp) ---
+    // Plays an entry. False when its file cannot be found; the song that plays then plays on. Throws
+    // EPlayListException without a player, and what the player throws.
+    bool PlayEntry(int index, const PlayOptions& options = {});
+    // Plays what queue and order choose; an entry that cannot be played is passed over, and the user is told
+    // once a round why. False when there is no next song: the user has been told that too. Throws
+    // EPlayListException without a player.
+    bool PlayNext(SongChange change = SongChange::Hard);
+    // Whether PlayNext would find an entry; tells nobody and changes nothing.
+    bool HasNext() const;
+    // Goes back to the song that was played before the current one, which becomes the next one. False when
+    // there is none.
+    bool PlayPrevious(SongChange change = SongChange::Hard);
+    bool HasPrevious() const { return history_.size() >= 2; }
+
+    // The entry that plays, by its name in the list; empty before the first.
+    const QString& CurrentSong() const { return currentSong_; }
+    // The file that the player was given: the song or its copy.
+    const QString& CurrentFile() const { return currentFile_; }
+    // What was played in this round, the latest first.
+    const QStringList& History() const { return history_; }
+    // Forgets what was played.
+    void StartNewRound();
+    // Has the database mark the song of an entry; -1 is the entry with the focus in the view. False when the
+    // database does not have it.
+    bool MarkSong(int index = -1);
+
+    // --- Files (PlayListFiles.h, PlayListCommands.cpp) ---
+    const QString& PlayListFileName() const { return playListFileName_; }
+    // Loads the list; an empty name begins an empty one. Throws EPlayListException or EStreamError; the list
+    // is then as it was, but empty when the file is of an unknown version.
+    void SetPlayListFileName(const QString& fileName);
+    // The format goes by the extension. Throws EStreamError; an existing file is then as it was.
+    void Save(const QString& fileName);
+    // Saves under the known name, or asks for one. False when the user cancelled.
+    bool SaveOrAsk(bool askForName = false);
+    // Makes the folder, and in it a link to each song. Throws EStreamError.
+    void ExportAsLinks(const QString& folder);
+
+    // --- Properties ---
+    TPlayOrder PlayOrder() const { return playOrder_; }
+    void SetPlayOrder(TPlayOrder order) { playOrder_ = order; }
+    // Intro scan: each song is played for ScanTime milliseconds. Both go on to the player.
+    bool Scan() const { return scan_; }
+    void SetScan(bool scan);
+    int ScanTime() const { return scanTime_; }
+    void SetScanTime(int milliseconds);
+    // Whether a new round begins when all songs have been played.
+    bool RepeatAll() const { return repeatAll_; }
+    void SetRepeatAll(bool value) { repeatAll_ = value; }
+    // Whether songs are played from a copy in the temporary folder, so that the medium can be taken out.
+    bool CopyMp3sBeforePlay() const { return copyMp3sBeforePlay_; }
+    void SetCopyMp3sBeforePlay(bool value) { copyMp3sBeforePlay_ = value; }
+
+    // --- Wiring ---
+    TMusicDatabase* MusicDatabase() const { return database_; }
+    // The database gets its reference to this list, and keeps its settings.
+    void SetMusicDatabase(TMusicDatabase* database);
+    SongPlayer* PlaySound() const { return player_; }
+    // A player tells when it goes: SetPlaySound(nullptr).
+    void SetPlaySound(SongPlayer* player);
+    QObject* RemoteControl() const { return remoteControl_; }
+    void SetRemoteControl(QObject* component) { remoteControl_ = component; }
+    PlayListView* View() const { return view_; }
+    // A view tells when it goes: SetView(nullptr).
+    void SetView(PlayListView* view) { view_ = view; }
+    void RefreshView();
+    void RedrawView();
+    // The source of random choices; seeded differently in every run.
+    void SetRandom(const std::mt19937& random) { random_ = random; }
+
+    // --- Command menu (PlayListMenu.h) ---
+    // Built at the first call.
+    TMenuExItem& Menu();
+    // Runs the operation behind an item; false when nobody knows the command. Throws what it throws.
+    bool ClickMenuItem(int id);
+
+    // --- Settings ---
+    void LoadSettings(const TRWReg& settings) override;
+    void SaveSettings(TRWReg& settings) const override;
+
+    // --- Events ---
+    // A round has ended. `showException` is whether the user is told; false unless the handler sets it.
+    std::function<void(TPlayList&, bool& showException)> OnAllFilesPlayed;
+    // Index -1: the whole list (ctRemoved: it was emptied).
+    std::function<void(TPlayList&, int index, TChangeType change)> OnChange;
+
+ private:
+    class Search;
+
+    void RaiseChange(int index, TChangeType change);
+    const QString& NameAt(int index) const { return entries_.At(index).Name; }
+    QString PlayablePath(const QString& name) const;
+    bool Play(int index, const PlayOptions& options);
+    bool StartPlayer(SongChange change);
+    void HandleAllPlayed();
+
+    EntryList entries_;
+    QStringList history_;
+    QStringList queue_;
+    QString currentSong_;
+    QString currentFile_;
+    QString playListFileName_;
+    QSet<QString> told_;  // entries whose failure the user has been told of in this round
+    std::mt19937 random_;
+
+    TPlayOrder playOrder_ = poDownwards;
+    int scanTime_ = 10000;
+    bool scan_ = false;
+    bool repeatAll_ = false;
+    bool copyMp3sBeforePlay_ = false;
+    bool searching_ = false;
+    bool roundIsOver_ = false;
+
+    QPointer<TMusicDatabase> database_;
+    QPointer<QObject> remoteControl_;
+    SongPlayer* player_ = nullptr;
+    PlayListView* view_ = nullptr;
+    std::unique_ptr<TMenuExItem> menu_;
+};
