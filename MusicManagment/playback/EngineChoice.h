@@ -1,0 +1,42 @@
+#pragma once
+
+#include <QString>
+#include <exception>
+#include <functional>
+#include <map>
+#include <memory>
+#include <optional>
+#include <vector>
+
+#include "MusicManagment/playback/PlaySoundContainer.h"
+#include "MusicManagment/playback/PlaySoundSettings.h"
+
+// The sound engines, in the order in which they are preferred.
+enum class TEngine { FMOD, EldoS, MCI, WinAmp };
+
+// "FMOD", "EldoS", "MCI" or "WinAmp".
+QString EngineName(TEngine engine);
+
+bool IsAllowed(TEngine engine, const EngineSettings& settings);
+
+// The first engine that is allowed and takes files with this extension; nothing when there is none.
+std::optional<TEngine> ChooseEngine(const QString& fileName, const EngineSettings& settings);
+
+// The engines that are tried after this one has failed, whether or not they take such files; those that are
+// not allowed are left out.
+std::vector<TEngine> EnginesAfter(TEngine failed, const EngineSettings& settings);
+
+// Makes back ends. The player knows the engines only by this table, so that a build can leave engines out and
+// a test can put its own in.
+class EngineTable {
+ public:
+    using Maker = std::function<std::unique_ptr<TPlaySoundContainer>(const EngineSettings&)>;
+
+    // Replaces the former maker.
+    void Register(TEngine engine, Maker maker) { makers_[engine] = std::move(maker); }
+    // Throws EPlaySoundException when nothing is registered, and what the engine throws.
+    std::unique_ptr<TPlaySoundContainer> Create(TEngine engine, const EngineSettings& settings) const;
+
+ private:
+    std::map<TEngine, Maker> makers_;
+};
