@@ -14,11 +14,28 @@ bool IsLineEnd(QChar character) {
     return character == u'\r' || character == u'\n';
 }
 
+bool IsHexDigit(char character) {
+    return (character >= '0' && character <= '9') || (character >= 'A' && character <= 'F') ||
+           (character >= 'a' && character <= 'f');
+}
+
 // ':' + 8 hexadecimal digits + ':'
 bool IsStoredCdPath(const QString& text) {
     if (text.size() < 10 || text[0] != u':' || text[9] != u':') return false;
     const QStringView digits = QStringView(text).sliced(1, 8);
-    return std::ranges::all_of(digits, [](QChar digit) { return isxdigit(digit.toLatin1()) != 0; });
+    return std::ranges::all_of(digits, [](QChar digit) { return IsHexDigit(digit.toLatin1()); });
+}
+
+// "%20" is a blank; a percent sign without two hexadecimal digits is itself.
+QByteArray PercentDecoded(const QByteArray& text) {
+    QByteArray bytes;
+    for (qsizetype i = 0; i < text.size(); ++i) {
+        const bool isCode =
+            text[i] == '%' && i + 2 < text.size() && IsHexDigit(text[i + 1]) && IsHexDigit(text[i + 2]);
+        bytes += isCode ? QByteArray::fromHex(text.sliced(i + 1, 2)).front() : text[i];
+        if (isCode) i += 2;
+    }
+    return bytes;
 }
 
 // The path of a file: address on this computer (RFC 8089); empty for anything else.
@@ -32,7 +49,7 @@ QString LocalPath(const QString& text) {
         if (!host.isEmpty() && host.compare("localhost"_L1, Qt::CaseInsensitive) != 0) return {};
         rest = rest.sliced(path);
     }
-    const QByteArray bytes = QByteArray::fromPercentEncoding(rest.toUtf8());
+    const QByteArray bytes = PercentDecoded(rest.toUtf8());
     if (bytes.contains('\0')) return {};
     const QString path =
         CodePage::FromSystem(AsBytes({bytes.constData(), static_cast<std::size_t>(bytes.size())}));
@@ -73,7 +90,9 @@ QString NameFromList(const QString& text) {
     const QString local = LocalPath(text);
     if (!local.isEmpty()) return AbsolutePath(local);
     const bool isAsItIs = text.size() < 2 || text[1] == u':' || IsStoredCdPath(text) || IsAddress(text);
-    return isAsItIs ? text : AbsolutePath(text);
+    if (isAsItIs) return text;
+    // Qt takes a name that begins with a colon for one inside the program, and so for absolute.
+    return AbsolutePath(text.startsWith(u':') ? QDir::currentPath() + u'/' + text : text);
 }
 
 QString NameFromList(ByteSpan text) {

@@ -72,7 +72,7 @@ bool TPlayList::SaveOrAsk(bool askForName) {
 void TPlayList::ExportAsLinks(const QString& folder) {
     QStringList paths;
     for (const EntryToSave& entry : EntriesForSaving())
-        if (!entry.Path.isEmpty() && !IsAddress(entry.Path)) paths << entry.Path;
+        if (!entry.Path.isEmpty() && !IsCdPath(entry.Path) && !IsAddress(entry.Path)) paths << entry.Path;
     WriteLinkFolder(folder, paths);
 }
 

@@ -1,0 +1,45 @@
+#pragma once
+
+#include <memory>
+#include <optional>
+
+#include "MusicManagment/playback/ExternalPlayer.h"
+#include "MusicManagment/playback/PlaySoundSettings.h"
+
+// The player's side of the way to a separate player program: finds it, starts it, and keeps it informed of
+// the settings.
+class ExternalLink {
+ public:
+    enum class Reached {
+        No,
+        Known,
+        New,  // a player program that has just got to know this one; it has no song yet
+    };
+
+    // The receiver must outlive the link.
+    ExternalLink(std::unique_ptr<ExternalPlayer> player, FeedbackReceiver& receiver)
+        : player_(std::move(player)), receiver_(receiver) {}
+
+    // Looks for a player program that runs. One that is met for the first time is told where feedback goes
+    // and all the settings. Throws EPlaySoundException when there is no place for feedback.
+    Reached Find(const EngineSettings& settings);
+    // The same, but starts the player program when none runs and gives it three seconds to come up.
+    Reached FindOrStart(const EngineSettings& settings);
+
+    // Tells the player program, when one runs, what differs.
+    void SendChanges(const EngineSettings& before, const EngineSettings& after);
+    qint64 Send(ExternalCommand command, qint64 parameter = 0) {
+        return player_->SendCommand(command, parameter);
+    }
+    qint64 SendText(ExternalCommand command, const QString& text) { return player_->SendText(command, text); }
+
+ private:
+    bool Start();
+    void Greet(const EngineSettings& settings);
+    void MakeFeedback();
+
+    std::unique_ptr<ExternalPlayer> player_;
+    FeedbackReceiver& receiver_;
+    std::optional<qint64> known_;     // the player program that has been greeted
+    std::optional<qint64> feedback_;  // our number for feedback
+};
