@@ -1,13 +1,12 @@
 #pragma once
 
-#include <QHash>
 #include <QList>
 #include <functional>
 
-class QAction;
-class QMenu;
+#include "app/CommandMenu.h"
+#include "app/MenuIcons.h"
+
 class QMenuBar;
-class TMenuExItem;
 class TMusicDatabase;
 
 // The main window's menu: the command menu of the database as the toolkit shows it, and "Beenden".
@@ -17,6 +16,8 @@ class MainMenu {
     MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(int id)> run,
              std::function<void()> exit);
 
+    // The keys of commands that are about single songs then work only in their list.
+    void BindTo(QWidget& songList);
     // While a long operation runs every command of the database rests.
     void SetRunning(bool running);
     // Enables, disables and marks the items as the database's menu says now; builds them anew when the
@@ -28,16 +29,15 @@ class MainMenu {
  private:
     void Build();
     void AddExit();
-    void AddItems(QMenu& menu, const TMenuExItem& item);
-    void AddCommand(QMenu& menu, const TMenuExItem& item);
+    void Run(int id);
 
     QMenuBar& bar_;
     TMusicDatabase& database_;
     std::function<void(int)> run_;
     std::function<void()> exit_;
     QList<QMenu*> menus_;
-    bool readOnly_ = false;         // as the menus were built for
-    QHash<int, QAction*> actions_;  // by number
+    CommandMenu commands_{[this](int id) { Run(id); }, &MenuIcon};
+    bool readOnly_ = false;  // as the menus were built for
     QMenu* songMenu_ = nullptr;
     bool running_ = false;
 };

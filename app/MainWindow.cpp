@@ -21,6 +21,7 @@
 #include "MusicManagment/database/Settings.h"
 #include "app/CommandRunner.h"
 #include "app/MainMenu.h"
+#include "app/Playing.h"
 #include "app/SongCommands.h"
 #include "app/Startup.h"
 #include "app/ToolWindows.h"
@@ -138,7 +139,11 @@ void TTunesteadMainWnd::SetUpMenu() {
     };
     songCommands_->OnFind = [this] { filter_->Activate(); };
     songCommands_->OnFindNext = [this] { FindNext(); };
-    toolWindows_->AddTo(*menuBar()->addMenu(u"Fe&nster"_s));
+    menu_->BindTo(*list_);
+    playing_->AddMenusTo(*menuBar());
+    QMenu& windows = *menuBar()->addMenu(u"Fe&nster"_s);
+    toolWindows_->AddTo(windows);
+    playing_->AddTo(windows);
     list_->OnContextMenu = [this](const QPoint& place) { menu_->SongMenu().popup(place); };
 }
 
@@ -150,6 +155,9 @@ void TTunesteadMainWnd::SetUpToolWindows() {
     };
     connect(list_->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
             [this](const QModelIndex& song) { toolWindows_->ShowSong(shown_.SongAt(song.row())); });
+    playing_ =
+        std::make_unique<Playing>(*this, database_, *list_, options_.Files.PlayList(), options_.Engines);
+    playing_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
 }
 
 void TTunesteadMainWnd::RunMenuCommand(int id) {
@@ -158,7 +166,7 @@ void TTunesteadMainWnd::RunMenuCommand(int id) {
 
 // Commands that need the window or the collection's file; everything else is the database's.
 bool TTunesteadMainWnd::RunOwnCommand(int id) {
-    return commands_.Run(id) || songCommands_->Run(id) || toolWindows_->Run(id);
+    return commands_.Run(id) || songCommands_->Run(id) || toolWindows_->Run(id) || playing_->Run(id);
 }
 
 void TTunesteadMainWnd::LoadSettings() {
@@ -194,7 +202,9 @@ void TTunesteadMainWnd::SetUpPlacement() {
 }
 
 void TTunesteadMainWnd::StartOnce() {
-    if (!Startup(database_, commands_).Run(options_.Arguments)) close();
+    Startup startup(database_, commands_);
+    startup.OnOpened = [this] { playing_->OpenStandardList(); };
+    if (!startup.Run(options_.Arguments)) close();
 }
 
 // --- What follows the database ---
@@ -242,7 +252,7 @@ void TTunesteadMainWnd::ShowMarked() {
 // --- Files from other windows ---
 
 void TTunesteadMainWnd::dragEnterEvent(QDragEnterEvent* event) {
-    if (LocalFiles(*event->mimeData()).isEmpty()) return;
+    if (event->source() != nullptr || LocalFiles(*event->mimeData()).isEmpty()) return;
     event->setDropAction(Qt::CopyAction);  // the files stay where they are
     event->accept();
     empty_->SetDropMark(true);
@@ -269,6 +279,7 @@ void TTunesteadMainWnd::closeEvent(QCloseEvent* event) {
     if (database_.ProgressRunning()) return OfferToStop();
     if (!commands_.MayClose()) return;
     RunCommand([this] { StoreSettings(); });
+    RunCommand([this] { playing_->Close(); });
     event->accept();
 }
 

@@ -5,6 +5,7 @@
 #include <QTimer>
 
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/playback/EngineChoice.h"
 #include "app/CollectionCommands.h"
 #include "app/desktop/ProgressDisplay.h"
 #include "app/models/CollectionTotals.h"
@@ -14,6 +15,7 @@
 class EmptyState;
 class FilterField;
 class MainMenu;
+class Playing;
 class QLabel;
 class QStackedWidget;
 class QToolButton;
@@ -26,6 +28,7 @@ struct MainWindowOptions {
     StandardFiles Files{};
     QString SettingsFile{};
     QStringList Arguments{};  // of the command line, without the program's name
+    EngineTable Engines{};    // that songs are played with
 };
 
 // The program's main window: owns the collection and brings together what shows it and what works on it.
@@ -73,6 +76,7 @@ class TTunesteadMainWnd : public QMainWindow {
     std::unique_ptr<SongCommands> songCommands_;
     std::unique_ptr<MainMenu> menu_;
     std::unique_ptr<ToolWindows> toolWindows_;
+    std::unique_ptr<Playing> playing_;
     QStackedWidget* centre_ = nullptr;
     QWidget* listPage_ = nullptr;
     FilterField* filter_ = nullptr;

@@ -12,6 +12,7 @@ using namespace Qt::StringLiterals;
 
 bool Startup::Run(const QStringList& arguments) {
     if (!OpenStandardDatabase()) return false;
+    if (OnOpened) OnOpened();
     ActOn(arguments);
     return true;
 }

@@ -13,6 +13,9 @@ class Startup {
     Startup(TMusicDatabase& database, CollectionCommands& commands)
         : database_(database), commands_(commands) {}
 
+    // The standard database is open; the other standard files are to be opened.
+    std::function<void()> OnOpened;
+
     // `arguments` without the program's name. False when the user does not want to go on.
     bool Run(const QStringList& arguments);
 

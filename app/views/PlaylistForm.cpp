@@ -54,7 +54,7 @@ TPlaylistForm::TPlaylistForm(TPlayList& list, QWidget* parent)
     totals_->setObjectName(u"playListTotals"_s);
 
     auto* layout = new QVBoxLayout(contents);
-    layout->setContentsMargins(0, 0, 0, 0);
+    layout->setContentsMargins(4, 0, 4, 0);
     layout->setSpacing(0);
     layout->addWidget(MakeOptions());
     layout->addWidget(view_, 1);
@@ -78,7 +78,7 @@ QWidget* TPlaylistForm::MakeOptions() {
     SetUpScan();
     auto* options = new QWidget(widget());
     auto* layout = new QHBoxLayout(options);
-    layout->setContentsMargins(4, 4, 4, 4);
+    layout->setContentsMargins(0, 4, 0, 4);
     layout->setSpacing(4);
     layout->addWidget(order_, 1);
     layout->addWidget(repeat_);

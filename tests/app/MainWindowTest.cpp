@@ -351,10 +351,10 @@ TEST_F(MainWindowTest, TheMenuFollowsADatabaseThatBecomesReadOnly) {
 
 TEST_F(MainWindowTest, TheWindowKeepsItsSizeBetweenTwoStarts) {
     Start();
-    window_->resize(640, 420);
+    window_->resize(800, 520);
     window_->close();
     Start();
-    EXPECT_EQ(window_->size(), QSize(640, 420));
+    EXPECT_EQ(window_->size(), QSize(800, 520));
 }
 
 TEST_F(MainWindowTest, FindsSongsFromTheFilterLineAndGoesOn) {
