@@ -94,7 +94,7 @@ void ExternalLink::MakeFeedback() {
 }
 
 void ExternalLink::SendChanges(const EngineSettings& before, const EngineSettings& after) {
-    if (before == after || Find(after) != Reached::Known) return;  // a new one has been told everything
+    if (!Runs()) return;  // a new one is told everything when it is met
     for (const NumberRow& row : kNumbers)
         if (row.Value(before) != row.Value(after)) Send(row.Command, row.Value(after));
     for (const TextRow& row : kTexts)

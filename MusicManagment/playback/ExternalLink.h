@@ -20,13 +20,14 @@ class ExternalLink {
     ExternalLink(std::unique_ptr<ExternalPlayer> player, FeedbackReceiver& receiver)
         : player_(std::move(player)), receiver_(receiver) {}
 
-    // Looks for a player program that runs. One that is met for the first time is told where feedback goes
-    // and all the settings. Throws EPlaySoundException when there is no place for feedback.
-    Reached Find(const EngineSettings& settings);
-    // The same, but starts the player program when none runs and gives it three seconds to come up.
+    // Whether the player program that this one knows still runs.
+    bool Runs() { return known_ && player_->Find() == known_; }
+    // Looks for a player program, starts it when none runs, and gives it three seconds to come up. One that is
+    // met for the first time is told where feedback goes and all the settings. Throws EPlaySoundException
+    // when there is no place for feedback.
     Reached FindOrStart(const EngineSettings& settings);
 
-    // Tells the player program, when one runs, what differs.
+    // Tells the player program, when the one it knows runs, what differs.
     void SendChanges(const EngineSettings& before, const EngineSettings& after);
     qint64 Send(ExternalCommand command, qint64 parameter = 0) {
         return player_->SendCommand(command, parameter);
@@ -34,6 +35,7 @@ class ExternalLink {
     qint64 SendText(ExternalCommand command, const QString& text) { return player_->SendText(command, text); }
 
  private:
+    Reached Find(const EngineSettings& settings);
     bool Start();
     void Greet(const EngineSettings& settings);
     void MakeFeedback();

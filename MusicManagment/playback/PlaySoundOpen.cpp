@@ -101,7 +101,7 @@ void TPlaySound::SetPlayExtern(bool value) {
 }
 
 bool TPlaySound::ExternalRuns() {
-    return playExtern_ && external_->Find(settings_) != ExternalLink::Reached::No;
+    return playExtern_ && external_->Runs();
 }
 
 // Hands the song over. False when songs are played here, be it from now on.

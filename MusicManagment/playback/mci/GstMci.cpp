@@ -191,6 +191,13 @@ quint32 GstMci::Device::Mode() const {
 GstMci::GstMci() = default;
 GstMci::~GstMci() = default;
 
+bool GstMci::HasPart(const char* name) {
+    if (!gst_init_check(nullptr, nullptr, nullptr)) return false;
+    GstElementFactory* factory = gst_element_factory_find(name);
+    if (factory != nullptr) gst_object_unref(factory);
+    return factory != nullptr;
+}
+
 quint32 GstMci::Result(const QString& text) {
     if (text.isEmpty()) return 0;
     lastErrorText_ = text;

@@ -12,6 +12,9 @@ class GstMci : public MciInterface {
     GstMci();
     ~GstMci() override;
 
+    // Whether GStreamer has a part that is needed for playing, as "playbin" or "wavparse".
+    static bool HasPart(const char* name);
+
     quint32 SendCommand(quint32 device, MciCommand command, quint32 flags,
                         MciParameters& parameters) override;
     QString ErrorString(quint32 error) override;
