@@ -18,6 +18,8 @@ class MainMenu {
 
     // The keys of commands that are about single songs then work only in their list.
     void BindTo(QWidget& songList);
+    // Adds the items for the options and the set-up, to the end of the menu "Extras" where there is one.
+    void AddSettings(std::function<void()> options, std::function<void()> wizard);
     // While a long operation runs every command of the database rests.
     void SetRunning(bool running);
     // Enables, disables and marks the items as the database's menu says now; builds them anew when the
@@ -28,6 +30,7 @@ class MainMenu {
 
  private:
     void Build();
+    void BuildSettings(QMenu& menu);
     void AddExit();
     void Run(int id);
 
@@ -35,9 +38,12 @@ class MainMenu {
     TMusicDatabase& database_;
     std::function<void(int)> run_;
     std::function<void()> exit_;
+    std::function<void()> options_;
+    std::function<void()> wizard_;
     QList<QMenu*> menus_;
     CommandMenu commands_{[this](int id) { Run(id); }, &MenuIcon};
     bool readOnly_ = false;  // as the menus were built for
+    QList<QAction*> settings_;
     QMenu* songMenu_ = nullptr;
     bool running_ = false;
 };

@@ -22,6 +22,7 @@
 #include "app/CommandRunner.h"
 #include "app/MainMenu.h"
 #include "app/Playing.h"
+#include "app/SettingsCommands.h"
 #include "app/SongCommands.h"
 #include "app/Startup.h"
 #include "app/ToolWindows.h"
@@ -137,6 +138,11 @@ void TTunesteadMainWnd::SetUpMenu() {
         toolWindows_->MarkMenu();
         menu_->Update();
     };
+    settingsCommands_ =
+        std::make_unique<SettingsCommands>(*this, database_, kSettingsKey.toString(), options_.SettingsFile);
+    settingsCommands_->OnApplied = [this] { menu_->Update(); };
+    menu_->AddSettings([this] { RunCommand([this] { settingsCommands_->ShowOptions(); }); },
+                       [this] { RunCommand([this] { settingsCommands_->ShowWizard(); }); });
     songCommands_->OnFind = [this] { filter_->Activate(); };
     songCommands_->OnFindNext = [this] { FindNext(); };
     menu_->BindTo(*list_);
@@ -204,7 +210,11 @@ void TTunesteadMainWnd::SetUpPlacement() {
 void TTunesteadMainWnd::StartOnce() {
     Startup startup(database_, commands_);
     startup.OnOpened = [this] { playing_->OpenStandardList(); };
-    if (!startup.Run(options_.Arguments)) close();
+    if (!startup.Run(options_.Arguments)) {
+        close();
+        return;
+    }
+    if (firstTime_ && options_.OfferWizard) RunCommand([this] { settingsCommands_->OfferWizard(); });
 }
 
 // --- What follows the database ---

@@ -19,6 +19,7 @@ class Playing;
 class QLabel;
 class QStackedWidget;
 class QToolButton;
+class SettingsCommands;
 class SongCommands;
 class SongListWidget;
 class ToolWindows;
@@ -27,8 +28,9 @@ class ToolWindows;
 struct MainWindowOptions {
     StandardFiles Files{};
     QString SettingsFile{};
-    QStringList Arguments{};  // of the command line, without the program's name
-    EngineTable Engines{};    // that songs are played with
+    QStringList Arguments{};   // of the command line, without the program's name
+    bool OfferWizard = false;  // at the first start
+    EngineTable Engines{};     // that songs are played with
 };
 
 // The program's main window: owns the collection and brings together what shows it and what works on it.
@@ -74,6 +76,7 @@ class TTunesteadMainWnd : public QMainWindow {
     CollectionCommands commands_;
     ProgressDisplay progress_;
     std::unique_ptr<SongCommands> songCommands_;
+    std::unique_ptr<SettingsCommands> settingsCommands_;
     std::unique_ptr<MainMenu> menu_;
     std::unique_ptr<ToolWindows> toolWindows_;
     std::unique_ptr<Playing> playing_;

@@ -58,7 +58,10 @@ int main(int argc, char** argv) {
     SetUserDialogs(&dialogs);
     int result = 0;
     {
-        TTunesteadMainWnd window({LocateStandardFiles(), UserSettingsFile(), files});
+        TTunesteadMainWnd window({.Files = LocateStandardFiles(),
+                                  .SettingsFile = UserSettingsFile(),
+                                  .Arguments = files,
+                                  .OfferWizard = true});
         dialogs.SetMainWindow(&window);
         const Termination termination([&window] { window.End(); });
         window.show();

@@ -44,3 +44,10 @@ QString BuildNameFromPattern(const QString& pattern, const QString& path, const 
     const QString extension = dot > slash ? path.mid(dot) : QString();
     return path.left(slash + 1) + MakeValidFileName(name) + extension;
 }
+
+QStringList NamePatternPlaceholders() {
+    QStringList names;
+    for (const auto& value : Values(TID3Tag()))
+        names << value.first;
+    return names;
+}

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QString>
+#include <QStringList>
 
 #include "ReadMPEGHeader/ID3Tag.h"
 
@@ -8,3 +9,6 @@
 // are kept, the place-holders are replaced one after the other (a value that itself holds a later
 // place-holder is expanded too, on purpose), and the result is made a valid file name.
 QString BuildNameFromPattern(const QString& pattern, const QString& path, const TID3Tag& info);
+
+// The place-holders of a pattern, in the order in which they are replaced.
+QStringList NamePatternPlaceholders();

@@ -188,13 +188,17 @@ UpdateResult UpdateDatabase(TMusicDatabase& database, UpdateTags tags) {
     return result;
 }
 
-void RememberFolders(TMusicDatabase& database, const QStringList& folders) {
-    QStringList remembered = database.UpdateFolders();
-    for (const QString& folder : folders) {
-        if (remembered.contains(folder) || LiesBelow(folder, remembered)) continue;
-        remembered.removeIf([&folder](const QString& other) { return LiesBelow(other, {folder}); });
-        remembered << folder;
+QStringList MergeFolders(QStringList folders, const QStringList& more) {
+    for (const QString& folder : more) {
+        if (folders.contains(folder) || LiesBelow(folder, folders)) continue;
+        folders.removeIf([&folder](const QString& other) { return LiesBelow(other, {folder}); });
+        folders << folder;
     }
+    return folders;
+}
+
+void RememberFolders(TMusicDatabase& database, const QStringList& folders) {
+    const QStringList remembered = MergeFolders(database.UpdateFolders(), folders);
     if (remembered == database.UpdateFolders()) return;
     database.SetUpdateFolders(remembered);
     database.SetModified(true);

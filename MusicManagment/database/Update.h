@@ -25,6 +25,9 @@ struct UpdateResult {
 // going or when there are no update folders.
 UpdateResult UpdateDatabase(TMusicDatabase& database, UpdateTags tags);
 
+// `folders` and `more` in one list, in which no folder lies below another.
+QStringList MergeFolders(QStringList folders, const QStringList& more);
+
 // Remembers folders for later updates; one that lies below a remembered folder is not remembered twice.
 void RememberFolders(TMusicDatabase& database, const QStringList& folders);
 

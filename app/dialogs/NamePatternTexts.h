@@ -1,0 +1,20 @@
+#pragma once
+
+#include <QString>
+#include <optional>
+#include <span>
+
+// What a place-holder of a name pattern stands for.
+struct PlaceholderText {
+    const char16_t* Name;  // "%TITLE%"
+    const char16_t* Meaning;
+};
+
+// Every place-holder, the ones that are used most first.
+std::span<const PlaceholderText> PlaceholderTexts();
+
+// The file name that a pattern gives an invented song.
+QString ExampleName(const QString& pattern);
+
+// What is wrong with a pattern, for the user; nothing when it can be used.
+std::optional<QString> FaultOfPattern(const QString& pattern);

@@ -1,0 +1,38 @@
+#include "app/dialogs/PageScroller.h"
+
+#include <QEvent>
+#include <QScrollBar>
+
+namespace {
+
+constexpr int kLeastLines = 6;
+
+}  // namespace
+
+PageScroller::PageScroller(QWidget* sheet, QWidget* parent) : QScrollArea(parent) {
+    setWidgetResizable(true);
+    setFrameShape(QFrame::NoFrame);
+    setFocusPolicy(Qt::NoFocus);
+    setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+    setWidget(sheet);
+}
+
+int PageScroller::FrameWidth() const {
+    return 2 * frameWidth() + verticalScrollBar()->sizeHint().width();
+}
+
+QSize PageScroller::sizeHint() const {
+    const int width = widget()->sizeHint().width();
+    const int height =
+        widget()->hasHeightForWidth() ? widget()->heightForWidth(width) : widget()->sizeHint().height();
+    return QSize(width + FrameWidth(), height + 2 * frameWidth()).expandedTo(minimumSizeHint());
+}
+
+QSize PageScroller::minimumSizeHint() const {
+    return {widget()->minimumSizeHint().width() + FrameWidth(), kLeastLines * fontMetrics().lineSpacing()};
+}
+
+bool PageScroller::event(QEvent* event) {
+    if (event->type() == QEvent::LayoutRequest) updateGeometry();
+    return QScrollArea::event(event);
+}

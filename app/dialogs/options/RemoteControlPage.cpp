@@ -1,0 +1,27 @@
+#include "app/dialogs/options/RemoteControlPage.h"
+
+#include <QCheckBox>
+#include <QFormLayout>
+
+#include "MusicManagment/database/MusicManagment.h"
+#include "app/desktop/Icons.h"
+
+using namespace Qt::StringLiterals;
+
+RemoteControlPage::RemoteControlPage(const TMusicDatabase& database)
+    : OptionsPage(u"Fernsteuerung"_s, ThemeIcon(u"network-connect"_s, QStyle::SP_DriveNetIcon)) {
+    QFormLayout& group = AddGroup(u"Andere Programme"_s);
+    auto* enabled =
+        AddCheck(group, u"RCEnabled"_s, u"Andere Programme &dürfen Tunestead steuern"_s,
+                 u"Andere Programme Ihres Rechners können dann den Player und die PlayList bedienen."_s);
+    fields_.BindBool(enabled, u"RCEnabled"_s, true);
+    SetAvailable(group, database.RemoteControl() != nullptr, u"Wird mit dem Player wirksam."_s);
+}
+
+void RemoteControlPage::Load(const TMusicDatabase&, const TRWReg& settings) {
+    fields_.Load(settings);
+}
+
+void RemoteControlPage::Apply(TMusicDatabase&, TRWReg& settings) {
+    fields_.Store(settings);
+}

@@ -1,0 +1,34 @@
+#include "app/dialogs/wizard/WizardChoice.h"
+
+#include <QFileInfo>
+#include <QStandardPaths>
+
+#include "CommonRUKTools/AbsolutePath.h"
+#include "MusicManagment/database/MusicManagment.h"
+
+WizardChoice FirstChoice(const TMusicDatabase& database) {
+    WizardChoice choice = CurrentChoice(database);
+    choice.RenameAndMove = false;
+    const QString music = QStandardPaths::writableLocation(QStandardPaths::MusicLocation);
+    if (choice.Folders.isEmpty() && QFileInfo(music).isDir()) choice.Folders << AbsolutePath(music);
+    return choice;
+}
+
+WizardChoice CurrentChoice(const TMusicDatabase& database) {
+    return {database.UpdateFolders(), database.RenameAndMoveMP3s(), AbsolutePath(database.MP3MoveRootDir()),
+            database.MP3NamePattern()};
+}
+
+void ApplyChoice(const WizardChoice& choice, TMusicDatabase& database) {
+    if (choice.Folders != database.UpdateFolders()) {
+        database.SetUpdateFolders(choice.Folders);
+        database.SetModified(true);
+    }
+    database.SetRenameAndMoveMP3s(choice.RenameAndMove);
+    if (!choice.RenameAndMove) return;
+    // Files are moved into the genre folders below the root folder; without them nothing would be moved
+    // there.
+    database.SetMoveMP3sAfterGenreChange(true);
+    database.SetMP3MoveRootDir(choice.RootFolder);
+    database.SetMP3NamePattern(choice.Pattern);
+}

@@ -1,0 +1,24 @@
+#pragma once
+
+#include <QString>
+#include <QStringList>
+
+class TMusicDatabase;
+
+// What the user chooses when the collection is set up.
+struct WizardChoice {
+    QStringList Folders{};  // where songs are searched, with their sub-folders
+    bool RenameAndMove = false;
+    QString RootFolder{};
+    QString Pattern{};
+    bool ScanNow = true;
+};
+
+// What is proposed at the first start: the user's music folder, where there is one, and files that stay as
+// they are.
+WizardChoice FirstChoice(const TMusicDatabase& database);
+// What is set now.
+WizardChoice CurrentChoice(const TMusicDatabase& database);
+
+// Sets the folders and the naming of the database. Does not search.
+void ApplyChoice(const WizardChoice& choice, TMusicDatabase& database);
