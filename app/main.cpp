@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <string_view>
 
+#include "MusicManagment/playback/Engines.h"
 #include "app/MainWindow.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/StandardFiles.h"
@@ -61,7 +62,8 @@ int main(int argc, char** argv) {
         TTunesteadMainWnd window({.Files = LocateStandardFiles(),
                                   .SettingsFile = UserSettingsFile(),
                                   .Arguments = files,
-                                  .OfferWizard = true});
+                                  .OfferWizard = true,
+                                  .Engines = MakeEngines()});
         dialogs.SetMainWindow(&window);
         const Termination termination([&window] { window.End(); });
         window.show();
