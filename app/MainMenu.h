@@ -1,13 +1,12 @@
 #pragma once
 
-#include <QHash>
 #include <QList>
 #include <functional>
 
-class QAction;
-class QMenu;
+#include "app/CommandMenu.h"
+#include "app/MenuIcons.h"
+
 class QMenuBar;
-class TMenuExItem;
 class TMusicDatabase;
 
 // The main window's menu: the command menu of the database as the toolkit shows it, and "Beenden".
@@ -17,6 +16,8 @@ class MainMenu {
     MainMenu(QMenuBar& bar, TMusicDatabase& database, std::function<void(int id)> run,
              std::function<void()> exit);
 
+    // The keys of commands that are about single songs then work only in their list.
+    void BindTo(QWidget& songList);
     // Adds the items for the options and the set-up, to the end of the menu "Extras" where there is one.
     void AddSettings(std::function<void()> options, std::function<void()> wizard);
     // While a long operation runs every command of the database rests.
@@ -31,8 +32,7 @@ class MainMenu {
     void Build();
     void BuildSettings(QMenu& menu);
     void AddExit();
-    void AddItems(QMenu& menu, const TMenuExItem& item);
-    void AddCommand(QMenu& menu, const TMenuExItem& item);
+    void Run(int id);
 
     QMenuBar& bar_;
     TMusicDatabase& database_;
@@ -41,8 +41,8 @@ class MainMenu {
     std::function<void()> options_;
     std::function<void()> wizard_;
     QList<QMenu*> menus_;
-    bool readOnly_ = false;         // as the menus were built for
-    QHash<int, QAction*> actions_;  // by number
+    CommandMenu commands_{[this](int id) { Run(id); }, &MenuIcon};
+    bool readOnly_ = false;  // as the menus were built for
     QList<QAction*> settings_;
     QMenu* songMenu_ = nullptr;
     bool running_ = false;

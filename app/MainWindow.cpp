@@ -24,6 +24,7 @@
 #include "app/CommandRunner.h"
 #include "app/HelpMenu.h"
 #include "app/MainMenu.h"
+#include "app/Playing.h"
 #include "app/SettingsCommands.h"
 #include "app/SongCommands.h"
 #include "app/ToolWindows.h"
@@ -151,10 +152,13 @@ void TTunesteadMainWnd::SetUpMenu() {
                        [this] { RunCommand([this] { settingsCommands_->ShowWizard(); }); });
     songCommands_->OnFind = [this] { filter_->Activate(); };
     songCommands_->OnFindNext = [this] { FindNext(); };
-    QMenu* windows = menuBar()->addMenu(u"Fe&nster"_s);
-    toolWindows_->AddTo(*windows);
+    menu_->BindTo(*list_);
+    playing_->AddMenusTo(*menuBar());
+    QMenu& windows = *menuBar()->addMenu(u"Fe&nster"_s);
+    toolWindows_->AddTo(windows);
+    playing_->AddTo(windows);
     arrangement_ = std::make_unique<ArrangementCommands>(*this, *list_);
-    arrangement_->AddTo(*windows);
+    arrangement_->AddTo(windows);
     AddHelpMenu(*menuBar(), *this);
     list_->OnContextMenu = [this](const QPoint& place) { menu_->SongMenu().popup(place); };
 }
@@ -167,6 +171,9 @@ void TTunesteadMainWnd::SetUpToolWindows() {
     };
     connect(list_->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
             [this](const QModelIndex& song) { toolWindows_->ShowSong(shown_.SongAt(song.row())); });
+    playing_ =
+        std::make_unique<Playing>(*this, database_, *list_, options_.Files.PlayList(), options_.Engines);
+    playing_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
 }
 
 void TTunesteadMainWnd::RunMenuCommand(int id) {
@@ -175,7 +182,7 @@ void TTunesteadMainWnd::RunMenuCommand(int id) {
 
 // Commands that need the window or the collection's file; everything else is the database's.
 bool TTunesteadMainWnd::RunOwnCommand(int id) {
-    return commands_.Run(id) || songCommands_->Run(id) || toolWindows_->Run(id);
+    return commands_.Run(id) || songCommands_->Run(id) || toolWindows_->Run(id) || playing_->Run(id);
 }
 
 void TTunesteadMainWnd::LoadSettings() {
@@ -214,6 +221,9 @@ void TTunesteadMainWnd::SetUpPlacement() {
 
 void TTunesteadMainWnd::SetUpStart() {
     startup_.LinkFolder = linkPath_;
+    startup_.OpenStandardPlayList = [this] { playing_->OpenStandardList(); };
+    startup_.OpenPlayList = [this](const QString& path) { playing_->OpenPlayList(path); };
+    startup_.OpenSong = [this](const QString& path) { playing_->OpenSong(path); };
     startup_.OpenArrangement = [this](const QString& path) { arrangement_->Load(path); };
     requests_.IsReady = [this] {
         return started_ && !database_.ProgressRunning() && QApplication::activeModalWidget() == nullptr;
@@ -285,7 +295,7 @@ void TTunesteadMainWnd::ShowMarked() {
 // --- Files from other windows ---
 
 void TTunesteadMainWnd::dragEnterEvent(QDragEnterEvent* event) {
-    if (LocalFiles(*event->mimeData()).isEmpty()) return;
+    if (event->source() != nullptr || LocalFiles(*event->mimeData()).isEmpty()) return;
     event->setDropAction(Qt::CopyAction);  // the files stay where they are
     event->accept();
     empty_->SetDropMark(true);
@@ -312,6 +322,7 @@ void TTunesteadMainWnd::closeEvent(QCloseEvent* event) {
     if (database_.ProgressRunning()) return OfferToStop();
     if (!commands_.MayClose()) return;
     if (!installation_.Removed().Settings) RunCommand([this] { StoreSettings(); });
+    RunCommand([this] { playing_->Close(!installation_.Removed().Lists); });
     event->accept();
 }
 

@@ -5,6 +5,7 @@
 #include <QTimer>
 
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/playback/EngineChoice.h"
 #include "app/CollectionCommands.h"
 #include "app/Startup.h"
 #include "app/desktop/InstallationSteps.h"
@@ -18,6 +19,7 @@ class ArrangementCommands;
 class EmptyState;
 class FilterField;
 class MainMenu;
+class Playing;
 class QLabel;
 class QStackedWidget;
 class QToolButton;
@@ -34,6 +36,7 @@ struct MainWindowOptions {
     QStringList Arguments{};        // of the command line, without the program's name
     Installation* Setup = nullptr;  // none where the program cannot install itself
     bool OfferWizard = false;       // at the first start
+    EngineTable Engines{};          // that songs are played with
 };
 
 // The program's main window: owns the collection and brings together what shows it and what works on it.
@@ -91,6 +94,7 @@ class TTunesteadMainWnd : public QMainWindow {
     std::unique_ptr<SettingsCommands> settingsCommands_;
     std::unique_ptr<MainMenu> menu_;
     std::unique_ptr<ToolWindows> toolWindows_;
+    std::unique_ptr<Playing> playing_;
     QStackedWidget* centre_ = nullptr;
     QWidget* listPage_ = nullptr;
     FilterField* filter_ = nullptr;

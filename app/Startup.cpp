@@ -81,8 +81,7 @@ bool Startup::ReadStandardDatabase() {
 
 void Startup::OpenStandardLists() {
     RunCommand([this] { commands_.BannList().Load(); });
-    const QString playList = commands_.Files().PlayList();
-    if (OpenPlayList && QFileInfo::exists(playList)) RunCommand([&] { OpenPlayList(playList); });
+    if (OpenStandardPlayList) RunCommand(OpenStandardPlayList);
 }
 
 bool Startup::Uninstall() {

@@ -16,6 +16,8 @@ class Startup {
     Startup(TMusicDatabase& database, CollectionCommands& commands, InstallationSteps& installation)
         : database_(database), commands_(commands), installation_(installation) {}
 
+    // Opens the playlist of the last run.
+    std::function<void()> OpenStandardPlayList;
     // Makes it the playlist's file. Unset, the user is told that playlists cannot be opened.
     std::function<void(const QString& path)> OpenPlayList;
     // Makes it the player's current file. Unset, a song is taken into the collection instead.

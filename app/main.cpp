@@ -6,6 +6,7 @@
 #include "CommonRUKTools/AbsolutePath.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/RWReg.h"
+#include "MusicManagment/playback/Engines.h"
 #include "app/MainWindow.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/Installation.h"
@@ -119,7 +120,8 @@ int Start(QtDialogs& dialogs, const StartRequest& request) {
                       .SettingsFile = TRWReg::DefaultFile(),
                       .Arguments = request.Arguments,
                       .Setup = setup,
-                      .OfferWizard = true});
+                      .OfferWizard = true,
+                      .Engines = MakeEngines()});
 }
 
 }  // namespace

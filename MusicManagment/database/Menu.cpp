@@ -59,7 +59,7 @@ constexpr MenuRow kEdit[] = {
 
 constexpr MenuRow kSong[] = {
     {kCommand, u"Abspielen", mcPlay, u"Return"},
-    {kCommand, u"Zur PlayList hinzufügen", 402},
+    {kCommand, u"Zur PlayList hinzufügen", mcAddToPlayList},
     {kCommand, u"Mit externem Programm öffnen", mcOpenExternally, {}, Shown::Writable},
     {kCommand, u"In passendes Genre aufnehmen", 404, u"Alt+A", Shown::Writable},
     kLine,
@@ -137,15 +137,8 @@ void AddSongMenu(TMenuExItem& root, bool readOnly) {
 }
 
 // Commands whose operation is still to be built.
-constexpr int kLater[] = {mcFindOnline, mcRemoveFromDisk,
-                          mcBan,        mcPlay,
-                          402,          404,
-                          501,          503,
-                          504,          505,
-                          506,          507,
-                          508,          509,
-                          510,          512,
-                          513,          514};
+constexpr int kLater[] = {
+    mcFindOnline, mcRemoveFromDisk, mcBan, 404, 501, 503, 504, 505, 506, 507, 508, 509, 510, 512, 513, 514};
 
 void DisableLater(TMenuExItem& menu) {
     for (const int id : kLater) {

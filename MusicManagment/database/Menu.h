@@ -30,6 +30,7 @@ enum MenuCommand : int {
     mcListGenres = 305,
     mcRecount = 311,
     mcPlay = 401,
+    mcAddToPlayList = 402,
     mcOpenExternally = 403,
     mcSortSubmenu = 410,
     mcSortFirst = 411,  // to 422, in the order of TSortType

@@ -101,6 +101,11 @@ int SongListModel::columnCount(const QModelIndex& parent) const {
     return parent.isValid() ? 0 : static_cast<int>(SongColumns().size());
 }
 
+Qt::ItemFlags SongListModel::flags(const QModelIndex& index) const {
+    const Qt::ItemFlags flags = QAbstractTableModel::flags(index);
+    return index.isValid() ? flags | Qt::ItemIsDragEnabled : flags;
+}
+
 QVariant SongListModel::data(const QModelIndex& index, int role) const {
     if (!index.isValid()) return {};
     const SongColumn& column = ColumnOf(index.column());

@@ -1,11 +1,9 @@
 #include "app/views/SongListWidget.h"
 
-#include <QApplication>
 #include <QContextMenuEvent>
 #include <QHeaderView>
 #include <QScopedValueRollback>
 #include <QScrollBar>
-#include <QStyledItemDelegate>
 #include <algorithm>
 
 #include "CommonRUKTools/Dialogs.h"
@@ -13,38 +11,15 @@
 #include "app/CommandRunner.h"
 #include "app/models/FilteredSongs.h"
 #include "app/models/SongColumns.h"
+#include "app/models/SongMime.h"
 #include "app/views/ColumnLayout.h"
 #include "app/views/ColumnMenu.h"
+#include "app/views/RowList.h"
+#include "app/views/SongDrag.h"
 #include "app/views/SongMarks.h"
+#include "app/views/WaitCursor.h"
 
 using namespace Qt::StringLiterals;
-
-namespace {
-
-// Rows are chosen whole, so no single cell shows the focus; a focused row that is not selected does.
-class RowDelegate : public QStyledItemDelegate {
- public:
-    using QStyledItemDelegate::QStyledItemDelegate;
-
- protected:
-    void initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const override {
-        QStyledItemDelegate::initStyleOption(option, index);
-        option->state &= ~QStyle::State_HasFocus;
-        const auto* view = qobject_cast<const QAbstractItemView*>(option->widget);
-        if (view == nullptr || !view->hasFocus() || (option->state & QStyle::State_Selected) != 0) return;
-        if (view->currentIndex().row() == index.row()) option->state |= QStyle::State_HasFocus;
-    }
-};
-
-class WaitCursor {
- public:
-    WaitCursor() { QApplication::setOverrideCursor(Qt::WaitCursor); }
-    ~WaitCursor() { QApplication::restoreOverrideCursor(); }
-    WaitCursor(const WaitCursor&) = delete;
-    WaitCursor& operator=(const WaitCursor&) = delete;
-};
-
-}  // namespace
 
 SongListWidget::SongListWidget(FilteredSongs& songs, TMusicDatabase& database, QWidget* parent)
     : QTableView(parent), songs_(songs), database_(database) {
@@ -52,30 +27,17 @@ SongListWidget::SongListWidget(FilteredSongs& songs, TMusicDatabase& database, Q
     setAccessibleName(u"Songs"_s);
     setModel(&songs);
     setItemDelegate(new RowDelegate(this));
-    SetUpLook();
+    SetUpRowList(*this);
+    setDragDropMode(DragOnly);
     SetUpHeader();
-    FitToFont();
+    FitRowsToFont(*this);
     ResetColumns();
     FollowModel();
     ShowSortIndicator();
 }
 
-void SongListWidget::SetUpLook() {
-    setSelectionBehavior(SelectRows);
-    setSelectionMode(ExtendedSelection);
-    setEditTriggers(NoEditTriggers);
-    setAlternatingRowColors(true);
-    setShowGrid(false);
-    setWordWrap(false);
-    setTabKeyNavigation(false);
-    setHorizontalScrollMode(ScrollPerPixel);
-}
-
 void SongListWidget::SetUpHeader() {
-    verticalHeader()->hide();
-    verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
     QHeaderView* header = horizontalHeader();
-    header->setHighlightSections(false);
     // A header that knew the selection would look through all rows for columns that are selected whole.
     header->setSelectionModel(new QItemSelectionModel(&songs_, header));
     header->setSectionsMovable(true);
@@ -88,15 +50,9 @@ void SongListWidget::SetUpHeader() {
     connect(header, &QHeaderView::customContextMenuRequested, this, &SongListWidget::ShowColumnMenu);
 }
 
-// All rows have one height, which the header then need not keep for each.
-void SongListWidget::FitToFont() {
-    verticalHeader()->setMinimumSectionSize(0);
-    verticalHeader()->setDefaultSectionSize(fontMetrics().height() + fontMetrics().height() / 3);
-}
-
 void SongListWidget::changeEvent(QEvent* event) {
     QTableView::changeEvent(event);
-    if (event->type() == QEvent::FontChange || event->type() == QEvent::StyleChange) FitToFont();
+    if (event->type() == QEvent::FontChange || event->type() == QEvent::StyleChange) FitRowsToFont(*this);
 }
 
 // In a list of rows Home and End go to the first and the last row.
@@ -188,6 +144,19 @@ std::vector<SongIndex> SongListWidget::MarkedSongs() const {
 
 SongIndex SongListWidget::FocusedSong() const {
     return currentIndex().isValid() ? songs_.IndexAt(currentIndex().row()) : -1;
+}
+
+std::vector<SongRef> SongListWidget::DraggedSongs() const {
+    std::vector<SongRef> songs;
+    for (const SongIndex index : MarkedSongs())
+        songs.push_back({database_.Song(index).FileName, index});
+    return songs;
+}
+
+// The view's own way would paint every marked row, of which there may be a million.
+void SongListWidget::startDrag(Qt::DropActions) {
+    if (auto songs = DraggedSongs(); !songs.empty())
+        DragSongs(*this, std::make_unique<SongMimeData>(std::move(songs)), Qt::CopyAction);
 }
 
 void SongListWidget::MarkAll() {

@@ -11,6 +11,7 @@
 
 class FilteredSongs;
 class TMusicDatabase;
+struct SongRef;
 
 // The list of songs. A click on a column's header sorts by it, a second one backwards. The song that has the
 // focus and the marked (selected) songs are two things; of both only shown songs count.
@@ -28,6 +29,8 @@ class SongListWidget : public QTableView {
     std::vector<SongIndex> MarkedSongs() const;
     // -1 when no song has the focus.
     SongIndex FocusedSong() const;
+    // The marked songs as a drag takes them along.
+    std::vector<SongRef> DraggedSongs() const;
     void MarkAll();
     void InvertMarks();
     // Asks for a filter and marks the shown songs that it lets through, and no others.
@@ -53,11 +56,10 @@ class SongListWidget : public QTableView {
     QModelIndex moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) override;
     void changeEvent(QEvent* event) override;
     void contextMenuEvent(QContextMenuEvent* event) override;
+    void startDrag(Qt::DropActions actions) override;
 
  private:
-    void SetUpLook();
     void SetUpHeader();
-    void FitToFont();
     void HeaderClicked(int section);
     void ShowColumnMenu(const QPoint& position);
     void ShowSortIndicator();

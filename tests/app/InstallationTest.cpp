@@ -179,7 +179,7 @@ class RefusingTrash : public Trash {
     ~RefusingTrash() override { SetTrash(nullptr); }
     QStringList Taken;
     bool Take(const QString& path) override {
-        if (path.endsWith(u".ini"_s)) return false;
+        if (path.endsWith(u".conf"_s)) return false;
         Taken << path;
         return QFile::remove(path);
     }
@@ -216,7 +216,8 @@ TEST_F(InstallationTest, TheUserSaysWhatGoesWithTheProgram) {
     EXPECT_EQ(dialogs.Questions.value(1), u"Soll die Datenbank ebenfalls entfernt werden?"_s);
     EXPECT_EQ(dialogs.Questions.size(), 4);
     EXPECT_EQ(trash.Taken, QStringList{files.Database()});
-    EXPECT_EQ(Files(), QStringList({u"config/tunestead.conf"_s, u"data/tunestead/Tunestead3_BannList.str"_s}));
+    EXPECT_EQ(Files(),
+              QStringList({u"config/tunestead.conf"_s, u"data/tunestead/Tunestead3_BannList.str"_s}));
     EXPECT_TRUE(steps.Removed().Program && steps.Removed().Database);
     EXPECT_FALSE(steps.Removed().Lists || steps.Removed().Settings);
 }

@@ -25,6 +25,7 @@
 #include "app/dialogs/ProgressWindow.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
+#include "tests/app/ScriptedBackend.h"
 #include "tests/app/ScriptedDialogs.h"
 
 using namespace Qt::StringLiterals;
@@ -64,7 +65,10 @@ class MainWindowTest : public testing::Test {
     void Start(const QStringList& arguments = {}) {
         window_.reset();  // only one at a time owns the data folder
         window_ = std::make_unique<TTunesteadMainWnd>(
-            MainWindowOptions{{folder_.filePath(u"data"_s)}, folder_.filePath(u"settings.ini"_s), arguments});
+            MainWindowOptions{.Files = {folder_.filePath(u"data"_s)},
+                              .SettingsFile = folder_.filePath(u"settings.ini"_s),
+                              .Arguments = arguments,
+                              .Engines = ScriptedEngines(song_)});
         window_->show();
         Work();
     }
@@ -113,6 +117,7 @@ class MainWindowTest : public testing::Test {
 
     QTemporaryDir folder_;
     ScriptedDialogs dialogs_;
+    ScriptedSong song_;
     std::unique_ptr<TTunesteadMainWnd> window_;
 };
 
@@ -147,9 +152,12 @@ TEST_F(MainWindowTest, TheCommandLineTakesFoldersSongsAndCapitals) {
     MakeSongs(3);
     Write(folder_.filePath(u"EINZELN.MP3"_s), Mp3Builder().Frames(80).Data());
     Write(folder_.filePath(u"brief.TXT"_s), {});
-    Start({Music(), folder_.filePath(u"EINZELN.MP3"_s), folder_.filePath(u"brief.TXT"_s),
+    const QString first = Music() + u"/Band/Lied 101.mp3"_s;
+    Start({Music(), first, folder_.filePath(u"EINZELN.MP3"_s), folder_.filePath(u"brief.TXT"_s),
            folder_.filePath(u"fehlt.mp3"_s)});
     EXPECT_EQ(Database().Count(), 4);
+    EXPECT_EQ(song_.File, first);
+    EXPECT_EQ(song_.Status, psPlaying);
     EXPECT_EQ(dialogs_.Messages,
               QStringList({u"Unbekannter Dateityp: .TXT"_s,
                            u"Datei nicht gefunden: "_s + folder_.filePath(u"fehlt.mp3"_s)}));
@@ -355,10 +363,10 @@ TEST_F(MainWindowTest, TheMenuFollowsADatabaseThatBecomesReadOnly) {
 
 TEST_F(MainWindowTest, TheWindowKeepsItsSizeBetweenTwoStarts) {
     Start();
-    window_->resize(640, 420);
+    window_->resize(800, 520);
     window_->close();
     Start();
-    EXPECT_EQ(window_->size(), QSize(640, 420));
+    EXPECT_EQ(window_->size(), QSize(800, 520));
 }
 
 TEST_F(MainWindowTest, FindsSongsFromTheFilterLineAndGoesOn) {

@@ -91,7 +91,7 @@ TEST_F(StartupTest, WithoutPlayerAndPlaylistItSaysWhatItCannotDo) {
 
 TEST_F(StartupTest, AFileThatFailsIsSaidAndTheNextIsOpened) {
     startup_.OpenPlayList = [](const QString&) { throw ERukException(u"kaputt"_s); };
-    Make(u"data/Tunestead3_PlayList.rukpl"_s);
+    startup_.OpenStandardPlayList = [] { throw ERukException(u"auch kaputt"_s); };
     QDir().mkpath(files_.BannList());  // a folder in place of the file
     ASSERT_TRUE(startup_.Run({Make(u"a.rukpl"_s), MakeSong(u"b.mp3"_s)}));
     EXPECT_EQ(dialogs_.Messages.size(), 3);

@@ -1,0 +1,212 @@
+#include "app/Playing.h"
+
+#include <QFileInfo>
+#include <QMainWindow>
+#include <QMenu>
+#include <QMenuBar>
+#include <QSet>
+#include <algorithm>
+
+#include "MusicManagment/database/Menu.h"
+#include "MusicManagment/playback/PlaySoundMenu.h"
+#include "MusicManagment/playlist/PlayListMenu.h"
+#include "app/CommandRunner.h"
+#include "app/desktop/Icons.h"
+#include "app/views/PlayerForm.h"
+#include "app/views/PlaylistForm.h"
+#include "app/views/SongListWidget.h"
+#include "app/views/VisPlayList.h"
+#include "app/views/VisPlaySound.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+QString SongCount(std::size_t count) {
+    return count == 1 ? u"1 Song"_s : QString::number(count) + u" Songs"_s;
+}
+
+QSet<QString> NamesIn(const TPlayList& list) {
+    QSet<QString> names;
+    for (int i = 0; i < list.Count(); ++i)
+        names.insert(list.Entry(i).Name);
+    return names;
+}
+
+}  // namespace
+
+Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& songs, QString standardList,
+                 EngineTable engines)
+    : database_(database),
+      songs_(songs),
+      standardList_(std::move(standardList)),
+      player_(std::move(engines)),
+      listForm_(new TPlaylistForm(list_, &window)),
+      playerForm_(new TPlayerForm(player_, list_, &window)),
+      contextMenu_(new QMenu(listForm_)) {
+    list_.SetMusicDatabase(&database);
+    player_.SetMusicDatabase(&database);
+    player_.SetPlayList(&list_);
+    SetUpWindows(window);
+    SetUpContextMenu();
+    QObject::connect(&songs, &QAbstractItemView::doubleClicked, listForm_,
+                     [this] { RunCommand([this] { database_.ClickMenuItem(mcPlay); }); });
+}
+
+// The window would let its tool windows live longer than what they show.
+Playing::~Playing() {
+    delete listForm_;
+    delete playerForm_;
+}
+
+void Playing::SetUpWindows(QMainWindow& window) {
+    window.addDockWidget(Qt::RightDockWidgetArea, listForm_);
+    window.addDockWidget(Qt::BottomDockWidgetArea, playerForm_);
+    TVisPlayList& view = listForm_->View();
+    view.OnPlay = [this](int index) { RunCommand([&] { PlayEntry(index); }); };
+    view.OnContextMenu = [this](const QPoint& place) { contextMenu_->popup(place); };
+    TVisPlaySound& panel = playerForm_->Panel();
+    panel.OnCommand = [this](int id) { RunPlayerCommand(id); };
+    panel.OnChange = [this] { FollowSong(); };
+}
+
+// The list goes along with the songs that it plays.
+void Playing::FollowSong() {
+    if (list_.CurrentSong() == shownSong_) return;
+    shownSong_ = list_.CurrentSong();
+    listForm_->View().ShowEntry(list_.IndexOf());
+}
+
+// --- Menus ---
+
+void Playing::AddMenusTo(QMenuBar& bar) {
+    QString taken = u"dbseüfh"_s;  // by the menus of others
+    QMenu* list = bar.addMenu(WithAccessKey(list_.Menu().Caption(), taken));
+    listMenu_.Bind(pcRemoveSelected, listForm_->View());
+    listMenu_.Fill(*list, list_.Menu());
+    playerMenu_.Fill(*bar.addMenu(WithAccessKey(player_.Menu().Caption(), taken)), player_.Menu());
+    contextMenu_->addActions(list->actions());
+}
+
+// The keys are those of the view, which acts on them itself.
+void Playing::SetUpContextMenu() {
+    TVisPlayList& view = listForm_->View();
+    QAction* play = contextMenu_->addAction(PlayerIcon(plPlay), u"&Abspielen"_s, QKeySequence(u"Return"_s),
+                                            &view, &TVisPlayList::PlaySelected);
+    contextMenu_->addAction(ThemeIcon(u"go-next"_s, QStyle::SP_ArrowRight), u"Als &nächstes spielen"_s,
+                            QKeySequence(u"Ctrl+Return"_s), &view, &TVisPlayList::QueueSelected);
+    contextMenu_->addAction(u"Aus der &Warteschlange nehmen"_s, QKeySequence(u"Ctrl+Backspace"_s), &view,
+                            &TVisPlayList::UnqueueSelected);
+    contextMenu_->addSeparator();
+    contextMenu_->setDefaultAction(play);
+}
+
+void Playing::AddTo(QMenu& menu) {
+    menu.addAction(listForm_->toggleViewAction());
+    menu.addAction(playerForm_->toggleViewAction());
+}
+
+void Playing::RunPlayListCommand(int id) {
+    RunCommand([&] { list_.ClickMenuItem(id); });
+}
+
+// Without a song "Play" begins with the list.
+void Playing::RunPlayerCommand(int id) {
+    RunCommand([&] {
+        if (id != plPlay || player_.GetStatus() != psClosed) {
+            player_.ClickMenuItem(id);
+            return;
+        }
+        const int entry = listForm_->View().CurrentEntry();
+        if (entry >= 0)
+            PlayEntry(entry);
+        else
+            list_.PlayNext();
+    });
+}
+
+// --- Songs of the collection ---
+
+bool Playing::Run(int id) {
+    switch (id) {
+        case mcPlay:
+            PlayChosen();
+            return true;
+        case mcAddToPlayList:
+            AddChosen();
+            return true;
+        default:
+            return false;
+    }
+}
+
+// The marked songs, else the focused one.
+std::vector<SongIndex> Playing::Chosen() const {
+    auto songs = songs_.MarkedSongs();
+    if (songs.empty() && songs_.FocusedSong() >= 0) songs.push_back(songs_.FocusedSong());
+    return songs;
+}
+
+// At the end; what is listed already stays where it is. Returns how many came in.
+int Playing::Append(const std::vector<SongIndex>& songs) {
+    QSet<QString> listed = NamesIn(list_);
+    const int before = list_.Count();
+    for (const SongIndex song : songs) {
+        const QString name = database_.Song(song).FileName;
+        if (listed.contains(name)) continue;
+        listed.insert(name);
+        list_.InsertSong(list_.Count(), song);
+    }
+    return list_.Count() - before;
+}
+
+void Playing::PlayChosen() {
+    const auto songs = Chosen();
+    if (songs.empty()) return;
+    const SongIndex focused = songs_.FocusedSong();
+    const SongIndex song = std::ranges::binary_search(songs, focused) ? focused : songs.front();
+    Append(songs);
+    PlayEntry(list_.IndexOf(database_.Song(song).FileName), song);
+}
+
+void Playing::AddChosen() {
+    const auto songs = Chosen();
+    if (songs.empty()) return;
+    const auto added = static_cast<std::size_t>(Append(songs));
+    QString sentence = SongCount(added) + u" zur PlayList hinzugefügt"_s;
+    if (const std::size_t known = songs.size() - added; known > 0)
+        sentence += u", %1 schon darin"_s.arg(known == 1 ? u"1 war"_s : u"%1 waren"_s.arg(known));
+    if (OnDone) OnDone(sentence + u'.');
+}
+
+void Playing::PlayEntry(int index, SongIndex hint) {
+    const QString name = list_.Entry(index).Name;
+    if (!list_.PlayEntry(index, {.Change = player_.ChangeOnDemand(), .DatabaseHint = hint}))
+        throw EPlayListException(u"Die Datei ist nicht verfügbar: "_s + name);
+}
+
+// --- Files ---
+
+void Playing::OpenStandardList() {
+    RunCommand([this] {
+        if (QFileInfo::exists(standardList_)) list_.SetPlayListFileName(standardList_);
+        standardListIsUnread_ = false;
+    });
+}
+
+void Playing::OpenPlayList(const QString& path) {
+    list_.SetPlayListFileName(path);
+}
+
+// It plays without being in the list, where "Nächstes" goes on.
+void Playing::OpenSong(const QString& path) {
+    player_.SetFileName(path);
+    if (!player_.AutoPlay()) player_.Play();
+}
+
+void Playing::Close(bool keepList) {
+    player_.SetFileName(QString());
+    // An empty list is no reason to make a file, and none to lose what could not be read.
+    const bool nothingToKeep = standardListIsUnread_ || !QFileInfo::exists(standardList_);
+    if (keepList && (list_.Count() > 0 || !nothingToKeep)) list_.Save(standardList_);
+}

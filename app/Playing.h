@@ -1,0 +1,73 @@
+#pragma once
+
+#include <QString>
+#include <functional>
+#include <vector>
+
+#include "MusicManagment/playback/PlaySound.h"
+#include "MusicManagment/playlist/PlayList.h"
+#include "app/CommandMenu.h"
+#include "app/MenuIcons.h"
+
+class QMainWindow;
+class QMenuBar;
+class SongListWidget;
+class TPlayerForm;
+class TPlaylistForm;
+
+// Everything about playing that the main window has: the playlist, the player, their windows and commands.
+class Playing {
+ public:
+    // The tool windows belong to `window`. `standardList` is the file that keeps the playlist between two
+    // runs; `songs` is where songs are chosen.
+    Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& songs, QString standardList,
+            EngineTable engines);
+    ~Playing();
+
+    // Told what came of a command, in a sentence for the status bar.
+    std::function<void(const QString&)> OnDone;
+
+    TPlayList& PlayList() { return list_; }
+    TPlaySound& Player() { return player_; }
+
+    // The commands of the database's menu that play songs. False when the number is none of them. Throws what
+    // playing throws.
+    bool Run(int id);
+    // Adds the menus of the playlist and the player.
+    void AddMenusTo(QMenuBar& bar);
+    // Adds the items that show and hide the tool windows.
+    void AddTo(QMenu& menu);
+
+    // Opens the list of the last run where there is one.
+    void OpenStandardList();
+    // Each throws what the playlist or the player throws.
+    void OpenPlayList(const QString& path);
+    void OpenSong(const QString& path);
+    // Stops playing and keeps the list for the next run if that is wanted. Throws EStreamError.
+    void Close(bool keepList);
+
+ private:
+    void SetUpWindows(QMainWindow& window);
+    void SetUpContextMenu();
+    void FollowSong();
+    std::vector<SongIndex> Chosen() const;
+    int Append(const std::vector<SongIndex>& songs);
+    void PlayChosen();
+    void AddChosen();
+    void PlayEntry(int index, SongIndex hint = -1);
+    void RunPlayerCommand(int id);
+    void RunPlayListCommand(int id);
+
+    TMusicDatabase& database_;
+    SongListWidget& songs_;
+    const QString standardList_;
+    bool standardListIsUnread_ = true;
+    TPlayList list_;
+    TPlaySound player_;
+    CommandMenu listMenu_{[this](int id) { RunPlayListCommand(id); }, &PlayListIcon};
+    CommandMenu playerMenu_{[this](int id) { RunPlayerCommand(id); }, &PlayerIcon};
+    TPlaylistForm* listForm_;
+    TPlayerForm* playerForm_;
+    QMenu* contextMenu_;
+    QString shownSong_;
+};

@@ -1,0 +1,216 @@
+#include "app/Playing.h"
+
+#include <gtest/gtest.h>
+
+#include <QFile>
+#include <QMainWindow>
+#include <QMenuBar>
+#include <QTemporaryDir>
+#include <QTest>
+
+#include "MusicManagment/database/Menu.h"
+#include "MusicManagment/playback/PlaySoundMenu.h"
+#include "app/MainMenu.h"
+#include "app/models/FilteredSongs.h"
+#include "app/views/PlaylistForm.h"
+#include "app/views/SongListWidget.h"
+#include "app/views/VisPlayList.h"
+#include "tests/PrintQt.h"
+#include "tests/app/ScriptedBackend.h"
+#include "tests/app/ScriptedDialogs.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+// A window with five songs "0" to "4" in its list and a player that makes no sound.
+class PlayingTest : public testing::Test {
+ protected:
+    PlayingTest() {
+        database_.SetSortType(stTitle);
+        for (int i = 0; i < 5; ++i)
+            AddFile(i);
+        model_.SyncViews();
+        songs_ = new SongListWidget(shown_, database_, &window_);
+        window_.setCentralWidget(songs_);
+        Start();
+    }
+    ~PlayingTest() override { playing_.reset(); }
+
+    QString Path(int number) const { return folder_.filePath(u"%1.mp3"_s.arg(number)); }
+    void AddFile(int number) {
+        QFile file(Path(number));
+        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+        TID3Tag song;
+        song.FileName = file.fileName();
+        song.Title = QString::number(number);
+        song.Length = 60;
+        database_.AddEntry(QString(), song);
+    }
+    void Start() {
+        menu_ = std::make_unique<MainMenu>(
+            *window_.menuBar(), database_, [this](int id) { database_.ClickMenuItem(id); }, [] {});
+        menu_->BindTo(*songs_);
+        playing_ =
+            std::make_unique<Playing>(window_, database_, *songs_, StandardList(), ScriptedEngines(song_));
+        playing_->AddMenusTo(*window_.menuBar());
+        playing_->OnDone = [this](const QString& sentence) { told_ = sentence; };
+        database_.OnMenuItemClicked = [this](TMusicDatabase&, const TMenuExItem&, void*, qint64 id,
+                                             bool& proceed) {
+            proceed = !playing_->Run(static_cast<int>(id));
+        };
+        window_.resize(1000, 600);
+        window_.show();
+        window_.activateWindow();
+        QApplication::processEvents();
+    }
+    QString StandardList() const { return folder_.filePath(u"liste.rukpl"_s); }
+    void Mark(const QList<int>& rows, int focus) {
+        songs_->selectionModel()->clear();
+        for (const int row : rows)
+            songs_->selectionModel()->select(shown_.index(row, 0),
+                                             QItemSelectionModel::Select | QItemSelectionModel::Rows);
+        songs_->selectionModel()->setCurrentIndex(shown_.index(focus, 0), QItemSelectionModel::NoUpdate);
+    }
+    QString Listed() {
+        QString listed;
+        for (int i = 0; i < playing_->PlayList().Count(); ++i)
+            listed += QFileInfo(playing_->PlayList().Entry(i).Name).completeBaseName();
+        return listed;
+    }
+    TVisPlayList& View() { return window_.findChild<TPlaylistForm*>()->View(); }
+    QString Sounding() const { return QFileInfo(song_.File).completeBaseName(); }
+    void Choose(const QString& menu, const QString& caption) {
+        for (const QAction* top : window_.menuBar()->actions())
+            for (QAction* action : top->menu()->actions())
+                if (top->text().remove(u'&') == menu && action->text().remove(u'&') == caption)
+                    return action->trigger();
+        ADD_FAILURE();
+    }
+
+    QTemporaryDir folder_;
+    ScriptedDialogs dialogs_;
+    ScriptedSong song_;
+    TMusicDatabase database_;
+    SongListModel model_{database_};
+    FilteredSongs shown_{model_};
+    QMainWindow window_;
+    SongListWidget* songs_ = nullptr;
+    std::unique_ptr<MainMenu> menu_;
+    std::unique_ptr<Playing> playing_;
+    QString told_;
+};
+
+TEST_F(PlayingTest, ReturnAppendsTheMarkedSongsAndPlaysTheFocusedOne) {
+    Mark({1, 2, 4}, 2);
+    songs_->setFocus();
+    QTest::keyClick(songs_, Qt::Key_Return);
+    EXPECT_EQ(Listed(), u"124"_s);
+    EXPECT_EQ(Sounding(), u"2"_s);
+    EXPECT_EQ(song_.Status, psPlaying);
+
+    const QPoint last = songs_->visualRect(shown_.index(4, 0)).center();
+    QTest::mouseClick(songs_->viewport(), Qt::LeftButton, {}, last);
+    QTest::mouseDClick(songs_->viewport(), Qt::LeftButton, {}, last);
+    EXPECT_EQ(Listed(), u"124"_s);
+    EXPECT_EQ(Sounding(), u"4"_s);
+}
+
+TEST_F(PlayingTest, AddingLeavesOutWhatIsListed) {
+    Mark({0, 3}, 0);
+    database_.ClickMenuItem(mcAddToPlayList);
+    EXPECT_EQ(told_, u"2 Songs zur PlayList hinzugefügt."_s);
+    Mark({0, 1, 3}, 0);
+    database_.ClickMenuItem(mcAddToPlayList);
+    EXPECT_EQ(told_, u"1 Song zur PlayList hinzugefügt, 2 waren schon darin."_s);
+    EXPECT_EQ(Listed(), u"031"_s);
+    EXPECT_EQ(song_.Status, psClosed);
+}
+
+TEST_F(PlayingTest, DelWorksInTheListThatHasTheFocus) {
+    Mark({0, 1, 2}, 0);
+    database_.ClickMenuItem(mcAddToPlayList);
+    View().setFocus();
+    View().selectRow(1);
+    QTest::keyClick(&View(), Qt::Key_Delete);
+    EXPECT_EQ(Listed(), u"02"_s);
+    EXPECT_TRUE(dialogs_.Questions.isEmpty());
+
+    songs_->setFocus();
+    database_.OnMenuItemClicked = {};
+    int removals = 0;
+    database_.OnMenuItemClicked = [&](TMusicDatabase&, const TMenuExItem&, void*, qint64 id, bool& proceed) {
+        removals += id == mcRemoveFromDatabase;
+        proceed = false;
+    };
+    QTest::keyClick(songs_, Qt::Key_Delete);
+    EXPECT_EQ(removals, 1);
+    EXPECT_EQ(Listed(), u"02"_s);
+}
+
+TEST_F(PlayingTest, PlayWithoutASongBeginsWithTheList) {
+    Choose(u"Player"_s, u"Play"_s);
+    EXPECT_EQ(dialogs_.Messages, QStringList(u"Keine Lieder in der PlayList zum Abspielen"_s));
+    Mark({1, 2}, 1);
+    database_.ClickMenuItem(mcAddToPlayList);
+    Choose(u"Player"_s, u"Play"_s);
+    EXPECT_EQ(Sounding(), u"1"_s);
+    Choose(u"Player"_s, u"Nächstes"_s);
+    EXPECT_EQ(Sounding(), u"2"_s);
+    Choose(u"Player"_s, u"Vorheriges"_s);
+    EXPECT_EQ(Sounding(), u"1"_s);
+}
+
+TEST_F(PlayingTest, ASongThatIsGoneIsToldAndTheOtherPlaysOn) {
+    Mark({0, 1}, 0);
+    database_.ClickMenuItem(mcPlay);
+    QFile::remove(Path(1));
+    View().OnPlay(1);
+    EXPECT_EQ(dialogs_.Messages, QStringList(u"Die Datei ist nicht verfügbar: "_s + Path(1)));
+    EXPECT_EQ(Sounding(), u"0"_s);
+    EXPECT_EQ(song_.Status, psPlaying);
+}
+
+TEST_F(PlayingTest, TheListIsThereAgainAtTheNextStart) {
+    playing_->OpenStandardList();
+    playing_->Close(true);
+    EXPECT_FALSE(QFile::exists(StandardList()));
+    Mark({3, 4}, 3);
+    database_.ClickMenuItem(mcPlay);
+    playing_->Close(true);
+    EXPECT_EQ(song_.Status, psClosed);
+
+    playing_.reset();
+    Start();
+    playing_->OpenStandardList();
+    EXPECT_EQ(Listed(), u"34"_s);
+    EXPECT_TRUE(dialogs_.Messages.isEmpty());
+}
+
+TEST_F(PlayingTest, AListThatCannotBeReadIsNotLost) {
+    QFile file(StandardList());
+    ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+    file.write("RUKPLYLST??");
+    file.close();
+    playing_->OpenStandardList();
+    EXPECT_EQ(dialogs_.Messages.size(), 1);
+    playing_->Close(true);
+    ASSERT_TRUE(file.open(QIODevice::ReadOnly));
+    EXPECT_EQ(file.readAll(), "RUKPLYLST??");
+}
+
+TEST_F(PlayingTest, FilesFromTheCommandLinePlayOrBecomeTheList) {
+    playing_->OpenSong(Path(4));
+    EXPECT_EQ(Sounding(), u"4"_s);
+    EXPECT_EQ(Listed(), QString());
+    Mark({0, 2}, 0);
+    database_.ClickMenuItem(mcAddToPlayList);
+    const QString other = folder_.filePath(u"andere.m3u"_s);
+    playing_->PlayList().Save(other);
+    playing_->OpenPlayList(QString());
+    playing_->OpenPlayList(other);
+    EXPECT_EQ(Listed(), u"02"_s);
+    EXPECT_EQ(song_.Status, psPlaying);
+}
+
+}  // namespace

@@ -1,0 +1,161 @@
+#include "app/views/VisPlaySound.h"
+
+#include <gtest/gtest.h>
+
+#include <QComboBox>
+#include <QFile>
+#include <QLabel>
+#include <QTemporaryDir>
+#include <QTest>
+#include <QToolButton>
+
+#include "MusicManagment/playback/PlaySoundMenu.h"
+#include "app/views/SeekSlider.h"
+#include "tests/PrintQt.h"
+#include "tests/app/ScriptedBackend.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+class VisPlaySoundTest : public testing::Test {
+ protected:
+    VisPlaySoundTest() {
+        player_.SetPlayList(&list_);
+        for (const QString& name : {u"a"_s, u"b"_s}) {
+            QFile file(folder_.filePath(name + u".mp3"_s));
+            EXPECT_TRUE(file.open(QIODevice::WriteOnly));
+            list_.Insert(list_.Count(), {.Name = file.fileName()});
+        }
+        panel_.resize(900, 60);
+        panel_.show();
+        panel_.OnCommand = [this](int command) { commands_ << command; };
+    }
+
+    QString Text(const QString& name) const { return panel_.findChild<QLabel*>(name)->text(); }
+    QToolButton* Button(int command) const {
+        return panel_.findChild<QToolButton*>(u"player%1"_s.arg(command));
+    }
+    SeekSlider* Slider() const { return panel_.findChild<SeekSlider*>(); }
+    void TickAt(quint32 position) {
+        song_.Position = position;
+        player_.Tick();
+    }
+
+    QTemporaryDir folder_;
+    ScriptedSong song_;
+    TPlayList list_;
+    TPlaySound player_{ScriptedEngines(song_)};
+    TVisPlaySound panel_{player_, list_};
+    QList<int> commands_;
+};
+
+TEST_F(VisPlaySoundTest, ShowsTheSongAndItsTimes) {
+    EXPECT_EQ(Text(u"songTitle"_s), u"Kein Lied"_s);
+    EXPECT_FALSE(Slider()->isEnabled());
+    ASSERT_TRUE(list_.PlayEntry(0));
+    TickAt(65'400);
+    EXPECT_EQ(Text(u"songTitle"_s), u"a"_s);
+    EXPECT_EQ(Text(u"elapsed"_s), u"1:05"_s);
+    EXPECT_EQ(Text(u"remaining"_s), u"−2:54 / 4:00"_s);
+    EXPECT_EQ(Slider()->value(), 65'400);
+    TickAt(250'000);  // a length that was told wrong
+    EXPECT_EQ(Text(u"remaining"_s), u"−0:00 / 4:00"_s);
+
+    player_.SetFileName(QString());
+    EXPECT_EQ(Text(u"songTitle"_s), u"Kein Lied"_s);
+    EXPECT_EQ(Text(u"elapsed"_s), QString());
+    EXPECT_FALSE(Slider()->isEnabled());
+}
+
+TEST_F(VisPlaySoundTest, OneButtonPlaysAndPauses) {
+    Button(plPlay)->click();
+    ASSERT_TRUE(list_.PlayEntry(0));
+    EXPECT_EQ(Button(plPlay)->accessibleName(), u"Pause"_s);
+    EXPECT_TRUE(Button(plStop)->isEnabled());
+    Button(plPlay)->click();
+    player_.PauseResume();
+    EXPECT_EQ(Button(plPlay)->accessibleName(), u"Play"_s);
+    Button(plPlay)->click();
+    EXPECT_EQ(commands_, QList<int>({plPlay, plPause, plPlay}));
+    player_.Stop();
+    EXPECT_FALSE(Button(plStop)->isEnabled());
+}
+
+TEST_F(VisPlaySoundTest, PreviousRestsUntilThereIsOne) {
+    ASSERT_TRUE(list_.PlayEntry(0));
+    EXPECT_FALSE(Button(plPrevious)->isEnabled());
+    ASSERT_TRUE(list_.PlayEntry(1));
+    EXPECT_TRUE(Button(plPrevious)->isEnabled());
+}
+
+// --- The position ---
+
+TEST_F(VisPlaySoundTest, AClickGoesThere) {
+    ASSERT_TRUE(list_.PlayEntry(0));
+    QTest::mouseClick(Slider(), Qt::LeftButton, {}, Slider()->rect().center());
+    EXPECT_NEAR(song_.Position, 120'000, 3'000);
+    QTest::mouseClick(Slider(), Qt::LeftButton, {}, QPoint(0, 5));
+    EXPECT_EQ(song_.Position, 0u);
+}
+
+TEST_F(VisPlaySoundTest, DraggingShowsTheTimeAndGoesThereAtItsEnd) {
+    ASSERT_TRUE(list_.PlayEntry(0));
+    TickAt(10'000);
+    const QPoint middle = Slider()->rect().center();
+    QTest::mousePress(Slider(), Qt::LeftButton, {}, middle - QPoint(100, 0));
+    QTest::mouseMove(Slider(), middle);
+    TickAt(11'000);
+    EXPECT_EQ(song_.Position, 11'000u);
+    EXPECT_NEAR(Slider()->value(), 120'000, 3'000);
+    EXPECT_TRUE(Text(u"elapsed"_s).startsWith(u"2:0"_s) || Text(u"elapsed"_s).startsWith(u"1:5"_s));
+    QTest::mouseRelease(Slider(), Qt::LeftButton, {}, middle);
+    EXPECT_NEAR(song_.Position, 120'000, 3'000);
+}
+
+TEST_F(VisPlaySoundTest, KeysMoveTheSongWithinItsBounds) {
+    ASSERT_TRUE(list_.PlayEntry(0));
+    TickAt(20'000);
+    quint32 told = 0;
+    panel_.OnSeeked = [&](quint32 position) { told = position; };
+    QTest::keyClick(Slider(), Qt::Key_Right);
+    EXPECT_EQ(song_.Position, 25'000u);
+    EXPECT_EQ(told, 25'000u);
+    QTest::keyClick(Slider(), Qt::Key_PageDown);
+    EXPECT_EQ(song_.Position, 0u);
+    for (int i = 0; i < 9; ++i)
+        QTest::keyClick(Slider(), Qt::Key_PageUp);
+    EXPECT_EQ(song_.Position, 240'000u);
+}
+
+// --- Cross-fading ---
+
+TEST_F(VisPlaySoundTest, ThePlayerAsksHereWhenToFade) {
+    EXPECT_EQ(player_.Crossover(), coAutoChange);
+    auto* modes = panel_.findChild<QComboBox*>(u"crossover"_s);
+    QTest::keyClick(modes, Qt::Key_End);
+    EXPECT_EQ(player_.Crossover(), coAlways);
+    panel_.SetCrossover(coNone);
+    EXPECT_EQ(modes->currentText(), u"Kein Überblenden"_s);
+}
+
+// --- The look ---
+
+TEST_F(VisPlaySoundTest, AWideStripIsLowAndANarrowStackIsNotCut) {
+    for (const int points : {9, 12, 16}) {
+        QFont font = panel_.font();
+        font.setPointSize(points);
+        panel_.setFont(font);
+        panel_.resize(1200, 60);
+        QApplication::processEvents();
+        const int strip = panel_.sizeHint().height();
+        panel_.resize(panel_.minimumSizeHint().width(), 200);
+        QApplication::processEvents();
+        EXPECT_GT(panel_.sizeHint().height(), strip);
+        const auto* modes = panel_.findChild<QComboBox*>(u"crossover"_s);
+        EXPECT_GE(modes->width(), modes->minimumSizeHint().width());
+        EXPECT_TRUE(panel_.rect().contains(modes->geometry()));
+    }
+}
+
+}  // namespace
