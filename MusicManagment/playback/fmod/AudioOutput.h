@@ -21,6 +21,8 @@ class AudioOutput {
     virtual void Close() = 0;
     // True once an open output has been lost (a server ended, a disk is full). It must be closed then.
     virtual bool Failed() const = 0;
+    // True when another one may be opened in the place of a lost one without doing harm.
+    virtual bool Replaceable() const { return false; }
 
     // True when nobody but Advance pulls. Such an output may have to wait for its sources: none of it is
     // heard, all of it counts.

@@ -17,7 +17,7 @@ struct OutputChoice {
         Sdl,      // `name` is one of SDL's drivers
     };
     Kind kind = Kind::ByType;
-    QString name;
+    QString name{};
     bool floats = false;   // WavFile: 32-bit floats instead of 16-bit integers
     bool unpaced = false;  // WavFile, Null: as fast as Advance is called instead of in real time
 };

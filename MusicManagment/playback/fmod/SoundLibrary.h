@@ -1,10 +1,14 @@
 #pragma once
 
 #include <QString>
+#include <map>
 #include <memory>
 
+#include "MusicManagment/playback/fmod/DecodeAhead.h"
 #include "MusicManagment/playback/fmod/FmodLibrary.h"
+#include "MusicManagment/playback/fmod/Mixer.h"
 #include "MusicManagment/playback/fmod/OutputChoice.h"
+#include "MusicManagment/playback/fmod/Spectrum.h"
 
 // The sound library itself: mixes streams and songs into one output. Every open file is decoded ahead by a
 // thread of its own; the output's thread only mixes.
@@ -67,6 +71,50 @@ class SoundLibrary : public FmodLibrary {
     const float* FSOUND_DSP_GetSpectrum() override;
 
  private:
-    class Engine;
-    std::unique_ptr<Engine> engine_;
+    struct Voice {
+        std::unique_ptr<DecodeAhead> ahead;
+        quint64 length = 0;  // frames
+        int channel = Mixer::kNoChannel;
+    };
+    struct Song : Voice {
+        FMUSIC_TYPES type = FMUSIC_TYPE_NONE;
+        int orders = 0;
+        float gain = 1;
+    };
+
+    bool Fail(TFmodError error);
+    bool Initialised();
+    bool BeforeInit();
+    // Runs what may throw and keeps the reason; false when it did.
+    template <typename Action>
+    bool Try(Action action);
+    template <typename Table, typename Handle>
+    auto* Find(Table& table, Handle handle);
+    template <typename Table>
+    bool HasSpace(const Table& table);
+
+    bool OpenOutput();
+    bool OutputWorks();
+    void Render(float* stereo, std::size_t frames);
+    bool StartVoice(Voice& voice, float gain, bool paused);
+    bool Rewind(Voice& voice);
+    std::size_t BufferFrames() const;
+
+    const OutputFactory outputs_;
+    QString midiFont_;
+    int lastError_ = FMOD_ERR_NONE;
+    TFSoundOutputTypes outputType_ = FSOUND_OUTPUT_DSOUND;
+    int bufferMs_ = 100;
+    int rate_ = 0;
+    qint64 lastReopening_ = 0;  // ticks
+
+    // The mixer is there from FSOUND_Init to FSOUND_Close. Files and the output use it, so they go first.
+    std::unique_ptr<Mixer> mixer_;
+    std::map<FSOUND_STREAM, Voice> streams_;
+    std::map<FMUSIC_MODULE, Song> songs_;
+    std::uint64_t lastHandle_ = 0;
+    std::unique_ptr<AudioOutput> output_;
+
+    Spectrum spectrum_;
+    bool spectrumActive_ = false;
 };
