@@ -7,10 +7,10 @@
 #include <cmath>
 #include <numbers>
 
-#include "CommonRUKTools/Clock.h"
 #include "MusicManagment/playback/eldos/NullPush.h"
 #include "tests/PrintQt.h"
 #include "tests/playback/engines/EncodedTone.h"
+#include "tests/playback/engines/SetClockTo.h"
 
 using namespace Qt::StringLiterals;
 
@@ -55,15 +55,6 @@ class RecordingOutput : public PushOutput {
 
  private:
     Record& record_;
-};
-
-class SetClockTo : public Clock {
- public:
-    SetClockTo() { SetClock(this); }
-    ~SetClockTo() override { SetClock(nullptr); }
-    qint64 Ticks() const override { return ticks; }
-    double Now() const override { return 0; }
-    qint64 ticks = 1000;
 };
 
 // How loud a tone is in interleaved stereo samples: its amplitude in the left channel, 1 is full scale.
