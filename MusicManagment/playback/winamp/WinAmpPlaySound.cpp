@@ -20,6 +20,8 @@ constexpr QStringView kDefaultFile = u"WinAmp.exe";
 constexpr qint64 kAssumed = 1500;
 // A position that has grown counts as playing for so long: some players call themselves stopped meanwhile.
 constexpr qint64 kMoving = 1000;
+// Further off than this the position cannot be, unless the player has not gone there yet.
+constexpr qint64 kOff = 1500 * 1000;  // microseconds
 constexpr qint64 kAskAgain = 50;
 // A song that was left so close to its end has ended by itself.
 constexpr qint64 kCloseToEnd = 2000 * 1000;  // microseconds
@@ -147,6 +149,7 @@ void TWinAmpPlaySound::SetPosition(quint32 milliseconds) {
     if (state_.Length > 0) target = qMin(target, state_.Length);
     if (!TrySetPosition(target)) Throw(u"Fehler beim Setzen der neuen Position."_s);
     AssumePosition(target);
+    soughtUntil_ = Now() + kAssumed;
 }
 
 quint32 TWinAmpPlaySound::GetPosition() {
@@ -309,7 +312,9 @@ void TWinAmpPlaySound::Take(const MprisState& state) {
         if (!IsAssumed()) EndSong();
         return;
     }
+    const qint64 position = PositionNow();
     TakeNew(state);
+    if (Now() < soughtUntil_ && qAbs(state.Position - position) > kOff) state_.Position = position;
 }
 
 void TWinAmpPlaySound::TakeNew(const MprisState& state) {
@@ -344,7 +349,7 @@ bool TWinAmpPlaySound::IsAssumed() const {
 }
 
 bool TWinAmpPlaySound::IsPlaying() const {
-    if (over_) return false;
+    if (over_ || (wish_ != Wish::Playing && wish_ != Wish::Paused)) return false;
     if (IsAssumed()) return wish_ == Wish::Playing;
     return state_.Status == "Playing"_L1 || (state_.Status == "Stopped"_L1 && Now() < movingUntil_);
 }

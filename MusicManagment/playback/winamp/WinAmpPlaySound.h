@@ -88,6 +88,7 @@ class TWinAmpPlaySound : public TPlaySoundContainer {
     // Ticks of the clock.
     qint64 stateTime_ = 0;
     qint64 assumedUntil_ = 0;  // until then the player is taken to do what it was told
+    qint64 soughtUntil_ = 0;   // until then it is taken to be on its way to the position it was told
     qint64 movingUntil_ = 0;   // until then its position is taken to move, whatever its status says
     bool over_ = false;        // the song has ended, or the player has left it
 };

@@ -85,6 +85,8 @@ TEST_F(WinAmpTest, AnOpenedSongIsHeldAtItsStartUntilItIsPlayed) {
     EXPECT_TRUE(WaitUntil([this] { return player_.Calls.contains(u"SetPosition"_s); }, kPatience));
     EXPECT_EQ(player_.Status, u"Paused"_s);
     EXPECT_EQ(player_.Position, 0);
+    clock_.ticks += 5000;
+    EXPECT_EQ(sound->GetPosition(), 0U);
 
     sound->Play();
     EXPECT_EQ(player_.Status, u"Playing"_s);
@@ -120,11 +122,18 @@ TEST_F(WinAmpTest, PositionFollowsThePlayerAndTheTimeBetween) {
     sound->SetPosition(90000);
     EXPECT_EQ(player_.Position, 90'000'000);
     EXPECT_EQ(sound->GetPosition(), 90000U);
+    // It takes a while to get there.
+    player_.Position = 30'000'000;
+    StatusAfter(*sound, 100);
+    EXPECT_EQ(sound->GetPosition(), 90100U);
+    StatusAfter(*sound, 2000);
+    EXPECT_EQ(sound->GetPosition(), 30000U);
     sound->SetPosition(999999);
     EXPECT_EQ(player_.Position, player_.Length);
 
     sound->Stop();
     EXPECT_EQ(sound->GetStatus(), psStopped);
+    clock_.ticks += 5000;
     EXPECT_EQ(sound->GetPosition(), 0U);
     EXPECT_EQ(player_.Position, 0);
     EXPECT_FALSE(player_.Calls.contains(u"Stop"_s));
