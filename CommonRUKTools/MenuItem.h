@@ -22,6 +22,10 @@ class TMenuExItem {
     // As "Ctrl+Alt+N"; empty for none.
     const QString& Shortcut() const { return shortcut_; }
 
+    // Number of the picture beside the caption; -1 none.
+    int ImageIndex() const { return imageIndex_; }
+    void SetImageIndex(int index) { imageIndex_ = index; }
+
     bool Enabled() const { return enabled_; }
     void SetEnabled(bool enabled) { enabled_ = enabled; }
     // Why the item is disabled or what it does; empty for none.
@@ -51,6 +55,7 @@ class TMenuExItem {
     int id_;
     QString shortcut_;
     QString hint_;
+    int imageIndex_ = -1;
     bool enabled_ = true;
     bool checkable_ = false;
     bool checked_ = false;

@@ -11,8 +11,8 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr std::array<const CommandRow*, 5> kCommands = {&kInfoCommand, &kScanCommand, &kListCommand,
-                                                        &kGroupsCommand, &kSaveCommand};
+constexpr std::array<const CommandRow*, 6> kCommands = {&kInfoCommand,   &kScanCommand, &kListCommand,
+                                                        &kGroupsCommand, &kSaveCommand, &kPlaylistCommand};
 
 bool IsHelp(const QString& word) {
     return word == u"--help"_s || word == u"-h"_s;

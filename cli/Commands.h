@@ -22,6 +22,7 @@ extern const CommandRow kScanCommand;
 extern const CommandRow kListCommand;
 extern const CommandRow kGroupsCommand;
 extern const CommandRow kSaveCommand;
+extern const CommandRow kPlaylistCommand;
 
 // All of them, in the order of the help.
 std::span<const CommandRow* const> AllCommands();

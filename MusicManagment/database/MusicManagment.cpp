@@ -19,10 +19,8 @@ namespace {
 
 constexpr quint8 kHighestGenre = 254;
 
-// The path under which a song's file can be opened now; empty when its medium is not there.
-QString ResolvedPath(const QString& fileName) {
-    return IsCdPath(fileName) ? QString() : fileName;
-}
+// For songs on their way into the collection: no question, and no copy in place of the song.
+constexpr ResolveOptions kOriginalOnly = {.Ask = false, .UseCache = false};
 
 QString WithTrailingSeparator(const QString& folder) {
     return folder.endsWith(u'/') ? folder : folder + u'/';
@@ -136,10 +134,19 @@ bool TMusicDatabase::IsBanned(const TID3Tag& record) const {
     return bannList_.Contains(BanEntry(record));
 }
 
+QString TMusicDatabase::ResolveSongPath(const QString& path, const ResolveOptions& options) const {
+    if (!IsCdPath(path)) return path;
+    return OnResolveCdPath ? OnResolveCdPath(path, options) : QString();
+}
+
+void TMusicDatabase::MarkSong(SongIndex index) {
+    if (OnMarkSong && index >= 0 && index < Count()) OnMarkSong(*this, index);
+}
+
 // The looks at the disk and at the ban list before a song is taken in.
 bool TMusicDatabase::Accepts(const TID3Tag& record, const AddOptions& options) {
     if (options.SkipChecks || options.SkipDiskChecks) return true;
-    const QString path = ResolvedPath(record.FileName);
+    const QString path = ResolveSongPath(record.FileName, kOriginalOnly);
     if (!path.isEmpty() && !FileSource::Exists(path)) return false;
     if (!IsBanned(record)) return true;
     if (autoDelBannedFiles_) MoveToRecycleBin(path, true);
@@ -177,7 +184,7 @@ SongIndex TMusicDatabase::AddEntry(std::unique_ptr<TID3Tag> entry, const AddOpti
 
 SongIndex TMusicDatabase::AddSong(const QString& path, const SongOverrides& overrides,
                                   const AddOptions& options) {
-    const QString resolved = ResolvedPath(path);
+    const QString resolved = ResolveSongPath(path, kOriginalOnly);
     TID3Tag record;
     if (!ReadAudioFile(resolved, AudioReadOptions(), record).isEmpty()) return -1;
     ApplyOverrides(overrides, record);

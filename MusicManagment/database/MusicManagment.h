@@ -56,6 +56,12 @@ struct SongOverrides {
     std::optional<quint16> Reserved{};
 };
 
+// How far finding a song's file may go.
+struct ResolveOptions {
+    bool Ask = true;       // ask the user for a medium that is not there
+    bool UseCache = true;  // take the copy that was put on the disk
+};
+
 struct CdName {
     QString Name;
     quint32 Serial = 0;  // volume serial number
@@ -103,6 +109,12 @@ class TMusicDatabase : public QObject {
     // Empties the database; does nothing while it is busy.
     void Clear(bool notify = true, bool keepFileName = false);
     bool IsBanned(const TID3Tag& record) const;
+    // The path under which a song's file can be opened now; empty when its medium is not there. An ordinary
+    // path is its own answer, whether or not there is such a file. A path on a catalogued CD goes to
+    // OnResolveCdPath, where the catalogue takes part; without one no CD is ever there.
+    QString ResolveSongPath(const QString& path, const ResolveOptions& options = {}) const;
+    // Has the views mark a song and show it.
+    void MarkSong(SongIndex index);
     // Sorts the whole list anew. Throws EMusicDatabaseException while the database is busy.
     void Resort();
 
@@ -263,6 +275,11 @@ class TMusicDatabase : public QObject {
     TNotifyEvent OnEndProgress;
     TNotifyEvent OnCaptionChanged;
     TMenuItemClickedEvent OnMenuItemClicked;
+    // Finds the file of a path on a CD; see ResolveSongPath.
+    std::function<QString(const QString& path, const ResolveOptions& options)> OnResolveCdPath;
+    std::function<void(TMusicDatabase&, SongIndex index)> OnMarkSong;
+    // The playlist has played all its songs; `showException` is whether the user is told.
+    std::function<void(TMusicDatabase&, bool& showException)> OnAllFilesPlayed;
 
     // Raising events whose cause lies in a capability beside this class.
     void RaiseChange(SongIndex index, TChangeType change);

@@ -1,14 +1,9 @@
 #pragma once
 
-#include "CommonRUKTools/Errors.h"
+#include "MusicManagment/playback/EngineErrors.h"
+#include "MusicManagment/playback/FadingBackend.h"
 #include "MusicManagment/playback/PlaySoundContainer.h"
 #include "MusicManagment/playback/fmod/FmodLibrary.h"
-
-// The sound library refuses; the message is for the user.
-class EFMODException : public ERukException {
- public:
-    using ERukException::ERukException;
-};
 
 // The player's settings that concern this engine, copied when a back end is made.
 struct TFMODSettings {
@@ -21,7 +16,7 @@ struct TFMODSettings {
 
 // A song that sounds through the sound library: tracker and MIDI files as songs, everything else as streams.
 // Fades run in steps: whoever owns the back end calls FadeStep on every tick of its timer.
-class TFMODPlaySound : public TPlaySoundContainer {
+class TFMODPlaySound : public TPlaySoundContainer, public FadingBackend {
  public:
     // The library must outlive the back end.
     TFMODPlaySound(FmodLibrary& library, const TFMODSettings& settings, QObject* parent = nullptr);
@@ -39,23 +34,16 @@ class TFMODPlaySound : public TPlaySoundContainer {
     quint32 GetLength() override;
     TPSStatus GetStatus() override;
 
-    // Below 0 is 0, above 100 is 100.
-    void SetVolume(int percent);
-
+    void SetVolume(int percent) override;
     quint32 FadeTime() const { return settings_.FadeTime; }
-    void SetFadeTime(quint32 milliseconds) { settings_.FadeTime = milliseconds; }
-    // The volume goes from silence to full, or from full to silence, within the fade time from now on.
-    void StartFadeIn();
-    void StartFadeOut();
-    // Sets the volume that the running fades ask for now. True when a fade-out has come to its end in this
-    // step; the back end has stopped itself then.
-    bool FadeStep();
-    bool IsFadingIn() const { return fadeInEnd_ != 0; }
-    bool IsFadingOut() const { return fadeOutEnd_ != 0; }
-    // Forgets both fades and leaves the volume as it is.
-    void CancelFades();
-    // A running fade-out ends with the next step.
-    void CutFadeOut();
+    void SetFadeTime(quint32 milliseconds) override { settings_.FadeTime = milliseconds; }
+    void StartFadeIn() override;
+    void StartFadeOut() override;
+    bool FadeStep() override;
+    bool IsFadingIn() const override { return fadeInEnd_ != 0; }
+    bool IsFadingOut() const override { return fadeOutEnd_ != 0; }
+    void CancelFades() override;
+    void CutFadeOut() override;
 
  private:
     QString LibraryError();

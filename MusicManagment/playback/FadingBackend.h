@@ -2,6 +2,8 @@
 
 #include <QtGlobal>
 
+#include "MusicManagment/playback/PlaySoundContainer.h"
+
 // What a back end that can fade offers besides playing. The player fades, and fades from song to song, with
 // these only. Fades run in steps: the player calls FadeStep at every tick of its timer.
 class FadingBackend {
@@ -24,3 +26,8 @@ class FadingBackend {
     // A running fade-out ends with the next step.
     virtual void CutFadeOut() = 0;
 };
+
+// The fades of a back end; nullptr when it has none.
+inline FadingBackend* AsFading(TPlaySoundContainer* backend) {
+    return dynamic_cast<FadingBackend*>(backend);
+}

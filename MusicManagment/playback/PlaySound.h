@@ -34,20 +34,20 @@ class TPlaySound : public TPlaySoundContainer,
                    public SettingsClient,
                    private FeedbackReceiver {
  public:
-    // The engines are those of the table; see Engines.h for the real ones.
+    // The engines are those of the table; Engines.h has the real ones.
     explicit TPlaySound(EngineTable engines, QObject* parent = nullptr);
     ~TPlaySound() override;
 
     // --- The song (PlaySoundOpen.cpp) ---
     const QString& FileName() const { return fileName_; }
-    // Closes the former song and opens this one, and plays it with AutoPlay. An empty name closes. A missing
-    // file opens nothing. Throws EPlaySoundException when no engine is allowed for the file, and what the
-    // last engine throws.
+    // Closes the former song and opens this one, and plays it with AutoPlay. An empty name only closes. A
+    // missing file opens nothing. Throws EPlaySoundException when no engine is allowed for the file, and what
+    // the last engine throws; nothing is open then.
     void SetFileName(const QString& path) override;
     void Open() override;
     void Close() override;
 
-    // --- Playing. Without a song they do nothing; they throw what the engine throws ---
+    // --- Playing. Without a song they do nothing. They throw what the engine throws ---
     void Play() override;
     void Stop() override { Stop(StopMode::AtOnce); }
     void Stop(StopMode mode);
@@ -63,25 +63,32 @@ class TPlaySound : public TPlaySoundContainer,
     void WaitForEnd(WaitMode mode);
 
     // --- Fading (PlaySoundFades.cpp) ---
+    // Plays this file while the current song fades out. False when that is not possible; the current song
+    // goes on then as if nothing had been asked.
     bool PlayWithCrossFade(const QString& path) override;
-    // A song that sounds while the current one keeps playing; empty when there is none.
+    // A song that sounds, fading out, while the current one keeps playing; empty when there is none.
     QString COFileName();
     void SetCOFileName(const QString& path);
     // As the controller or else the panel wants it; asked anew for every decision.
     TCrossover Crossover() const;
+    // What it means for a user who wants another song, or wants to stop.
+    SongChange ChangeOnDemand() const;
+    StopMode StopOnDemand() const;
 
     // --- Properties ---
     bool AutoPlay() const override { return autoPlay_; }
     void SetAutoPlay(bool value) { autoPlay_ = value; }
     int TimerInterval() const { return timerInterval_; }
     void SetTimerInterval(int milliseconds);  // at least 1
+    // The longest time a song plays, in milliseconds; 0 is no limit.
     int AutoStop() const { return autoStop_; }
     void SetAutoStop(int milliseconds) override;
     const EngineSettings& Engines() const { return settings_; }
-    // Hold for the next song; a reachable external player is told of each change.
+    // They hold from the next song on. A reachable external player is told of each change.
     void SetEngines(const EngineSettings& settings);
     bool PlayExtern() const { return playExtern_; }
-    // Closes the song here and opens it there. Without a channel to external players nothing changes.
+    // Closes the song here and opens it there, or the other way round. Without a way to external players
+    // nothing changes.
     void SetPlayExtern(bool value);
 
     // --- Wiring ---
@@ -96,20 +103,21 @@ class TPlaySound : public TPlaySoundContainer,
     QObject* DSPDraw() const { return dspDraw_; }
     void SetDSPDraw(QObject* component) { dspDraw_ = component; }
     PlayerPanel* Panel() const { return panel_; }
+    // A panel tells when it goes: SetPanel(nullptr).
     void SetPanel(PlayerPanel* panel) { panel_ = panel; }
     PlayController* Controller() const { return controller_; }
-    // The controller tells when it goes: SetController(nullptr).
+    // A controller tells when it goes: SetController(nullptr).
     void SetController(PlayController* controller) { controller_ = controller; }
     // The way to a separate player program; nullptr: there is none.
     void SetExternalPlayer(std::unique_ptr<ExternalPlayer> player);
     void RedrawPanel() override;
 
-    // --- Handlers of the timers; they throw what playing throws ---
+    // --- Handlers of the timers (PlaySoundTick.cpp); they throw what playing throws ---
     void Tick();
     void HandleEndOfSong();
     void HandleAutoStop();
-    // Runs the handlers that are due by the clock, for those who have no event loop.
-    void RunDueTimers();
+    // Runs the handlers whose time has come by the engine's clock, for those who have no event loop.
+    void RunDueTimers() { timers_.RunDue(); }
     const PlayTimers& Timers() const { return timers_; }
 
     // --- Command menu (PlaySoundMenu.h) ---
@@ -130,55 +138,70 @@ class TPlaySound : public TPlaySoundContainer,
     TNotifyEvent OnPlayingResumed;
     TNotifyEvent OnReachedEndOfSong;
     TNotifyEvent OnCrossover;
-    std::function<void(TPlaySound&, quint32 position)> OnPlaying;
+    std::function<void(TPlaySound&, quint32 position)> OnPlaying;  // ms
 
  private:
     using Backend = std::unique_ptr<TPlaySoundContainer>;
+    enum class TickKind { Running, Last };
 
     // PlaySoundOpen.cpp
-    Backend MakeBackend(TEngine engine, const QString& path);
+    Backend MakeBackend(TEngine engine, const QString& path) const;
     void CreateBackend(TEngine engine, const QString& message);
-    void CreateBackendsAfter(TEngine failed, const ERukException& error);
-    void OpenExternally();
+    bool CreateBackendsAfter(TEngine failed, const QString& message);
+    bool OpenExternally();
+    bool UseExternal();
+    bool ExternalRuns();
+    void PlayInternally();
     void CloseBackends();
+    void ClearPanel();
+
+    // PlaySound.cpp
+    bool EndFadesOfPlaying();
+    void AnnounceSong();
+    void FinishStop();
+    void StartTimers();
+    void StopTimers();
+    void RestartAutoStop();
+    void MarkSong();
+    SongIndex SongInDatabase() const;
+    void MoveBy(qint64 milliseconds);
+
+    // PlaySoundFades.cpp
+    bool CanFade() const;
+    bool CrossFadeTo(Backend next, const QString& path);
 
     // PlaySoundTick.cpp
-    enum class TickKind { Running, Last };
     void RunTick(TickKind kind);
     void ReportPosition(quint32 position, quint32 length);
     bool FinishFades();
+    bool IsStopping() const;
+    bool HasEnded(quint32 position, quint32 length);
     void CheckEnd(quint32 position, quint32 length);
     void CheckCrossFade(quint32 position, quint32 length);
-    void CountSong();
     void CountSongWhenDue();
+    void CountSong();
     void AskForNextSong(SongChange change);
     void PlayNextOfDatabase(SongChange change);
     void RunHandler(void (TPlaySound::*handler)());
-    void StartTimers();
-    void StopTimers();
 
-    void FinishStop();
-    void StateChanged();
+    // PlaySoundFeedback.cpp
     void Raise(const TNotifyEvent& event);
     void Feedback(FeedbackCode code, quint32 parameter = 0);
+    void StateChanged();
     qint64 HandleFeedback(int code, quint32 parameter) override;
     void HandleFeedbackText(int code, const QString& text) override;
-    // True when the song plays in the external player. Falls back to playing here when there is none.
-    bool UseExternal();
-    bool CanFade() const;
-    static FadingBackend* AsFading(const Backend& backend);
 
     EngineTable engineTable_;
     EngineSettings settings_;
     QString fileName_;
     QString coFileName_;
     Backend current_;
-    Backend fading_;  // the song that fades out, or the one of COFileName
+    Backend fading_;  // the song that fades out
     PlayTimers timers_;
     PlayCountClock playCount_;
     std::unique_ptr<ExternalLink> external_;
     int timerInterval_ = 250;  // ms
-    int autoStop_ = 0;         // ms; 0 off
+    int autoStop_ = 0;         // ms
     bool autoPlay_ = false;
     bool playExtern_ = false;
     bool endReached_ = false;

@@ -23,6 +23,7 @@ class PlayTimers {
     void StartTicks(int interval);
     void StartEnd();
     void StartAutoStop(int delay);
+    void StopTicks() { ticks_.Stop(); }
     void StopEnd() { end_.Stop(); }
     void StopAutoStop() { autoStop_.Stop(); }
     void StopAll();

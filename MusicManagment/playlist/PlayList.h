@@ -7,6 +7,7 @@
 #include <QStringList>
 #include <functional>
 #include <memory>
+#include <optional>
 #include <random>
 #include <vector>
 
@@ -17,6 +18,7 @@
 #include "MusicManagment/playlist/PlayListTypes.h"
 
 class PlayListView;
+struct EntryToSave;
 class SongPlayer;
 
 // How one entry is played.
@@ -42,7 +44,8 @@ class TPlayList : public QObject, public SettingsClient {
     qint64 TotalSeconds() const { return entries_.TotalSeconds(); }
 
     // Each inserts before `position`, which is brought into the range 0 to Count(). The first takes a song of
-    // the database; throws EPlayListException without a database, and for a song that it does not have.
+    // the database; throws EPlayListException without a database, EMusicDatabaseException for an index that
+    // is none of its songs.
     void InsertSong(int position, SongIndex song);
     void Insert(int position, PlayListEntry entry);
     // What a drop brings (Drop.cpp): songs, folders with the songs in them, playlists with their entries. Of
@@ -160,13 +163,32 @@ class TPlayList : public QObject, public SettingsClient {
 
  private:
     class Search;
+    enum class Outcome { Failed, Playing, CurrentGoesOn };
 
     void RaiseChange(int index, TChangeType change);
     const QString& NameAt(int index) const { return entries_.At(index).Name; }
+    QString ResolvedPath(const QString& name, const ResolveOptions& options) const;
     QString PlayablePath(const QString& name) const;
-    bool Play(int index, const PlayOptions& options);
+    std::optional<TID3Tag> FindRecord(const QString& name, SongIndex databaseHint) const;
+
+    // Next.cpp
+    Outcome Play(int index, const PlayOptions& options);
     bool StartPlayer(SongChange change);
+    bool IsOpen(int index, int current, const QSet<QString>& played) const;
+    std::vector<int> RestOfRound(int current);
     void HandleAllPlayed();
+    void ReturnTo(const QString& song);
+    void RequirePlayer() const;
+    static void Tell(const QString& report);
+
+    // Drop.cpp
+    std::vector<PlayListEntry> EntriesFor(const QStringList& paths) const;
+
+    // PlayListCommands.cpp
+    void Replace(std::vector<PlayListEntry> entries, const QString& fileName);
+    std::vector<EntryToSave> EntriesForSaving() const;
+    void OpenFromDialog();
+    void ExportFromDialog();
 
     EntryList entries_;
     QStringList history_;

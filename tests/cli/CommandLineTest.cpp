@@ -45,7 +45,7 @@ TEST(CommandLine, WrongUsageIsNamedWithWhereTheHelpIs) {
 
 TEST(CommandLine, HelpNamesEveryCommandAndEachOfItsOptions) {
     const std::pair<QString, QStringList> cases[] = {
-        {u""_s, {u"info"_s, u"scan"_s, u"list"_s, u"groups"_s, u"save"_s}},
+        {u""_s, {u"info"_s, u"scan"_s, u"list"_s, u"groups"_s, u"save"_s, u"playlist"_s}},
         {u"info"_s, {u"--json"_s, u"--classic"_s, u"--frames"_s, u"DATEI…"_s}},
         {u"scan"_s, {u"--db DATENBANK"_s, u"--no-subfolders"_s, u"--classic"_s, u"--json"_s, u"PFAD…"_s}},
         {u"list"_s, {u"--db"_s, u"--sort"_s, u"--subsort"_s, u"--backwards"_s, u"--json"_s}},

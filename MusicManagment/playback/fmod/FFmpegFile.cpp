@@ -3,6 +3,7 @@
 #include <QFile>
 #include <QFileInfo>
 #include <algorithm>
+#include <utility>
 
 #include "CommonRUKTools/ByteReader.h"
 #include "MusicManagment/playback/fmod/SoundSource.h"
@@ -62,14 +63,15 @@ class Options {
     AVDictionary* dictionary_ = nullptr;
 };
 
-// Samples at the end of a packet that are not part of the sound.
-std::int64_t PaddingOf(const AVPacket& packet) {
+// How many samples of a packet are part of the sound. What an encoder added behind it stands beside the
+// packet; where frames have no size of their own (Vorbis) the duration leaves it out already.
+std::int64_t SamplesOf(const AVPacket& packet, std::int64_t duration, int frameSize) {
     std::size_t size = 0;
     const std::uint8_t* data = av_packet_get_side_data(&packet, AV_PKT_DATA_SKIP_SAMPLES, &size);
-    if (data == nullptr) return 0;
+    if (data == nullptr || frameSize <= 0) return duration;
     ByteReader reader({data, size});
     reader.Skip(4);
-    return reader.U32Le();
+    return std::min(duration, frameSize - std::int64_t{reader.U32Le()});
 }
 
 }  // namespace
@@ -93,6 +95,7 @@ FFmpegFile::FFmpegFile(const QString& path, LengthBy lengthBy)
     OpenContainer(path);
     OpenDecoder();
     MeasureLength(lengthBy, QFileInfo(path).size());
+    FindFirstSample();
 }
 
 FFmpegFile::~FFmpegFile() = default;
@@ -177,15 +180,24 @@ void FFmpegFile::CountPackets() {
     while (ReadPacket()) {
         const std::int64_t start = packet_->pts != AV_NOPTS_VALUE ? packet_->pts : packet_->dts;
         if (start == AV_NOPTS_VALUE) continue;
-        const std::int64_t packetEnd =
-            av_rescale_q(start + packet_->duration - Origin(), stream_->time_base, sample);
-        end = std::max(end, packetEnd - PaddingOf(*packet_));
+        const std::int64_t from = av_rescale_q(start - Origin(), stream_->time_base, sample);
+        const std::int64_t duration = av_rescale_q(packet_->duration, stream_->time_base, sample);
+        end = std::max(end, from + SamplesOf(*packet_, duration, stream_->codecpar->frame_size));
     }
     if (end != AV_NOPTS_VALUE) length_ = end;
     if (!SeekBefore(0)) throw ESoundFileError(FMOD_ERR_FILE_BAD);
 }
 
+// Some decoders (of Windows Media) give nothing for the first packet, and stamp what follows accordingly. The
+// place 0 is the first sample that comes out.
+void FFmpegFile::FindFirstSample() {
+    if (Next() == nullptr) throw ESoundFileError(FMOD_ERR_FILE_FORMAT);
+    firstSample_ = std::max<std::int64_t>(0, SampleOf(*frame_));
+    keepFrame_ = true;
+}
+
 const AVFrame* FFmpegFile::Next() {
+    if (std::exchange(keepFrame_, false)) return frame_.get();
     for (;;) {
         const int result = avcodec_receive_frame(codec_.get(), frame_.get());
         if (result == 0) return frame_.get();
@@ -199,11 +211,12 @@ const AVFrame* FFmpegFile::Next() {
 std::int64_t FFmpegFile::SampleOf(const AVFrame& frame) const {
     if (frame.best_effort_timestamp == AV_NOPTS_VALUE) return -1;
     const std::int64_t since = frame.best_effort_timestamp - Origin();
-    return std::max<std::int64_t>(0, av_rescale_q(since, stream_->time_base, {1, Rate()}));
+    return std::max<std::int64_t>(0, av_rescale_q(since, stream_->time_base, {1, Rate()}) - firstSample_);
 }
 
 bool FFmpegFile::SeekBefore(std::int64_t sample) {
     const std::int64_t stamp = av_rescale_q(sample, {1, Rate()}, stream_->time_base) + Origin();
+    keepFrame_ = false;
     if (av_seek_frame(format_.get(), stream_->index, stamp, AVSEEK_FLAG_BACKWARD) < 0) return false;
     avcodec_flush_buffers(codec_.get());
     drained_ = false;

@@ -16,8 +16,8 @@ class FFmpegFile {
  public:
     enum class LengthBy { Header, Counting };
 
-    // Throws ESoundFileError. Counting reads all packets of the file; small files, which cost nothing, are
-    // always counted.
+    // Throws ESoundFileError, also when nothing in the file can be decoded. Counting reads all packets of the
+    // file; small files, which cost nothing, are always counted.
     FFmpegFile(const QString& path, LengthBy lengthBy);
     ~FFmpegFile();
 
@@ -51,6 +51,7 @@ class FFmpegFile {
     bool LengthIsExact(std::int64_t fileSize) const;
     bool ReadPacket();
     void CountPackets();
+    void FindFirstSample();
     std::int64_t Origin() const;
 
     std::unique_ptr<AVFormatContext, Deleter<FreeFormat>> format_;
@@ -59,5 +60,7 @@ class FFmpegFile {
     std::unique_ptr<AVPacket, Deleter<FreePacket>> packet_;
     AVStream* stream_ = nullptr;  // the format's
     std::int64_t length_ = 0;
+    std::int64_t firstSample_ = 0;
+    bool keepFrame_ = false;  // the next frame is in frame_ already
     bool drained_ = false;
 };

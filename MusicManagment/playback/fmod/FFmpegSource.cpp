@@ -13,8 +13,8 @@ extern "C" {
 namespace {
 
 // Where decoding starts before the place that is sought, one after the other while the file leads too far:
-// frames of MPEG sound lean on those before them.
-constexpr std::array kMarginsMs = {200, 1200, 6000};
+// frames of MPEG sound lean on those before them, in the lowest of variable bit rates on a dozen and more.
+constexpr std::array kMarginsMs = {600, 2400, 9600};
 constexpr int kToleranceMs = 5;
 constexpr int kMostFrameSamples = 1 << 20;
 
@@ -27,7 +27,6 @@ void FFmpegSource::ResamplerDeleter::operator()(SwrContext* context) const {
 FFmpegSource::FFmpegSource(const QString& path, FFmpegFile::LengthBy lengthBy, int rate)
     : file_(path, lengthBy), rate_(rate) {
     length_ = static_cast<std::uint64_t>(ToMixRate(file_.Length()));
-    if (!Fill()) throw ESoundFileError(FMOD_ERR_FILE_FORMAT);
 }
 
 FFmpegSource::~FFmpegSource() = default;
@@ -52,6 +51,9 @@ void FFmpegSource::PrepareResampler(const AVFrame& frame) {
                             static_cast<AVSampleFormat>(frame.format), frame.sample_rate, 0, nullptr);
     av_channel_layout_uninit(&from);
     resampler_.reset(made);
+    // Mono goes to both sides as it is; the resampler would halve its power.
+    constexpr std::array<double, 2> kBothSides = {1, 1};
+    if (result >= 0 && input.channels == 1) swr_set_matrix(made, kBothSides.data(), 1);
     if (result < 0 || swr_init(made) < 0) throw ESoundFileError(FMOD_ERR_FILE_FORMAT);
     input_ = input;
 }

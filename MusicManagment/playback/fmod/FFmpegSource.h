@@ -11,7 +11,7 @@ struct SwrContext;
 // A sound file as frames at the mix rate. Seeks are exact to the sample wherever the file's time stamps are.
 class FFmpegSource : public SoundSource {
  public:
-    // Throws ESoundFileError, also when nothing in the file can be decoded. `rate` in Hz.
+    // Throws ESoundFileError. `rate` in Hz.
     FFmpegSource(const QString& path, FFmpegFile::LengthBy lengthBy, int rate);
     ~FFmpegSource() override;
 

@@ -1,0 +1,102 @@
+#include "MusicManagment/playback/ExternalLink.h"
+
+#include "MusicManagment/playback/EngineErrors.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+constexpr int kLooks = 30;
+constexpr int kLookEvery = 100;  // ms
+
+#ifdef Q_OS_WIN
+constexpr QStringView kProgram = u"TSPlayer.exe";
+#else
+constexpr QStringView kProgram = u"TSPlayer";
+#endif
+
+struct NumberRow {
+    ExternalCommand Command;
+    qint64 (*Value)(const EngineSettings&);
+};
+
+// In the order in which a new player program is told.
+constexpr NumberRow kNumbers[] = {
+    {ecUseFMOD, [](const EngineSettings& s) -> qint64 { return s.UseFMOD; }},
+    {ecUseMCI, [](const EngineSettings& s) -> qint64 { return s.UseMCI; }},
+    {ecUseEldoS, [](const EngineSettings& s) -> qint64 { return s.UseEldoS; }},
+    {ecUseWinAmp, [](const EngineSettings& s) -> qint64 { return s.UseWinAmp; }},
+    {ecCrossoverTime, [](const EngineSettings& s) -> qint64 { return s.FMODCrossoverTime; }},
+    {ecSoundOutputTypes, [](const EngineSettings& s) -> qint64 { return s.FMODSoundOutputTypes; }},
+    {ecMixRate, [](const EngineSettings& s) -> qint64 { return s.FMODMixRate; }},
+    {ecSoftChannels, [](const EngineSettings& s) -> qint64 { return s.FMODSoftChannels; }},
+    {ecBufferSize, [](const EngineSettings& s) -> qint64 { return s.FMODBufferSize; }},
+    {ecEldoSBufferCount, [](const EngineSettings& s) -> qint64 { return s.EldoSBufferCount; }},
+    {ecEldoSBufferSize, [](const EngineSettings& s) -> qint64 { return s.EldoSBufferSize; }},
+};
+
+struct TextRow {
+    ExternalCommand Command;
+    QString EngineSettings::*Value;
+};
+
+constexpr TextRow kTexts[] = {
+    {ecWinAmpClassName, &EngineSettings::WinAmpClassName},
+    {ecWinAmpFile, &EngineSettings::WinAmpFile},
+};
+
+}  // namespace
+
+ExternalLink::Reached ExternalLink::Find(const EngineSettings& settings) {
+    const auto found = player_->Find();
+    if (!found) return Reached::No;
+    if (known_ == found) return Reached::Known;
+    Greet(settings);
+    known_ = found;
+    return Reached::New;
+}
+
+ExternalLink::Reached ExternalLink::FindOrStart(const EngineSettings& settings) {
+    const Reached running = Find(settings);
+    if (running != Reached::No || !Start()) return running;
+    for (int look = 0; look < kLooks; ++look) {
+        player_->Wait(kLookEvery);
+        const Reached reached = Find(settings);
+        if (reached != Reached::No) return reached;
+    }
+    return Reached::No;
+}
+
+bool ExternalLink::Start() {
+    const QString program = kProgram.toString();
+    const QString argument = u"/NoVisible"_s;
+    return player_->Start(program, argument) || player_->Start(u"TSPlayer/"_s + program, argument);
+}
+
+void ExternalLink::Greet(const EngineSettings& settings) {
+    MakeFeedback();
+    Send(ecFeedbackHandle, *feedback_);
+    for (const NumberRow& row : kNumbers)
+        Send(row.Command, row.Value(settings));
+    for (const TextRow& row : kTexts)
+        SendText(row.Command, settings.*row.Value);
+}
+
+void ExternalLink::MakeFeedback() {
+    if (feedback_) return;
+    if (!player_->RegisterFeedback())
+        throw EPlaySoundException(
+            u"Fehler beim Erstellen eines Hilfs-Fensters für EPS-FeedBacks (RegisterClass fehlgeschlagen)"_s);
+    feedback_ = player_->CreateFeedback(receiver_);
+    if (!feedback_)
+        throw EPlaySoundException(
+            u"Fehler beim Erstellen eines Hilfs-Fensters für EPS-FeedBacks (CreateWindow fehlgeschlagen)"_s);
+}
+
+void ExternalLink::SendChanges(const EngineSettings& before, const EngineSettings& after) {
+    if (!Runs()) return;  // a new one is told everything when it is met
+    for (const NumberRow& row : kNumbers)
+        if (row.Value(before) != row.Value(after)) Send(row.Command, row.Value(after));
+    for (const TextRow& row : kTexts)
+        if (before.*row.Value != after.*row.Value) SendText(row.Command, after.*row.Value);
+}

@@ -1,0 +1,33 @@
+#pragma once
+
+#include <map>
+#include <memory>
+
+#include "MusicManagment/playback/mci/MciInterface.h"
+
+// The media control interface on GStreamer: a device is a player of its own, with its own way to the
+// loudspeaker. The environment variable TUNESTEAD_AUDIO with "null" plays in silence, in real time.
+class GstMci : public MciInterface {
+ public:
+    GstMci();
+    ~GstMci() override;
+
+    // Whether GStreamer has a part that is needed for playing, as "playbin" or "wavparse".
+    static bool HasPart(const char* name);
+
+    quint32 SendCommand(quint32 device, MciCommand command, quint32 flags,
+                        MciParameters& parameters) override;
+    QString ErrorString(quint32 error) override;
+
+ private:
+    class Device;
+
+    quint32 Open(MciParameters& parameters);
+    // Keeps the text for ErrorString; an empty one is no error.
+    quint32 Result(const QString& text);
+
+    std::map<quint32, std::unique_ptr<Device>> devices_;
+    quint32 lastDevice_ = 0;
+    quint32 lastError_ = 0;
+    QString lastErrorText_;
+};

@@ -1,0 +1,111 @@
+#include "MusicManagment/playlist/ListNames.h"
+
+#include <QDir>
+#include <algorithm>
+
+#include "CommonRUKTools/AbsolutePath.h"
+#include "CommonRUKTools/CodePage.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+bool IsLineEnd(QChar character) {
+    return character == u'\r' || character == u'\n';
+}
+
+bool IsHexDigit(char character) {
+    return (character >= '0' && character <= '9') || (character >= 'A' && character <= 'F') ||
+           (character >= 'a' && character <= 'f');
+}
+
+// ':' + 8 hexadecimal digits + ':'
+bool IsStoredCdPath(const QString& text) {
+    if (text.size() < 10 || text[0] != u':' || text[9] != u':') return false;
+    const QStringView digits = QStringView(text).sliced(1, 8);
+    return std::ranges::all_of(digits, [](QChar digit) { return IsHexDigit(digit.toLatin1()); });
+}
+
+// "%20" is a blank; a percent sign without two hexadecimal digits is itself.
+QByteArray PercentDecoded(const QByteArray& text) {
+    QByteArray bytes;
+    for (qsizetype i = 0; i < text.size(); ++i) {
+        const bool isCode =
+            text[i] == '%' && i + 2 < text.size() && IsHexDigit(text[i + 1]) && IsHexDigit(text[i + 2]);
+        bytes += isCode ? QByteArray::fromHex(text.sliced(i + 1, 2)).front() : text[i];
+        if (isCode) i += 2;
+    }
+    return bytes;
+}
+
+// The path of a file: address on this computer (RFC 8089); empty for anything else.
+QString LocalPath(const QString& text) {
+    if (!text.startsWith("file:/"_L1, Qt::CaseInsensitive)) return {};
+    QString rest = text.sliced(5);
+    if (rest.startsWith("//"_L1)) {
+        const qsizetype path = rest.indexOf(u'/', 2);
+        if (path < 0) return {};
+        const QStringView host = QStringView(rest).sliced(2, path - 2);
+        if (!host.isEmpty() && host.compare("localhost"_L1, Qt::CaseInsensitive) != 0) return {};
+        rest = rest.sliced(path);
+    }
+    const QByteArray bytes = PercentDecoded(rest.toUtf8());
+    if (bytes.contains('\0')) return {};
+    const QString path =
+        CodePage::FromSystem(AsBytes({bytes.constData(), static_cast<std::size_t>(bytes.size())}));
+    // "/C:/Musik" names a drive where there are drives.
+    return QDir::isAbsolutePath(path.sliced(1)) && !path.startsWith("//"_L1) ? path.sliced(1) : path;
+}
+
+bool ReadsBack(const QString& path) {
+    return std::ranges::none_of(path, IsLineEnd) && !path.isEmpty() && !path.front().isSpace() &&
+           !path.back().isSpace();
+}
+
+}  // namespace
+
+bool IsAddress(const QString& text) {
+    const qsizetype colon = text.indexOf("://"_L1);
+    // A scheme of one letter would be a drive.
+    if (colon < 2) return false;
+    const QStringView scheme = QStringView(text).first(colon);
+    return std::ranges::all_of(scheme, [](QChar character) {
+        return character.unicode() < 0x80 &&
+               (character.isLetterOrNumber() || character == u'+' || character == u'-' || character == u'.');
+    });
+}
+
+std::vector<ByteSpan> ListLines(ByteSpan bytes) {
+    std::vector<ByteSpan> lines;
+    const auto isLineEnd = [](std::uint8_t byte) { return byte == '\r' || byte == '\n'; };
+    for (auto begin = bytes.begin(); begin != bytes.end();) {
+        const auto end = std::find_if(begin, bytes.end(), isLineEnd);
+        if (end != begin) lines.emplace_back(begin, end);
+        begin = end == bytes.end() ? end : end + 1;
+    }
+    return lines;
+}
+
+QString NameFromList(const QString& text) {
+    const QString local = LocalPath(text);
+    if (!local.isEmpty()) return AbsolutePath(local);
+    const bool isAsItIs = text.size() < 2 || text[1] == u':' || IsStoredCdPath(text) || IsAddress(text);
+    if (isAsItIs) return text;
+    // Qt takes a name that begins with a colon for one inside the program, and so for absolute.
+    return AbsolutePath(text.startsWith(u':') ? QDir::currentPath() + u'/' + text : text);
+}
+
+QString NameFromList(ByteSpan text) {
+    return NameFromList(CodePage::FromSystem(text));
+}
+
+QByteArray PathForList(const QString& path) {
+    if (ReadsBack(path)) return CodePage::ToSystem(path);
+    return "file://" + path.toUtf8().toPercentEncoding("/");
+}
+
+QByteArray TitleForList(const QString& artist, const QString& title) {
+    QString text = artist + u" - "_s + title;
+    std::ranges::replace_if(text, IsLineEnd, QChar(u' '));
+    return CodePage::ToSystem(text);
+}

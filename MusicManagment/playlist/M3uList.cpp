@@ -1,0 +1,29 @@
+#include "MusicManagment/playlist/ListNames.h"
+#include "MusicManagment/playlist/PlayListFiles.h"
+
+// Extended M3U: one path a line, before it a remark with length, artist and title.
+
+namespace {
+
+constexpr std::string_view kRemark = "#EXTINF:";
+
+}  // namespace
+
+std::vector<PlayListEntry> ParseM3uList(ByteSpan contents) {
+    std::vector<PlayListEntry> entries;
+    for (const ByteSpan line : ListLines(contents))
+        if (!StartsWith(line, kRemark)) AppendEntry(entries, {.Name = NameFromList(line)});
+    return entries;
+}
+
+void WriteM3uList(ByteWriter& file, std::span<const EntryToSave> entries) {
+    file.Raw("#EXTM3U\r\n");
+    for (const auto& [entry, path] : entries) {
+        if (path.isEmpty()) continue;
+        if (const auto& record = entry->Record)
+            file.Raw(std::string_view(QByteArray(kRemark.data(), kRemark.size()) +
+                                      QByteArray::number(record->Length) + ',' +
+                                      TitleForList(record->Artist, record->Title) + "\r\n"));
+        file.Raw(std::string_view(PathForList(path) + "\r\n"));
+    }
+}

@@ -1,0 +1,16 @@
+#include "MusicManagment/playlist/ListNames.h"
+#include "MusicManagment/playlist/PlayListFiles.h"
+
+// One path a line.
+
+std::vector<PlayListEntry> ParsePlainList(ByteSpan contents) {
+    std::vector<PlayListEntry> entries;
+    for (const ByteSpan line : ListLines(contents))
+        AppendEntry(entries, {.Name = NameFromList(line)});
+    return entries;
+}
+
+void WritePlainList(ByteWriter& file, std::span<const EntryToSave> entries) {
+    for (const auto& [entry, path] : entries)
+        if (!path.isEmpty()) file.Raw(std::string_view(PathForList(path) + "\r\n"));
+}

@@ -1,0 +1,37 @@
+#include "MusicManagment/playlist/PlayListMenu.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+struct MenuRow {
+    QStringView Caption;  // empty: a separator
+    int Id = 0;
+    QStringView Shortcut{};
+    int ImageIndex = -1;
+};
+
+constexpr MenuRow kRows[] = {
+    {u"Neue PlayList", pcNew, u"Ctrl+Shift+N", 60},
+    {u"PlayList öffnen...", pcOpen, u"Ctrl+Shift+O", 61},
+    {u"PlayList speichern", pcSave, u"Ctrl+Shift+S", 62},
+    {u"PlayList speichern unter...", pcSaveAs, u"Ctrl+Alt+Shift+S", 63},
+    {u"PlayList als Link-Liste speichern...", pcExportAsLinks, {}, 64},
+    {},
+    {u"Markierte Einträge entfernen", pcRemoveSelected, u"Del", 65},
+    {u"Dieses Lied markieren", pcMarkCurrent, u"Ctrl+Shift+F", 66},
+    {u"Nicht verfügbare Lieder entfernen", pcRemoveUnavailable, u"Ctrl+Shift+Del", 67},
+};
+
+}  // namespace
+
+std::unique_ptr<TMenuExItem> BuildPlayListMenu() {
+    using Kind = TMenuExItem::ItemKind;
+    auto root = std::make_unique<TMenuExItem>(Kind::Submenu, u"PlayList"_s);
+    for (const MenuRow& row : kRows) {
+        const Kind kind = row.Caption.isEmpty() ? Kind::Separator : Kind::Command;
+        root->Add(kind, row.Caption.toString(), row.Id, row.Shortcut.toString())
+            .SetImageIndex(row.ImageIndex);
+    }
+    return root;
+}

@@ -1,0 +1,67 @@
+#include "MusicManagment/playlist/PlayList.h"
+
+#include "ReadMPEGHeader/DisplayTexts.h"
+#include "cli/CommandLine.h"
+#include "cli/Commands.h"
+#include "cli/JsonOutput.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+void WriteText(const TPlayList& list, Console& console) {
+    for (int i = 0; i < list.Count(); ++i) {
+        const auto& [name, record] = list.Entry(i);
+        const QString song = record ? Printable(record->Artist) + u'\t' + Printable(record->Title) + u'\t' +
+                                          FormatLength(record->Length, true)
+                                    : u"\t\t"_s;
+        console.WriteLine(QString::number(i) + u'\t' + song + u'\t' + Printable(name));
+    }
+}
+
+void WriteJson(const TPlayList& list, Console& console) {
+    JsonLine line;
+    for (int i = 0; i < list.Count(); ++i) {
+        const auto& [name, record] = list.Entry(i);
+        line.Begin();
+        line.Number("index", i);
+        line.Text("name", name);
+        if (record) WriteSongFields(line, *record);
+        console.Write(line.End());
+    }
+}
+
+int RunPlaylist(const Arguments& arguments, Console& console) {
+    if (arguments.Operands().size() > 1) throw EUsageError(u"Es kann nur eine PlayList angegeben werden."_s);
+    if (arguments.Has(u"--out") && arguments.Has(u"--json"))
+        throw EUsageError(u"--out und --json schließen sich aus."_s);
+    TPlayList list;
+    list.SetPlayListFileName(arguments.Operands().first());
+    if (arguments.Has(u"--out"))
+        list.Save(arguments.Value(u"--out"));
+    else
+        arguments.Has(u"--json") ? WriteJson(list, console) : WriteText(list, console);
+    return esDone;
+}
+
+constexpr OptionRow kOptions[] = {
+    {u"--json", u"", u"ein JSON-Objekt je Eintrag und Zeile"},
+    {u"--out", u"DATEI2", u"schreibt die PlayList in diese Datei, statt sie zu zeigen"},
+};
+
+}  // namespace
+
+const CommandRow kPlaylistCommand = {
+    u"playlist",
+    u"Zeigt eine PlayList oder wandelt sie um",
+    u"Das Format einer PlayList wird an ihren ersten Bytes erkannt, das Format von DATEI2 richtet sich nach\n"
+    u"der Endung: .rukpl und .rpl eigenes Format, .m3u und .extpl M3U, .pls und .inipl PLS, alles andere "
+    u"ein\n"
+    u"Pfad je Zeile. Eine Zeile je Eintrag: Nummer (ab 0), Interpret, Titel, Länge und Name, durch\n"
+    u"Tabulatoren getrennt. Felder im JSON-Format: index, name und, wenn die PlayList sie enthält, die "
+    u"Felder\n"
+    u"des Datensatzes, wie der Befehl info sie zeigt.\n",
+    {u"DATEI", u"PlayList"},
+    kOptions,
+    RunPlaylist,
+};

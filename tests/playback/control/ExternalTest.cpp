@@ -1,0 +1,274 @@
+#include "tests/playback/control/PlayerRig.h"
+
+// Playing in a separate player program.
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+// What the player program would get and answer; lives longer than the way to it.
+struct ExternalScript {
+    std::optional<qint64> Running;
+    bool Registers = true;
+    bool Creates = true;
+    QStringList Startable;  // programs
+    int ComesUpAfter = 3;   // looks
+    std::map<int, qint64> Answers;
+
+    QStringList Log;
+    QStringList Started;
+    int Waited = 0;  // ms
+    FeedbackReceiver* Receiver = nullptr;
+
+    QStringList Take() { return std::exchange(Log, {}); }
+};
+
+class ScriptedExternal : public ExternalPlayer {
+ public:
+    explicit ScriptedExternal(ExternalScript& script) : script_(script) {}
+
+    std::optional<qint64> Find() override { return script_.Running; }
+    bool Start(const QString& program, const QString& argument) override {
+        script_.Started << program + u' ' + argument;
+        return script_.Startable.contains(program);
+    }
+    void Wait(int milliseconds) override {
+        script_.Waited += milliseconds;
+        if (script_.Waited == 100 * script_.ComesUpAfter) script_.Running = 1;
+    }
+    qint64 SendCommand(ExternalCommand command, qint64 parameter) override {
+        script_.Log << u"%1 %2"_s.arg(command).arg(parameter);
+        return script_.Answers[command];
+    }
+    qint64 SendText(ExternalCommand command, const QString& text) override {
+        script_.Log << u"%1 \"%2\""_s.arg(command).arg(QFileInfo(text).fileName());
+        return script_.Answers[command];
+    }
+    bool RegisterFeedback() override { return script_.Registers; }
+    std::optional<qint64> CreateFeedback(FeedbackReceiver& receiver) override {
+        if (!script_.Creates) return std::nullopt;
+        script_.Receiver = &receiver;
+        return 77;
+    }
+
+ private:
+    ExternalScript& script_;
+};
+
+class ExternalTest : public PlayerTest {
+ protected:
+    ExternalTest() {
+        script_.Running = 1;
+        player_.SetExternalPlayer(std::make_unique<ScriptedExternal>(script_));
+        player_.SetPlayExtern(true);
+        player_.SetPanel(&panel_);
+    }
+    // A song is open there, and what was said until then forgotten.
+    void OpenThere(const QString& song) {
+        player_.SetFileName(Add(song));
+        script_.Take();
+        panel_.Log.clear();
+    }
+
+    ExternalScript script_;
+    ScriptedPanel panel_;
+};
+
+const QStringList kGreeting = {u"22 77"_s,
+                               u"23 1"_s,
+                               u"24 1"_s,
+                               u"25 1"_s,
+                               u"26 1"_s,
+                               u"27 10000"_s,
+                               u"28 2"_s,
+                               u"29 44100"_s,
+                               u"30 32"_s,
+                               u"31 0"_s,
+                               u"34 4"_s,
+                               u"35 32768"_s,
+                               u"32 \"WinAmp v1.x\""_s,
+                               u"33 \"WinAmp.exe\""_s};
+
+TEST_F(ExternalTest, FirstMeetingTellsAllSettings) {
+    player_.SetFileName(Add(u"a.mp3"_s));
+    EXPECT_EQ(script_.Take(), kGreeting + QStringList(u"17 \"a.mp3\""_s));
+    player_.SetFileName(Add(u"b.mp3"_s));
+    EXPECT_EQ(script_.Take(), QStringList({u"13 0"_s, u"14 0"_s, u"17 \"b.mp3\""_s}));
+    EXPECT_EQ(Open(), QString());
+}
+
+TEST_F(ExternalTest, OperationsAreCommands) {
+    OpenThere(u"a.mp3"_s);
+    script_.Answers = {{1, 1234}, {3, 180'000}, {4, psPlaying}};
+    player_.Play();
+    player_.SetPosition(5000);
+    EXPECT_EQ(player_.GetPosition(), 1234U);
+    EXPECT_EQ(player_.GetLength(), 180'000U);
+    EXPECT_EQ(player_.GetStatus(), psPlaying);
+    player_.PauseResume();
+    player_.Stop();
+    player_.Stop(StopMode::Fade);
+    EXPECT_EQ(script_.Take(), QStringList({u"15 0"_s, u"2 5000"_s, u"1 0"_s, u"3 0"_s, u"4 0"_s, u"20 0"_s,
+                                           u"19 0"_s, u"19 1"_s}));
+    script_.Answers[4] = 99;
+    EXPECT_EQ(player_.GetStatus(), psClosed);
+}
+
+TEST_F(ExternalTest, CrossFadesAreTheOtherProgramsBusiness) {
+    OpenThere(u"a.mp3"_s);
+    EXPECT_FALSE(player_.PlayWithCrossFade(Add(u"b.mp3"_s)));
+    EXPECT_EQ(player_.FileName(), folder_.Path(u"a.mp3"_s));
+    script_.Answers[21] = 1;
+    EXPECT_TRUE(player_.PlayWithCrossFade(Add(u"b.mp3"_s)));
+    EXPECT_EQ(player_.FileName(), folder_.Path(u"b.mp3"_s));
+    EXPECT_EQ(script_.Take(), QStringList({u"21 \"b.mp3\""_s, u"21 \"b.mp3\""_s}));
+
+    player_.SetCOFileName(Add(u"c.mp3"_s));
+    EXPECT_EQ(script_.Take(),
+              QStringList({u"18 0"_s, u"7 \"c.mp3\""_s, u"8 0"_s, u"10 10000"_s, u"12 1"_s, u"16 0"_s}));
+    EXPECT_EQ(player_.COFileName(), folder_.Path(u"c.mp3"_s));
+    script_.Running.reset();
+    EXPECT_EQ(player_.COFileName(), QString());
+}
+
+TEST_F(ExternalTest, ChangedSettingsAreForwarded) {
+    OpenThere(u"a.mp3"_s);
+    Change([](EngineSettings& s) {
+        s.UseMCI = false;
+        s.FMODCrossoverTime = 5000;
+        s.WinAmpFile = u"mpv"_s;
+    });
+    EXPECT_EQ(script_.Take(), QStringList({u"24 0"_s, u"27 5000"_s, u"33 \"mpv\""_s}));
+    script_.Running.reset();
+    Change([](EngineSettings& s) { s.UseMCI = true; });
+    EXPECT_TRUE(script_.Take().isEmpty());
+    EXPECT_TRUE(script_.Started.isEmpty());
+}
+
+TEST_F(ExternalTest, PlayerProgramIsStartedAndWaitedFor) {
+    script_.Running.reset();
+    script_.Startable = {u"TSPlayer/TSPlayer"_s};
+    player_.SetFileName(Add(u"a.mp3"_s));
+    EXPECT_EQ(script_.Started, QStringList({u"TSPlayer /NoVisible"_s, u"TSPlayer/TSPlayer /NoVisible"_s}));
+    EXPECT_EQ(script_.Waited, 300);
+    EXPECT_EQ(script_.Take(), kGreeting + QStringList(u"17 \"a.mp3\""_s));
+    EXPECT_TRUE(Messages().isEmpty());
+}
+
+TEST_F(ExternalTest, ALaterPlayerProgramGetsSettingsAndSongAnew) {
+    OpenThere(u"a.mp3"_s);
+    script_.Running = 2;
+    player_.Play();
+    EXPECT_EQ(script_.Take(), kGreeting + QStringList({u"17 \"a.mp3\""_s, u"15 0"_s}));
+}
+
+TEST_F(ExternalTest, WithoutThePlayerProgramTheSongPlaysHere) {
+    script_.Running.reset();
+    script_.Startable = {u"TSPlayer"_s};
+    script_.ComesUpAfter = 31;
+    player_.SetFileName(Add(u"a.mp3"_s));
+    EXPECT_EQ(script_.Waited, 3000);
+    EXPECT_EQ(Messages(),
+              QStringList{u"Kann das Programm TSPlayer nicht starten. Der Sound wird intern abgespielt."_s});
+    EXPECT_FALSE(player_.PlayExtern());
+    EXPECT_EQ(Open(), u"FMOD:a"_s);
+}
+
+TEST_F(ExternalTest, PlayFallsBackWithTheSongThatWasOpenThere) {
+    OpenThere(u"a.mp3"_s);
+    script_.Running.reset();
+    player_.Play();
+    EXPECT_FALSE(player_.PlayExtern());
+    EXPECT_EQ(Open(), u"FMOD:a"_s);
+    EXPECT_EQ(player_.GetStatus(), psPlaying);
+}
+
+TEST_F(ExternalTest, SwitchingTakesTheSongAlong) {
+    OpenThere(u"a.mp3"_s);
+    player_.SetPlayExtern(false);
+    EXPECT_EQ(script_.Take(), QStringList({u"13 0"_s, u"14 0"_s}));
+    EXPECT_EQ(Open(), u"FMOD:a"_s);
+    player_.SetPlayExtern(true);
+    EXPECT_EQ(script_.Take(), QStringList(u"17 \"a.mp3\""_s));
+    EXPECT_EQ(Open(), QString());
+}
+
+TEST_F(ExternalTest, WithoutAPlaceForFeedbackAnExceptionSaysWhy) {
+    const auto messageOfOpening = [this] {
+        try {
+            player_.SetFileName(Add(u"a.mp3"_s));
+        } catch (const EPlaySoundException& error) {
+            return error.Message();
+        }
+        return QString();
+    };
+    script_.Creates = false;
+    EXPECT_EQ(
+        messageOfOpening(),
+        u"Fehler beim Erstellen eines Hilfs-Fensters für EPS-FeedBacks (CreateWindow fehlgeschlagen)"_s);
+    script_.Registers = false;
+    EXPECT_EQ(
+        messageOfOpening(),
+        u"Fehler beim Erstellen eines Hilfs-Fensters für EPS-FeedBacks (RegisterClass fehlgeschlagen)"_s);
+    EXPECT_TRUE(script_.Take().isEmpty());
+}
+
+TEST_F(ExternalTest, FeedbackBecomesEventsAndPanel) {
+    OpenThere(u"a.mp3"_s);
+    script_.Answers[3] = 180'000;
+    QStringList events;
+    player_.OnPlaying = [&](TPlaySound&, quint32 position) { events << QString::number(position); };
+    player_.OnPlayingStopped = [&](TPlaySound&) { events << u"stopped"_s; };
+    player_.OnPlayingStarted = [&](TPlaySound&) { events << u"started"_s; };
+    player_.OnPlayingPaused = [&](TPlaySound&) { events << u"paused"_s; };
+    player_.OnPlayingResumed = [&](TPlaySound&) { events << u"resumed"_s; };
+    for (const int code : {2, 3, 4, 5, 8, 9, 10, 11, 99})
+        EXPECT_EQ(script_.Receiver->HandleFeedback(code, 4711), 0);
+    script_.Receiver->HandleFeedbackText(11, u"/m/x.mp3"_s);
+    script_.Receiver->HandleFeedbackText(12, u"/m/y.mp3"_s);
+    EXPECT_EQ(events, (QStringList{u"4711"_s, u"stopped"_s, u"started"_s, u"paused"_s, u"resumed"_s}));
+    EXPECT_EQ(panel_.Position, 4711U);
+    EXPECT_EQ(panel_.Length, 180'000U);
+    EXPECT_EQ(panel_.Log, (QStringList{u"redraw"_s, u"x"_s}));
+}
+
+TEST_F(ExternalTest, FeedbackAsksForTheModeAndTheNextSong) {
+    TPlayList list;
+    player_.SetPlayList(&list);
+    for (const QString& song : {u"a.mp3"_s, u"b.mp3"_s, u"c.mp3"_s})
+        list.Insert(list.Count(), {.Name = Add(song)});
+    list.PlayNext();
+    script_.Take();
+    panel_.Mode = coAllChanges;
+    EXPECT_EQ(script_.Receiver->HandleFeedback(12, 0), coAllChanges);
+    script_.Answers[21] = 1;
+    script_.Receiver->HandleFeedback(6, 0);
+    EXPECT_EQ(script_.Take(), QStringList(u"21 \"b.mp3\""_s));
+    script_.Receiver->HandleFeedback(1, 0);
+    EXPECT_EQ(script_.Take(), QStringList({u"13 0"_s, u"14 0"_s, u"17 \"c.mp3\""_s, u"15 0"_s}));
+}
+
+TEST_F(ExternalTest, WithAControllerOfItsOwnTheEndAndTheCountAreNotItsBusiness) {
+    TMusicDatabase database;
+    player_.SetMusicDatabase(&database);
+    database.AddSong(Add(u"a.wav"_s));
+    OpenThere(u"a.wav"_s);
+    ScriptedController controller;
+    int ends = 0;
+    player_.OnReachedEndOfSong = [&](TPlaySound&) { ++ends; };
+    const auto tell = [this] {
+        script_.Receiver->HandleFeedback(1, 0);
+        script_.Receiver->HandleFeedback(7, 1);
+        return script_.Receiver->HandleFeedback(12, 0);
+    };
+    player_.SetController(&controller);
+    EXPECT_EQ(tell(), 1);
+    EXPECT_EQ(ends, 0);
+    EXPECT_EQ(database.Song(0).PlayCount, 0U);
+    player_.SetController(nullptr);
+    tell();
+    EXPECT_EQ(ends, 1);
+    EXPECT_EQ(database.Song(0).PlayCount, 1U);
+}
+
+}  // namespace

@@ -1,0 +1,48 @@
+#include "CommonRUKTools/SafeFile.h"
+#include "MusicManagment/playlist/PlayListFiles.h"
+#include "tests/playlist/Playing.h"
+
+using namespace Qt::StringLiterals;
+
+class DropTest : public PlayingTest {
+ protected:
+    QString Put(const QString& name, std::string_view text) const {
+        SafeFile file(folder_.Path(name));
+        file.Write(AsBytes(text));
+        file.Commit();
+        return folder_.Path(name);
+    }
+};
+
+TEST_F(DropTest, FilesFoldersAndListsBecomeEntriesWithWhatIsKnownOfThem) {
+    Add(u"ab"_s);
+    folder_.Add(u"sub/deep/Zoe - Beta.wav"_s, 3);
+    folder_.Add(u"sub/Anna - Alpha.wav"_s, 2);
+    Put(u"sub/cover.jpg"_s, "no song");
+    const QString module = Put(u"tune.mod"_s, "module");
+    const QString list = Put(u"list.m3u"_s, "#EXTM3U\r\n" + Path(u"a"_s).toStdString() + "\r\n/gone.mp3\r\n");
+    EXPECT_EQ(list_.InsertFiles(1, {folder_.Path(u"sub/../sub"_s), u"/not/there.mp3"_s, module, list}), 5);
+    EXPECT_EQ(Listed(), u"aAnna - AlphaZoe - Betatuneagoneb"_s);
+    EXPECT_EQ(list_.Entry(1).Name, folder_.Path(u"sub/Anna - Alpha.wav"_s));
+    EXPECT_EQ(list_.Entry(1).Record.value().Title, u"Alpha"_s);
+    EXPECT_FALSE(list_.Entry(3).Record);
+    EXPECT_FALSE(list_.Entry(5).Record);
+    EXPECT_EQ(list_.TotalSeconds(), 5);
+}
+
+TEST_F(DropTest, TheDatabaseKnowsBetterThanTheFile) {
+    TMusicDatabase database;
+    list_.SetMusicDatabase(&database);
+    TID3Tag song;
+    song.Title = u"Aus der Sammlung"_s;
+    database.AddEntry(folder_.Add(u"x.wav"_s), song);
+    EXPECT_EQ(list_.InsertFiles(0, {Path(u"x"_s)}), 1);
+    EXPECT_EQ(list_.Entry(0).Record.value().Title, u"Aus der Sammlung"_s);
+}
+
+TEST_F(DropTest, ADamagedListIsSaidAndInsertsNothing) {
+    Add(u"a"_s);
+    const QString list = Put(u"list.rukpl"_s, std::string_view("RUKPLYLST\x00\x01\x05", 12));
+    EXPECT_THROW(list_.InsertFiles(0, {Path(u"a"_s), list}), EPlayListException);
+    EXPECT_EQ(list_.Count(), 1);
+}

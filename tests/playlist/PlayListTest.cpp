@@ -1,0 +1,204 @@
+#include "MusicManagment/playlist/PlayList.h"
+
+#include <gtest/gtest.h>
+
+#include "CommonRUKTools/RWReg.h"
+#include "tests/playlist/Playing.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+class PlayListTest : public PlayingTest {
+ protected:
+    PlayListTest() {
+        list_.OnChange = [this](TPlayList&, int index, TChangeType change) {
+            changes_ << QString::number(index) + u'/' + QString::number(change);
+        };
+    }
+    QString Changes() { return std::exchange(changes_, {}).join(u' '); }
+
+    QStringList changes_;
+};
+
+TID3Tag SongOf(quint16 seconds) {
+    TID3Tag song;
+    song.Length = seconds;
+    return song;
+}
+
+}  // namespace
+
+TEST_F(PlayListTest, EntriesComeAndGoWithTheirEvents) {
+    Add(u"ABC"_s);
+    list_.Insert(-5, {.Name = Path(u"D"_s), .Record = SongOf(100)});
+    list_.Insert(99, {.Name = Path(u"E"_s), .Record = SongOf(65'535)});
+    EXPECT_EQ(Changes(), u"0/1 1/1 2/1 0/1 4/1"_s);
+    EXPECT_EQ(Listed(), u"DABCE"_s);
+    EXPECT_EQ(list_.TotalSeconds(), 65'635);
+    EXPECT_EQ(list_.IndexOf(Path(u"B"_s)), 2);
+    EXPECT_EQ(list_.IndexOf(), -1);
+
+    list_.Remove({4, 1, 4, 7, -1});
+    list_.Remove(5);
+    EXPECT_EQ(Listed(), u"DBC"_s);
+    EXPECT_EQ(Changes(), u"4/2 1/2"_s);
+    EXPECT_EQ(list_.TotalSeconds(), 100);
+    list_.Clear();
+    EXPECT_EQ(Changes(), u"-1/2"_s);
+    EXPECT_EQ(list_.TotalSeconds(), 0);
+}
+
+TEST_F(PlayListTest, MovedEntriesKeepTheirOrderAndComeBeforeTheOneAimedAt) {
+    struct Case {
+        std::vector<int> Indices;
+        int Before;
+        QString Outcome;
+        int First;
+    };
+    const Case cases[] = {
+        {{0}, 6, u"BCDEFA"_s, 5},     {{5}, 0, u"FABCDE"_s, 0},        {{4, 1, 1}, 3, u"ACBEDF"_s, 2},
+        {{1, 2}, 2, u"ABCDEF"_s, 1},  {{0, 9, -1}, 1, u"ABCDEF"_s, 0}, {{3}, 99, u"ABCEFD"_s, 5},
+        {{2, 3}, -4, u"CDABEF"_s, 0}, {{}, 3, u"ABCDEF"_s, 3},
+    };
+    for (const Case& move : cases) {
+        list_.Clear();
+        Add(u"ABCDEF"_s);
+        EXPECT_EQ(list_.Move(move.Indices, move.Before), move.First) << move.Outcome.toStdString();
+        EXPECT_EQ(Listed(), move.Outcome);
+    }
+}
+
+TEST_F(PlayListTest, ASongOfTheDatabaseNeedsOne) {
+    try {
+        list_.InsertSong(0, 0);
+        FAIL();
+    } catch (const EPlayListException& error) {
+        EXPECT_EQ(error.Message(),
+                  u"Zugriff auf die MusicDatenbank nicht mmöglich, da auf MusicDatabase kein "
+                  "Wert zugewiesen wurde"_s);
+    }
+    TMusicDatabase database;
+    list_.SetMusicDatabase(&database);
+    database.AddEntry(folder_.Add(u"x.wav"_s), SongOf(7));
+    Add(u"A"_s);
+    Changes();
+    list_.InsertSong(1, 0);
+    EXPECT_EQ(Changes(), u"1/1"_s);
+    EXPECT_EQ(list_.Entry(1).Name, Path(u"x"_s));
+    EXPECT_EQ(list_.Entry(1).Record, database.Song(0));
+    for (const int none : {-1, 1})
+        EXPECT_THROW(list_.InsertSong(0, none), EMusicDatabaseException);
+}
+
+TEST_F(PlayListTest, TheQueueHoldsEachEntryOnce) {
+    Add(u"ABC"_s);
+    for (const int index : {2, 0, 2, 9, -1})
+        list_.Enqueue(index);
+    EXPECT_EQ(Names(list_.Queue()), u"CA"_s);
+    EXPECT_EQ(list_.QueuePosition(0), 1);
+    EXPECT_EQ(list_.QueuePosition(1), -1);
+    list_.Dequeue(2);
+    list_.Dequeue(1);
+    EXPECT_EQ(Names(list_.Queue()), u"A"_s);
+    list_.Clear();
+    EXPECT_TRUE(list_.Queue().isEmpty());
+}
+
+TEST_F(PlayListTest, ScanningGoesOnToThePlayer) {
+    EXPECT_EQ(list_.ScanTime(), 10'000);
+    list_.SetScanTime(8'000);
+    EXPECT_EQ(player_.AutoStop, -1);
+    list_.SetScan(true);
+    EXPECT_EQ(player_.AutoStop, 8'000);
+    list_.SetScanTime(5'000);
+    EXPECT_EQ(player_.AutoStop, 5'000);
+    ScriptedPlayer other;
+    list_.SetPlaySound(&other);
+    EXPECT_EQ(other.AutoStop, 5'000);
+    list_.SetScan(false);
+    EXPECT_EQ(other.AutoStop, 0);
+    list_.SetScanTime(-1);
+    EXPECT_EQ(list_.ScanTime(), 0);
+}
+
+TEST_F(PlayListTest, WhatHasNoFileLeaves) {
+    Add(u"aBcD"_s);
+    list_.Insert(0, {.Name = u"http://radio.example/live"_s});
+    list_.Insert(0, {.Name = u":00000001:\\a.mp3"_s});
+    Changes();
+    EXPECT_EQ(list_.RemoveUnavailable(), 4);
+    EXPECT_EQ(Listed(), u"ac"_s);
+    EXPECT_EQ(Changes(), u"5/2 3/2 1/2 0/2"_s);
+}
+
+TEST_F(PlayListTest, MarkingGoesToTheDatabase) {
+    TMusicDatabase database;
+    database.AddEntry(folder_.Add(u"b.wav"_s), TID3Tag());
+    QList<int> marked;
+    database.OnMarkSong = [&](TMusicDatabase&, SongIndex index) { marked << index; };
+    Add(u"ab"_s);
+    EXPECT_FALSE(list_.MarkSong(1));
+    list_.SetMusicDatabase(&database);
+    EXPECT_FALSE(list_.MarkSong());  // no view that has a current entry
+    EXPECT_FALSE(list_.MarkSong(0));
+    EXPECT_TRUE(list_.MarkSong(1));
+    ScriptedView view;
+    view.Current = 1;
+    list_.SetView(&view);
+    EXPECT_TRUE(list_.MarkSong());
+    EXPECT_EQ(marked, (QList<int>{0, 0}));
+}
+
+TEST_F(PlayListTest, SettingsAreKeptWithTheDatabases) {
+    const QString file = folder_.Path(u"s.conf"_s);
+    const auto defaults = [](const TPlayList& list) {
+        return list.PlayOrder() == poDownwards && !list.Scan() && list.ScanTime() == 10'000 &&
+               !list.RepeatAll() && !list.CopyMp3sBeforePlay();
+    };
+    TMusicDatabase database;
+    list_.SetMusicDatabase(&database);
+    TRWReg settings(u"\\Software\\RUK\\Tunestead3"_s, file);
+    LoadDatabaseSettings(database, settings);
+    EXPECT_TRUE(defaults(list_));
+
+    list_.SetPlayOrder(poRandom);
+    list_.SetScan(true);
+    list_.SetScanTime(3'000);
+    list_.SetRepeatAll(true);
+    list_.SetCopyMp3sBeforePlay(true);
+    SaveDatabaseSettings(database, settings);
+
+    TPlayList other;
+    ScriptedPlayer player;
+    other.SetPlaySound(&player);
+    other.LoadSettings(settings);
+    EXPECT_EQ(other.PlayOrder(), poRandom);
+    EXPECT_TRUE(other.Scan() && other.RepeatAll() && other.CopyMp3sBeforePlay());
+    EXPECT_EQ(player.AutoStop, 3'000);
+
+    settings.WriteInteger(u"PlayOrder"_s, 4);
+    settings.WriteInteger(u"ScanTime"_s, -1);
+    for (const QString& name : {u"Scan"_s, u"RepeatAll"_s, u"CopyMp3sBeforePlay"_s})
+        settings.WriteInteger(name, 1);  // another type
+    TPlayList fresh;
+    fresh.LoadSettings(settings);
+    EXPECT_TRUE(defaults(fresh));
+}
+
+TEST_F(PlayListTest, EachSideForgetsTheOtherWhenItGoes) {
+    auto database = std::make_unique<TMusicDatabase>();
+    {
+        TPlayList list;
+        list.SetMusicDatabase(database.get());
+        EXPECT_EQ(database->PlayList(), &list);
+        EXPECT_EQ(database->SettingsClients().size(), 1u);
+    }
+    EXPECT_EQ(database->PlayList(), nullptr);
+    EXPECT_TRUE(database->SettingsClients().empty());
+    list_.SetMusicDatabase(database.get());
+    database.reset();
+    EXPECT_EQ(list_.MusicDatabase(), nullptr);
+    Add(u"a"_s);
+    EXPECT_TRUE(list_.PlayEntry(0));
+}
