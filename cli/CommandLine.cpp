@@ -11,8 +11,9 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr std::array<const CommandRow*, 6> kCommands = {&kInfoCommand,   &kScanCommand, &kListCommand,
-                                                        &kGroupsCommand, &kSaveCommand, &kPlaylistCommand};
+constexpr std::array<const CommandRow*, 7> kCommands = {&kInfoCommand,   &kScanCommand, &kListCommand,
+                                                        &kGroupsCommand, &kSaveCommand, &kPlaylistCommand,
+                                                        &kPlayCommand};
 
 bool IsHelp(const QString& word) {
     return word == u"--help"_s || word == u"-h"_s;

@@ -23,6 +23,7 @@ extern const CommandRow kListCommand;
 extern const CommandRow kGroupsCommand;
 extern const CommandRow kSaveCommand;
 extern const CommandRow kPlaylistCommand;
+extern const CommandRow kPlayCommand;
 
 // All of them, in the order of the help.
 std::span<const CommandRow* const> AllCommands();

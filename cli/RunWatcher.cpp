@@ -8,7 +8,6 @@ using namespace Qt::StringLiterals;
 namespace {
 
 constexpr qint64 kShowEveryMs = 100;
-constexpr qsizetype kLineWidth = 78;
 
 // What the run is called, without the name of the component.
 QString RunName(const TMusicDatabase& database) {
@@ -20,19 +19,18 @@ QString RunName(const TMusicDatabase& database) {
 
 RunWatcher::RunWatcher(TMusicDatabase& database, Console& console, StopBy stopBy)
     : database_(database),
-      terminal_(IsTerminal(console.ErrorStream()) ? console.ErrorStream() : nullptr),
+      line_(IsTerminal(console.ErrorStream()) ? console.ErrorStream() : nullptr),
       nextShow_(CurrentClock().Ticks() + kShowEveryMs) {
     database_.OnProgress = [this, stopBy](TMusicDatabase&, const ProgressPoint& point) {
         if (stopBy == StopBy::Interrupt && InterruptRequested()) database_.RequestAbort();
-        if (terminal_ != nullptr) Show(point);
+        if (line_.IsWatched()) Show(point);
     };
-    database_.OnEndProgress = [this](TMusicDatabase&) { Erase(); };
+    database_.OnEndProgress = [this](TMusicDatabase&) { line_.Erase(); };
 }
 
 RunWatcher::~RunWatcher() {
     database_.OnProgress = nullptr;
     database_.OnEndProgress = nullptr;
-    Erase();
 }
 
 void RunWatcher::Show(const ProgressPoint& point) {
@@ -43,19 +41,5 @@ void RunWatcher::Show(const ProgressPoint& point) {
     QString text = RunName(database_);
     if (percent >= 0) text += u": "_s + QString::number(percent) + u" %"_s;
     if (!point.Description.isEmpty()) text += u"  "_s + point.Description;
-    Print(Printable(text).left(kLineWidth));
-}
-
-void RunWatcher::Print(const QString& text) {
-    const QString line = u'\r' + text.leftJustified(shown_);
-    std::fputs(line.toUtf8().constData(), terminal_);
-    std::fflush(terminal_);
-    shown_ = text.size();
-}
-
-void RunWatcher::Erase() {
-    if (shown_ == 0) return;
-    Print(QString());
-    std::fputc('\r', terminal_);
-    std::fflush(terminal_);
+    line_.Show(text);
 }

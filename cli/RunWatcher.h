@@ -2,6 +2,7 @@
 
 #include "MusicManagment/database/MusicManagment.h"
 #include "cli/Console.h"
+#include "cli/TransientLine.h"
 
 enum class StopBy {
     Nothing,
@@ -19,11 +20,8 @@ class RunWatcher {
 
  private:
     void Show(const ProgressPoint& point);
-    void Print(const QString& text);
-    void Erase();
 
     TMusicDatabase& database_;
-    std::FILE* terminal_;  // nullptr: nobody watches
-    qint64 nextShow_;      // ticks of the clock
-    qsizetype shown_ = 0;  // characters that stand in the line
+    TransientLine line_;
+    qint64 nextShow_;  // ticks of the clock
 };

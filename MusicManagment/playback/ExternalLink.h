@@ -22,8 +22,8 @@ class ExternalLink {
 
     // Whether the player program that this one knows still runs.
     bool Runs() { return known_ && player_->Find() == known_; }
-    // Looks for a player program, starts it when none runs, and gives it three seconds to come up. One that is
-    // met for the first time is told where feedback goes and all the settings. Throws EPlaySoundException
+    // Looks for a player program, starts it when none runs, and gives it three seconds to come up. One that
+    // is met for the first time is told where feedback goes and all the settings. Throws EPlaySoundException
     // when there is no place for feedback.
     Reached FindOrStart(const EngineSettings& settings);
 

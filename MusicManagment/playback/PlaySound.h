@@ -177,6 +177,7 @@ class TPlaySound : public TPlaySoundContainer,
     bool IsStopping() const;
     bool HasEnded(quint32 position, quint32 length);
     void CheckEnd(quint32 position, quint32 length);
+    void RestWhenOver();
     void CheckCrossFade(quint32 position, quint32 length);
     void CountSongWhenDue();
     void CountSong();

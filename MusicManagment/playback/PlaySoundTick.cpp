@@ -85,7 +85,9 @@ bool TPlaySound::HasEnded(quint32 position, quint32 length) {
 }
 
 void TPlaySound::CheckEnd(quint32 position, quint32 length) {
-    if (!current_ || endReached_ || IsStopping() || !HasEnded(position, length)) return;
+    if (!current_) return;
+    if (endReached_ && !timers_.EndPending()) return RestWhenOver();
+    if (endReached_ || IsStopping() || !HasEnded(position, length)) return;
     endReached_ = true;
     timers_.StartEnd();
 }
@@ -105,8 +107,12 @@ void TPlaySound::HandleEndOfSong() {
     Raise(OnReachedEndOfSong);
     AskForNextSong(SongChange::Hard);
     Feedback(fbEndOfSong);
+    RestWhenOver();
+}
+
+// After a song that nothing has followed. One whose length was told too short plays on for a while.
+void TPlaySound::RestWhenOver() {
     if (!current_ || current_->GetStatus() != psStopped) return;
-    // Nothing has followed.
     StopTimers();
     StateChanged();
 }

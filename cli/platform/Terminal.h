@@ -1,6 +1,8 @@
 #pragma once
 
 #include <cstdio>
+#include <memory>
+#include <optional>
 
 // What the command line needs of the system's terminal and of its signals.
 
@@ -22,3 +24,20 @@ class InterruptGuard {
 bool InterruptRequested();
 // What the signal does.
 void RequestInterrupt();
+
+// While one exists, keys arrive without the Enter key and are not shown, when the standard input is a
+// terminal and this program has it. The terminal is as it was afterwards. Ctrl-C stays what it is.
+class KeyReader {
+ public:
+    KeyReader();
+    ~KeyReader();
+    KeyReader(const KeyReader&) = delete;
+    KeyReader& operator=(const KeyReader&) = delete;
+
+    // A key that was pressed; does not wait.
+    std::optional<char> Read();
+
+ private:
+    struct Former;
+    std::unique_ptr<Former> former_;  // nullptr: no keys
+};

@@ -1,4 +1,6 @@
+#include <poll.h>
 #include <signal.h>
+#include <termios.h>
 #include <unistd.h>
 
 #include <array>
@@ -50,4 +52,32 @@ bool InterruptRequested() {
 
 void RequestInterrupt() {
     interrupted = true;
+}
+
+struct KeyReader::Former {
+    termios settings;
+};
+
+KeyReader::KeyReader() {
+    // A program in the background would be stopped for touching the terminal.
+    if (tcgetpgrp(STDIN_FILENO) != getpgrp()) return;
+    termios settings = {};
+    if (tcgetattr(STDIN_FILENO, &settings) != 0) return;
+    former_ = std::make_unique<Former>(Former{settings});
+    settings.c_lflag &= ~static_cast<tcflag_t>(ICANON | ECHO);
+    settings.c_cc[VMIN] = 1;
+    settings.c_cc[VTIME] = 0;
+    settings.c_cc[VQUIT] = _POSIX_VDISABLE;  // it would end the process and leave the terminal like this
+    tcsetattr(STDIN_FILENO, TCSANOW, &settings);
+}
+
+KeyReader::~KeyReader() {
+    if (former_) tcsetattr(STDIN_FILENO, TCSANOW, &former_->settings);
+}
+
+std::optional<char> KeyReader::Read() {
+    pollfd input = {STDIN_FILENO, POLLIN, 0};
+    char key = 0;
+    if (!former_ || poll(&input, 1, 0) != 1 || read(STDIN_FILENO, &key, 1) != 1) return std::nullopt;
+    return key;
 }

@@ -1,3 +1,4 @@
+#include <conio.h>
 #include <fcntl.h>
 #include <io.h>
 #include <windows.h>
@@ -41,4 +42,16 @@ bool InterruptRequested() {
 
 void RequestInterrupt() {
     interrupted = true;
+}
+
+// The console delivers single keys by functions of their own; nothing has to be switched.
+struct KeyReader::Former {};
+
+KeyReader::KeyReader() : former_(IsTerminal(stdin) ? std::make_unique<Former>() : nullptr) {}
+
+KeyReader::~KeyReader() = default;
+
+std::optional<char> KeyReader::Read() {
+    if (!former_ || _kbhit() == 0) return std::nullopt;
+    return static_cast<char>(_getch());
 }

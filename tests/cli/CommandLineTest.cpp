@@ -16,7 +16,7 @@ TEST(CommandLine, WrongUsageIsNamedWithWhereTheHelpIs) {
     };
     const Case cases[] = {
         {u""_s, u"Es fehlt ein Befehl."_s, u"tunestead-cli --help"_s},
-        {u"play x"_s, u"Unbekannter Befehl: play"_s, u"tunestead-cli --help"_s},
+        {u"sing x"_s, u"Unbekannter Befehl: sing"_s, u"tunestead-cli --help"_s},
         {u"--verbose"_s, u"Unbekannter Befehl: --verbose"_s, u"tunestead-cli --help"_s},
         {u"info"_s, u"DATEI fehlt."_s, u"tunestead-cli info --help"_s},
         {u"info --nix=3 a"_s, u"Unbekannte Option: --nix"_s, u"tunestead-cli info --help"_s},
@@ -45,7 +45,7 @@ TEST(CommandLine, WrongUsageIsNamedWithWhereTheHelpIs) {
 
 TEST(CommandLine, HelpNamesEveryCommandAndEachOfItsOptions) {
     const std::pair<QString, QStringList> cases[] = {
-        {u""_s, {u"info"_s, u"scan"_s, u"list"_s, u"groups"_s, u"save"_s, u"playlist"_s}},
+        {u""_s, {u"info"_s, u"scan"_s, u"list"_s, u"groups"_s, u"save"_s, u"playlist"_s, u"play"_s}},
         {u"info"_s, {u"--json"_s, u"--classic"_s, u"--frames"_s, u"DATEI…"_s}},
         {u"scan"_s, {u"--db DATENBANK"_s, u"--no-subfolders"_s, u"--classic"_s, u"--json"_s, u"PFAD…"_s}},
         {u"list"_s, {u"--db"_s, u"--sort"_s, u"--subsort"_s, u"--backwards"_s, u"--json"_s}},

@@ -11,7 +11,8 @@
 namespace {
 
 constexpr int kOrderMs = 144;
-constexpr int kTailMs = 300;   // notes that still sound at the end fade within this
+constexpr int kTailMs = 300;  // notes that still sound at the end fade within this
+constexpr int kFramesAtOnce = 512;
 constexpr double kGain = 0.4;  // the library's own 0.2 is far below the level of recorded music
 // Small, good enough and on every system that has the library.
 constexpr const char* kUsualFont = "/usr/share/sounds/sf2/TimGM6mb.sf2";
@@ -67,6 +68,7 @@ class MidiSong : public SongSource {
         return microseconds * static_cast<std::uint64_t>(rate_) / 1'000'000;
     }
     std::uint64_t End() const { return length_ + static_cast<std::uint64_t>(rate_) * kTailMs / 1000; }
+    void Silence();
     void MakeSynth(const QString& font);
     void Tell(const MidiEvent& event);
     void FadeTail(float* stereo, std::size_t frames) const;
@@ -127,10 +129,18 @@ void MidiSong::Tell(const MidiEvent& event) {
     }
 }
 
+// A reset leaves voices and reverberation to die away within some tenths of a second.
+void MidiSong::Silence() {
+    fluid_synth_system_reset(synth_.get());
+    std::array<float, 2 * kFramesAtOnce> lost{};
+    for (int frames = rate_ * kTailMs / 1000; frames > 0; frames -= kFramesAtOnce)
+        fluid_synth_write_float(synth_.get(), kFramesAtOnce, lost.data(), 0, 2, lost.data(), 1, 2);
+}
+
 // Notes that began before the place stay silent; everything that shapes the later ones is told.
 std::uint64_t MidiSong::Seek(std::uint64_t frame) {
     frame_ = std::min(frame, length_);
-    fluid_synth_system_reset(synth_.get());
+    Silence();
     for (next_ = 0; next_ < song_.events.size() && FrameAt(song_.events[next_].time) < frame_; ++next_) {
         const int kind = song_.events[next_].status & 0xF0;
         if (kind != 0x80 && kind != 0x90) Tell(song_.events[next_]);

@@ -41,6 +41,8 @@ QStringList UsualSdlDrivers() {
 #ifdef Q_OS_WIN
     return {u"wasapi"_s, u"directsound"_s, u"winmm"_s};
 #else
-    return {u"pulseaudio"_s, u"pipewire"_s, u"alsa"_s, u"dsp"_s};
+    // Not "pipewire": opening a device waits there for ever while the server has no sink, and the loss of the
+    // server goes unnoticed. A PipeWire desktop answers as PulseAudio, and through ALSA.
+    return {u"pulseaudio"_s, u"alsa"_s, u"dsp"_s};
 #endif
 }

@@ -13,7 +13,7 @@ constexpr int kLowestRate = 4000;
 constexpr int kHighestRate = 192000;
 constexpr int kMostChannels = 1024;
 constexpr std::size_t kSmallestBuffer = 64;  // frames
-constexpr qint64 kReopenEvery = 2000;        // ms
+constexpr qint64 kReopenEvery = 5000;        // ms; each attempt takes some tenths of a second
 
 }  // namespace
 

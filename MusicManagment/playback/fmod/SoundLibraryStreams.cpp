@@ -50,8 +50,10 @@ int SoundLibrary::FSOUND_Stream_GetTime(FSOUND_STREAM stream) {
 bool SoundLibrary::FSOUND_Stream_SetTime(FSOUND_STREAM stream, int milliseconds) {
     Voice* found = Find(streams_, stream);
     if (found == nullptr) return false;
-    const auto ms = static_cast<quint64>(std::max(0, milliseconds));
-    return Try([&] { found->ahead->Seek(ms * static_cast<quint64>(rate_) / 1000); });
+    // Rounded up, so that the time reads back as it was set.
+    const quint64 frame =
+        (static_cast<quint64>(std::max(0, milliseconds)) * static_cast<quint64>(rate_) + 999) / 1000;
+    return Try([&] { found->ahead->Seek(frame); });
 }
 
 int SoundLibrary::FSOUND_Stream_PlayEx(FSOUND_STREAM stream, int channel, FSOUND_DSPUNIT unit, bool paused) {

@@ -47,9 +47,8 @@ GstElement* MakeSilentSink() {
 }
 
 // Without a sound server the automatic choice quietly becomes a silent one; nothing better can be done then.
-GstElement* MakeAudioSink() {
-    if (qEnvironmentVariable("TUNESTEAD_AUDIO") == u"null"_s) return MakeSilentSink();
-    return gst_element_factory_make("autoaudiosink", nullptr);
+GstElement* MakeAudioSink(MciSound sound) {
+    return sound == MciSound::Silent ? MakeSilentSink() : gst_element_factory_make("autoaudiosink", nullptr);
 }
 
 }  // namespace
@@ -62,7 +61,7 @@ class GstMci::Device {
     }
 
     // Each returns the text of an error, empty for none.
-    QString Open(const QString& path);
+    QString Open(const QString& path, MciSound sound);
     QString Play();
     QString Stop();
     QString Pause();
@@ -84,12 +83,12 @@ class GstMci::Device {
     bool playing_ = false;
 };
 
-QString GstMci::Device::Open(const QString& path) {
+QString GstMci::Device::Open(const QString& path, MciSound sound) {
     GstElement* player = gst_element_factory_make("playbin", nullptr);
     if (player == nullptr) return u"GStreamer hat kein \"playbin\"."_s;
     player_.reset(GST_ELEMENT(gst_object_ref_sink(player)));
     bus_.reset(gst_element_get_bus(player));
-    GstElement* audio = MakeAudioSink();
+    GstElement* audio = MakeAudioSink(sound);
     GstElement* video = MakeSilentSink();
     if (audio == nullptr || video == nullptr) return u"GStreamer hat keine Ausgabe."_s;
     const QByteArray uri = QUrl::fromLocalFile(path).toEncoded();
@@ -188,7 +187,11 @@ quint32 GstMci::Device::Mode() const {
 
 // --- The interface ---
 
-GstMci::GstMci() = default;
+MciSound MciSoundOfEnvironment() {
+    return qEnvironmentVariable("TUNESTEAD_AUDIO") == u"null"_s ? MciSound::Silent : MciSound::Audible;
+}
+
+GstMci::GstMci(MciSound sound) : sound_(sound) {}
 GstMci::~GstMci() = default;
 
 bool GstMci::HasPart(const char* name) {
@@ -216,7 +219,7 @@ quint32 GstMci::Open(MciParameters& parameters) {
         return Result(text);
     }
     auto device = std::make_unique<Device>();
-    const QString text = device->Open(QDir::current().absoluteFilePath(parameters.Element));
+    const QString text = device->Open(QDir::current().absoluteFilePath(parameters.Element), sound_);
     if (!text.isEmpty()) return Result(text);
     parameters.Device = ++lastDevice_;
     devices_[parameters.Device] = std::move(device);

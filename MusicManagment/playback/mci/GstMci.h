@@ -5,11 +5,19 @@
 
 #include "MusicManagment/playback/mci/MciInterface.h"
 
+enum class MciSound {
+    Audible,
+    Silent,  // in real time all the same
+};
+
+// Silent when the environment variable TUNESTEAD_AUDIO says "null".
+MciSound MciSoundOfEnvironment();
+
 // The media control interface on GStreamer: a device is a player of its own, with its own way to the
-// loudspeaker. The environment variable TUNESTEAD_AUDIO with "null" plays in silence, in real time.
+// loudspeaker.
 class GstMci : public MciInterface {
  public:
-    GstMci();
+    explicit GstMci(MciSound sound = MciSoundOfEnvironment());
     ~GstMci() override;
 
     // Whether GStreamer has a part that is needed for playing, as "playbin" or "wavparse".
@@ -26,6 +34,7 @@ class GstMci : public MciInterface {
     // Keeps the text for ErrorString; an empty one is no error.
     quint32 Result(const QString& text);
 
+    MciSound sound_;
     std::map<quint32, std::unique_ptr<Device>> devices_;
     quint32 lastDevice_ = 0;
     quint32 lastError_ = 0;

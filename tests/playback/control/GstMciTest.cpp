@@ -16,12 +16,10 @@ namespace {
 
 class GstMciTest : public testing::Test {
  protected:
-    GstMciTest() { qputenv("TUNESTEAD_AUDIO", "null"); }
     void SetUp() override {
         for (const char* part : {"playbin", "wavparse"})
             if (!GstMci::HasPart(part)) GTEST_SKIP() << "GStreamer has no " << part;
     }
-    ~GstMciTest() override { qunsetenv("TUNESTEAD_AUDIO"); }
 
     void Open(const QString& path) {
         sound_.SetBackendFile(path);
@@ -37,7 +35,7 @@ class GstMciTest : public testing::Test {
     }
 
     SongFolder folder_;
-    GstMci mci_;
+    GstMci mci_{MciSound::Silent};
     TMCIPlaySound sound_{mci_, folder_.Path(u"settings.conf"_s)};
 };
 

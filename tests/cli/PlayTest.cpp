@@ -1,0 +1,128 @@
+#include <QtEndian>
+#include <cmath>
+
+#include "tests/PrintQt.h"
+#include "tests/cli/CommandRunner.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+constexpr int kRate = 44100;  // of the mix
+
+class PlayTest : public CommandTest {
+ protected:
+    // A song that is one level (-1 to 1) from its beginning to its end, so that the mix tells who sounds how
+    // loud.
+    QString AddLevel(const QString& name, double level, quint32 seconds) {
+        constexpr quint32 kSongRate = 8000;
+        ByteWriter file;
+        file.Raw("RIFF");
+        file.U32Le(36 + seconds * kSongRate * 2);
+        file.Raw("WAVEfmt ");
+        file.U32Le(16);
+        file.U16Le(1);
+        file.U16Le(1);
+        file.U32Le(kSongRate);
+        file.U32Le(kSongRate * 2);
+        file.U16Le(2);
+        file.U16Le(16);
+        file.Raw("data");
+        file.U32Le(seconds * kSongRate * 2);
+        for (quint32 i = 0; i < seconds * kSongRate; ++i)
+            file.U16Le(static_cast<quint16>(std::lround(level * 32767)));
+        Put(Path(name), file.Bytes());
+        return Path(name);
+    }
+    // Writes the mix, and keeps it.
+    CommandResult WriteMix(const QStringList& words) {
+        const CommandResult result = RunWords(
+            QStringList{u"play"_s, u"--fast"_s, u"--output"_s, u"file:"_s + Path(u"mix.wav"_s)} + words);
+        QFile file(Path(u"mix.wav"_s));
+        if (file.open(QIODevice::ReadOnly)) mix_ = file.readAll().mid(44);
+        return result;
+    }
+    double Seconds() const { return static_cast<double>(mix_.size()) / (4 * kRate); }
+    double LevelAt(double seconds) const {
+        const auto at = static_cast<qsizetype>(seconds * kRate) * 4;
+        return at + 2 <= mix_.size() ? qFromLittleEndian<qint16>(mix_.constData() + at) / 32767.0 : NAN;
+    }
+
+    QByteArray mix_;  // 16 bit, left and right in turn
+};
+
+TEST_F(PlayTest, SongsCrossInTheMix) {
+    const QString a = AddLevel(u"a.wav"_s, 0.25, 12);
+    const QString b = AddLevel(u"b.wav"_s, -0.5, 12);
+    const CommandResult result = WriteMix({u"--crossfade"_s, u"4000"_s, a, b});
+    EXPECT_EQ(result.Status, 0);
+    EXPECT_EQ(result.Err, QString());
+    EXPECT_EQ(result.Out, a + u'\n' + b + u'\n');
+    EXPECT_NEAR(Seconds(), 20.5, 0.75);
+    EXPECT_NEAR(LevelAt(6), 0.25, 0.01);
+    EXPECT_NEAR(LevelAt(10.1), (0.25 - 0.5) / 2, 0.06);
+    EXPECT_NEAR(LevelAt(15), -0.5, 0.01);
+}
+
+TEST_F(PlayTest, SongsFollowOneAnotherInTheOrderThatIsAskedFor) {
+    const QString a = AddLevel(u"a.wav"_s, 0.25, 3);
+    const QString b = AddLevel(u"b.wav"_s, -0.5, 3);
+    const CommandResult result = WriteMix({u"--order"_s, u"up"_s, u"--mode=none"_s, a, b});
+    EXPECT_EQ(result.Out, b + u'\n' + a + u'\n');
+    EXPECT_NEAR(LevelAt(2), -0.5, 0.01);
+    EXPECT_NEAR(LevelAt(5), 0.25, 0.01);
+    EXPECT_NEAR(Seconds(), 6.75, 0.75);
+}
+
+TEST_F(PlayTest, IntroScanGoesOnAfterItsTime) {
+    const QString a = AddLevel(u"a.wav"_s, 0.25, 30);
+    const QString b = AddLevel(u"b.wav"_s, -0.5, 30);
+    WriteMix({u"--scan"_s, u"2000"_s, u"--crossfade=0"_s, a, b});
+    EXPECT_NEAR(LevelAt(1.5), 0.25, 0.01);
+    EXPECT_NEAR(LevelAt(3), -0.5, 0.01);
+    EXPECT_NEAR(Seconds(), 4, 0.3);
+}
+
+TEST_F(PlayTest, ListsAndFoldersStandForTheirSongs) {
+    const QString a = AddLevel(u"a.wav"_s, 0.25, 2);
+    const QString b = AddLevel(u"music/b.wav"_s, 0.25, 2);
+    Put(Path(u"list.m3u"_s), AsBytes("a.wav\n"));
+    const CommandResult result = WriteMix({u"--mode=none"_s, Path(u"list.m3u"_s), Path(u"music"_s)});
+    EXPECT_EQ(result.Out, a + u'\n' + b + u'\n');
+}
+
+TEST_F(PlayTest, WhatCannotBePlayedIsToldAndTheRestIsPlayed) {
+    const QString a = AddLevel(u"a.wav"_s, 0.25, 2);
+    Put(Path(u"bad.mp3"_s), AsBytes("no sound at all"));
+    const CommandResult result = WriteMix({Path(u"missing.mp3"_s), Path(u"bad.mp3"_s), a});
+    EXPECT_EQ(result.Status, 1);
+    EXPECT_EQ(result.Out, a + u'\n');
+    EXPECT_TRUE(result.Err.contains(u"Nichts zum Abspielen gefunden: "_s + Path(u"missing.mp3"_s)));
+    EXPECT_TRUE(result.Err.contains(u"Fehler beim Öffnen der Datei "_s + Path(u"bad.mp3"_s)));
+}
+
+TEST_F(PlayTest, OptionsThatDoNotFitTogetherAreRefused) {
+    const QString a = AddLevel(u"a.wav"_s, 0.25, 1);
+    const QStringList cases[] = {
+        {u"--fast"_s},
+        {u"--fast"_s, u"--output=alsa"_s},
+        {u"--fast"_s, u"--output=null"_s, u"--engine=mci"_s},
+        {u"--output=file:"_s + Path(u"x.wav"_s), u"--engine=eldos"_s},
+        {u"--output=what:ever"_s},
+        {u"--scan=soon"_s},
+        {u"--crossfade=-1"_s},
+        {u"--order=sideways"_s},
+    };
+    for (const QStringList& words : cases)
+        EXPECT_EQ(RunWords(QStringList{u"play"_s, a} + words).Status, 2) << words.join(u' ').toStdString();
+    EXPECT_FALSE(QFile::exists(Path(u"x.wav"_s)));
+}
+
+TEST_F(PlayTest, OutputThatCannotBeOpenedFails) {
+    const QString a = AddLevel(u"a.wav"_s, 0.25, 1);
+    const CommandResult result = RunWords({u"play"_s, u"--output"_s, u"file:"_s + Path(u"no/x.wav"_s), a});
+    EXPECT_EQ(result.Status, 1);
+    EXPECT_TRUE(result.Err.contains(u"Error initializing output device"_s));
+}
+
+}  // namespace

@@ -1,0 +1,98 @@
+#include <gtest/gtest.h>
+
+#include "MusicManagment/playback/FMODPlaySound.h"
+#include "tests/playback/Listening.h"
+#include "tests/playback/ScriptedFmod.h"
+
+namespace {
+
+constexpr quint32 kFade = 4000;  // ms
+constexpr int kStep = 250;       // ms between two ticks of the player's timer
+constexpr double kOld = 440;     // Hz
+constexpr double kNew = 880;
+
+// Two back ends, the sound library and the clock, run as the player runs them.
+class CrossFadeTest : public Listening {
+ protected:
+    CrossFadeTest() {
+        WriteWav(Path("old.wav"), Sine({.frequency = kOld, .amplitude = 0.45}, 8));
+        WriteWav(Path("new.wav"), Sine({.frequency = kNew, .amplitude = 0.45}, 8));
+        oldSound.SetBackendFile(Path("old.wav"));
+        newSound.SetBackendFile(Path("new.wav"));
+    }
+    // True when the old sound's fade has ended.
+    bool Tick() {
+        newSound.FadeStep();
+        const bool ended = oldSound.FadeStep();
+        Hear(kStep / 1000.0);
+        clock.ticks += kStep;
+        return ended;
+    }
+    void StartCrossFade() {
+        oldSound.Open();
+        oldSound.Play();
+        Tick();
+        newSound.Open();
+        oldSound.StartFadeOut();
+        newSound.StartFadeIn();
+        newSound.Play();
+        faded = HeardFrames();
+    }
+
+    TestClock clock;
+    TFMODPlaySound oldSound{library, {.FadeTime = kFade, .OutputType = FSOUND_OUTPUT_NOSOUND}};
+    TFMODPlaySound newSound{library, {.FadeTime = kFade, .OutputType = FSOUND_OUTPUT_NOSOUND}};
+    std::size_t faded = 0;  // the frame at which the fade began
+};
+
+TEST_F(CrossFadeTest, OneToneFallsAsTheOtherRises) {
+    StartCrossFade();
+    for (int i = 0; i < 16; ++i) {
+        const std::size_t from = HeardFrames() + Mixer::kBlock;
+        EXPECT_FALSE(Tick());
+        const int left = 100 * (16 - i) * kStep / static_cast<int>(kFade);
+        EXPECT_NEAR(AmplitudeOf(kOld, *heard, from, Frames(0.2)), 0.0045 * left, 0.002) << i;
+        EXPECT_NEAR(AmplitudeOf(kNew, *heard, from, Frames(0.2)), 0.0045 * (100 - left), 0.002) << i;
+    }
+    EXPECT_FALSE(Tick());  // the end itself
+    EXPECT_EQ(oldSound.GetStatus(), psPlaying);
+    EXPECT_TRUE(Tick());
+    EXPECT_EQ(oldSound.GetStatus(), psStopped);
+    EXPECT_EQ(newSound.GetStatus(), psPlaying);
+
+    EXPECT_LT(*std::max_element(heard->begin(), heard->end()), 0.95F);
+    EXPECT_EQ(library.FramesStarved(), 0U);
+    // The new tone is where it must be after so many frames: none was dropped on the way.
+    Tick();
+    const std::size_t from = HeardFrames() - Frames(0.2);
+    EXPECT_LT(
+        Difference(*heard, from, Sine({.frequency = kNew, .amplitude = 0.45}, 8), from - faded, Frames(0.2)),
+        1e-3);
+}
+
+// Steps of the volume glide: nothing in the sum of two slow tones changes faster than the tones themselves.
+TEST_F(CrossFadeTest, NoStepIsAClick) {
+    StartCrossFade();
+    const std::size_t from = HeardFrames() + Mixer::kBlock;
+    for (int i = 0; i < 18; ++i)
+        Tick();
+    const double steepest = 0.45 * 2 * 3.1416 * kNew / kRate * 1.05;
+    for (std::size_t i = from + 1; i < HeardFrames() - Frames(0.3); ++i)
+        ASSERT_LT(std::abs(heard->at(2 * i) - heard->at(2 * i - 2)), steepest) << i - faded;
+}
+
+TEST_F(CrossFadeTest, NewSettingsCloseWhatAnotherBackEndPlays) {
+    StartCrossFade();
+    TFMODPlaySound third(library, {.OutputType = FSOUND_OUTPUT_NOSOUND, .MixRate = 48000});
+    third.SetBackendFile(Path("old.wav"));
+    third.Open();
+    EXPECT_EQ(oldSound.GetStatus(), psStopped);
+    EXPECT_THROW(oldSound.Play(), EFMODException);
+    oldSound.Close();
+    third.Play();
+    Hear(0.1);
+    EXPECT_EQ(third.GetStatus(), psPlaying);
+    EXPECT_EQ(third.GetLength(), 8000U);
+}
+
+}  // namespace
