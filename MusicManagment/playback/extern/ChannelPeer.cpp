@@ -77,7 +77,7 @@ bool ChannelPeer::WaitFor(Condition condition, int timeout) {
 void ChannelPeer::ReadSocket() {
     const QPointer<ChannelPeer> self(this);
     while (!self.isNull() && !gone_) {
-        reader_.Append(socket_->readAll());
+        if (socket_->bytesAvailable() > 0) reader_.Append(socket_->readAll());
         const std::optional<Frame> frame = reader_.Next();
         if (!frame) break;
         Take(*frame);

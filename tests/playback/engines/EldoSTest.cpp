@@ -9,8 +9,8 @@
 
 #include "MusicManagment/playback/eldos/NullPush.h"
 #include "tests/PrintQt.h"
+#include "tests/playback/control/PlayerRig.h"
 #include "tests/playback/engines/EncodedTone.h"
-#include "tests/playback/engines/SetClockTo.h"
 
 using namespace Qt::StringLiterals;
 
@@ -194,31 +194,31 @@ TEST_F(EldoSTest, AbsurdSettingsOfBuffersAreBounded) {
 }
 
 TEST_F(EldoSTest, PositionFollowsPauseStopAndTheTime) {
-    SetClockTo clock;
+    HandClock clock;
     const auto sound = Sound(ToneFile(u"wav"_s));
     settings_.MakeOutput = [] { return std::make_unique<NullPush>(); };
     TEldoSPlaySound timed(settings_);
     timed.SetBackendFile(sound->BackendFile());
     timed.Open();
-    clock.ticks += 5000;
+    clock.Now_ += 5000;
     EXPECT_EQ(timed.GetPosition(), 0U);
     timed.Play();
-    clock.ticks += 300;
+    clock.Now_ += 300;
     EXPECT_EQ(timed.GetPosition(), 300U);
     timed.PauseResume();
     EXPECT_EQ(timed.GetStatus(), psPaused);
-    clock.ticks += 5000;
+    clock.Now_ += 5000;
     EXPECT_EQ(timed.GetPosition(), 300U);
     timed.PauseResume();
     EXPECT_EQ(timed.GetStatus(), psPlaying);
-    clock.ticks += 200;
+    clock.Now_ += 200;
     EXPECT_EQ(timed.GetPosition(), 500U);
     timed.Stop();
     EXPECT_EQ(timed.GetStatus(), psStopped);
     EXPECT_EQ(timed.GetPosition(), 0U);
     // The output ran dry: nobody topped it up for so long.
     timed.Play();
-    clock.ticks += 5000;
+    clock.Now_ += 5000;
     EXPECT_EQ(timed.GetPosition(), 743U);
 }
 

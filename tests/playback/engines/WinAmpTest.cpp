@@ -6,9 +6,9 @@
 
 #include "MusicManagment/playback/winamp/Waiting.h"
 #include "tests/PrintQt.h"
+#include "tests/playback/control/PlayerRig.h"
 #include "tests/playback/engines/FakePlayer.h"
 #include "tests/playback/engines/PrivateBus.h"
-#include "tests/playback/engines/SetClockTo.h"
 
 using namespace Qt::StringLiterals;
 
@@ -44,7 +44,7 @@ class WinAmpTest : public testing::Test {
     }
     // Lets time pass, and the back end ask the player once and take the answer.
     int StatusAfter(TWinAmpPlaySound& sound, int milliseconds) {
-        clock_.ticks += milliseconds;
+        clock_.Now_ += milliseconds;
         const int told = player_.StatesTold;
         sound.GetStatus();
         // A question of our own comes after that of the back end, and so does its answer.
@@ -64,7 +64,7 @@ class WinAmpTest : public testing::Test {
         return u"no error"_s;
     }
 
-    SetClockTo clock_;
+    HandClock clock_;
     QTemporaryDir folder_;
     const QString song_ = folder_.filePath(u"Ärger & 100 % Spaß #1.mp3"_s);
     PrivateBus bus_;
@@ -85,7 +85,7 @@ TEST_F(WinAmpTest, AnOpenedSongIsHeldAtItsStartUntilItIsPlayed) {
     EXPECT_TRUE(WaitUntil([this] { return player_.Calls.contains(u"SetPosition"_s); }, kPatience));
     EXPECT_EQ(player_.Status, u"Paused"_s);
     EXPECT_EQ(player_.Position, 0);
-    clock_.ticks += 5000;
+    clock_.Now_ += 5000;
     EXPECT_EQ(sound->GetPosition(), 0U);
 
     sound->Play();
@@ -108,7 +108,7 @@ TEST_F(WinAmpTest, PositionFollowsThePlayerAndTheTimeBetween) {
     player_.Position = 30'000'000;
     StatusAfter(*sound, 100);
     EXPECT_EQ(sound->GetPosition(), 30000U);
-    clock_.ticks += 40;
+    clock_.Now_ += 40;
     EXPECT_EQ(sound->GetPosition(), 30040U);
 
     sound->PauseResume();
@@ -133,7 +133,7 @@ TEST_F(WinAmpTest, PositionFollowsThePlayerAndTheTimeBetween) {
 
     sound->Stop();
     EXPECT_EQ(sound->GetStatus(), psStopped);
-    clock_.ticks += 5000;
+    clock_.Now_ += 5000;
     EXPECT_EQ(sound->GetPosition(), 0U);
     EXPECT_EQ(player_.Position, 0);
     EXPECT_FALSE(player_.Calls.contains(u"Stop"_s));
@@ -193,7 +193,7 @@ TEST_F(WinAmpTest, APlayerThatDoesNotRunIsStartedAndWaitedFor) {
     player_.Vanish();
     EXPECT_TRUE(WaitUntil(
         [&] {
-            clock_.ticks += 100;
+            clock_.Now_ += 100;
             return sound->GetStatus() == psStopped;
         },
         kPatience));
