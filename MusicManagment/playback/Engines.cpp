@@ -35,7 +35,8 @@ TWinAmpSettings WinAmpSettings(const EngineSettings& settings) {
 
 }  // namespace
 
-EngineTable MakeEngines(std::shared_ptr<FmodLibrary> library, std::shared_ptr<MciInterface> mci) {
+EngineTable MakeEngines(const std::shared_ptr<FmodLibrary>& library,
+                        const std::shared_ptr<MciInterface>& mci) {
     EngineTable table;
     table.Register(TEngine::FMOD, [library](const EngineSettings& settings) -> Backend {
         return std::make_unique<TFMODPlaySound>(*library, FmodSettings(settings));
