@@ -116,7 +116,7 @@ bool MprisPlayer::TakesFiles() const {
     return schemes.toStringList().contains(u"file"_s);
 }
 
-QStringList RunningPlayers(QDBusConnection bus, int answerTimeout) {
+QStringList RunningPlayers(const QDBusConnection& bus, int answerTimeout) {
     const QDBusMessage question = QDBusMessage::createMethodCall(
         u"org.freedesktop.DBus"_s, u"/org/freedesktop/DBus"_s, u"org.freedesktop.DBus"_s, u"ListNames"_s);
     const QDBusMessage answer = WaitForAnswer(bus.asyncCall(question, answerTimeout), answerTimeout);

@@ -56,7 +56,7 @@ class MprisPlayer {
 };
 
 // The names of all players on the bus but our own, sorted.
-QStringList RunningPlayers(QDBusConnection bus, int answerTimeout);
+QStringList RunningPlayers(const QDBusConnection& bus, int answerTimeout);
 // Whether a name on the bus is that of a player: "vlc" fits "org.mpris.MediaPlayer2.vlc" and
 // "org.mpris.MediaPlayer2.vlc.instance7", in upper and lower case.
 bool IsPlayerNamed(const QString& busName, const QString& player);

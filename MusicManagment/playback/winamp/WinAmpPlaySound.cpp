@@ -72,7 +72,7 @@ std::function<bool()> TWinAmpPlaySound::Disturbance() const {
 template <typename Waiting>
 auto TWinAmpPlaySound::Undisturbed(Waiting waiting) {
     const std::function<bool()> disturbed = Disturbance();
-    const auto result = waiting();
+    auto result = waiting();
     if (disturbed()) throw EAbort();
     return result;
 }
