@@ -6,6 +6,7 @@
 
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/playback/EngineChoice.h"
+#include "MusicManagment/playback/spectrum/SpectrumFeed.h"
 #include "app/CollectionCommands.h"
 #include "app/desktop/ProgressDisplay.h"
 #include "app/models/CollectionTotals.h"
@@ -28,9 +29,10 @@ class ToolWindows;
 struct MainWindowOptions {
     StandardFiles Files{};
     QString SettingsFile{};
-    QStringList Arguments{};   // of the command line, without the program's name
-    bool OfferWizard = false;  // at the first start
-    EngineTable Engines{};     // that songs are played with
+    QStringList Arguments{};    // of the command line, without the program's name
+    bool OfferWizard = false;   // at the first start
+    EngineTable Engines{};      // that songs are played with
+    SpectrumSource Spectrum{};  // of what they play
 };
 
 // The program's main window: owns the collection and brings together what shows it and what works on it.

@@ -4,6 +4,8 @@
 #include <string_view>
 
 #include "MusicManagment/playback/Engines.h"
+#include "MusicManagment/playback/fmod/SoundLibrary.h"
+#include "MusicManagment/playback/mci/GstMci.h"
 #include "app/MainWindow.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/StandardFiles.h"
@@ -40,6 +42,14 @@ bool WantsTextOnly(int argc, char** argv) {
                        [&](const char* argument) { return std::ranges::count(kOptions, argument) > 0; });
 }
 
+static_assert(kSpectrumBands == FSOUND_SPECTRUM_SIZE);
+
+SpectrumSource SpectrumOf(const std::shared_ptr<FmodLibrary>& sound) {
+    return {.SetActive =
+                [sound](bool active) { sound->FSOUND_DSP_SetActive(sound->FSOUND_DSP_GetFFTUnit(), active); },
+            .Get = [sound] { return sound->FSOUND_DSP_GetSpectrum(); }};
+}
+
 }  // namespace
 
 int main(int argc, char** argv) {
@@ -59,11 +69,13 @@ int main(int argc, char** argv) {
     SetUserDialogs(&dialogs);
     int result = 0;
     {
+        const auto sound = std::make_shared<SoundLibrary>();
         TTunesteadMainWnd window({.Files = LocateStandardFiles(),
                                   .SettingsFile = UserSettingsFile(),
                                   .Arguments = files,
                                   .OfferWizard = true,
-                                  .Engines = MakeEngines()});
+                                  .Engines = MakeEngines(sound, std::make_shared<GstMci>()),
+                                  .Spectrum = SpectrumOf(sound)});
         dialogs.SetMainWindow(&window);
         const Termination termination([&window] { window.End(); });
         window.show();
