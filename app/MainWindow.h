@@ -6,6 +6,8 @@
 
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/playback/EngineChoice.h"
+#include "MusicManagment/playback/ExternalPlayer.h"
+#include "MusicManagment/playback/spectrum/SpectrumFeed.h"
 #include "app/CollectionCommands.h"
 #include "app/Startup.h"
 #include "app/desktop/InstallationSteps.h"
@@ -37,6 +39,9 @@ struct MainWindowOptions {
     Installation* Setup = nullptr;  // none where the program cannot install itself
     bool OfferWizard = false;       // at the first start
     EngineTable Engines{};          // that songs are played with
+    SpectrumSource Spectrum{};      // of what they play
+    // Makes the way to a separate player program; none where it is empty.
+    std::function<std::unique_ptr<ExternalPlayer>()> MakeExternalPlayer{};
 };
 
 // The program's main window: owns the collection and brings together what shows it and what works on it.

@@ -12,9 +12,11 @@
 #include "MusicManagment/playlist/PlayListMenu.h"
 #include "app/CommandRunner.h"
 #include "app/desktop/Icons.h"
+#include "app/views/DSPDraw.h"
 #include "app/views/PlayerForm.h"
 #include "app/views/PlaylistForm.h"
 #include "app/views/SongListWidget.h"
+#include "app/views/SpectrumForm.h"
 #include "app/views/VisPlayList.h"
 #include "app/views/VisPlaySound.h"
 
@@ -35,28 +37,34 @@ QSet<QString> NamesIn(const TPlayList& list) {
 
 }  // namespace
 
-Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& songs, QString standardList,
-                 EngineTable engines)
+Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& songs, PlayingOptions options)
     : database_(database),
       songs_(songs),
-      standardList_(std::move(standardList)),
-      player_(std::move(engines)),
+      standardList_(std::move(options.StandardList)),
+      player_(std::move(options.Engines)),
       listForm_(new TPlaylistForm(list_, &window)),
       playerForm_(new TPlayerForm(player_, list_, &window)),
+      spectrumForm_(new TSpectrumForm(&window)),
       contextMenu_(new QMenu(listForm_)) {
     list_.SetMusicDatabase(&database);
     player_.SetMusicDatabase(&database);
     player_.SetPlayList(&list_);
+    if (options.MakeExternalPlayer) player_.SetExternalPlayer(options.MakeExternalPlayer());
     SetUpWindows(window);
+    SetUpSpectrum(window, std::move(options.Spectrum));
     SetUpContextMenu();
+    JoinDesktop(window);
     QObject::connect(&songs, &QAbstractItemView::doubleClicked, listForm_,
                      [this] { RunCommand([this] { database_.ClickMenuItem(mcPlay); }); });
 }
 
 // The window would let its tool windows live longer than what they show.
 Playing::~Playing() {
+    mpris_.reset();
+    database_.LeaveSettings(*spectrumForm_);
     delete listForm_;
     delete playerForm_;
+    delete spectrumForm_;
 }
 
 void Playing::SetUpWindows(QMainWindow& window) {
@@ -70,8 +78,44 @@ void Playing::SetUpWindows(QMainWindow& window) {
     panel.OnChange = [this] { FollowSong(); };
 }
 
+// Nothing is computed unless somebody looks at it.
+void Playing::SetUpSpectrum(QMainWindow& window, SpectrumSource source) {
+    window.addDockWidget(Qt::RightDockWidgetArea, spectrumForm_);
+    spectrumForm_->hide();
+    database_.JoinSettings(*spectrumForm_);
+    player_.SetDSPDraw(&spectrumForm_->Draw());
+    if (!source.Get) return;
+    spectrumFeed_ = std::make_unique<SpectrumFeed>(std::move(source));
+    spectrumForm_->Draw().OnDrawing = [this](bool drawing) {
+        drawing ? spectrumFeed_->Start() : spectrumFeed_->Stop();
+    };
+}
+
+// Without a session bus it is as if nobody was listening.
+void Playing::JoinDesktop(QMainWindow& window) {
+    mpris_ = std::make_unique<Mpris>(
+        player_, list_,
+        Mpris::Hooks{.Run = [this](int id) { RunPlayerCommand(id); },
+                     .OpenSong = [this](const QString& path) { OpenSong(path); },
+                     .Raise =
+                         [&window] {
+                             window.setWindowState(window.windowState() & ~Qt::WindowMinimized);
+                             window.raise();
+                             window.activateWindow();
+                         },
+                     .Quit = [&window] { window.close(); }});
+    mpris_->Register(QDBusConnection::sessionBus());
+    const auto update = [this] { mpris_->Update(); };
+    const QAbstractItemModel* list = listForm_->View().model();
+    QObject::connect(list, &QAbstractItemModel::modelReset, mpris_.get(), update);
+    QObject::connect(list, &QAbstractItemModel::rowsInserted, mpris_.get(), update);
+    QObject::connect(list, &QAbstractItemModel::rowsRemoved, mpris_.get(), update);
+    playerForm_->Panel().OnSeeked = [this](quint32 position) { mpris_->TellSeeked(position); };
+}
+
 // The list goes along with the songs that it plays.
 void Playing::FollowSong() {
+    if (mpris_) mpris_->Update();
     if (list_.CurrentSong() == shownSong_) return;
     shownSong_ = list_.CurrentSong();
     listForm_->View().ShowEntry(list_.IndexOf());
@@ -104,6 +148,7 @@ void Playing::SetUpContextMenu() {
 void Playing::AddTo(QMenu& menu) {
     menu.addAction(listForm_->toggleViewAction());
     menu.addAction(playerForm_->toggleViewAction());
+    menu.addAction(spectrumForm_->toggleViewAction());
 }
 
 void Playing::RunPlayListCommand(int id) {

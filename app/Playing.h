@@ -5,23 +5,33 @@
 #include <vector>
 
 #include "MusicManagment/playback/PlaySound.h"
+#include "MusicManagment/playback/spectrum/SpectrumFeed.h"
 #include "MusicManagment/playlist/PlayList.h"
 #include "app/CommandMenu.h"
 #include "app/MenuIcons.h"
+#include "app/desktop/Mpris.h"
 
 class QMainWindow;
 class QMenuBar;
 class SongListWidget;
 class TPlayerForm;
 class TPlaylistForm;
+class TSpectrumForm;
+
+// What playing needs from outside.
+struct PlayingOptions {
+    QString StandardList{};     // the file that keeps the playlist between two runs
+    EngineTable Engines{};      // that songs are played with
+    SpectrumSource Spectrum{};  // of what they play; empty for none
+    // Makes the way to a separate player program; empty for none.
+    std::function<std::unique_ptr<ExternalPlayer>()> MakeExternalPlayer{};
+};
 
 // Everything about playing that the main window has: the playlist, the player, their windows and commands.
 class Playing {
  public:
-    // The tool windows belong to `window`. `standardList` is the file that keeps the playlist between two
-    // runs; `songs` is where songs are chosen.
-    Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& songs, QString standardList,
-            EngineTable engines);
+    // The tool windows belong to `window`; in `songs` songs are chosen.
+    Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& songs, PlayingOptions options);
     ~Playing();
 
     // Told what came of a command, in a sentence for the status bar.
@@ -48,7 +58,9 @@ class Playing {
 
  private:
     void SetUpWindows(QMainWindow& window);
+    void SetUpSpectrum(QMainWindow& window, SpectrumSource source);
     void SetUpContextMenu();
+    void JoinDesktop(QMainWindow& window);
     void FollowSong();
     std::vector<SongIndex> Chosen() const;
     int Append(const std::vector<SongIndex>& songs);
@@ -68,6 +80,9 @@ class Playing {
     CommandMenu playerMenu_{[this](int id) { RunPlayerCommand(id); }, &PlayerIcon};
     TPlaylistForm* listForm_;
     TPlayerForm* playerForm_;
+    TSpectrumForm* spectrumForm_;
+    std::unique_ptr<SpectrumFeed> spectrumFeed_;
     QMenu* contextMenu_;
+    std::unique_ptr<Mpris> mpris_;
     QString shownSong_;
 };

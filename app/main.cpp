@@ -7,6 +7,9 @@
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/playback/Engines.h"
+#include "MusicManagment/playback/extern/LocalExternalPlayer.h"
+#include "MusicManagment/playback/fmod/SoundLibrary.h"
+#include "MusicManagment/playback/mci/GstMci.h"
 #include "app/MainWindow.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/Installation.h"
@@ -89,6 +92,14 @@ int RunWindow(QtDialogs& dialogs, SingleInstance& instance, const MainWindowOpti
     return result;
 }
 
+static_assert(kSpectrumBands == FSOUND_SPECTRUM_SIZE);
+
+SpectrumSource SpectrumOf(const std::shared_ptr<FmodLibrary>& sound) {
+    return {.SetActive =
+                [sound](bool active) { sound->FSOUND_DSP_SetActive(sound->FSOUND_DSP_GetFFTUnit(), active); },
+            .Get = [sound] { return sound->FSOUND_DSP_GetSpectrum(); }};
+}
+
 int RefuseToStart(const SingleInstance& instance) {
     UserDialogs().ShowMessage(
         MessageKind::Error,
@@ -115,13 +126,16 @@ int Start(QtDialogs& dialogs, const StartRequest& request) {
     Installation forThisUser(InstallationPlaces::OfThisUser());
     Installation* setup = &forThisUser;
 #endif
+    const auto sound = std::make_shared<SoundLibrary>();
     return RunWindow(dialogs, instance,
                      {.Files = files,
                       .SettingsFile = TRWReg::DefaultFile(),
                       .Arguments = request.Arguments,
                       .Setup = setup,
                       .OfferWizard = true,
-                      .Engines = MakeEngines()});
+                      .Engines = MakeEngines(sound, std::make_shared<GstMci>()),
+                      .Spectrum = SpectrumOf(sound),
+                      .MakeExternalPlayer = [] { return std::make_unique<LocalExternalPlayer>(); }});
 }
 
 }  // namespace

@@ -51,8 +51,8 @@ class PlayingTest : public testing::Test {
         menu_ = std::make_unique<MainMenu>(
             *window_.menuBar(), database_, [this](int id) { database_.ClickMenuItem(id); }, [] {});
         menu_->BindTo(*songs_);
-        playing_ =
-            std::make_unique<Playing>(window_, database_, *songs_, StandardList(), ScriptedEngines(song_));
+        playing_ = std::make_unique<Playing>(window_, database_, *songs_,
+                                             PlayingOptions{StandardList(), ScriptedEngines(song_), {}});
         playing_->AddMenusTo(*window_.menuBar());
         playing_->OnDone = [this](const QString& sentence) { told_ = sentence; };
         database_.OnMenuItemClicked = [this](TMusicDatabase&, const TMenuExItem&, void*, qint64 id,

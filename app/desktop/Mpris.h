@@ -1,0 +1,69 @@
+#pragma once
+
+#include <QDBusConnection>
+#include <QDBusVirtualObject>
+#include <QTimer>
+#include <QVariantMap>
+#include <functional>
+
+#include "app/models/PlayingSong.h"
+
+class TPlayList;
+class TPlaySound;
+
+// Lets the desktop drive the player: media keys, the volume applet, the lock screen. Speaks MPRIS 2, see
+// https://specifications.freedesktop.org/mpris-spec/latest/.
+class Mpris : public QDBusVirtualObject {
+ public:
+    // What other parts of the program do for the desktop.
+    struct Hooks {
+        std::function<void(int command)> Run;  // of the player's menu (PlaySoundMenu.h)
+        std::function<void(const QString& path)> OpenSong;
+        std::function<void()> Raise;
+        std::function<void()> Quit;
+    };
+
+    Mpris(TPlaySound& player, TPlayList& list, Hooks hooks);
+    ~Mpris() override;
+
+    // Takes the name "org.mpris.MediaPlayer2.tunestead", or one of its own where that is taken. False without
+    // a bus, which is no error: there is nobody then who would want to know.
+    bool Register(QDBusConnection bus);
+    // The name that was taken; empty for none.
+    const QString& ServiceName() const { return serviceName_; }
+
+    // The song, what the player does with it or the list has changed. Told to the bus as soon as the program
+    // comes to it.
+    void Update() { updateTimer_.start(); }
+    // The user has gone to another place of the song.
+    void TellSeeked(quint32 position);  // ms
+
+    bool handleMessage(const QDBusMessage& message, const QDBusConnection& connection) override;
+    QString introspect(const QString& path) const override;
+
+ private:
+    struct Interface;
+
+    bool HandleProperties(const QDBusMessage& message, const QDBusConnection& connection);
+    void SetProperty(const QString& name, const QVariant& value);
+    QVariantMap PropertiesOf(const QString& interface) const;
+    QVariantMap RootProperties() const;
+    QVariantMap PlayerProperties() const;
+    QVariantMap Metadata() const;
+    QString TrackId() const;
+    bool CallRoot(const QString& method);
+    bool CallPlayer(const QString& method, const QVariantList& arguments);
+    void Seek(qint64 microseconds);
+    void TellChanges();
+    void Signal(const QString& interface, const QString& name, const QVariantList& arguments) const;
+
+    TPlaySound& player_;
+    TPlayList& list_;
+    Hooks hooks_;
+    QDBusConnection bus_;
+    QString serviceName_;
+    QTimer updateTimer_;
+    QVariantMap told_;  // what the bus knows of the player
+    PlayingSong song_;
+    int track_ = 0;  // counts the songs
+};

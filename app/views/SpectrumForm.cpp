@@ -1,0 +1,58 @@
+#include "app/views/SpectrumForm.h"
+
+#include <QAction>
+#include <QActionGroup>
+
+#include "CommonRUKTools/RWReg.h"
+#include "app/views/DSPDraw.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+struct StyleCaption {
+    TSpectrumStyle Style;
+    const char16_t* Caption;
+};
+
+constexpr StyleCaption kStyles[] = {{ssBars, u"&Balken"}, {ssLine, u"&Linie"}, {ssCircle, u"&Kreis"}};
+
+const QString kValue = u"SpectrumStyle"_s;
+
+}  // namespace
+
+TSpectrumForm::TSpectrumForm(QWidget* parent)
+    : QDockWidget(u"Spektrum"_s, parent), draw_(new TDSPDraw(this)), styles_(new QActionGroup(this)) {
+    setObjectName(u"SpectrumForm"_s);
+    setAccessibleName(windowTitle());
+    setWidget(draw_);
+    AddStyles();
+}
+
+void TSpectrumForm::AddStyles() {
+    for (const auto& [style, caption] : kStyles) {
+        QAction* action = styles_->addAction(QString::fromUtf16(caption));
+        action->setCheckable(true);
+        action->setData(style);
+        connect(action, &QAction::triggered, this, [this, style] { draw_->SetStyle(style); });
+    }
+    draw_->addActions(styles_->actions());
+    draw_->setContextMenuPolicy(Qt::ActionsContextMenu);
+    draw_->setToolTip(u"Die Darstellung wählt das Kontextmenü."_s);
+    ShowStyle();
+}
+
+void TSpectrumForm::ShowStyle() {
+    for (QAction* action : styles_->actions())
+        action->setChecked(action->data().toInt() == draw_->Style());
+}
+
+void TSpectrumForm::LoadSettings(const TRWReg& settings) {
+    const auto style = settings.ReadInteger(kValue);
+    if (style && *style >= ssBars && *style <= ssCircle) draw_->SetStyle(static_cast<TSpectrumStyle>(*style));
+    ShowStyle();
+}
+
+void TSpectrumForm::SaveSettings(TRWReg& settings) const {
+    settings.WriteInteger(kValue, draw_->Style());
+}

@@ -1,0 +1,174 @@
+#include "app/desktop/Mpris.h"
+
+#include <gtest/gtest.h>
+
+#include <QDBusMessage>
+#include <QDBusObjectPath>
+#include <QDBusReply>
+#include <QDBusVariant>
+#include <QFile>
+#include <QProcess>
+#include <QTemporaryDir>
+#include <QTest>
+
+#include "MusicManagment/playback/PlaySound.h"
+#include "MusicManagment/playback/PlaySoundMenu.h"
+#include "tests/PrintQt.h"
+#include "tests/app/ScriptedBackend.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+const QString kPlayer = u"org.mpris.MediaPlayer2.Player"_s;
+const QString kRoot = u"org.mpris.MediaPlayer2"_s;
+
+// A bus of the test's own with the player on one connection and the desktop on another.
+class MprisTest : public testing::Test {
+ protected:
+    void SetUp() override {
+        daemon_.start(u"dbus-daemon"_s, {u"--session"_s, u"--nofork"_s, u"--print-address"_s});
+        if (!daemon_.waitForStarted() || !daemon_.waitForReadyRead()) GTEST_SKIP() << "no dbus-daemon";
+        address_ = QString::fromLocal8Bit(daemon_.readLine()).trimmed();
+        desktop_ = QDBusConnection::connectToBus(address_, u"desktop"_s);
+        ASSERT_TRUE(mpris_.Register(QDBusConnection::connectToBus(address_, u"player"_s)));
+        player_.SetPlayList(&list_);
+        for (const QString& name : {u"a"_s, u"b"_s}) {
+            QFile file(folder_.filePath(name + u".mp3"_s));
+            EXPECT_TRUE(file.open(QIODevice::WriteOnly));
+            TID3Tag record;
+            record.Title = name.toUpper();
+            record.Artist = u"Band"_s;
+            record.Album = u"Platte"_s;
+            list_.Insert(list_.Count(), {.Name = file.fileName(), .Record = record});
+        }
+    }
+    void TearDown() override {
+        QDBusConnection::disconnectFromBus(u"player"_s);
+        QDBusConnection::disconnectFromBus(u"desktop"_s);
+        daemon_.kill();
+        daemon_.waitForFinished();
+    }
+
+    // The player answers in this thread, so the desktop may not block.
+    QDBusMessage Ask(const QString& interface, const QString& method, const QVariantList& arguments = {}) {
+        QDBusMessage call = QDBusMessage::createMethodCall(u"org.mpris.MediaPlayer2.tunestead"_s,
+                                                           u"/org/mpris/MediaPlayer2"_s, interface, method);
+        call.setArguments(arguments);
+        const QDBusPendingCall pending = desktop_.asyncCall(call);
+        EXPECT_TRUE(QTest::qWaitFor([&] { return pending.isFinished(); }));
+        return pending.reply();
+    }
+    QVariant Property(const QString& name, const QString& interface = kPlayer) {
+        const QDBusMessage reply = Ask(u"org.freedesktop.DBus.Properties"_s, u"Get"_s, {interface, name});
+        return reply.arguments().value(0).value<QDBusVariant>().variant();
+    }
+    QVariantMap Metadata() { return qdbus_cast<QVariantMap>(Property(u"Metadata"_s)); }
+
+    QTemporaryDir folder_;
+    QProcess daemon_;
+    QString address_;
+    QDBusConnection desktop_{QString()};
+    ScriptedSong song_;
+    TPlayList list_;
+    TPlaySound player_{ScriptedEngines(song_)};
+    QList<int> commands_;
+    QString opened_;
+    int raised_ = 0;
+    Mpris mpris_{player_,
+                 list_,
+                 {.Run = [this](int command) { commands_ << command; },
+                  .OpenSong = [this](const QString& path) { opened_ = path; },
+                  .Raise = [this] { ++raised_; },
+                  .Quit = [] {}}};
+};
+
+TEST_F(MprisTest, TellsWhatPlays) {
+    EXPECT_EQ(Property(u"PlaybackStatus"_s), u"Stopped"_s);
+    ASSERT_TRUE(list_.PlayEntry(1));
+    mpris_.Update();
+    QApplication::processEvents();
+    EXPECT_EQ(Property(u"PlaybackStatus"_s), u"Playing"_s);
+    const QVariantMap data = Metadata();
+    EXPECT_EQ(data.value(u"xesam:title"_s), u"B"_s);
+    EXPECT_EQ(data.value(u"xesam:artist"_s).toStringList(), QStringList(u"Band"_s));
+    EXPECT_EQ(data.value(u"xesam:album"_s), u"Platte"_s);
+    EXPECT_EQ(data.value(u"mpris:length"_s).toLongLong(), 240'000'000);
+    song_.Position = 1500;
+    EXPECT_EQ(Property(u"Position"_s).toLongLong(), 1'500'000);
+    player_.PauseResume();
+    EXPECT_EQ(Property(u"PlaybackStatus"_s), u"Paused"_s);
+    EXPECT_EQ(Property(u"Identity"_s, kRoot), u"Tunestead"_s);
+}
+
+TEST_F(MprisTest, MediaKeysBecomeCommandsOfThePlayer) {
+    for (const QString& method : {u"PlayPause"_s, u"Next"_s, u"Previous"_s, u"Stop"_s, u"Pause"_s})
+        Ask(kPlayer, method);
+    EXPECT_EQ(commands_, QList<int>({plPlay, plNext, plPrevious, plStop}));
+    commands_.clear();
+    ASSERT_TRUE(list_.PlayEntry(0));
+    Ask(kPlayer, u"PlayPause"_s);
+    Ask(kPlayer, u"Pause"_s);
+    player_.PauseResume();
+    Ask(kPlayer, u"Pause"_s);
+    Ask(kPlayer, u"Play"_s);
+    EXPECT_EQ(commands_, QList<int>({plPause, plPause, plPause}));
+    Ask(kRoot, u"Raise"_s);
+    EXPECT_EQ(raised_, 1);
+    Ask(kPlayer, u"OpenUri"_s, {u"file:///Musik/a%20b.mp3"_s});
+    EXPECT_EQ(opened_, u"/Musik/a b.mp3"_s);
+    EXPECT_EQ(Ask(kPlayer, u"Dance"_s).type(), QDBusMessage::ErrorMessage);
+}
+
+TEST_F(MprisTest, SeeksWithinTheSongThatIsMeant) {
+    ASSERT_TRUE(list_.PlayEntry(0));
+    mpris_.Update();
+    QApplication::processEvents();
+    song_.Position = 10'000;
+    Ask(kPlayer, u"Seek"_s, {qint64{-4'000'000}});
+    EXPECT_EQ(song_.Position, 6'000u);
+    Ask(kPlayer, u"Seek"_s, {qint64{-40'000'000}});
+    EXPECT_EQ(song_.Position, 0u);
+    Ask(kPlayer, u"Seek"_s, {qint64{300'000'000}});
+    EXPECT_EQ(commands_, QList<int>{plNext});
+
+    const QVariant track = Metadata().value(u"mpris:trackid"_s);
+    Ask(kPlayer, u"SetPosition"_s, {track, qint64{90'000'000}});
+    EXPECT_EQ(song_.Position, 90'000u);
+    Ask(kPlayer, u"SetPosition"_s, {track, qint64{241'000'000}});
+    Ask(kPlayer, u"SetPosition"_s, {QVariant::fromValue(QDBusObjectPath(u"/other"_s)), qint64{1'000'000}});
+    EXPECT_EQ(song_.Position, 90'000u);
+}
+
+TEST_F(MprisTest, OrderAndRepeatAreSetFromOutside) {
+    const QString properties = u"org.freedesktop.DBus.Properties"_s;
+    const auto set = [&](const QString& name, const QVariant& value) {
+        return Ask(properties, u"Set"_s, {kPlayer, name, QVariant::fromValue(QDBusVariant(value))}).type();
+    };
+    EXPECT_EQ(set(u"Shuffle"_s, true), QDBusMessage::ReplyMessage);
+    EXPECT_EQ(set(u"LoopStatus"_s, u"Playlist"_s), QDBusMessage::ReplyMessage);
+    EXPECT_EQ(list_.PlayOrder(), poRandom);
+    EXPECT_TRUE(list_.RepeatAll());
+    EXPECT_EQ(set(u"Nonsense"_s, true), QDBusMessage::ErrorMessage);
+}
+
+TEST_F(MprisTest, ASecondProgramTakesANameOfItsOwn) {
+    Mpris second(player_, list_, {});
+    EXPECT_TRUE(second.Register(QDBusConnection::connectToBus(address_, u"second"_s)));
+    EXPECT_TRUE(second.ServiceName().startsWith(u"org.mpris.MediaPlayer2.tunestead.instance"_s));
+    QDBusConnection::disconnectFromBus(u"second"_s);
+}
+
+TEST(MprisWithoutBusTest, NobodyIsListening) {
+    TPlayList list;
+    ScriptedSong song;
+    TPlaySound player(ScriptedEngines(song));
+    Mpris mpris(player, list, {});
+    EXPECT_FALSE(mpris.Register(QDBusConnection(u"none"_s)));
+    mpris.Update();
+    mpris.TellSeeked(1000);
+    QApplication::processEvents();
+    EXPECT_TRUE(mpris.ServiceName().isEmpty());
+}
+
+}  // namespace
