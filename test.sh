@@ -11,7 +11,7 @@ git ls-files '*.h' '*.cpp' | xargs clang-format --dry-run -Werror
 echo "== Build and test"
 cmake --preset release -DTUNESTEAD_TESTS=ON -DTUNESTEAD_BENCH=ON >/dev/null
 cmake --build --preset release
-desktop-file-validate data/tunestead.desktop
+tools/check_data.sh build/release/bin
 ctest --preset release
 
 echo "== Tests under the address and undefined-behaviour sanitizers"

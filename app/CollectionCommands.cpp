@@ -12,8 +12,24 @@
 
 using namespace Qt::StringLiterals;
 
+namespace {
+
+// `save` tells whether the program may end. Where it fails, the user decides.
+bool SavedOrGivenUp(const std::function<bool()>& save, const QString& loss) {
+    try {
+        return save();
+    } catch (const EAbort&) {
+        return false;
+    } catch (const ERukException& error) {
+        const QString question = error.Message() + u"\n\n"_s + loss + u" Trotzdem beenden?"_s;
+        return UserDialogs().Ask(question, {u"Beenden"_s, u"Abbrechen"_s}, 1) == 0;
+    }
+}
+
+}  // namespace
+
 CollectionCommands::CollectionCommands(TMusicDatabase& database, StandardFiles files)
-    : database_(database), files_(std::move(files)) {}
+    : database_(database), files_(std::move(files)), bannList_(database.BannList(), files_) {}
 
 bool CollectionCommands::Run(int id) {
     switch (id) {
@@ -95,16 +111,17 @@ bool CollectionCommands::KeepChanges() {
 }
 
 bool CollectionCommands::MayClose() {
-    try {
-        return KeepChanges();
-    } catch (const EAbort&) {
-        return false;
-    } catch (const ERukException& error) {
-        const QString question =
-            error.Message() +
-            u"\n\nDie Änderungen in der Datenbank sind noch nicht gespeichert. Trotzdem beenden?"_s;
-        return UserDialogs().Ask(question, {u"Beenden"_s, u"Abbrechen"_s}, 1) == 0;
-    }
+    const auto saveBannList = [this] {
+        bannList_.Save();
+        return true;
+    };
+    return SavedOrGivenUp([this] { return KeepChanges(); },
+                          u"Die Änderungen in der Datenbank sind noch nicht gespeichert."_s) &&
+           SavedOrGivenUp(saveBannList, u"Die Bann-Liste ist noch nicht gespeichert."_s);
+}
+
+void CollectionCommands::ForgetStandard() {
+    if (StandardInUse()) database_.Clear();
 }
 
 bool CollectionCommands::StandardInUse() const {

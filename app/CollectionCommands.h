@@ -3,6 +3,7 @@
 #include <QStringList>
 #include <functional>
 
+#include "app/desktop/BannListFile.h"
 #include "app/desktop/StandardFiles.h"
 
 class TMusicDatabase;
@@ -32,10 +33,14 @@ class CollectionCommands {
     // Before the collection goes: the standard database saves its changes, any other asks. False when the
     // user wants to keep it open.
     bool KeepChanges();
-    // The same before the program ends, where changes that cannot be saved are given up only on request.
+    // The same before the program ends, and for the ban list. Changes that cannot be saved are given up only
+    // on request.
     bool MayClose();
+    // The user has removed the standard database: it is not to come back when the program ends.
+    void ForgetStandard();
 
     const StandardFiles& Files() const { return files_; }
+    BannListFile& BannList() { return bannList_; }
 
  private:
     bool StandardInUse() const;
@@ -43,4 +48,5 @@ class CollectionCommands {
 
     TMusicDatabase& database_;
     StandardFiles files_;
+    BannListFile bannList_;
 };

@@ -4,6 +4,7 @@
 #include <QCloseEvent>
 #include <QDragEnterEvent>
 #include <QLabel>
+#include <QMenu>
 #include <QMenuBar>
 #include <QMimeData>
 #include <QScreen>
@@ -19,14 +20,17 @@
 #include "MusicManagment/database/Intake.h"
 #include "MusicManagment/database/IntakeReport.h"
 #include "MusicManagment/database/Settings.h"
+#include "app/ArrangementCommands.h"
 #include "app/CommandRunner.h"
+#include "app/HelpMenu.h"
 #include "app/MainMenu.h"
 #include "app/Playing.h"
 #include "app/SettingsCommands.h"
 #include "app/SongCommands.h"
-#include "app/Startup.h"
 #include "app/ToolWindows.h"
 #include "app/desktop/Icons.h"
+#include "app/desktop/RaiseWindow.h"
+#include "app/desktop/SingleInstance.h"
 #include "app/views/EmptyState.h"
 #include "app/views/FilterField.h"
 #include "app/views/SongListWidget.h"
@@ -52,7 +56,9 @@ TTunesteadMainWnd::TTunesteadMainWnd(MainWindowOptions options)
       shown_(songs_),
       totals_(database_),
       commands_(database_, options_.Files),
-      progress_(database_, *this) {
+      progress_(database_, *this),
+      installation_(options_.Setup, options_.Files, options_.SettingsFile),
+      startup_(database_, commands_, installation_) {
     setWindowIcon(ProgramIcon());
     setAcceptDrops(true);
     SetUpDatabase();
@@ -62,6 +68,7 @@ TTunesteadMainWnd::TTunesteadMainWnd(MainWindowOptions options)
     SetUpMenu();
     LoadSettings();
     SetUpPlacement();
+    SetUpStart();
     ListChanged();
     QTimer::singleShot(0, this, &TTunesteadMainWnd::StartOnce);
 }
@@ -150,6 +157,9 @@ void TTunesteadMainWnd::SetUpMenu() {
     QMenu& windows = *menuBar()->addMenu(u"Fe&nster"_s);
     toolWindows_->AddTo(windows);
     playing_->AddTo(windows);
+    arrangement_ = std::make_unique<ArrangementCommands>(*this, *list_);
+    arrangement_->AddTo(windows);
+    AddHelpMenu(*menuBar(), *this);
     list_->OnContextMenu = [this](const QPoint& place) { menu_->SongMenu().popup(place); };
 }
 
@@ -208,14 +218,37 @@ void TTunesteadMainWnd::SetUpPlacement() {
     resize(wanted.boundedTo(screen()->availableSize() * 0.9));
 }
 
+// --- Starting ---
+
+void TTunesteadMainWnd::SetUpStart() {
+    startup_.LinkFolder = linkPath_;
+    startup_.OpenStandardPlayList = [this] { playing_->OpenStandardList(); };
+    startup_.OpenPlayList = [this](const QString& path) { playing_->OpenPlayList(path); };
+    startup_.OpenSong = [this](const QString& path) { playing_->OpenSong(path); };
+    startup_.OpenArrangement = [this](const QString& path) { arrangement_->Load(path); };
+    requests_.IsReady = [this] {
+        return started_ && !database_.ProgressRunning() && QApplication::activeModalWidget() == nullptr;
+    };
+    requests_.Act = [this](const QStringList& arguments) {
+        if (!startup_.ActOn(arguments)) close();
+    };
+}
+
 void TTunesteadMainWnd::StartOnce() {
-    Startup startup(database_, commands_);
-    startup.OnOpened = [this] { playing_->OpenStandardList(); };
-    if (!startup.Run(options_.Arguments)) {
+    const bool goesOn = startup_.Run(options_.Arguments);
+    started_ = true;
+    if (!goesOn) {
         close();
         return;
     }
     if (firstTime_ && options_.OfferWizard) RunCommand([this] { settingsCommands_->OfferWizard(); });
+}
+
+bool TTunesteadMainWnd::TakeOver(const StartRequest& request) {
+    if (!isVisible()) return false;
+    RaiseWindow(*this, request.ActivationToken);
+    if (!request.Arguments.isEmpty()) requests_.Add(request.Arguments);
+    return true;
 }
 
 // --- What follows the database ---
@@ -289,8 +322,8 @@ void TTunesteadMainWnd::closeEvent(QCloseEvent* event) {
     event->ignore();
     if (database_.ProgressRunning()) return OfferToStop();
     if (!commands_.MayClose()) return;
-    RunCommand([this] { StoreSettings(); });
-    RunCommand([this] { playing_->Close(); });
+    if (!installation_.Removed().Settings) RunCommand([this] { StoreSettings(); });
+    RunCommand([this] { playing_->Close(!installation_.Removed().Lists); });
     event->accept();
 }
 

@@ -8,11 +8,15 @@
 #include "MusicManagment/playback/EngineChoice.h"
 #include "MusicManagment/playback/spectrum/SpectrumFeed.h"
 #include "app/CollectionCommands.h"
+#include "app/Startup.h"
+#include "app/desktop/InstallationSteps.h"
 #include "app/desktop/ProgressDisplay.h"
+#include "app/desktop/StartRequests.h"
 #include "app/models/CollectionTotals.h"
 #include "app/models/FilteredSongs.h"
 #include "app/models/SongListModel.h"
 
+class ArrangementCommands;
 class EmptyState;
 class FilterField;
 class MainMenu;
@@ -24,15 +28,17 @@ class SettingsCommands;
 class SongCommands;
 class SongListWidget;
 class ToolWindows;
+struct StartRequest;
 
 // What the main window is started with.
 struct MainWindowOptions {
     StandardFiles Files{};
     QString SettingsFile{};
-    QStringList Arguments{};    // of the command line, without the program's name
-    bool OfferWizard = false;   // at the first start
-    EngineTable Engines{};      // that songs are played with
-    SpectrumSource Spectrum{};  // of what they play
+    QStringList Arguments{};        // of the command line, without the program's name
+    Installation* Setup = nullptr;  // none where the program cannot install itself
+    bool OfferWizard = false;       // at the first start
+    EngineTable Engines{};          // that songs are played with
+    SpectrumSource Spectrum{};      // of what they play
 };
 
 // The program's main window: owns the collection and brings together what shows it and what works on it.
@@ -44,6 +50,10 @@ class TTunesteadMainWnd : public QMainWindow {
     TMusicDatabase& Database() { return database_; }
     // Closes the window; a long operation is stopped first, without a question.
     void End();
+
+    // Comes to the front for a later start of the program and acts on it as soon as possible. False when this
+    // window has been closed.
+    bool TakeOver(const StartRequest& request);
 
  protected:
     void closeEvent(QCloseEvent* event) override;
@@ -64,6 +74,7 @@ class TTunesteadMainWnd : public QMainWindow {
     void StoreSettings();
     void RunMenuCommand(int id);
     bool RunOwnCommand(int id);
+    void SetUpStart();
     void StartOnce();
     void RunningChanged(bool running);
     void ListChanged();
@@ -77,6 +88,10 @@ class TTunesteadMainWnd : public QMainWindow {
     CollectionTotals totals_;
     CollectionCommands commands_;
     ProgressDisplay progress_;
+    InstallationSteps installation_;
+    Startup startup_;
+    StartRequests requests_;
+    std::unique_ptr<ArrangementCommands> arrangement_;
     std::unique_ptr<SongCommands> songCommands_;
     std::unique_ptr<SettingsCommands> settingsCommands_;
     std::unique_ptr<MainMenu> menu_;
@@ -94,4 +109,5 @@ class TTunesteadMainWnd : public QMainWindow {
     bool ending_ = false;     // as soon as the long operation has stopped
     QString linkPath_;        // folder of the program's shortcuts
     bool firstTime_ = false;  // this is the program's first start
+    bool started_ = false;    // the standard files are open and the command line is done
 };

@@ -236,11 +236,9 @@ void Playing::PlayEntry(int index, SongIndex hint) {
 // --- Files ---
 
 void Playing::OpenStandardList() {
-    if (!QFileInfo::exists(standardList_)) return;
-    standardListIsDamaged_ = true;
     RunCommand([this] {
-        list_.SetPlayListFileName(standardList_);
-        standardListIsDamaged_ = false;
+        if (QFileInfo::exists(standardList_)) list_.SetPlayListFileName(standardList_);
+        standardListIsUnread_ = false;
     });
 }
 
@@ -254,9 +252,9 @@ void Playing::OpenSong(const QString& path) {
     if (!player_.AutoPlay()) player_.Play();
 }
 
-void Playing::Close() {
+void Playing::Close(bool keepList) {
     player_.SetFileName(QString());
     // An empty list is no reason to make a file, and none to lose what could not be read.
-    if (list_.Count() == 0 && (standardListIsDamaged_ || !QFileInfo::exists(standardList_))) return;
-    list_.Save(standardList_);
+    const bool nothingToKeep = standardListIsUnread_ || !QFileInfo::exists(standardList_);
+    if (keepList && (list_.Count() > 0 || !nothingToKeep)) list_.Save(standardList_);
 }

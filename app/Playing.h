@@ -51,8 +51,8 @@ class Playing {
     // Each throws what the playlist or the player throws.
     void OpenPlayList(const QString& path);
     void OpenSong(const QString& path);
-    // Stops playing and keeps the list for the next run. Throws EStreamError.
-    void Close();
+    // Stops playing and keeps the list for the next run if that is wanted. Throws EStreamError.
+    void Close(bool keepList);
 
  private:
     void SetUpWindows(QMainWindow& window);
@@ -71,7 +71,7 @@ class Playing {
     TMusicDatabase& database_;
     SongListWidget& songs_;
     const QString standardList_;
-    bool standardListIsDamaged_ = false;
+    bool standardListIsUnread_ = true;
     TPlayList list_;
     TPlaySound player_;
     CommandMenu listMenu_{[this](int id) { RunPlayListCommand(id); }, &PlayListIcon};

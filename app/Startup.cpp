@@ -7,14 +7,47 @@
 #include "MusicManagment/database/MusicManagment.h"
 #include "app/CollectionCommands.h"
 #include "app/CommandRunner.h"
+#include "app/desktop/InstallationSteps.h"
 
 using namespace Qt::StringLiterals;
 
+namespace {
+
+enum class Step { OpenFiles, Install, Uninstall };
+
+// Only the first argument can ask for a step.
+Step StepOf(const QStringList& arguments) {
+    const QString first = arguments.value(0).toLower();
+    if (first == u"-install"_s || first == u"/install"_s) return Step::Install;
+    if (first == u"-uninstall"_s || first == u"/uninstall"_s) return Step::Uninstall;
+    return Step::OpenFiles;
+}
+
+void Warn(const QString& text) {
+    UserDialogs().ShowMessage(MessageKind::Warning, text);
+}
+
+}  // namespace
+
+// A start for the removal alone ends the program even when the user has kept everything.
 bool Startup::Run(const QStringList& arguments) {
     if (!OpenStandardDatabase()) return false;
-    if (OnOpened) OnOpened();
-    ActOn(arguments);
-    return true;
+    OpenStandardLists();
+    RunCommand([this] { installation_.Refresh(); });
+    return ActOn(arguments) && StepOf(arguments) != Step::Uninstall;
+}
+
+bool Startup::ActOn(const QStringList& arguments) {
+    switch (StepOf(arguments)) {
+        case Step::Install:
+            RunCommand([this] { installation_.Install(LinkFolder); });
+            return true;
+        case Step::Uninstall:
+            return !Uninstall();
+        default:
+            OpenFiles(arguments);
+            return true;
+    }
 }
 
 // Without the file the standard database is an empty one, which closing the program will save there.
@@ -46,21 +79,56 @@ bool Startup::ReadStandardDatabase() {
     return complete;
 }
 
-void Startup::ActOn(const QStringList& arguments) {
-    QStringList songs;
+void Startup::OpenStandardLists() {
+    RunCommand([this] { commands_.BannList().Load(); });
+    if (OpenStandardPlayList) RunCommand(OpenStandardPlayList);
+}
+
+bool Startup::Uninstall() {
+    RunCommand([this] { installation_.Uninstall(LinkFolder); });
+    const RemovalChoice& removed = installation_.Removed();
+    if (removed.Database) commands_.ForgetStandard();
+    if (removed.Lists) commands_.BannList().Forget();
+    return removed.Program;
+}
+
+// The player has one current file, so further songs are taken into the collection, as folders are.
+void Startup::OpenFiles(const QStringList& arguments) {
+    QStringList intake;
+    bool songOpened = false;
     for (const QString& argument : arguments) {
         const QFileInfo file(argument);
         const QString path = file.absoluteFilePath();
-        if (!file.exists())
+        const FileKind kind = KindOfFile(path);
+        if (!file.exists()) {
             RunCommand([&] { throw EMusicDatabaseException(u"Datei nicht gefunden: "_s + path); });
-        else if (file.isDir() || IsSongFile(path))
-            songs << path;
-        else if (file.suffix().toLower() == u"tsdb"_s)
-            OfferDatabase(path);
-        else
-            UserDialogs().ShowMessage(MessageKind::Warning, u"Unbekannter Dateityp: ."_s + file.suffix());
+        } else if (file.isDir()) {
+            intake << path;
+        } else if (kind != FileKind::Song) {
+            OpenFile(kind, path);
+        } else if (OpenSong && !songOpened) {
+            RunCommand([&] { OpenSong(path); });
+            songOpened = true;
+        } else if (IsSongFile(path)) {
+            intake << path;
+        } else {
+            Warn(u"Diese Datei kann nicht in die Datenbank aufgenommen werden: "_s + path);
+        }
     }
-    if (!songs.isEmpty()) RunCommand([&] { commands_.AddPaths(songs); });
+    if (!intake.isEmpty()) RunCommand([&] { commands_.AddPaths(intake); });
+}
+
+void Startup::OpenFile(FileKind kind, const QString& path) {
+    if (kind == FileKind::PlayList && OpenPlayList)
+        RunCommand([&] { OpenPlayList(path); });
+    else if (kind == FileKind::PlayList)
+        Warn(u"PlayLists können noch nicht geöffnet werden: "_s + path);
+    else if (kind == FileKind::Database)
+        OfferDatabase(path);
+    else if (kind == FileKind::Arrangement && OpenArrangement)
+        RunCommand([&] { OpenArrangement(path); });
+    else
+        Warn(u"Unbekannter Dateityp: "_s + FileExtension(path));
 }
 
 void Startup::OfferDatabase(const QString& path) {

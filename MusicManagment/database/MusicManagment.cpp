@@ -9,6 +9,7 @@
 #include "CommonRUKTools/Collation.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/FileSource.h"
+#include "MusicManagment/database/BannList.h"
 #include "MusicManagment/database/Menu.h"
 #include "MusicManagment/database/RecycleBin.h"
 #include "MusicManagment/database/Views.h"
@@ -30,10 +31,6 @@ QString WithoutTrailingSeparators(QString name) {
     while (name.size() > 1 && (name.endsWith(u'/') || name.endsWith(u'\\')))
         name.chop(1);
     return name;
-}
-
-QString BanEntry(const TID3Tag& record) {
-    return record.Artist + u" - "_s + record.Title;
 }
 
 quint8 ValidMainGenre(quint8 genre) {

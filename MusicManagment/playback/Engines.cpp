@@ -1,12 +1,11 @@
 #include "MusicManagment/playback/Engines.h"
 
-#include "MusicManagment/playback/EngineErrors.h"
 #include "MusicManagment/playback/FMODPlaySound.h"
+#include "MusicManagment/playback/eldos/EldoSPlaySound.h"
 #include "MusicManagment/playback/fmod/SoundLibrary.h"
 #include "MusicManagment/playback/mci/GstMci.h"
 #include "MusicManagment/playback/mci/MCIPlaySound.h"
-
-using namespace Qt::StringLiterals;
+#include "MusicManagment/playback/winamp/WinAmpPlaySound.h"
 
 namespace {
 
@@ -20,26 +19,36 @@ TFMODSettings FmodSettings(const EngineSettings& settings) {
             .BufferSize = settings.FMODBufferSize};
 }
 
-// An engine that this build does not have refuses every song in its own name, so that the player goes on to
-// the next one.
-template <typename Exception>
-EngineTable::Maker Missing(TEngine engine) {
-    return [engine](const EngineSettings&) -> Backend {
-        throw Exception(u"Die Engine %1 ist in diesem Programm nicht enthalten."_s.arg(EngineName(engine)));
-    };
+TEldoSSettings EldoSSettings(const EngineSettings& settings) {
+    TEldoSSettings eldos;
+    eldos.BufferCount = settings.EldoSBufferCount;
+    eldos.BufferSize = settings.EldoSBufferSize;
+    return eldos;
+}
+
+TWinAmpSettings WinAmpSettings(const EngineSettings& settings) {
+    TWinAmpSettings winAmp;
+    winAmp.ClassName = settings.WinAmpClassName;
+    winAmp.File = settings.WinAmpFile;
+    return winAmp;
 }
 
 }  // namespace
 
-EngineTable MakeEngines(std::shared_ptr<FmodLibrary> library, std::shared_ptr<MciInterface> mci) {
+EngineTable MakeEngines(const std::shared_ptr<FmodLibrary>& library,
+                        const std::shared_ptr<MciInterface>& mci) {
     EngineTable table;
     table.Register(TEngine::FMOD, [library](const EngineSettings& settings) -> Backend {
         return std::make_unique<TFMODPlaySound>(*library, FmodSettings(settings));
     });
     table.Register(TEngine::MCI,
                    [mci](const EngineSettings&) -> Backend { return std::make_unique<TMCIPlaySound>(*mci); });
-    table.Register(TEngine::EldoS, Missing<EEldoSException>(TEngine::EldoS));
-    table.Register(TEngine::WinAmp, Missing<EWinAmpException>(TEngine::WinAmp));
+    table.Register(TEngine::EldoS, [](const EngineSettings& settings) -> Backend {
+        return std::make_unique<TEldoSPlaySound>(EldoSSettings(settings));
+    });
+    table.Register(TEngine::WinAmp, [](const EngineSettings& settings) -> Backend {
+        return std::make_unique<TWinAmpPlaySound>(WinAmpSettings(settings));
+    });
     return table;
 }
 

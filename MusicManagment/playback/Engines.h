@@ -8,7 +8,8 @@
 
 // The engines of this build: where the player meets the sound libraries. The table keeps the two that are
 // given here alive.
-EngineTable MakeEngines(std::shared_ptr<FmodLibrary> library, std::shared_ptr<MciInterface> mci);
+EngineTable MakeEngines(const std::shared_ptr<FmodLibrary>& library,
+                        const std::shared_ptr<MciInterface>& mci);
 // With the sound library and the media control interface of this system. Where the sound goes is the
 // business of the environment variable TUNESTEAD_AUDIO.
 EngineTable MakeEngines();

@@ -20,10 +20,11 @@ void WriteM3uList(ByteWriter& file, std::span<const EntryToSave> entries) {
     file.Raw("#EXTM3U\r\n");
     for (const auto& [entry, path] : entries) {
         if (path.isEmpty()) continue;
-        if (const auto& record = entry->Record)
-            file.Raw(std::string_view(QByteArray(kRemark.data(), kRemark.size()) +
-                                      QByteArray::number(record->Length) + ',' +
-                                      TitleForList(record->Artist, record->Title) + "\r\n"));
-        file.Raw(std::string_view(PathForList(path) + "\r\n"));
+        if (const auto& record = entry->Record) {
+            file.Raw(kRemark);
+            file.Raw(AllOf(QByteArray::number(record->Length) + ',' +
+                           TitleForList(record->Artist, record->Title) + "\r\n"));
+        }
+        file.Raw(AllOf(PathForList(path) + "\r\n"));
     }
 }

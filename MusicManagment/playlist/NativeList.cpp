@@ -50,7 +50,7 @@ PlayListEntry ReadEntry(ByteReader& reader, std::size_t number) {
 void WriteText(ByteWriter& file, const QString& text) {
     const QByteArray bytes = CodePage::CutSystem(CodePage::ToSystem(text), kLongestText);
     file.U16Le(static_cast<std::uint16_t>(bytes.size()));
-    file.Raw(std::string_view(bytes));
+    file.Raw(AllOf(bytes));
 }
 
 }  // namespace

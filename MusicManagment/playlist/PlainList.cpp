@@ -12,5 +12,5 @@ std::vector<PlayListEntry> ParsePlainList(ByteSpan contents) {
 
 void WritePlainList(ByteWriter& file, std::span<const EntryToSave> entries) {
     for (const auto& [entry, path] : entries)
-        if (!path.isEmpty()) file.Raw(std::string_view(PathForList(path) + "\r\n"));
+        if (!path.isEmpty()) file.Raw(AllOf(PathForList(path) + "\r\n"));
 }

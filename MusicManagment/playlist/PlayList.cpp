@@ -20,7 +20,7 @@ bool IsThere(const QString& path) {
 std::vector<int> ValidPositions(std::vector<int> indices, int count) {
     std::erase_if(indices, [count](int index) { return index < 0 || index >= count; });
     std::ranges::sort(indices);
-    indices.erase(std::ranges::unique(indices).begin(), indices.end());
+    indices.erase(std::unique(indices.begin(), indices.end()), indices.end());
     return indices;
 }
 

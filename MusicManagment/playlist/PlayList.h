@@ -104,7 +104,7 @@ class TPlayList : public QObject, public SettingsClient {
     // --- Files (PlayListFiles.h, PlayListCommands.cpp) ---
     const QString& PlayListFileName() const { return playListFileName_; }
     // Loads the list; an empty name begins an empty one. Throws EPlayListException or EStreamError; the list
-    // is then as it was, but empty when the file is of an unknown version.
+    // is then as it was, but empty and without a name when the file is of an unknown version.
     void SetPlayListFileName(const QString& fileName);
     // The format goes by the extension. Throws EStreamError; an existing file is then as it was.
     void Save(const QString& fileName);

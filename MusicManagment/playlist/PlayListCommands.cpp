@@ -37,7 +37,7 @@ void TPlayList::SetPlayListFileName(const QString& fileName) {
     try {
         Replace(ReadPlayList(fileName), fileName);
     } catch (const EUnknownPlayListVersion&) {
-        Clear();
+        Replace({}, {});  // without a name, so that nothing empty is saved over a list
         throw;
     }
 }
@@ -51,6 +51,7 @@ void TPlayList::Replace(std::vector<PlayListEntry> entries, const QString& fileN
 
 std::vector<EntryToSave> TPlayList::EntriesForSaving() const {
     std::vector<EntryToSave> entries;
+    entries.reserve(static_cast<std::size_t>(Count()));
     for (int index = 0; index < Count(); ++index)
         entries.push_back({&Entry(index), ResolvedPath(NameAt(index), {.Ask = false})});
     return entries;

@@ -2,8 +2,8 @@
 
 #include <QByteArray>
 #include <QString>
-#include <functional>
 #include <span>
+#include <string_view>
 #include <vector>
 
 #include "CommonRUKTools/ByteReader.h"
@@ -32,6 +32,11 @@ struct EntryToSave {
 // Writes a list in the format that the name's extension stands for. Throws EStreamError; the old file is then
 // as it was.
 void WritePlayList(const QString& fileName, std::span<const EntryToSave> entries);
+
+// All bytes of a text; the implicit conversion would end at the first zero byte.
+inline std::string_view AllOf(const QByteArray& text) {
+    return {text.constData(), static_cast<std::size_t>(text.size())};
+}
 
 // --- The formats ---
 

@@ -53,7 +53,7 @@ PlsSection ReadSection(ByteSpan contents) {
 
 void WriteKey(ByteWriter& file, std::string_view key, int number, const QByteArray& value) {
     file.Raw(key);
-    file.Raw(std::string_view(QByteArray::number(number) + '=' + value + "\r\n"));
+    file.Raw(AllOf(QByteArray::number(number) + '=' + value + "\r\n"));
 }
 
 }  // namespace
@@ -79,5 +79,5 @@ void WritePlsList(ByteWriter& file, std::span<const EntryToSave> entries) {
         WriteKey(file, "Title", number, TitleForList(entry->Record->Artist, entry->Record->Title));
         WriteKey(file, "Length", number, QByteArray::number(entry->Record->Length));
     }
-    file.Raw(std::string_view("NumberOfEntries=" + QByteArray::number(number) + "\r\nVersion=2\r\n"));
+    file.Raw(AllOf("NumberOfEntries=" + QByteArray::number(number) + "\r\nVersion=2\r\n"));
 }

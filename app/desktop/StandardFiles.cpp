@@ -47,7 +47,3 @@ StandardFiles LocateStandardFiles() {
     return LocateStandardFiles(QCoreApplication::applicationDirPath(),
                                UserFolder(QStandardPaths::GenericDataLocation));
 }
-
-QString UserSettingsFile() {
-    return UserFolder(QStandardPaths::GenericConfigLocation) + u"/tunestead.ini"_s;
-}

@@ -19,6 +19,3 @@ struct StandardFiles {
 StandardFiles LocateStandardFiles(const QString& programFolder, const QString& dataFolder);
 // The same for this program and this user.
 StandardFiles LocateStandardFiles();
-
-// Where windows remember their places between two starts.
-QString UserSettingsFile();

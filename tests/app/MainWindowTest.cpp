@@ -4,6 +4,7 @@
 
 #include <QAction>
 #include <QDir>
+#include <QDockWidget>
 #include <QDropEvent>
 #include <QFile>
 #include <QLabel>
@@ -17,10 +18,14 @@
 #include <QTimer>
 #include <QUrl>
 
+#include "CommonRUKTools/Trash.h"
 #include "MusicManagment/database/Menu.h"
+#include "app/desktop/Installation.h"
+#include "app/desktop/SingleInstance.h"
 #include "app/dialogs/ProgressWindow.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
+#include "tests/app/ScriptedBackend.h"
 #include "tests/app/ScriptedDialogs.h"
 
 using namespace Qt::StringLiterals;
@@ -60,7 +65,10 @@ class MainWindowTest : public testing::Test {
     void Start(const QStringList& arguments = {}) {
         window_.reset();  // only one at a time owns the data folder
         window_ = std::make_unique<TTunesteadMainWnd>(
-            MainWindowOptions{{folder_.filePath(u"data"_s)}, folder_.filePath(u"settings.ini"_s), arguments});
+            MainWindowOptions{.Files = {folder_.filePath(u"data"_s)},
+                              .SettingsFile = folder_.filePath(u"settings.ini"_s),
+                              .Arguments = arguments,
+                              .Engines = ScriptedEngines(song_)});
         window_->show();
         Work();
     }
@@ -109,6 +117,7 @@ class MainWindowTest : public testing::Test {
 
     QTemporaryDir folder_;
     ScriptedDialogs dialogs_;
+    ScriptedSong song_;
     std::unique_ptr<TTunesteadMainWnd> window_;
 };
 
@@ -143,9 +152,12 @@ TEST_F(MainWindowTest, TheCommandLineTakesFoldersSongsAndCapitals) {
     MakeSongs(3);
     Write(folder_.filePath(u"EINZELN.MP3"_s), Mp3Builder().Frames(80).Data());
     Write(folder_.filePath(u"brief.TXT"_s), {});
-    Start({Music(), folder_.filePath(u"EINZELN.MP3"_s), folder_.filePath(u"brief.TXT"_s),
+    const QString first = Music() + u"/Band/Lied 101.mp3"_s;
+    Start({Music(), first, folder_.filePath(u"EINZELN.MP3"_s), folder_.filePath(u"brief.TXT"_s),
            folder_.filePath(u"fehlt.mp3"_s)});
     EXPECT_EQ(Database().Count(), 4);
+    EXPECT_EQ(song_.File, first);
+    EXPECT_EQ(song_.Status, psPlaying);
     EXPECT_EQ(dialogs_.Messages,
               QStringList({u"Unbekannter Dateityp: .TXT"_s,
                            u"Datei nicht gefunden: "_s + folder_.filePath(u"fehlt.mp3"_s)}));
@@ -383,6 +395,78 @@ TEST_F(MainWindowTest, FindsSongsFromTheFilterLineAndGoesOn) {
     EXPECT_EQ(list->selectionModel()->selectedRows().size(), 11);
     Database().ClickMenuItem(mcMarkAll);
     EXPECT_EQ(list->selectionModel()->selectedRows().size(), 12);
+}
+
+TEST_F(MainWindowTest, AnArrangementOfTheWindowsIsSavedAndComesBack) {
+    Start();
+    const auto choose = [this](const QString& caption) {
+        for (QAction* action : window_->findChildren<QAction*>())
+            if (action->text().remove(u'&') == caption) return action->trigger();
+        ADD_FAILURE() << caption.toStdString();
+    };
+    auto* overview = window_->findChildren<QDockWidget*>().first();
+    window_->resize(700, 500);
+    ASSERT_TRUE(overview->isVisible());
+    dialogs_.File = folder_.filePath(u"meine.DF"_s);
+    choose(u"Anordnung speichern unter..."_s);
+    overview->hide();
+    window_->resize(900, 600);
+    choose(u"Anordnung laden..."_s);
+    EXPECT_EQ(window_->size(), QSize(700, 500));
+    EXPECT_TRUE(overview->isVisible());
+    EXPECT_TRUE(dialogs_.Messages.isEmpty());
+
+    // What the file says of the docks is damaged: nothing changes.
+    Write(folder_.filePath(u"kaputt.df"_s),
+          {'[', 'T', 'u', 'n', 'e', 's', 't', 'e', 'a', 'd', ' ', 'D', 'e', 's', 'k', 't', 'o', 'p', ']'});
+    QFile damaged(folder_.filePath(u"kaputt.df"_s));
+    ASSERT_TRUE(damaged.open(QIODevice::Append));
+    damaged.write("\nVersion=1\nMainForm=AAAA\nMainFormState=AAAA\nSongListColumns=AAAA\n");
+    damaged.close();
+    window_->resize(800, 550);
+    window_->TakeOver({{damaged.fileName()}, {}});
+    EXPECT_TRUE(QTest::qWaitFor([this] { return !dialogs_.Messages.isEmpty(); }));
+    EXPECT_EQ(window_->size(), QSize(800, 550));
+    EXPECT_TRUE(overview->isVisible());
+}
+
+TEST_F(MainWindowTest, ALaterStartBringsItsFilesAndIsNotTakenByAClosedWindow) {
+    MakeSongs(60);
+    Start({Music()});
+    MakeSongs(2, u"Neue"_s);
+    window_->showMinimized();
+    EXPECT_TRUE(window_->TakeOver({{Music() + u"/Neue"_s}, {}}));
+    EXPECT_FALSE(window_->isMinimized());
+    EXPECT_TRUE(QTest::qWaitFor([this] { return Database().Count() == 62; }));
+    window_->close();
+    EXPECT_FALSE(window_->TakeOver({}));
+}
+
+TEST_F(MainWindowTest, WhatWasRemovedWithTheProgramDoesNotComeBack) {
+    MakeSongs(2);
+    Installation installation({u"/opt/tunestead"_s, folder_.filePath(u"xdg"_s), folder_.filePath(u"xdg"_s)},
+                              [](const QString&, const QStringList&) { return QString(); });
+    struct : Trash {
+        bool Take(const QString& path) override { return QFile::remove(path); }
+    } trash;
+    SetTrash(&trash);
+    Start({Music()});
+    Database().BannList().Insert(u"A - 1"_s);
+    window_->close();
+    ASSERT_TRUE(QFile::exists(StandardDatabase()) && QFile::exists(folder_.filePath(u"settings.ini"_s)));
+
+    dialogs_.Answers = {kYes, kYes, kYes, kYes};
+    window_ = std::make_unique<TTunesteadMainWnd>(MainWindowOptions{{folder_.filePath(u"data"_s)},
+                                                                    folder_.filePath(u"settings.ini"_s),
+                                                                    {u"-uninstall"_s},
+                                                                    &installation});
+    window_->show();
+    Work();
+    EXPECT_FALSE(window_->isVisible());
+    EXPECT_EQ(dialogs_.Questions.size(), 4);
+    EXPECT_FALSE(QFile::exists(StandardDatabase()) || QFile::exists(InData(u"Tunestead3_BannList.str"_s)) ||
+                 QFile::exists(folder_.filePath(u"settings.ini"_s)));
+    SetTrash(nullptr);
 }
 
 }  // namespace

@@ -185,11 +185,11 @@ TEST_F(PlayingTest, TheSongThatPlaysIsFoundInTheCollection) {
 
 TEST_F(PlayingTest, TheListIsThereAgainAtTheNextStart) {
     playing_->OpenStandardList();
-    playing_->Close();
+    playing_->Close(true);
     EXPECT_FALSE(QFile::exists(StandardList()));
     Mark({3, 4}, 3);
     database_.ClickMenuItem(mcPlay);
-    playing_->Close();
+    playing_->Close(true);
     EXPECT_EQ(song_.Status, psClosed);
 
     playing_.reset();
@@ -206,7 +206,7 @@ TEST_F(PlayingTest, AListThatCannotBeReadIsNotLost) {
     file.close();
     playing_->OpenStandardList();
     EXPECT_EQ(dialogs_.Messages.size(), 1);
-    playing_->Close();
+    playing_->Close(true);
     ASSERT_TRUE(file.open(QIODevice::ReadOnly));
     EXPECT_EQ(file.readAll(), "RUKPLYLST??");
 }

@@ -27,8 +27,8 @@ class SettingsCommandsTest : public testing::Test {
  protected:
     void Start(bool offerWizard) {
         window_.reset();
-        window_ = std::make_unique<TTunesteadMainWnd>(
-            MainWindowOptions{{folder_.path()}, SettingsFile(), {}, offerWizard});
+        window_ = std::make_unique<TTunesteadMainWnd>(MainWindowOptions{
+            .Files = {folder_.path()}, .SettingsFile = SettingsFile(), .OfferWizard = offerWizard});
         window_->show();
     }
     static void Work() {

@@ -86,7 +86,8 @@ TEST_F(PlayTest, IntroScanGoesOnAfterItsTime) {
 TEST_F(PlayTest, ListsAndFoldersStandForTheirSongs) {
     const QString a = AddLevel(u"a.wav"_s, 0.25, 2);
     const QString b = AddLevel(u"music/b.wav"_s, 0.25, 2);
-    Put(Path(u"list.m3u"_s), AsBytes("a.wav\n"));
+    const std::string list = "#EXTM3U\r\n" + a.toStdString() + "\r\n";
+    Put(Path(u"list.m3u"_s), AsBytes(list));
     const CommandResult result = WriteMix({u"--mode=none"_s, Path(u"list.m3u"_s), Path(u"music"_s)});
     EXPECT_EQ(result.Out, a + u'\n' + b + u'\n');
 }

@@ -41,6 +41,7 @@ const std::vector<PlayListEntry> kEntries = {
     {.Name = u"/musik/a.mp3"_s, .Record = Song(u"a"_s)},
     {.Name = u":0A1B2C3D:\\Ordner\\ä.mp3"_s},
     {.Name = u"http://radio.example/live"_s},
+    {.Name = u"/musik/Null\0Zeichen"_s},
     {.Name = u"/musik/zwei\nZeilen.mp3"_s, .Record = Song(u"日本"_s)},
 };
 

@@ -103,6 +103,7 @@ TEST_F(PlayListCommandsTest, AFileThatCannotBeReadCostsNothingButItself) {
     Put(u"new.rukpl"_s, std::string_view("RUKPLYLST\x00\x02", 11));
     EXPECT_THROW(list_.SetPlayListFileName(File(u"new.rukpl"_s)), EPlayListException);
     EXPECT_EQ(list_.Count(), 0);
+    EXPECT_TRUE(list_.PlayListFileName().isEmpty());
 }
 
 TEST_F(PlayListCommandsTest, ASaveThatFailsLeavesNameAndFile) {

@@ -32,7 +32,7 @@ QByteArray FontOf(fluid_settings_t* settings, const QString& font) {
     if (QFile::exists(QString::fromLatin1(kUsualFont))) return kUsualFont;
     char* named = nullptr;
     fluid_settings_dupstr(settings, "synth.default-soundfont", &named);
-    const QByteArray result(named);
+    QByteArray result(named);
     fluid_free(named);
     return result;
 }

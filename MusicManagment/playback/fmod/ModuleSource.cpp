@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cmath>
 #include <libopenmpt/libopenmpt.hpp>
 #include <ostream>
 #include <string_view>
@@ -68,12 +69,12 @@ class Module : public SongSource {
 
     void SetSeparation(float separation) override {
         module_.set_render_param(openmpt::module::RENDER_STEREOSEPARATION_PERCENT,
-                                 static_cast<int>(separation * 100 + 0.5F));
+                                 static_cast<int>(std::lround(separation * 100)));
     }
 
  private:
     std::uint64_t ToFrames(double seconds) const {
-        return static_cast<std::uint64_t>(std::max(0.0, seconds) * rate_ + 0.5);
+        return static_cast<std::uint64_t>(std::llround(std::max(0.0, seconds) * rate_));
     }
 
     std::ostream nowhere_{nullptr};  // for the library's remarks

@@ -65,13 +65,14 @@ void SinkOutput::Advance(std::size_t frames) {
 
 void SinkOutput::Run() {
     using Time = std::chrono::steady_clock;
+    const std::size_t frames = buffer_.size() / 2;
     const auto step = std::chrono::duration_cast<Time::duration>(
-        std::chrono::duration<double>(static_cast<double>(buffer_.size() / 2) / rate_));
+        std::chrono::duration<double>(static_cast<double>(frames) / rate_));
     auto due = Time::now();
     std::unique_lock lock(mutex_);
     while (!stop_) {
         lock.unlock();
-        const bool goesOn = PullSome(buffer_.size() / 2);
+        const bool goesOn = PullSome(frames);
         lock.lock();
         if (!goesOn) return;
         due += step;
@@ -116,7 +117,7 @@ bool WavFileOutput::Accept(std::span<const float> stereo) {
         encoded_.resize(static_cast<qsizetype>(stereo.size_bytes()));
         qToLittleEndian<float>(stereo.data(), static_cast<qsizetype>(stereo.size()), encoded_.data());
     } else {
-        encoded_.resize(static_cast<qsizetype>(stereo.size() * sizeof(qint16)));
+        encoded_.resize(2 * static_cast<qsizetype>(stereo.size()));
         for (std::size_t i = 0; i < stereo.size(); ++i)
             qToLittleEndian(static_cast<qint16>(std::lround(stereo[i] * 32767.0F)), encoded_.data() + 2 * i);
     }

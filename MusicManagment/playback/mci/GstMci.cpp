@@ -34,7 +34,7 @@ quint32 ToMilliseconds(gint64 nanoseconds) {
 QString ErrorText(GstMessage* message) {
     GError* error = nullptr;
     gst_message_parse_error(message, &error, nullptr);
-    const QString text = QString::fromUtf8(error->message);
+    QString text = QString::fromUtf8(error->message);
     g_error_free(error);
     return text;
 }
@@ -105,7 +105,7 @@ QString GstMci::Device::Open(const QString& path, MciSound sound) {
 
 QString GstMci::Device::Play() {
     if (atEnd_) {
-        const QString error = Seek(0);
+        QString error = Seek(0);
         if (!error.isEmpty()) return error;
     }
     stopped_ = false;

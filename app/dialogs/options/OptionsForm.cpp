@@ -75,6 +75,12 @@ TOptionsForm::TOptionsForm(TMusicDatabase& database, TRWReg& settings, QWidget* 
     SetUpSize();
 }
 
+// Lists that are taken down report it as a change, which must find the dialog still whole.
+TOptionsForm::~TOptionsForm() {
+    delete list_;
+    delete stack_;
+}
+
 void TOptionsForm::AddPage(OptionsPage* page) {
     list_->addItem(new QListWidgetItem(page->Icon(), page->Caption()));
     stack_->addWidget(new PageScroller(page));

@@ -21,6 +21,7 @@ class TOptionsForm : public QDialog {
  public:
     // Both outlive the dialog.
     TOptionsForm(TMusicDatabase& database, TRWReg& settings, QWidget* parent = nullptr);
+    ~TOptionsForm() override;
 
     void ShowTab(OptionsTab tab);
     // Takes over what is shown. False when something is wrong with it; the user has been told, and the dialog

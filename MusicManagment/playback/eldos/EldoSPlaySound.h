@@ -1,0 +1,62 @@
+#pragma once
+
+#include <QStringList>
+#include <QTimer>
+#include <memory>
+#include <vector>
+
+#include "MusicManagment/playback/EngineErrors.h"
+#include "MusicManagment/playback/PlaySoundContainer.h"
+#include "MusicManagment/playback/eldos/ModuleFiles.h"
+#include "MusicManagment/playback/eldos/PushOutput.h"
+
+class EldoSSound;
+
+// How the engine plays, copied when a back end is made.
+struct TEldoSSettings {
+    int BufferCount = 4;     // 2 to 64
+    int BufferSize = 32768;  // bytes, 1024 to 1048576; other values go to the nearer end
+    QStringList ModuleFolders = StandardModuleFolders();
+    PushOutputMaker MakeOutput = PushOutputOfEnvironment;
+};
+
+// A song in the light engine: a module decodes its type, and a few buffers ahead of what is heard are kept
+// queued in an output of its own.
+class TEldoSPlaySound : public TPlaySoundContainer {
+ public:
+    explicit TEldoSPlaySound(const TEldoSSettings& settings = {}, QObject* parent = nullptr);
+    ~TEldoSPlaySound() override;
+
+    // These throw EEldoSException.
+    void Open() override;
+    void Play() override;
+    void SetPosition(quint32 milliseconds) override;
+    void Stop() override;
+
+    void Close() override;
+    void PauseResume() override;
+    quint32 GetPosition() override;
+    quint32 GetLength() override;
+    TPSStatus GetStatus() override { return status_; }
+
+    // Queues what has been played since; a timer calls it often enough while the song plays.
+    void TopUp();
+
+ private:
+    void SeekTo(std::int64_t frame);
+    void QueueBuffer();
+    void SetPlaying(bool playing);
+    bool RecoverOutput();
+    std::int64_t PlayedFrames();
+    quint32 ToMilliseconds(std::int64_t frames) const;
+
+    const TEldoSSettings settings_;
+    std::unique_ptr<EldoSSound> sound_;
+    std::unique_ptr<PushOutput> output_;
+    std::vector<std::int16_t> buffer_;
+    QTimer timer_;
+    TPSStatus status_ = psClosed;
+    std::int64_t pushed_ = 0;  // frames of the song up to the last one queued
+    std::int64_t length_ = 0;  // frames; 0 when not known
+    bool atEnd_ = false;       // everything has been queued
+};

@@ -1,0 +1,7 @@
+#pragma once
+
+class QMenuBar;
+class QWidget;
+
+// The menu "Hilfe". Its windows belong to `window`.
+void AddHelpMenu(QMenuBar& bar, QWidget& window);

@@ -1,0 +1,60 @@
+#include "app/desktop/Arrangement.h"
+
+#include <gtest/gtest.h>
+
+#include <QFile>
+#include <QTemporaryDir>
+
+#include "CommonRUKTools/Errors.h"
+#include "tests/PrintQt.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+class ArrangementTest : public testing::Test {
+ protected:
+    QString Path() const { return folder_.filePath(u"fenster.df"_s); }
+    QByteArray Written() const {
+        QFile file(Path());
+        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
+    }
+    bool IsRefused(const QByteArray& text) const {
+        QFile file(Path());
+        if (!file.open(QIODevice::WriteOnly)) return false;
+        file.write(text);
+        file.close();
+        try {
+            ReadArrangement(Path());
+            return false;
+        } catch (const EStreamError&) {
+            return true;
+        }
+    }
+
+    const Arrangement arrangement_{QByteArray("\0\n=a", 4), QByteArray("\xff\xfe"), "columns"};
+    QTemporaryDir folder_;
+};
+
+TEST_F(ArrangementTest, ComesBackAsItWasSaved) {
+    WriteArrangement(Path(), arrangement_);
+    const Arrangement read = ReadArrangement(Path());
+    EXPECT_EQ(read.Placement, arrangement_.Placement);
+    EXPECT_EQ(read.Docks, arrangement_.Docks);
+    EXPECT_EQ(read.Columns, arrangement_.Columns);
+}
+
+TEST_F(ArrangementTest, ADamagedOrForeignFileIsRefused) {
+    WriteArrangement(Path(), arrangement_);
+    const QByteArray sound = Written();
+    EXPECT_FALSE(IsRefused(QByteArray(sound).replace("\n", "\r\n")));
+    EXPECT_TRUE(IsRefused({}));
+    EXPECT_TRUE(IsRefused("Filesystem 1K-blocks Used Available\n"));
+    EXPECT_TRUE(IsRefused(QByteArray(sound).replace("Version=1", "Version=2")));
+    EXPECT_TRUE(IsRefused(QByteArray(sound).replace("MainFormState=", "MainFormState=*")));
+    EXPECT_TRUE(IsRefused(sound.first(sound.indexOf("SongList"))));
+    EXPECT_TRUE(IsRefused(sound + QByteArray(2 << 20, 'x')));
+    EXPECT_THROW(ReadArrangement(folder_.filePath(u"fehlt.df"_s)), EStreamError);
+}
+
+}  // namespace

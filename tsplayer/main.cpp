@@ -1,0 +1,44 @@
+#include <QApplication>
+#include <QTimer>
+
+#include "MusicManagment/playback/Engines.h"
+#include "MusicManagment/playback/extern/PlayerChannel.h"
+#include "tsplayer/PlayerService.h"
+#include "tsplayer/PlayerWindow.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+// A hidden player that nobody drives would stay for ever.
+constexpr int kWaitForController = 30000;  // ms
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    QApplication application(argc, argv);
+    QCoreApplication::setApplicationName(u"TSPlayer"_s);
+    QCoreApplication::setApplicationVersion(QStringLiteral(TUNESTEAD_VERSION));
+    const bool hidden = QCoreApplication::arguments().contains(u"/NoVisible"_s, Qt::CaseInsensitive);
+    QGuiApplication::setQuitOnLastWindowClosed(true);
+
+    TPlaySound player(MakeEngines());
+    PlayerWindow window(player);
+    SetUserDialogs(&window);
+    ChannelServer server(QCoreApplication::applicationPid());
+    PlayerService service(player, server);
+    service.OnControllerGone = &QCoreApplication::quit;
+    service.OnFailure = [&window](const QString& message) {
+        window.ShowMessage(MessageKind::Error, message);
+    };
+    // Another one serves this user already.
+    if (!server.Listen(PlayerChannelPath())) return 1;
+
+    if (!hidden) window.show();
+    QTimer::singleShot(kWaitForController, &window, [&] {
+        if (hidden && !window.isVisible() && !service.HasController()) QCoreApplication::quit();
+    });
+    const int result = QApplication::exec();
+    SetUserDialogs(nullptr);
+    return result;
+}
