@@ -132,7 +132,8 @@ int Start(QtDialogs& dialogs, const StartRequest& request) {
                       .Arguments = request.Arguments,
                       .Setup = setup,
                       .OfferWizard = true,
-                      .Engines = MakeEngines()});
+                      .Engines = MakeEngines(sound, std::make_shared<GstMci>()),
+                      .Spectrum = SpectrumOf(sound)});
 }
 
 }  // namespace
