@@ -54,12 +54,16 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
     SetUpSpectrum(window, std::move(options.Spectrum));
     SetUpContextMenu();
     JoinDesktop(window);
+    database.OnMarkSong = [this](TMusicDatabase&, SongIndex song) {
+        if (!songs_.FocusSong(song) && OnDone) OnDone(u"Der Filter zeigt dieses Lied nicht."_s);
+    };
     QObject::connect(&songs, &QAbstractItemView::doubleClicked, listForm_,
                      [this] { RunCommand([this] { database_.ClickMenuItem(mcPlay); }); });
 }
 
 // The window would let its tool windows live longer than what they show.
 Playing::~Playing() {
+    database_.OnMarkSong = {};
     mpris_.reset();
     database_.LeaveSettings(*spectrumForm_);
     delete listForm_;
@@ -135,9 +139,9 @@ void Playing::AddMenusTo(QMenuBar& bar) {
 // The keys are those of the view, which acts on them itself.
 void Playing::SetUpContextMenu() {
     TVisPlayList& view = listForm_->View();
-    QAction* play = contextMenu_->addAction(PlayerIcon(plPlay), u"&Abspielen"_s, QKeySequence(u"Return"_s),
+    QAction* play = contextMenu_->addAction(PlayerIcon(plPlay), u"A&bspielen"_s, QKeySequence(u"Return"_s),
                                             &view, &TVisPlayList::PlaySelected);
-    contextMenu_->addAction(ThemeIcon(u"go-next"_s, QStyle::SP_ArrowRight), u"Als &nächstes spielen"_s,
+    contextMenu_->addAction(ThemeIcon(u"go-next"_s, QStyle::SP_ArrowRight), u"Als nächs&tes spielen"_s,
                             QKeySequence(u"Ctrl+Return"_s), &view, &TVisPlayList::QueueSelected);
     contextMenu_->addAction(u"Aus der &Warteschlange nehmen"_s, QKeySequence(u"Ctrl+Backspace"_s), &view,
                             &TVisPlayList::UnqueueSelected);

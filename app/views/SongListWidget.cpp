@@ -194,6 +194,15 @@ bool SongListWidget::FocusNext(const SongFilter& filter) {
     return false;
 }
 
+bool SongListWidget::FocusSong(SongIndex song) {
+    songs_.Songs().SyncViews();
+    const int row = songs_.RowOfSource(song);
+    if (row < 0) return false;
+    FocusRow(row);
+    scrollTo(currentIndex(), PositionAtCenter);
+    return true;
+}
+
 void SongListWidget::Enter() {
     setFocus(Qt::OtherFocusReason);
     if (!currentIndex().isValid() && songs_.rowCount() > 0) FocusRow(0);

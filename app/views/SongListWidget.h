@@ -38,6 +38,8 @@ class SongListWidget : public QTableView {
     // Goes to the next shown song that the filter lets through, round the end of the list; false when there
     // is none.
     bool FocusNext(const SongFilter& filter);
+    // Gives the focus to a song and shows it. False when it is not shown.
+    bool FocusSong(SongIndex song);
     // Takes the keys; a list in which no song has the focus gives it to its first.
     void Enter();
 

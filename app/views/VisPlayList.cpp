@@ -45,9 +45,9 @@ TVisPlayList::TVisPlayList(TPlayList& list, QWidget* parent) : QTableView(parent
     redrawTimer_.setInterval(0);
     connect(&redrawTimer_, &QTimer::timeout, this, [this] { model_.Redraw(); });
     connect(verticalScrollBar(), &QScrollBar::valueChanged, this, &TVisPlayList::LookForFilesSoon);
-    connect(&model_, &QAbstractItemModel::modelReset, this, &TVisPlayList::LookForFilesSoon);
-    connect(&model_, &QAbstractItemModel::rowsInserted, this, &TVisPlayList::LookForFilesSoon);
-    connect(&model_, &QAbstractItemModel::rowsRemoved, this, &TVisPlayList::LookForFilesSoon);
+    connect(&model_, &QAbstractItemModel::modelReset, this, &TVisPlayList::CountChanged);
+    connect(&model_, &QAbstractItemModel::rowsInserted, this, &TVisPlayList::CountChanged);
+    connect(&model_, &QAbstractItemModel::rowsRemoved, this, &TVisPlayList::CountChanged);
     // The focus shows in whole rows, the view would paint single cells.
     connect(selectionModel(), &QItemSelectionModel::currentChanged, viewport(),
             QOverload<>::of(&QWidget::update));
@@ -81,7 +81,8 @@ void TVisPlayList::FitColumns() {
         const int width = metrics.horizontalAdvance(widest) + margin;
         header->resizeSection(section, std::max(width, header->sectionSizeHint(section)));
     };
-    fit(kNumber, u"00000"_s);
+    digits_ = std::max<qsizetype>(QString::number(model_.rowCount()).size(), 2);
+    fit(kNumber, QString(digits_ + 1, u'0'));  // room for the mark of the current song
     fit(kLength, u"0:00:00"_s);
 }
 
@@ -112,6 +113,11 @@ void TVisPlayList::paintEvent(QPaintEvent* event) {
 }
 
 // --- Which files are there ---
+
+void TVisPlayList::CountChanged() {
+    if (QString::number(model_.rowCount()).size() > digits_) FitColumns();
+    LookForFilesSoon();
+}
 
 void TVisPlayList::LookForFilesSoon() {
     if (isVisible()) lookTimer_.start();

@@ -50,6 +50,7 @@ class TVisPlayList : public QTableView, public PlayListView {
  private:
     void SetUpColumns();
     void FitColumns();
+    void CountChanged();
     void LookForFilesSoon();
     void LookForFiles();
     int DropRow(const QPoint& position) const;
@@ -60,6 +61,7 @@ class TVisPlayList : public QTableView, public PlayListView {
 
     TPlayList& list_;
     PlayListModel model_{list_};
+    qsizetype digits_ = 0;  // that the numbers have room for
     QTimer lookTimer_;
     QTimer redrawTimer_;
 };

@@ -60,7 +60,8 @@ TVisPlaySound::TVisPlaySound(TPlaySound& player, const TPlayList& list, QWidget*
     SetUpCrossover();
     layout_->setContentsMargins(8, 4, 8, 4);
     layout_->setSpacing(8);
-    layout_->addWidget(MakeButtons());
+    buttons_ = MakeButtons();
+    layout_->addWidget(buttons_);
     layout_->addWidget(MakeSong(), 1);
     layout_->addWidget(crossover_);
     FitToFont();
@@ -179,7 +180,11 @@ QSize TVisPlaySound::minimumSizeHint() const {
 
 void TVisPlaySound::Arrange() {
     const bool narrow = width() < kNarrow * fontMetrics().averageCharWidth();
-    layout_->setDirection(narrow ? QBoxLayout::BottomToTop : QBoxLayout::LeftToRight);
+    layout_->setDirection(narrow ? QBoxLayout::TopToBottom : QBoxLayout::LeftToRight);
+    layout_->removeWidget(buttons_);
+    layout_->insertWidget(narrow ? 1 : 0, buttons_);  // below the song or left of it
+    // A strip takes no more of the window than it needs.
+    setMaximumHeight(narrow ? QWIDGETSIZE_MAX : sizeHint().height());
 }
 
 // Times that change do not move what stands beside them.

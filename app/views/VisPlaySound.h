@@ -64,6 +64,7 @@ class TVisPlaySound : public QWidget, public PlayerPanel {
     SeekSlider* slider_;
     QLabel* elapsed_;
     QLabel* remaining_;
+    QWidget* buttons_ = nullptr;
     QToolButton* play_ = nullptr;
     QToolButton* stop_ = nullptr;
     QToolButton* previous_ = nullptr;

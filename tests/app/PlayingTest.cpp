@@ -171,6 +171,18 @@ TEST_F(PlayingTest, ASongThatIsGoneIsToldAndTheOtherPlaysOn) {
     EXPECT_EQ(song_.Status, psPlaying);
 }
 
+TEST_F(PlayingTest, TheSongThatPlaysIsFoundInTheCollection) {
+    Mark({3}, 3);
+    database_.ClickMenuItem(mcPlay);
+    Mark({0}, 0);
+    Choose(u"Player"_s, u"Aktuelles Lied markieren"_s);
+    EXPECT_EQ(database_.Song(songs_->FocusedSong()).Title, u"3"_s);
+    EXPECT_EQ(songs_->MarkedSongs(), std::vector<SongIndex>({songs_->FocusedSong()}));
+    shown_.SetText(u"titel:0"_s);
+    Choose(u"Player"_s, u"Aktuelles Lied markieren"_s);
+    EXPECT_EQ(told_, u"Der Filter zeigt dieses Lied nicht."_s);
+}
+
 TEST_F(PlayingTest, TheListIsThereAgainAtTheNextStart) {
     playing_->OpenStandardList();
     playing_->Close(true);
