@@ -13,10 +13,10 @@ unset XDG_CONFIG_HOME XDG_DATA_HOME XDG_STATE_HOME PULSE_SERVER TUNESTEAD_AUDIO
 mkdir -m 700 "$XDG_RUNTIME_DIR"
 trap 'kill $(jobs -p) 2>/dev/null || true; wait; rm -rf "$folder"' EXIT
 
-# Waits for a command to succeed; ten seconds at most.
+# Waits for a command to succeed; a minute at most, for busy machines.
 await() {
     local attempt
-    for attempt in $(seq 200); do
+    for attempt in $(seq 1200); do
         if "$@" >/dev/null 2>&1; then return 0; fi
         sleep 0.05
     done
