@@ -1,6 +1,7 @@
 #include "app/views/PlaylistForm.h"
 
 #include <QComboBox>
+#include <QEvent>
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QSignalBlocker>
