@@ -2,6 +2,7 @@
 
 #include <QApplication>
 #include <QFileInfo>
+#include <QFont>
 #include <QPalette>
 #include <algorithm>
 
@@ -121,6 +122,7 @@ bool PlayListModel::IsMissing(const QString& name) const {
 
 std::vector<SongRef> PlayListModel::Songs(const std::vector<int>& rows) const {
     std::vector<SongRef> songs;
+    songs.reserve(rows.size());
     for (const int row : rows)
         songs.push_back({.Name = list_.Entry(row).Name});
     return songs;

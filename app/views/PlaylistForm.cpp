@@ -1,6 +1,7 @@
 #include "app/views/PlaylistForm.h"
 
 #include <QComboBox>
+#include <QEvent>
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QSignalBlocker>
@@ -68,6 +69,8 @@ TPlaylistForm::TPlaylistForm(TPlayList& list, QWidget* parent)
     connect(view_->model(), &QAbstractItemModel::rowsInserted, this, follow);
     connect(view_->model(), &QAbstractItemModel::rowsRemoved, this, follow);
     connect(view_->model(), &QAbstractItemModel::dataChanged, this, follow);
+    // Who plays the list from elsewhere may have set another order.
+    connect(view_->model(), &QAbstractItemModel::dataChanged, this, [this] { ShowOptions(); });
     ShowTotals();
     ShowOptions();
 }
@@ -134,7 +137,7 @@ void TPlaylistForm::ShowOptions() {
     order_->setCurrentIndex(order_->findData(list_.PlayOrder()));
     repeat_->setChecked(list_.RepeatAll());
     scan_->setChecked(list_.Scan());
-    scanTime_->setValue(list_.ScanTime() / kMillisecondsPerSecond);
+    if (!scanTime_->hasFocus()) scanTime_->setValue(list_.ScanTime() / kMillisecondsPerSecond);
     scanTime_->setVisible(list_.Scan());
 }
 

@@ -34,7 +34,7 @@ void TSpectrumForm::AddStyles() {
         QAction* action = styles_->addAction(QString::fromUtf16(caption));
         action->setCheckable(true);
         action->setData(style);
-        connect(action, &QAction::triggered, this, [this, style] { draw_->SetStyle(style); });
+        connect(action, &QAction::triggered, this, [this, chosen = style] { draw_->SetStyle(chosen); });
     }
     draw_->addActions(styles_->actions());
     draw_->setContextMenuPolicy(Qt::ActionsContextMenu);

@@ -1,6 +1,7 @@
 #include "app/views/VisPlaySound.h"
 
 #include <QComboBox>
+#include <QEvent>
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QToolButton>

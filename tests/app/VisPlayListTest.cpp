@@ -189,7 +189,9 @@ TEST(PlaylistFormTest, SetsHowTheListIsPlayedAndShowsWhatOthersHaveSet) {
 
     list.SetPlayOrder(poRandom);
     list.SetRepeatAll(false);
-    form.ShowOptions();
+    list.Insert(0, {.Name = u"/x"_s});
+    list.RedrawView();
+    QApplication::processEvents();
     EXPECT_EQ(order->currentText(), u"Zufällig"_s);
     EXPECT_FALSE(form.findChild<QToolButton*>(u"repeatAll"_s)->isChecked());
     list.SetPlaySound(nullptr);
