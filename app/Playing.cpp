@@ -19,6 +19,7 @@
 #include "app/views/SpectrumForm.h"
 #include "app/views/VisPlayList.h"
 #include "app/views/VisPlaySound.h"
+#include "app/views/VolumeSlider.h"
 
 using namespace Qt::StringLiterals;
 
@@ -50,7 +51,7 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
     player_.SetMusicDatabase(&database);
     player_.SetPlayList(&list_);
     if (options.MakeExternalPlayer) player_.SetExternalPlayer(options.MakeExternalPlayer());
-    SetUpWindows(window);
+    SetUpWindows(window, std::move(options.SetVolume));
     SetUpSpectrum(window, std::move(options.Spectrum));
     SetUpContextMenu();
     JoinDesktop(window);
@@ -66,12 +67,13 @@ Playing::~Playing() {
     database_.OnMarkSong = {};
     mpris_.reset();
     database_.LeaveSettings(*spectrumForm_);
+    database_.LeaveSettings(playerForm_->Panel().Volume());
     delete listForm_;
     delete playerForm_;
     delete spectrumForm_;
 }
 
-void Playing::SetUpWindows(QMainWindow& window) {
+void Playing::SetUpWindows(QMainWindow& window, std::function<void(float)> setVolume) {
     window.addDockWidget(Qt::RightDockWidgetArea, listForm_);
     window.addDockWidget(Qt::BottomDockWidgetArea, playerForm_);
     TVisPlayList& view = listForm_->View();
@@ -80,6 +82,8 @@ void Playing::SetUpWindows(QMainWindow& window) {
     TVisPlaySound& panel = playerForm_->Panel();
     panel.OnCommand = [this](int id) { RunPlayerCommand(id); };
     panel.OnChange = [this] { FollowSong(); };
+    panel.Volume().Follow(std::move(setVolume));
+    database_.JoinSettings(panel.Volume());
 }
 
 // Nothing is computed unless somebody looks at it.

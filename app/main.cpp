@@ -135,6 +135,7 @@ int Start(QtDialogs& dialogs, const StartRequest& request) {
                       .OfferWizard = true,
                       .Engines = MakeEngines(sound, std::make_shared<GstMci>()),
                       .Spectrum = SpectrumOf(sound),
+                      .SetVolume = [sound](float gain) { sound->SetMasterVolume(gain); },
                       .MakeExternalPlayer = [] { return std::make_unique<LocalExternalPlayer>(); }});
 }
 

@@ -1,15 +1,8 @@
 #include "MusicManagment/playback/PlaySoundMenu.h"
 
-using namespace Qt::StringLiterals;
+#include "CommonRUKTools/MenuRows.h"
 
 namespace {
-
-struct MenuRow {
-    QStringView Caption;  // empty: a separator
-    int Id = 0;
-    QStringView Shortcut{};
-    int ImageIndex = -1;
-};
 
 constexpr MenuRow kRows[] = {
     {u"Play", plPlay, u"F5", 69},
@@ -28,12 +21,5 @@ constexpr MenuRow kRows[] = {
 }  // namespace
 
 std::unique_ptr<TMenuExItem> BuildPlaySoundMenu() {
-    using Kind = TMenuExItem::ItemKind;
-    auto root = std::make_unique<TMenuExItem>(Kind::Submenu, u"Player"_s);
-    for (const MenuRow& row : kRows) {
-        const Kind kind = row.Caption.isEmpty() ? Kind::Separator : Kind::Command;
-        root->Add(kind, row.Caption.toString(), row.Id, row.Shortcut.toString())
-            .SetImageIndex(row.ImageIndex);
-    }
-    return root;
+    return BuildMenu(u"Player", kRows);
 }

@@ -1,15 +1,8 @@
 #include "MusicManagment/playlist/PlayListMenu.h"
 
-using namespace Qt::StringLiterals;
+#include "CommonRUKTools/MenuRows.h"
 
 namespace {
-
-struct MenuRow {
-    QStringView Caption;  // empty: a separator
-    int Id = 0;
-    QStringView Shortcut{};
-    int ImageIndex = -1;
-};
 
 constexpr MenuRow kRows[] = {
     {u"Neue PlayList", pcNew, u"Ctrl+Shift+N", 60},
@@ -26,12 +19,5 @@ constexpr MenuRow kRows[] = {
 }  // namespace
 
 std::unique_ptr<TMenuExItem> BuildPlayListMenu() {
-    using Kind = TMenuExItem::ItemKind;
-    auto root = std::make_unique<TMenuExItem>(Kind::Submenu, u"PlayList"_s);
-    for (const MenuRow& row : kRows) {
-        const Kind kind = row.Caption.isEmpty() ? Kind::Separator : Kind::Command;
-        root->Add(kind, row.Caption.toString(), row.Id, row.Shortcut.toString())
-            .SetImageIndex(row.ImageIndex);
-    }
-    return root;
+    return BuildMenu(u"PlayList", kRows);
 }

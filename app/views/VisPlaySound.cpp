@@ -12,8 +12,10 @@
 #include "ReadMPEGHeader/DisplayTexts.h"
 #include "app/CommandRunner.h"
 #include "app/MenuIcons.h"
+#include "app/models/SoundOutputs.h"
 #include "app/views/ElidedLabel.h"
 #include "app/views/SeekSlider.h"
+#include "app/views/VolumeSlider.h"
 
 using namespace Qt::StringLiterals;
 
@@ -35,9 +37,6 @@ constexpr ModeCaption kModes[] = {
     {coAlways, u"Immer"},
 };
 
-constexpr const char16_t* kOutputs[] = {u"ohne Ton", u"WinMM", u"DirectSound", u"A3D",
-                                        u"OSS",      u"ESD",   u"ALSA",        u"Xbox"};
-
 QString TimeText(quint32 milliseconds) {
     return FormatLength(static_cast<int>(milliseconds / kSecond), true);
 }
@@ -54,6 +53,7 @@ TVisPlaySound::TVisPlaySound(TPlaySound& player, const TPlayList& list, QWidget*
       slider_(new SeekSlider(this)),
       elapsed_(new QLabel(this)),
       remaining_(new QLabel(this)),
+      volume_(new VolumeSlider(this)),
       crossover_(new QComboBox(this)) {
     setObjectName(u"visPlaySound"_s);
     setAccessibleName(u"Player"_s);
@@ -64,6 +64,7 @@ TVisPlaySound::TVisPlaySound(TPlaySound& player, const TPlayList& list, QWidget*
     buttons_ = MakeButtons();
     layout_->addWidget(buttons_);
     layout_->addWidget(MakeSong(), 1);
+    layout_->addWidget(volume_);
     layout_->addWidget(crossover_);
     FitToFont();
     player_.SetPanel(this);
@@ -240,9 +241,10 @@ void TVisPlaySound::ShowState() {
 QString TVisPlaySound::EngineText() const {
     const auto engine = ChooseEngine(player_.FileName(), player_.Engines());
     if (!engine) return {};
-    const auto output = static_cast<std::size_t>(player_.Engines().FMODSoundOutputTypes);
-    if (*engine != TEngine::FMOD || output >= std::size(kOutputs)) return EngineName(*engine);
-    return EngineName(*engine) + u", Ausgabe "_s + QString::fromUtf16(kOutputs[output]);
+    const QString output =
+        SoundOutputNames().value(static_cast<qsizetype>(player_.Engines().FMODSoundOutputTypes));
+    if (*engine != TEngine::FMOD || output.isEmpty()) return EngineName(*engine);
+    return EngineName(*engine) + u", Ausgabe: "_s + output;
 }
 
 void TVisPlaySound::ShowPosition(quint32 position, quint32 length) {

@@ -12,6 +12,7 @@ class QComboBox;
 class QLabel;
 class QToolButton;
 class SeekSlider;
+class VolumeSlider;
 
 // The player's panel: the song, how far it has played, the buttons, and when songs are faded into each other.
 // In a wide window all that is one strip, in a narrow one it stands one above the other.
@@ -28,6 +29,7 @@ class TVisPlaySound : public QWidget, public PlayerPanel {
     std::function<void(quint32 position)> OnSeeked;
 
     const PlayingSong& Song() const { return song_; }
+    VolumeSlider& Volume() { return *volume_; }
     QSize minimumSizeHint() const override;
 
     void ShowSong(const QString& fileName) override;
@@ -69,5 +71,6 @@ class TVisPlaySound : public QWidget, public PlayerPanel {
     QToolButton* stop_ = nullptr;
     QToolButton* previous_ = nullptr;
     QToolButton* next_ = nullptr;
+    VolumeSlider* volume_;
     QComboBox* crossover_;
 };

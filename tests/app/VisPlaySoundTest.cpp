@@ -9,8 +9,10 @@
 #include <QTest>
 #include <QToolButton>
 
+#include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "app/views/SeekSlider.h"
+#include "app/views/VolumeSlider.h"
 #include "tests/PrintQt.h"
 #include "tests/app/ScriptedBackend.h"
 
@@ -36,7 +38,7 @@ class VisPlaySoundTest : public testing::Test {
     QToolButton* Button(int command) const {
         return panel_.findChild<QToolButton*>(u"player%1"_s.arg(command));
     }
-    SeekSlider* Slider() const { return panel_.findChild<SeekSlider*>(); }
+    SeekSlider* Slider() const { return panel_.findChild<SeekSlider*>(u"position"_s); }
     void TickAt(quint32 position) {
         song_.Position = position;
         player_.Tick();
@@ -49,6 +51,23 @@ class VisPlaySoundTest : public testing::Test {
     TVisPlaySound panel_{player_, list_};
     QList<int> commands_;
 };
+
+TEST_F(VisPlaySoundTest, TheVolumeIsThereWhereItCanBeSetAndIsKept) {
+    VolumeSlider& volume = panel_.Volume();
+    EXPECT_FALSE(volume.isVisible());
+    float gain = -1;
+    volume.Follow([&gain](float set) { gain = set; });
+    EXPECT_TRUE(volume.isVisible());
+    EXPECT_EQ(gain, 1);
+    volume.setValue(50);
+    EXPECT_EQ(gain, 0.25F);
+    TRWReg settings(u"Test"_s, folder_.filePath(u"settings"_s));
+    volume.SaveSettings(settings);
+    QTest::keyClick(&volume, Qt::Key_Home);
+    EXPECT_EQ(gain, 0);
+    volume.LoadSettings(settings);
+    EXPECT_EQ(volume.value(), 50);
+}
 
 TEST_F(VisPlaySoundTest, ShowsTheSongAndItsTimes) {
     EXPECT_EQ(Text(u"songTitle"_s), u"Kein Lied"_s);

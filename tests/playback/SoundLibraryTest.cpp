@@ -126,6 +126,25 @@ TEST(OutputChoiceTest, OutputThatIsNotThereFailsAtInitialisation) {
     EXPECT_TRUE(library.FSOUND_Init(44100, 32, 2));
 }
 
+TEST_F(SoundLibraryTest, TheMasterVolumeGlidesAndStaysWithANewInitialisation) {
+    WriteWav(Path("tone.wav"), Sine({.frequency = 440, .amplitude = 0.4}, 3));
+    library.SetMasterVolume(0.5F);
+    Init();
+    Play(OpenStream(Path("tone.wav")));
+    Hear(0.5);
+    EXPECT_NEAR(AmplitudeOf(440, *heard, Frames(0.2), Frames(0.2)), 0.2, 0.004);
+    const std::size_t turned = HeardFrames();
+    library.SetMasterVolume(0);
+    Hear(0.5);
+    // Louder by a step than any neighbour in a sine of this pitch would be a click.
+    for (std::size_t i = 2 * turned; i + 2 < heard->size(); i += 2)
+        ASSERT_LT(std::abs((*heard)[i + 2] - (*heard)[i]), 0.02F) << i / 2 - turned;
+    EXPECT_NEAR(AmplitudeOf(440, *heard, turned + Frames(0.2), Frames(0.2)), 0, 0.001);
+    library.SetMasterVolume(7);
+    Hear(0.5);
+    EXPECT_NEAR(AmplitudeOf(440, *heard, HeardFrames() - Frames(0.3), Frames(0.2)), 0.4, 0.008);
+}
+
 TEST_F(SoundLibraryTest, WavFileHoldsWhatWasHeard) {
     const Samples sine = Sine({.frequency = 441, .amplitude = 0.4}, 0.5);
     WriteWav(Path("a.wav"), sine);

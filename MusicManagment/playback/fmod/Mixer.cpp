@@ -99,7 +99,9 @@ bool Mixer::SetSides(int channel, float left, float right) {
 void Mixer::WaitReady(std::size_t frames) {
     for (Channel& channel : channels_) {
         DecodeAhead* source = channel.source.load();
-        if (source != nullptr && !channel.over.load() && !channel.paused.load()) source->WaitReady(frames);
+        // A channel that has just been paused glides out over one more block.
+        const bool silent = channel.paused.load() && channel.now == Sides{};
+        if (source != nullptr && !channel.over.load() && !silent) source->WaitReady(frames);
     }
 }
 
@@ -125,9 +127,22 @@ void Mixer::RenderBlock(float* stereo, std::size_t frames) {
     std::fill_n(stereo, 2 * frames, 0.0F);
     for (Channel& channel : channels_)
         AddChannel(channel, stereo, frames);
+    ApplyMaster(stereo, frames);
     for (std::size_t i = 0; i < 2 * frames; ++i)
         stereo[i] = std::clamp(stereo[i], -1.0F, 1.0F);
     Keep(stereo, frames);
+}
+
+void Mixer::ApplyMaster(float* stereo, std::size_t frames) {
+    const float target = master_.load(std::memory_order_relaxed);
+    if (target == 1 && masterNow_ == 1) return;
+    const float step = (target - masterNow_) / static_cast<float>(frames);
+    for (std::size_t i = 0; i < frames; ++i) {
+        const float gain = masterNow_ + step * static_cast<float>(i + 1);
+        stereo[2 * i] *= gain;
+        stereo[2 * i + 1] *= gain;
+    }
+    masterNow_ = target;
 }
 
 void Mixer::AddChannel(Channel& channel, float* stereo, std::size_t frames) {

@@ -37,8 +37,9 @@ class Mixer {
     // Gain of the two sides, 0 to 1 each.
     bool SetSides(int channel, float left, float right);
 
-    // Waits until the channels can give so many frames: for outputs that are not heard.
-    void WaitReady(std::size_t frames);
+    // Gain of the whole mix, 0 to 1.
+    void SetMaster(float gain) { master_.store(gain, std::memory_order_relaxed); }
+
     std::uint64_t FramesPlayed() const { return played_.load(std::memory_order_relaxed); }
     // Frames that a channel could not fill because its source was late.
     std::uint64_t FramesStarved() const { return starved_.load(std::memory_order_relaxed); }
@@ -47,6 +48,8 @@ class Mixer {
 
     // --- the output's thread
 
+    // Waits until the channels can give so many frames: for outputs that are not heard.
+    void WaitReady(std::size_t frames);
     void Render(float* stereo, std::size_t frames);
 
  private:
@@ -76,10 +79,13 @@ class Mixer {
     void AddChannel(Channel& channel, float* stereo, std::size_t frames);
     static void Add(float* target, const float* source, std::size_t frames, Sides from, Sides to,
                     std::size_t over);
+    void ApplyMaster(float* stereo, std::size_t frames);
     void Keep(const float* stereo, std::size_t frames);
 
     std::vector<Channel> channels_;
     int nextRound_ = 0;
+    std::atomic<float> master_{1};
+    float masterNow_ = 1;  // the output's thread only
     std::array<float, 2 * kBlock> scratch_{};
     // Odd while a block is being rendered.
     std::atomic<std::uint64_t> epoch_{0};

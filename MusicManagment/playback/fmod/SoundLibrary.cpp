@@ -42,6 +42,11 @@ void SoundLibrary::SetMidiFont(const QString& path) {
     midiFont_ = path;
 }
 
+void SoundLibrary::SetMasterVolume(float gain) {
+    masterVolume_ = std::clamp(gain, 0.0F, 1.0F);
+    if (mixer_ != nullptr) mixer_->SetMaster(masterVolume_);
+}
+
 void SoundLibrary::Advance(std::size_t frames) {
     if (output_ != nullptr) output_->Advance(frames);
 }
@@ -109,6 +114,7 @@ bool SoundLibrary::FSOUND_Init(int mixRate, int softChannels, [[maybe_unused]] u
         return Fail(FMOD_ERR_INVALID_PARAM);
     rate_ = mixRate;
     mixer_ = std::make_unique<Mixer>(static_cast<std::size_t>(softChannels));
+    mixer_->SetMaster(masterVolume_);
     if (OpenOutput()) return true;
     mixer_.reset();
     return Fail(FMOD_ERR_INIT);

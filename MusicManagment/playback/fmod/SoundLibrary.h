@@ -19,6 +19,8 @@ class SoundLibrary : public FmodLibrary {
 
     // The sound font for MIDI songs; a usual one of the system when it is empty.
     void SetMidiFont(const QString& path);
+    // How loud everything is together, 0 to 1; 1 at first. Fades and volumes of single sounds count as well.
+    void SetMasterVolume(float gain);
     // Lets an output without a pace of its own take so many frames at the mix rate; nothing otherwise.
     void Advance(std::size_t frames);
     // Frames that have been mixed since FSOUND_Init, and those of them that lacked sound because a file was
@@ -117,4 +119,5 @@ class SoundLibrary : public FmodLibrary {
 
     Spectrum spectrum_;
     bool spectrumActive_ = false;
+    float masterVolume_ = 1;
 };

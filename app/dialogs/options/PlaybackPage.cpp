@@ -10,6 +10,7 @@
 #include "MusicManagment/database/MusicManagment.h"
 #include "app/desktop/Icons.h"
 #include "app/dialogs/options/DurationBox.h"
+#include "app/models/SoundOutputs.h"
 
 using namespace Qt::StringLiterals;
 
@@ -22,20 +23,15 @@ struct Engine {
 
 constexpr Engine kEngines[] = {
     {u"UseFMOD", u"&FMOD"},
-    {u"UseMCI", u"&MCI (Windows)"},
+    {u"UseMCI", u"&MCI (Player des Systems)"},
     {u"UseEldoS", u"&EldoS"},
-    {u"UseWinamp", u"Win&amp"},
+    {u"UseWinamp", u"Win&amp (anderes Programm)"},
 };
 
 // In the order of the stored numbers.
 QStringList Crossovers() {
     return {u"nie"_s, u"am Ende eines Songs"_s, u"bei jedem Wechsel"_s,
             u"bei jedem Wechsel und beim Anhalten"_s};
-}
-
-QStringList SoundOutputs() {
-    return {u"kein Ton"_s, u"Windows Multimedia"_s, u"DirectSound"_s, u"A3D"_s, u"OSS"_s, u"ESD"_s, u"ALSA"_s,
-            u"Xbox"_s};
 }
 
 constexpr int kCrossoverAtEnd = 1;
@@ -117,7 +113,7 @@ void PlaybackPage::AddFmod() {
                           u"Unter 3 Sekunden wird nicht übergeblendet."_s);
     fields_.BindInteger(time, u"CrossoverTime"_s, 10'000);
     auto* output = AddField(fmod, u"FMODSoundOutput"_s, u"Au&sgabe"_s, new QComboBox);
-    output->addItems(SoundOutputs());
+    output->addItems(SoundOutputNames());
     fields_.BindChoice(output, u"FMODSoundOutput"_s, kDirectSound);
     AddNumber(fmod, u"FMODMixRate"_s, u"M&ischrate"_s, 4000, 192'000, 44'100, u" Hz"_s);
     AddNumber(fmod, u"FMODSoftChannels"_s, u"Software-&Kanäle"_s, 1, 1024, 32);

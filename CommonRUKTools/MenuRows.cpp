@@ -1,0 +1,12 @@
+#include "CommonRUKTools/MenuRows.h"
+
+std::unique_ptr<TMenuExItem> BuildMenu(QStringView caption, std::span<const MenuRow> rows) {
+    using Kind = TMenuExItem::ItemKind;
+    auto root = std::make_unique<TMenuExItem>(Kind::Submenu, caption.toString());
+    for (const MenuRow& row : rows) {
+        const Kind kind = row.Caption.isEmpty() ? Kind::Separator : Kind::Command;
+        root->Add(kind, row.Caption.toString(), row.Id, row.Shortcut.toString())
+            .SetImageIndex(row.ImageIndex);
+    }
+    return root;
+}
