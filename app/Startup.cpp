@@ -102,33 +102,29 @@ void Startup::OpenFiles(const QStringList& arguments) {
         const FileKind kind = KindOfFile(path);
         if (!file.exists()) {
             RunCommand([&] { throw EMusicDatabaseException(u"Datei nicht gefunden: "_s + path); });
-        } else if (file.isDir()) {
-            intake << path;
-        } else if (kind != FileKind::Song) {
-            OpenFile(kind, path);
-        } else if (OpenSong && !songOpened) {
+        } else if (OpenSong && !songOpened && kind == FileKind::Song && !file.isDir()) {
             RunCommand([&] { OpenSong(path); });
             songOpened = true;
-        } else if (IsSongFile(path)) {
+        } else if (file.isDir() || IsSongFile(path)) {
             intake << path;
-        } else {
+        } else if (kind == FileKind::Song) {
             Warn(u"Diese Datei kann nicht in die Datenbank aufgenommen werden: "_s + path);
+        } else {
+            OpenFile(kind, path);
         }
     }
     if (!intake.isEmpty()) RunCommand([&] { commands_.AddPaths(intake); });
 }
 
 void Startup::OpenFile(FileKind kind, const QString& path) {
-    if (kind == FileKind::PlayList && OpenPlayList)
-        RunCommand([&] { OpenPlayList(path); });
-    else if (kind == FileKind::PlayList)
-        Warn(u"PlayLists können noch nicht geöffnet werden: "_s + path);
-    else if (kind == FileKind::Database)
-        OfferDatabase(path);
-    else if (kind == FileKind::Arrangement && OpenArrangement)
-        RunCommand([&] { OpenArrangement(path); });
-    else
-        Warn(u"Unbekannter Dateityp: "_s + FileExtension(path));
+    const auto open = [&path](const std::function<void(const QString&)>& opener) {
+        RunCommand([&] { opener(path); });
+    };
+    if (kind == FileKind::Database) return OfferDatabase(path);
+    if (kind == FileKind::PlayList && OpenPlayList) return open(OpenPlayList);
+    if (kind == FileKind::Arrangement && OpenArrangement) return open(OpenArrangement);
+    Warn(kind == FileKind::PlayList ? u"PlayLists können noch nicht geöffnet werden: "_s + path
+                                    : u"Unbekannter Dateityp: "_s + FileExtension(path));
 }
 
 void Startup::OfferDatabase(const QString& path) {
