@@ -12,6 +12,7 @@
 #include "MusicManagment/playlist/PlayListMenu.h"
 #include "app/CommandRunner.h"
 #include "app/desktop/Icons.h"
+#include "app/models/CollectionTotals.h"
 #include "app/views/DSPDraw.h"
 #include "app/views/PlayerForm.h"
 #include "app/views/PlaylistForm.h"
@@ -24,10 +25,6 @@
 using namespace Qt::StringLiterals;
 
 namespace {
-
-QString SongCount(std::size_t count) {
-    return count == 1 ? u"1 Song"_s : QString::number(count) + u" Songs"_s;
-}
 
 QSet<QString> NamesIn(const TPlayList& list) {
     QSet<QString> names;
@@ -193,13 +190,6 @@ bool Playing::Run(int id) {
     }
 }
 
-// The marked songs, else the focused one.
-std::vector<SongIndex> Playing::Chosen() const {
-    auto songs = songs_.MarkedSongs();
-    if (songs.empty() && songs_.FocusedSong() >= 0) songs.push_back(songs_.FocusedSong());
-    return songs;
-}
-
 // At the end; what is listed already stays where it is. Returns how many came in.
 int Playing::Append(const std::vector<SongIndex>& songs) {
     QSet<QString> listed = NamesIn(list_);
@@ -214,7 +204,7 @@ int Playing::Append(const std::vector<SongIndex>& songs) {
 }
 
 void Playing::PlayChosen() {
-    const auto songs = Chosen();
+    const auto songs = songs_.ChosenSongs();
     if (songs.empty()) return;
     const SongIndex focused = songs_.FocusedSong();
     const SongIndex song = std::ranges::binary_search(songs, focused) ? focused : songs.front();
@@ -223,10 +213,10 @@ void Playing::PlayChosen() {
 }
 
 void Playing::AddChosen() {
-    const auto songs = Chosen();
+    const auto songs = songs_.ChosenSongs();
     if (songs.empty()) return;
     const auto added = static_cast<std::size_t>(Append(songs));
-    QString sentence = SongCount(added) + u" zur PlayList hinzugefügt"_s;
+    QString sentence = SongCountText(added) + u" zur PlayList hinzugefügt"_s;
     if (const std::size_t known = songs.size() - added; known > 0)
         sentence += u", %1 schon darin"_s.arg(known == 1 ? u"1 war"_s : u"%1 waren"_s.arg(known));
     if (OnDone) OnDone(sentence + u'.');
@@ -241,10 +231,8 @@ void Playing::PlayEntry(int index, SongIndex hint) {
 // --- Files ---
 
 void Playing::OpenStandardList() {
-    RunCommand([this] {
-        if (QFileInfo::exists(standardList_)) list_.SetPlayListFileName(standardList_);
-        standardListIsUnread_ = false;
-    });
+    if (QFileInfo::exists(standardList_)) list_.SetPlayListFileName(standardList_);
+    standardListIsUnread_ = false;
 }
 
 void Playing::OpenPlayList(const QString& path) {

@@ -50,9 +50,9 @@ class Playing {
     // Adds the items that show and hide the tool windows.
     void AddTo(QMenu& menu);
 
-    // Opens the list of the last run where there is one.
+    // Each throws what the playlist or the player throws. The first opens the list of the last run where
+    // there is one.
     void OpenStandardList();
-    // Each throws what the playlist or the player throws.
     void OpenPlayList(const QString& path);
     void OpenSong(const QString& path);
     // Stops playing and keeps the list for the next run if that is wanted. Throws EStreamError.
@@ -64,7 +64,6 @@ class Playing {
     void SetUpContextMenu();
     void JoinDesktop(QMainWindow& window);
     void FollowSong();
-    std::vector<SongIndex> Chosen() const;
     int Append(const std::vector<SongIndex>& songs);
     void PlayChosen();
     void AddChosen();

@@ -5,17 +5,10 @@
 #include "MusicManagment/database/CopySongs.h"
 #include "MusicManagment/database/Menu.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "app/models/CollectionTotals.h"
 #include "app/views/SongListWidget.h"
 
 using namespace Qt::StringLiterals;
-
-namespace {
-
-QString SongCount(std::size_t count) {
-    return count == 1 ? u"1 Song"_s : QString::number(count) + u" Songs"_s;
-}
-
-}  // namespace
 
 SongCommands::SongCommands(TMusicDatabase& database, SongListWidget& list)
     : database_(database), list_(list) {}
@@ -58,15 +51,9 @@ void SongCommands::UndoRemoval() {
     if (removals_.empty()) return;
     const int restored = RestoreSongs(database_, removals_.back());
     removals_.pop_back();
-    Tell(SongCount(static_cast<std::size_t>(restored)) + u" wieder in die Datenbank aufgenommen."_s);
+    Tell(SongCountText(static_cast<std::size_t>(restored)) + u" wieder in die Datenbank aufgenommen."_s);
     if (OnUndoChanged) OnUndoChanged(!removals_.empty());
     database_.SaveAfterCommand();
-}
-
-std::vector<SongIndex> SongCommands::Chosen() const {
-    auto songs = list_.MarkedSongs();
-    if (songs.empty() && list_.FocusedSong() >= 0) songs.push_back(list_.FocusedSong());
-    return songs;
 }
 
 // Through the list, which keeps the focused song in sight.
@@ -82,31 +69,31 @@ void SongCommands::SetOrder(int id) {
 }
 
 void SongCommands::RemoveChosen() {
-    const auto songs = Chosen();
+    const auto songs = list_.ChosenSongs();
     if (songs.empty()) return;
     const QString question = songs.size() == 1
                                  ? u"Soll \""_s + database_.Song(songs[0]).Artist + u" - "_s +
                                        database_.Song(songs[0]).Title +
                                        u"\" aus der Datenbank entfernt werden? Die Datei bleibt erhalten."_s
-                                 : u"Sollen "_s + SongCount(songs.size()) +
+                                 : u"Sollen "_s + SongCountText(songs.size()) +
                                        u" aus der Datenbank entfernt werden? Die Dateien bleiben erhalten."_s;
     if (UserDialogs().Ask(question, {u"Entfernen"_s, u"Abbrechen"_s}, 1) != 0) return;
     RemovedSongs removed = RemoveSongs(database_, songs);
     if (removed.empty()) return;
-    Tell(SongCount(removed.size()) + u" aus der Datenbank entfernt."_s);
+    Tell(SongCountText(removed.size()) + u" aus der Datenbank entfernt."_s);
     removals_.push_back(std::move(removed));
     if (OnUndoChanged) OnUndoChanged(true);
     database_.SaveAfterCommand();
 }
 
 void SongCommands::CopyChosen() {
-    const auto songs = Chosen();
+    const auto songs = list_.ChosenSongs();
     if (songs.empty()) return;
     const auto folder =
         UserDialogs().ChooseFolder(u"Ordner auswählen, in den die Songs kopiert werden sollen:"_s);
     if (!folder) return;
     const CopyResult result = CopySongs(database_, songs, *folder);
-    Tell(SongCount(static_cast<std::size_t>(result.Copied)) + u" kopiert."_s);
+    Tell(SongCountText(static_cast<std::size_t>(result.Copied)) + u" kopiert."_s);
     if (!result.Failed.isEmpty())
         UserDialogs().ShowMessage(MessageKind::Warning, u"Diese Dateien konnten nicht kopiert werden:\n"_s +
                                                             result.Failed.join(u'\n'));

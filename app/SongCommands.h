@@ -28,8 +28,6 @@ class SongCommands {
     void UndoRemoval();
 
  private:
-    // The marked songs, else the focused one.
-    std::vector<SongIndex> Chosen() const;
     void SetOrder(int id);
     void RemoveChosen();
     void CopyChosen();

@@ -3,6 +3,7 @@
 #include <QPointer>
 #include <functional>
 #include <memory>
+#include <optional>
 
 #include "CommonRUKTools/MenuItem.h"
 #include "MusicManagment/database/MusicManagment.h"
@@ -46,6 +47,9 @@ class TPlaySound : public TPlaySoundContainer,
     void SetFileName(const QString& path) override;
     void Open() override;
     void Close() override;
+    // The engine that has the song, be it after others refused; nothing when none has it or it is the
+    // external player's.
+    std::optional<TEngine> CurrentEngine() const { return current_ ? std::optional(engine_) : std::nullopt; }
 
     // --- Playing. Without a song they do nothing. They throw what the engine throws ---
     void Play() override;
@@ -197,7 +201,8 @@ class TPlaySound : public TPlaySoundContainer,
     QString fileName_;
     QString coFileName_;
     Backend current_;
-    Backend fading_;  // the song that fades out
+    TEngine engine_ = TEngine::FMOD;  // of the current song
+    Backend fading_;                  // the song that fades out
     PlayTimers timers_;
     PlayCountClock playCount_;
     std::unique_ptr<ExternalLink> external_;

@@ -66,6 +66,7 @@ void TPlaySound::CreateBackend(TEngine engine, const QString& message) {
     current_.reset();
     try {
         current_ = MakeBackend(engine, fileName_);
+        engine_ = engine;
     } catch (const EFMODException& error) {
         if (!CreateBackendsAfter(TEngine::FMOD, error.Message())) throw;
     } catch (const EEldoSException& error) {

@@ -20,6 +20,10 @@ QString PlayingTime(qint64 seconds) {
 
 }  // namespace
 
+QString SongCountText(std::size_t count) {
+    return count == 1 ? u"1 Song"_s : QString::number(count) + u" Songs"_s;
+}
+
 void CollectionTotals::SongChanged(SongIndex index, TChangeType change) {
     if (index >= 0 && change == ctInserted)
         seconds_ += database_.Song(index).Length;

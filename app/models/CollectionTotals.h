@@ -6,6 +6,8 @@
 
 class TMusicDatabase;
 
+// "1 Song", "2 Songs"
+QString SongCountText(std::size_t count);
 // "2 Songs, Spielzeit 7:05"
 QString TotalsText(qint64 songs, qint64 seconds);
 

@@ -142,6 +142,12 @@ std::vector<SongIndex> SongListWidget::MarkedSongs() const {
     return marked;
 }
 
+std::vector<SongIndex> SongListWidget::ChosenSongs() const {
+    auto songs = MarkedSongs();
+    if (songs.empty() && FocusedSong() >= 0) songs.push_back(FocusedSong());
+    return songs;
+}
+
 SongIndex SongListWidget::FocusedSong() const {
     return currentIndex().isValid() ? songs_.IndexAt(currentIndex().row()) : -1;
 }

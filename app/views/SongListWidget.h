@@ -27,6 +27,8 @@ class SongListWidget : public QTableView {
 
     // Positions in the database, ascending.
     std::vector<SongIndex> MarkedSongs() const;
+    // What a command is about: the marked songs, else the focused one.
+    std::vector<SongIndex> ChosenSongs() const;
     // -1 when no song has the focus.
     SongIndex FocusedSong() const;
     // The marked songs as a drag takes them along.

@@ -239,7 +239,7 @@ void TVisPlaySound::ShowState() {
 }
 
 QString TVisPlaySound::EngineText() const {
-    const auto engine = ChooseEngine(player_.FileName(), player_.Engines());
+    const auto engine = player_.CurrentEngine();
     if (!engine) return {};
     const QString output =
         SoundOutputNames().value(static_cast<qsizetype>(player_.Engines().FMODSoundOutputTypes));

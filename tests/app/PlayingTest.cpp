@@ -10,6 +10,7 @@
 
 #include "MusicManagment/database/Menu.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
+#include "app/CommandRunner.h"
 #include "app/MainMenu.h"
 #include "app/models/FilteredSongs.h"
 #include "app/views/PlaylistForm.h"
@@ -184,7 +185,7 @@ TEST_F(PlayingTest, TheSongThatPlaysIsFoundInTheCollection) {
 }
 
 TEST_F(PlayingTest, TheListIsThereAgainAtTheNextStart) {
-    playing_->OpenStandardList();
+    RunCommand([this] { playing_->OpenStandardList(); });
     playing_->Close(true);
     EXPECT_FALSE(QFile::exists(StandardList()));
     Mark({3, 4}, 3);
@@ -194,7 +195,7 @@ TEST_F(PlayingTest, TheListIsThereAgainAtTheNextStart) {
 
     playing_.reset();
     Start();
-    playing_->OpenStandardList();
+    RunCommand([this] { playing_->OpenStandardList(); });
     EXPECT_EQ(Listed(), u"34"_s);
     EXPECT_TRUE(dialogs_.Messages.isEmpty());
 }
@@ -204,7 +205,7 @@ TEST_F(PlayingTest, AListThatCannotBeReadIsNotLost) {
     ASSERT_TRUE(file.open(QIODevice::WriteOnly));
     file.write("RUKPLYLST??");
     file.close();
-    playing_->OpenStandardList();
+    RunCommand([this] { playing_->OpenStandardList(); });
     EXPECT_EQ(dialogs_.Messages.size(), 1);
     playing_->Close(true);
     ASSERT_TRUE(file.open(QIODevice::ReadOnly));

@@ -15,7 +15,8 @@ RemoteControlPage::RemoteControlPage(const TMusicDatabase& database)
         AddCheck(group, u"RCEnabled"_s, u"Andere Programme &dürfen Tunestead steuern"_s,
                  u"Andere Programme Ihres Rechners können dann den Player und die PlayList bedienen."_s);
     fields_.BindBool(enabled, u"RCEnabled"_s, true);
-    SetAvailable(group, database.RemoteControl() != nullptr, u"Wird mit dem Player wirksam."_s);
+    SetAvailable(group, database.RemoteControl() != nullptr,
+                 u"Wird mit der Fernsteuerung wirksam, die mit einer der nächsten Versionen kommt."_s);
 }
 
 void RemoteControlPage::Load(const TMusicDatabase&, const TRWReg& settings) {

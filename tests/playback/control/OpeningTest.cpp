@@ -49,6 +49,7 @@ TEST_F(OpeningTest, AfterTheFirstEngineTheLastAllowedOneStays) {
     EXPECT_EQ(Messages(), (QStringList{u"FMOD kaputt\r\nVersuche EldoS"_s, u"FMOD kaputt\r\nVersuche MCI"_s,
                                        u"FMOD kaputt\r\nVersuche WinAmp"_s}));
     EXPECT_EQ(Open(), u"WinAmp:a"_s);
+    EXPECT_EQ(player_.CurrentEngine(), TEngine::WinAmp);
 
     dialogs_.Messages.clear();
     Change([](EngineSettings& s) { s.UseWinAmp = false; });
