@@ -7,7 +7,9 @@
 
 #include <QProcess>
 #include <QTemporaryDir>
+#include <QThread>
 #include <random>
+#include <thread>
 
 #include "MusicManagment/playback/fmod/FFmpegSource.h"
 #include "MusicManagment/playback/fmod/SinkOutput.h"
@@ -56,6 +58,17 @@ QString Path(std::size_t file) {
     return path;
 }
 
+// Processor time, ms: RUSAGE_SELF of this program, RUSAGE_CHILDREN of all that it has started and that have
+// ended.
+double TimeOf(int who) {
+    rusage usage{};
+    getrusage(who, &usage);
+    const auto ms = [](const timeval& time) {
+        return 1000.0 * static_cast<double>(time.tv_sec) + static_cast<double>(time.tv_usec) / 1000;
+    };
+    return ms(usage.ru_utime) + ms(usage.ru_stime);
+}
+
 // The library over an output that is pulled by hand.
 class Player {
  public:
@@ -100,6 +113,50 @@ void PlayCrossFade(benchmark::State& state) {
     PlayStreams(state, 2);
 }
 
+constexpr int kHeardSeconds = 5;
+
+// Processor time of a second that passes while something goes on at the pace of hearing.
+void MeasureRealTime(benchmark::State& state, const std::function<void()>& hear) {
+    double spent = 0;
+    for (auto _ : state) {
+        const double before = TimeOf(RUSAGE_SELF);
+        hear();
+        spent += TimeOf(RUSAGE_SELF) - before;
+    }
+    state.counters["CPU ms a second"] = spent / static_cast<double>(state.iterations()) / kHeardSeconds;
+    Name(state);
+}
+
+// As it is at the user's: the threads sleep in between, and one decodes while the other rests.
+void PlayInRealTime(benchmark::State& state, int streams) {
+    Player player(OutputsFor({.kind = OutputChoice::Kind::Null}));
+    for (int i = 0; i < streams; ++i)
+        player.Start(Path(static_cast<std::size_t>(state.range(0))));
+    QThread::sleep(1);  // the first half second is decoded at once
+    MeasureRealTime(state, [] { QThread::sleep(kHeardSeconds); });
+}
+void RealTimeOne(benchmark::State& state) {
+    PlayInRealTime(state, 1);
+}
+void RealTimeCrossFade(benchmark::State& state) {
+    PlayInRealTime(state, 2);
+}
+
+// What any player pays at the least: one thread that decodes a buffer and sleeps until it is used up.
+void RealTimeDecodeOnly(benchmark::State& state) {
+    constexpr std::size_t kBuffer = 4096;
+    FFmpegSource source(Path(static_cast<std::size_t>(state.range(0))), FFmpegFile::LengthBy::Header, kRate);
+    Samples buffer(2 * kBuffer);
+    MeasureRealTime(state, [&] {
+        auto due = std::chrono::steady_clock::now();
+        for (std::size_t i = 0; i < kHeardSeconds * kFrames / kBuffer; ++i) {
+            source.Read(buffer.data(), kBuffer);
+            due += std::chrono::microseconds(1'000'000 * kBuffer / kRate);
+            std::this_thread::sleep_until(due);
+        }
+    });
+}
+
 void DecodeOnly(benchmark::State& state) {
     FFmpegSource source(Path(static_cast<std::size_t>(state.range(0))), FFmpegFile::LengthBy::Header, kRate);
     Samples second(2 * kFrames);
@@ -111,26 +168,16 @@ void DecodeOnly(benchmark::State& state) {
     Name(state);
 }
 
-// Processor time of all programs that have been started and ended, ms.
-double TimeOfChildren() {
-    rusage usage{};
-    getrusage(RUSAGE_CHILDREN, &usage);
-    const auto ms = [](const timeval& time) {
-        return 1000.0 * static_cast<double>(time.tv_sec) + static_cast<double>(time.tv_usec) / 1000;
-    };
-    return ms(usage.ru_utime) + ms(usage.ru_stime);
-}
-
 // The ffmpeg program decodes the whole file; its start is part of it.
 void DecodeByProgram(benchmark::State& state) {
     const QString path = Path(static_cast<std::size_t>(state.range(0)));
     const QString command = QStringLiteral("ffmpeg -v quiet -threads 1 -i %1 -f null -").arg(path);
-    const double before = TimeOfChildren();
+    const double before = TimeOf(RUSAGE_CHILDREN);
     for (auto _ : state) {
         if (QProcess::execute(QStringLiteral("/bin/sh"), {QStringLiteral("-c"), command}) != 0)
             return state.SkipWithError("no ffmpeg");
     }
-    const double spent = TimeOfChildren() - before;
+    const double spent = TimeOf(RUSAGE_CHILDREN) - before;
     state.counters["CPU ms a second"] = spent / static_cast<double>(state.iterations()) / kSeconds;
     Name(state);
 }
@@ -193,6 +240,9 @@ void Seek(benchmark::State& state) {
 constexpr int kLastFile = static_cast<int>(std::size(kFiles)) - 1;
 BENCHMARK(PlayOne)->DenseRange(0, kLastFile)->MeasureProcessCPUTime()->Unit(benchmark::kMillisecond);
 BENCHMARK(PlayCrossFade)->DenseRange(0, kLastFile)->MeasureProcessCPUTime()->Unit(benchmark::kMillisecond);
+BENCHMARK(RealTimeOne)->DenseRange(0, kLastFile)->Iterations(1)->Unit(benchmark::kMillisecond);
+BENCHMARK(RealTimeCrossFade)->DenseRange(0, kLastFile)->Iterations(1)->Unit(benchmark::kMillisecond);
+BENCHMARK(RealTimeDecodeOnly)->DenseRange(0, kLastFile)->Iterations(1)->Unit(benchmark::kMillisecond);
 BENCHMARK(DecodeOnly)->DenseRange(0, kLastFile)->MeasureProcessCPUTime()->Unit(benchmark::kMillisecond);
 BENCHMARK(DecodeByProgram)->DenseRange(0, kLastFile)->Unit(benchmark::kMillisecond)->UseRealTime();
 BENCHMARK(OpenToFirstSound)->DenseRange(0, kLastFile)->Unit(benchmark::kMillisecond)->UseRealTime();

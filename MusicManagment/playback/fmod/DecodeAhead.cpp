@@ -8,7 +8,7 @@ namespace {
 constexpr std::size_t kChunk = 1024;  // frames decoded at a time
 // The mixing thread never wakes the decoder, since that could make it wait; the decoder looks by itself, far
 // more often than the ring lasts.
-constexpr auto kLookInterval = std::chrono::milliseconds(50);
+constexpr auto kLookInterval = std::chrono::milliseconds(100);
 
 std::size_t HalfASecond(int rate) {
     return std::max(4 * kChunk, std::bit_ceil(static_cast<std::size_t>(rate) / 2));
@@ -68,15 +68,16 @@ void DecodeAhead::DropHeardMarks() const {
 }
 
 bool DecodeAhead::Ready(std::size_t frames) const {
-    const std::uint64_t written = ring_.Written();
-    const std::uint64_t from = std::max(ring_.Taken(), start_.load(std::memory_order_acquire));
-    return written - from >= frames || written >= end_.load(std::memory_order_acquire) || !HasRoom();
+    return Ahead() >= frames || ring_.Written() >= end_.load(std::memory_order_acquire) || !HasRoom();
 }
 
 void DecodeAhead::WaitReady(std::size_t frames) {
+    if (Ready(frames)) return;
     std::unique_lock lock(mutex_);
+    awaited_ = std::max(frames, target_ / 4);
     work_.notify_all();
-    ready_.wait(lock, [&] { return Ready(frames); });
+    ready_.wait(lock, [&] { return Ready(awaited_); });
+    awaited_ = 0;
 }
 
 std::size_t DecodeAhead::TakeLeft(float* stereo, std::size_t frames) {
@@ -96,11 +97,12 @@ std::size_t DecodeAhead::Take(float* stereo, std::size_t frames) {
     return count;
 }
 
+std::uint64_t DecodeAhead::Ahead() const {
+    return ring_.Written() - std::max(ring_.Taken(), start_.load(std::memory_order_acquire));
+}
+
 bool DecodeAhead::HasRoom() const {
-    const std::uint64_t written = ring_.Written();
-    const std::uint64_t taken = ring_.Taken();
-    const std::uint64_t from = std::max(taken, start_.load(std::memory_order_acquire));
-    return written - from + kChunk <= target_ && written - taken + kChunk <= ring_.Capacity();
+    return Ahead() + kChunk <= target_ && ring_.Written() - ring_.Taken() + kChunk <= ring_.Capacity();
 }
 
 void DecodeAhead::AddMark(std::uint64_t from, SongPlace place) {
@@ -124,17 +126,23 @@ void DecodeAhead::DecodeSome() {
     }
 }
 
+// In bursts: a decoder that goes on for a while finds its tables in the cache, one that is woken for every
+// block does not and takes twice the time.
 void DecodeAhead::Run() {
     std::unique_lock lock(mutex_);
+    bool filling = true;
     while (!quit_) {
-        if (end_.load(std::memory_order_relaxed) != kNoEnd || !HasRoom()) {
+        const bool ended = end_.load(std::memory_order_relaxed) != kNoEnd;
+        filling = !ended && HasRoom() && (filling || awaited_ > 0 || Ahead() <= target_ / 2);
+        if (!filling) {
             work_.wait_for(lock, kLookInterval);
             continue;
         }
         DecodeSome();
-        ready_.notify_all();
+        const bool answer = awaited_ > 0 && Ready(awaited_);
         // A moment for whoever wants to seek or ask.
         lock.unlock();
+        if (answer) ready_.notify_all();
         lock.lock();
     }
 }

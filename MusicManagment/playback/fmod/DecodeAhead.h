@@ -57,6 +57,7 @@ class DecodeAhead {
 
     void Run();
     void DecodeSome();
+    std::uint64_t Ahead() const;  // frames decoded and not taken
     bool HasRoom() const;
     bool Ready(std::size_t frames) const;
     void DropHeardMarks() const;
@@ -75,6 +76,7 @@ class DecodeAhead {
     std::condition_variable work_;
     std::condition_variable ready_;
     mutable std::deque<Mark> marks_;
+    std::size_t awaited_ = 0;  // frames that WaitReady waits for
     bool quit_ = false;
     std::thread thread_;
 };

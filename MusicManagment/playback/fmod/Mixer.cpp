@@ -129,7 +129,7 @@ void Mixer::RenderBlock(float* stereo, std::size_t frames) {
         AddChannel(channel, stereo, frames);
     ApplyMaster(stereo, frames);
     for (std::size_t i = 0; i < 2 * frames; ++i)
-        stereo[i] = std::clamp(stereo[i], -1.0F, 1.0F);
+        stereo[i] = std::min(std::max(stereo[i], -1.0F), 1.0F);  // two instructions, std::clamp branches
     Keep(stereo, frames);
 }
 
@@ -173,9 +173,17 @@ void Mixer::AddChannel(Channel& channel, float* stereo, std::size_t frames) {
         starved_.fetch_add(frames - count, std::memory_order_relaxed);
 }
 
+void Mixer::AddSteady(float* target, const float* source, std::size_t frames, Sides gain) {
+    for (std::size_t i = 0; i < frames; ++i) {
+        target[2 * i] += source[2 * i] * gain.left;
+        target[2 * i + 1] += source[2 * i + 1] * gain.right;
+    }
+}
+
 // The gain goes from `from` to `to` in a straight line of `over` frames.
 void Mixer::Add(float* target, const float* source, std::size_t frames, Sides from, Sides to,
                 std::size_t over) {
+    if (from == to) return AddSteady(target, source, frames, to);
     const float step = over > 0 ? 1.0F / static_cast<float>(over) : 0;
     for (std::size_t i = 0; i < frames; ++i) {
         const float way = step * static_cast<float>(i + 1);

@@ -77,6 +77,7 @@ class Mixer {
     void Detach(Channel& channel);
     void RenderBlock(float* stereo, std::size_t frames);
     void AddChannel(Channel& channel, float* stereo, std::size_t frames);
+    static void AddSteady(float* target, const float* source, std::size_t frames, Sides gain);
     static void Add(float* target, const float* source, std::size_t frames, Sides from, Sides to,
                     std::size_t over);
     void ApplyMaster(float* stereo, std::size_t frames);
