@@ -20,6 +20,17 @@ QString WithAccessKey(const QString& caption, QString& taken) {
     return text;
 }
 
+namespace {
+
+// The Enter key of the number block does what Return does.
+QList<QKeySequence> ShortcutsOf(const TMenuExItem& item) {
+    QList<QKeySequence> shortcuts{QKeySequence(item.Shortcut())};
+    if (shortcuts[0] == QKeySequence(Qt::Key_Return)) shortcuts << QKeySequence(Qt::Key_Enter);
+    return shortcuts;
+}
+
+}  // namespace
+
 void CommandMenu::Fill(QMenu& menu, const TMenuExItem& parent, QString taken) {
     menu.setToolTipsVisible(true);
     auto* group = new QActionGroup(&menu);
@@ -42,7 +53,7 @@ void CommandMenu::Fill(QMenu& menu, const TMenuExItem& parent, QString taken) {
 
 void CommandMenu::AddCommand(QMenu& menu, const TMenuExItem& item) {
     QAction* action = menu.addAction(icons_(item.Id()), item.Caption());
-    action->setShortcut(QKeySequence(item.Shortcut()));
+    action->setShortcuts(ShortcutsOf(item));
     action->setCheckable(item.Checkable());
     if (item.IsDefault()) menu.setDefaultAction(action);
     QObject::connect(action, &QAction::triggered, &menu, [this, id = item.Id()] { run_(id); });

@@ -44,10 +44,11 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
       playerForm_(new TPlayerForm(player_, list_, &window)),
       spectrumForm_(new TSpectrumForm(&window)),
       contextMenu_(new QMenu(listForm_)) {
+    // Before the settings, which may ask for it.
+    if (options.MakeExternalPlayer) player_.SetExternalPlayer(options.MakeExternalPlayer());
     list_.SetMusicDatabase(&database);
     player_.SetMusicDatabase(&database);
     player_.SetPlayList(&list_);
-    if (options.MakeExternalPlayer) player_.SetExternalPlayer(options.MakeExternalPlayer());
     SetUpWindows(window, std::move(options.SetVolume));
     SetUpSpectrum(window, std::move(options.Spectrum));
     SetUpContextMenu();
@@ -79,7 +80,11 @@ void Playing::SetUpWindows(QMainWindow& window, std::function<void(float)> setVo
     TVisPlaySound& panel = playerForm_->Panel();
     panel.OnCommand = [this](int id) { RunPlayerCommand(id); };
     panel.OnChange = [this] { FollowSong(); };
-    panel.Volume().Follow(std::move(setVolume));
+    panel.Volume().Follow([this, setVolume = std::move(setVolume)](float gain) {
+        if (setVolume) setVolume(gain);
+        player_.SetGain(gain);
+        if (mpris_) mpris_->Update();
+    });
     database_.JoinSettings(panel.Volume());
 }
 
@@ -108,14 +113,15 @@ void Playing::JoinDesktop(QMainWindow& window) {
                              window.raise();
                              window.activateWindow();
                          },
-                     .Quit = [&window] { window.close(); }});
+                     .Quit = [&window] { window.close(); },
+                     .Volume = [this] { return playerForm_->Panel().Volume().Part(); },
+                     .SetVolume = [this](double volume) { playerForm_->Panel().Volume().SetPart(volume); }});
     mpris_->Register(QDBusConnection::sessionBus());
     const auto update = [this] { mpris_->Update(); };
     const QAbstractItemModel* list = listForm_->View().model();
     QObject::connect(list, &QAbstractItemModel::modelReset, mpris_.get(), update);
     QObject::connect(list, &QAbstractItemModel::rowsInserted, mpris_.get(), update);
     QObject::connect(list, &QAbstractItemModel::rowsRemoved, mpris_.get(), update);
-    playerForm_->Panel().OnSeeked = [this](quint32 position) { mpris_->TellSeeked(position); };
 }
 
 // The list goes along with the songs that it plays.

@@ -11,6 +11,7 @@
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/playback/ExternalLink.h"
 #include "MusicManagment/playback/FadingBackend.h"
+#include "MusicManagment/playback/GainBackend.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 
 using namespace Qt::StringLiterals;
@@ -152,6 +153,7 @@ void TPlaySound::SetPosition(quint32 milliseconds) {
     } else if (current_) {
         current_->SetPosition(milliseconds);
     }
+    if (OnSeeked) OnSeeked(*this, milliseconds);
 }
 
 quint32 TPlaySound::GetLength() {
@@ -215,6 +217,11 @@ void TPlaySound::SetAutoStop(int milliseconds) {
 void TPlaySound::SetEngines(const EngineSettings& settings) {
     const EngineSettings former = std::exchange(settings_, settings);
     if (playExtern_) external_->SendChanges(former, settings_);
+}
+
+void TPlaySound::SetGain(float gain) {
+    gain_ = std::clamp(gain, 0.0F, 1.0F);
+    if (GainBackend* current = AsGain(current_.get())) current->SetGain(gain_);
 }
 
 // --- Wiring ---
@@ -314,6 +321,7 @@ void TPlaySound::LoadSettings(const TRWReg& settings) {
     LoadEngineSettings(engines, settings);
     SetEngines(engines);
     if (const auto autoPlay = settings.ReadBool(u"PSAutoPlay"_s)) SetAutoPlay(*autoPlay);
+    if (const auto playExtern = settings.ReadBool(u"PSPlayExtern"_s)) SetPlayExtern(*playExtern);
     const auto interval = settings.ReadInteger(u"PSTimerInterval"_s);
     if (interval && *interval >= 1 && *interval <= kLongestInterval) SetTimerInterval(*interval);
     const auto mode = settings.ReadInteger(u"Crossover"_s);
@@ -324,6 +332,7 @@ void TPlaySound::LoadSettings(const TRWReg& settings) {
 void TPlaySound::SaveSettings(TRWReg& settings) const {
     SaveEngineSettings(settings_, settings);
     settings.WriteBool(u"PSAutoPlay"_s, autoPlay_);
+    settings.WriteBool(u"PSPlayExtern"_s, playExtern_);
     settings.WriteInteger(u"PSTimerInterval"_s, timerInterval_);
     if (panel_ != nullptr) settings.WriteInteger(u"Crossover"_s, panel_->Crossover());
 }

@@ -84,6 +84,9 @@ class TPlaySound : public TPlaySoundContainer,
     void SetAutoPlay(bool value) { autoPlay_ = value; }
     int TimerInterval() const { return timerInterval_; }
     void SetTimerInterval(int milliseconds);  // at least 1
+    // How loud songs play here, 0 to 1 of the amplitude: now and from now on. Songs of the sound library
+    // follow that library's own loudness instead.
+    void SetGain(float gain);
     // The longest time a song plays, in milliseconds; 0 is no limit.
     int AutoStop() const { return autoStop_; }
     void SetAutoStop(int milliseconds) override;
@@ -143,6 +146,8 @@ class TPlaySound : public TPlaySoundContainer,
     TNotifyEvent OnReachedEndOfSong;
     TNotifyEvent OnCrossover;
     std::function<void(TPlaySound&, quint32 position)> OnPlaying;  // ms
+    // Somebody has gone to another place of the song, here or in the external player.
+    std::function<void(TPlaySound&, quint32 position)> OnSeeked;  // ms
 
  private:
     using Backend = std::unique_ptr<TPlaySoundContainer>;
@@ -208,6 +213,7 @@ class TPlaySound : public TPlaySoundContainer,
     std::unique_ptr<ExternalLink> external_;
     int timerInterval_ = 250;  // ms
     int autoStop_ = 0;         // ms
+    float gain_ = 1;
     bool autoPlay_ = false;
     bool playExtern_ = false;
     bool endReached_ = false;

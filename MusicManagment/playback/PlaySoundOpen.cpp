@@ -3,6 +3,7 @@
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/playback/ExternalLink.h"
+#include "MusicManagment/playback/GainBackend.h"
 #include "MusicManagment/playback/PlaySound.h"
 
 // Opening a song: in which engine, in which other engines when that one refuses, or in the external player.
@@ -50,10 +51,13 @@ void TPlaySound::ClearPanel() {
 
 // --- Engines ---
 
+// Full loudness is what engines begin with; another program that plays may have one of its own, which stays.
 TPlaySound::Backend TPlaySound::MakeBackend(TEngine engine, const QString& path) const {
     Backend backend = engineTable_.Create(engine, settings_);
     backend->SetBackendFile(path);
     backend->Open();
+    if (GainBackend* adjustable = AsGain(backend.get()); adjustable != nullptr && gain_ < 1)
+        adjustable->SetGain(gain_);
     return backend;
 }
 

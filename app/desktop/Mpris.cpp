@@ -45,9 +45,11 @@ Mpris::Mpris(TPlaySound& player, TPlayList& list, Hooks hooks)
     updateTimer_.setSingleShot(true);
     updateTimer_.setInterval(0);
     connect(&updateTimer_, &QTimer::timeout, this, [this] { TellChanges(); });
+    player_.OnSeeked = [this](TPlaySound&, quint32 position) { TellSeeked(position); };
 }
 
 Mpris::~Mpris() {
+    player_.OnSeeked = {};
     if (serviceName_.isEmpty()) return;
     bus_.unregisterService(serviceName_);
     bus_.unregisterObject(kPath);
@@ -99,12 +101,14 @@ bool Mpris::HandleProperties(const QDBusMessage& message, const QDBusConnection&
     return connection.send(message.createReply());
 }
 
-// Volume and rate can be set only to what they are.
+// The rate can be set only to what it is.
 void Mpris::SetProperty(const QString& name, const QVariant& value) {
     if (name == u"Shuffle"_s)
         list_.SetPlayOrder(value.toBool() ? poRandom : poDownwards);
     else if (name == u"LoopStatus"_s)
         list_.SetRepeatAll(value.toString() != u"None"_s);
+    else if (name == u"Volume"_s)
+        hooks_.SetVolume(std::clamp(value.toDouble(), 0.0, 1.0));
     list_.RedrawView();
     Update();
 }
@@ -144,7 +148,6 @@ void Mpris::Seek(qint64 microseconds) {
     const qint64 position = std::max(microseconds, qint64{0}) / kMicroseconds;
     if (position > player_.GetLength()) return hooks_.Run(plNext);
     player_.SetPosition(static_cast<quint32>(position));
-    TellSeeked(static_cast<quint32>(position));
 }
 
 // --- Properties ---
@@ -181,7 +184,7 @@ QVariantMap Mpris::PlayerProperties() const {
         {u"Rate"_s, 1.0},
         {u"MinimumRate"_s, 1.0},
         {u"MaximumRate"_s, 1.0},
-        {u"Volume"_s, 1.0},
+        {u"Volume"_s, hooks_.Volume()},
         {u"Metadata"_s, Metadata()},
         {u"CanGoNext"_s, list_.Count() > 0},
         {u"CanGoPrevious"_s, list_.HasPrevious()},

@@ -21,6 +21,8 @@ class Mpris : public QDBusVirtualObject {
         std::function<void(const QString& path)> OpenSong;
         std::function<void()> Raise;
         std::function<void()> Quit;
+        std::function<double()> Volume = [] { return 1.0; };  // 0 to 1, as on a slider
+        std::function<void(double volume)> SetVolume;
     };
 
     Mpris(TPlaySound& player, TPlayList& list, Hooks hooks);
@@ -32,12 +34,9 @@ class Mpris : public QDBusVirtualObject {
     // The name that was taken; empty for none.
     const QString& ServiceName() const { return serviceName_; }
 
-    // The song, what the player does with it or the list has changed. Told to the bus as soon as the program
-    // comes to it.
+    // The song, what the player does with it, the list or the volume has changed. Told to the bus as soon as
+    // the program comes to it.
     void Update() { updateTimer_.start(); }
-    // The user has gone to another place of the song.
-    void TellSeeked(quint32 position);  // ms
-
     bool handleMessage(const QDBusMessage& message, const QDBusConnection& connection) override;
     QString introspect(const QString& path) const override;
 
@@ -55,6 +54,7 @@ class Mpris : public QDBusVirtualObject {
     bool CallPlayer(const QString& method, const QVariantList& arguments);
     void Seek(qint64 microseconds);
     void TellChanges();
+    void TellSeeked(quint32 position);
     void Signal(const QString& interface, const QString& name, const QVariantList& arguments) const;
 
     TPlaySound& player_;

@@ -147,7 +147,6 @@ void TVisPlaySound::SetUpSlider() {
     slider_->OnSeek = [this](int position) {
         ShowTimes(static_cast<quint32>(position));
         RunCommand([&] { player_.SetPosition(static_cast<quint32>(position)); });
-        if (OnSeeked) OnSeeked(static_cast<quint32>(position));
     };
 }
 

@@ -25,8 +25,6 @@ class TVisPlaySound : public QWidget, public PlayerPanel {
     std::function<void(int command)> OnCommand;
     // The song or what the player does with it has changed.
     std::function<void()> OnChange;
-    // The user has gone to another place of the song.
-    std::function<void(quint32 position)> OnSeeked;
 
     const PlayingSong& Song() const { return song_; }
     VolumeSlider& Volume() { return *volume_; }

@@ -19,21 +19,18 @@ VolumeSlider::VolumeSlider(QWidget* parent) : QSlider(Qt::Horizontal, parent) {
     setPageStep(4 * kStep);
     setValue(kFull);
     setFixedWidth(12 * fontMetrics().averageCharWidth());
-    hide();
     connect(this, &QSlider::valueChanged, this, [this] { Tell(); });
 }
 
 void VolumeSlider::Follow(std::function<void(float)> follower) {
     follower_ = std::move(follower);
-    setVisible(follower_ != nullptr);
     Tell();
 }
 
 // The ear hears half as loud where the sound has about a quarter of its amplitude.
 void VolumeSlider::Tell() {
-    setToolTip(u"Lautstärke %1 % (Engine FMOD)"_s.arg(value()));
-    const float part = static_cast<float>(value()) / kFull;
-    if (follower_) follower_(part * part);
+    setToolTip(u"Lautstärke %1 %"_s.arg(value()));
+    if (follower_) follower_(static_cast<float>(Part() * Part()));
 }
 
 void VolumeSlider::LoadSettings(const TRWReg& settings) {

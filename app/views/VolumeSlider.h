@@ -10,8 +10,11 @@ class VolumeSlider : public QSlider, public SettingsClient {
  public:
     explicit VolumeSlider(QWidget* parent = nullptr);
 
-    // Told the gain, 0 to 1, now and at every change; the slider is hidden until somebody listens.
+    // Told the gain, 0 to 1 of the amplitude, now and at every change.
     void Follow(std::function<void(float gain)> follower);
+    // The value as a part of 1.
+    double Part() const { return static_cast<double>(value()) / maximum(); }
+    void SetPart(double part) { setValue(qRound(part * maximum())); }
 
     void LoadSettings(const TRWReg& settings) override;
     void SaveSettings(TRWReg& settings) const override;

@@ -75,12 +75,15 @@ class MprisTest : public testing::Test {
     QList<int> commands_;
     QString opened_;
     int raised_ = 0;
+    double volume_ = 0.75;
     Mpris mpris_{player_,
                  list_,
                  {.Run = [this](int command) { commands_ << command; },
                   .OpenSong = [this](const QString& path) { opened_ = path; },
                   .Raise = [this] { ++raised_; },
-                  .Quit = [] {}}};
+                  .Quit = [] {},
+                  .Volume = [this] { return volume_; },
+                  .SetVolume = [this](double volume) { volume_ = volume; }}};
 };
 
 TEST_F(MprisTest, TellsWhatPlays) {
@@ -149,6 +152,10 @@ TEST_F(MprisTest, OrderAndRepeatAreSetFromOutside) {
     EXPECT_EQ(set(u"LoopStatus"_s, u"Playlist"_s), QDBusMessage::ReplyMessage);
     EXPECT_EQ(list_.PlayOrder(), poRandom);
     EXPECT_TRUE(list_.RepeatAll());
+    EXPECT_EQ(set(u"Volume"_s, 0.5), QDBusMessage::ReplyMessage);
+    EXPECT_EQ(Property(u"Volume"_s).toDouble(), 0.5);
+    set(u"Volume"_s, 7.0);
+    EXPECT_EQ(volume_, 1);
     EXPECT_EQ(set(u"Nonsense"_s, true), QDBusMessage::ErrorMessage);
 }
 
@@ -166,7 +173,7 @@ TEST(MprisWithoutBusTest, NobodyIsListening) {
     Mpris mpris(player, list, {});
     EXPECT_FALSE(mpris.Register(QDBusConnection(u"none"_s)));
     mpris.Update();
-    mpris.TellSeeked(1000);
+    player.SetPosition(1000);
     QApplication::processEvents();
     EXPECT_TRUE(mpris.ServiceName().isEmpty());
 }

@@ -92,6 +92,10 @@ quint32 TEldoSPlaySound::GetLength() {
     return ToMilliseconds(length_);
 }
 
+void TEldoSPlaySound::SetGain(float gain) {
+    if (output_) output_->SetGain(gain);
+}
+
 void TEldoSPlaySound::TopUp() {
     if (status_ != psPlaying || (output_->Failed() && !RecoverOutput())) return;
     const std::size_t bytes = buffer_.size() * sizeof(std::int16_t);

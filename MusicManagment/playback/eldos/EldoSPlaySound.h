@@ -6,7 +6,7 @@
 #include <vector>
 
 #include "MusicManagment/playback/EngineErrors.h"
-#include "MusicManagment/playback/PlaySoundContainer.h"
+#include "MusicManagment/playback/GainBackend.h"
 #include "MusicManagment/playback/eldos/ModuleFiles.h"
 #include "MusicManagment/playback/eldos/PushOutput.h"
 
@@ -22,7 +22,7 @@ struct TEldoSSettings {
 
 // A song in the light engine: a module decodes its type, and a few buffers ahead of what is heard are kept
 // queued in an output of its own.
-class TEldoSPlaySound : public TPlaySoundContainer {
+class TEldoSPlaySound : public TPlaySoundContainer, public GainBackend {
  public:
     explicit TEldoSPlaySound(const TEldoSSettings& settings = {}, QObject* parent = nullptr);
     ~TEldoSPlaySound() override;
@@ -38,6 +38,7 @@ class TEldoSPlaySound : public TPlaySoundContainer {
     quint32 GetPosition() override;
     quint32 GetLength() override;
     TPSStatus GetStatus() override { return status_; }
+    void SetGain(float gain) override;
 
     // Queues what has been played since; a timer calls it often enough while the song plays.
     void TopUp();

@@ -10,6 +10,7 @@ class NullPush : public PushOutput {
     std::size_t Queued() override;
     void Clear() override;
     void SetPaused(bool paused) override;
+    void SetGain(float) override {}
     bool Failed() const override { return false; }
 
  private:

@@ -22,6 +22,8 @@ class PushOutput {
     // Forgets what is queued.
     virtual void Clear() = 0;
     virtual void SetPaused(bool paused) = 0;
+    // 0 to 1 of the amplitude; heard at once, also in what is queued.
+    virtual void SetGain(float gain) = 0;
     // True once an open output has been lost. Opening it again may help.
     virtual bool Failed() const = 0;
 };

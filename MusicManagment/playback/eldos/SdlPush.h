@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QStringList>
+#include <vector>
 
 #include "MusicManagment/playback/eldos/PushOutput.h"
 #include "MusicManagment/playback/fmod/SdlAudio.h"
@@ -16,13 +17,21 @@ class SdlPush : public PushOutput {
     std::size_t Queued() override;
     void Clear() override;
     void SetPaused(bool paused) override;
+    void SetGain(float gain) override;
     bool Failed() const override;
 
  private:
+    static void Fill(void* self, unsigned char* target, int bytes);
+    void Give(std::span<std::int16_t> target);
     void Close();
 
     const QStringList drivers_;
     SdlAudio audio_;
     unsigned device_ = 0;  // 0 = none
     bool paused_ = true;
+    // Under the lock of the device.
+    std::vector<std::int16_t> queue_;
+    std::size_t given_ = 0;  // samples at the front of the queue that the device has
+    float gain_ = 1;
+    float gainNow_ = 1;  // glides to gain_
 };

@@ -67,6 +67,7 @@ class GstMci::Device {
     QString Pause();
     QString Seek(quint32 milliseconds);
     QString Status(quint32 item, quint32& value);
+    QString SetAudio(quint32 item, quint32 value);
 
  private:
     void ReadMessages();
@@ -146,6 +147,12 @@ QString GstMci::Device::Status(quint32 item, quint32& value) {
     else
         value = Mode();
     return failure_;
+}
+
+QString GstMci::Device::SetAudio(quint32 item, quint32 value) {
+    if (item != kMciAudioVolume || value > kMciFullVolume) return u"Unbekannte Einstellung."_s;
+    g_object_set(player_.get(), "volume", static_cast<double>(value) / kMciFullVolume, nullptr);
+    return {};
 }
 
 void GstMci::Device::ReadMessages() {
@@ -245,6 +252,8 @@ quint32 GstMci::SendCommand(quint32 device, MciCommand command, quint32 flags, M
             return Result(opened.Seek(flags == kMciSeekToStart ? 0 : parameters.To));
         case MciCommand::Status:
             return Result(opened.Status(parameters.Item, parameters.Value));
+        case MciCommand::SetAudio:
+            return Result(opened.SetAudio(parameters.Item, parameters.Value));
         case MciCommand::Set:  // times are milliseconds anyway
         case MciCommand::Open:
             return 0;

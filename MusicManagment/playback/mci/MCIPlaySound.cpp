@@ -2,6 +2,7 @@
 
 #include <QDir>
 #include <QFileInfo>
+#include <cmath>
 #include <utility>
 
 #include "MusicManagment/playback/EngineErrors.h"
@@ -126,6 +127,14 @@ TPSStatus TMCIPlaySound::GetStatus() {
     for (const StatusRow& row : kStatuses)
         if (row.Mode == mode) return row.Status;
     return psClosed;
+}
+
+// Devices for waves and for CDs refuse it.
+void TMCIPlaySound::SetGain(float gain) {
+    if (device_ == 0) return;
+    MciParameters parameters{.Item = kMciAudioVolume,
+                             .Value = static_cast<quint32>(std::lround(gain * kMciFullVolume))};
+    mci_.SendCommand(device_, MciCommand::SetAudio, kMciSetAudioItem, parameters);
 }
 
 void TMCIPlaySound::Send(MciCommand command, quint32 flags, MciParameters parameters) {

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "CommonRUKTools/RWReg.h"
-#include "MusicManagment/playback/PlaySoundContainer.h"
+#include "MusicManagment/playback/GainBackend.h"
 #include "MusicManagment/playback/mci/MciInterface.h"
 
 // The kind of device that plays files with this name: what the settings say under its extension ("MP3"), or
@@ -9,7 +9,7 @@
 QString MciDeviceType(const QString& fileName, const TRWReg& extensions);
 
 // A song that the system's own player plays. Every operation throws EMCIException when it refuses.
-class TMCIPlaySound : public TPlaySoundContainer {
+class TMCIPlaySound : public TPlaySoundContainer, public GainBackend {
  public:
     // Where the settings keep device types by extension.
     static constexpr QStringView kExtensionsKey = u"\\Software\\RUK\\Tunestead3\\mci extensions";
@@ -30,6 +30,7 @@ class TMCIPlaySound : public TPlaySoundContainer {
     void SetPosition(quint32 milliseconds) override;
     quint32 GetLength() override;
     TPSStatus GetStatus() override;
+    void SetGain(float gain) override;
 
  private:
     void Send(MciCommand command, quint32 flags, MciParameters parameters = {});

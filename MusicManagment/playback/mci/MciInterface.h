@@ -16,14 +16,18 @@ enum class MciCommand : quint32 {
     Pause = 2057,
     Set = 2061,
     Status = 2068,
+    SetAudio = 2163,
 };
 
-inline constexpr quint32 kMciNotify = 1;              // Play: without a window to notify
-inline constexpr quint32 kMciTo = 8;                  // Seek
-inline constexpr quint32 kMciSeekToStart = 256;       // Seek
-inline constexpr quint32 kMciStatusItem = 256;        // Status
-inline constexpr quint32 kMciSetTimeFormat = 1024;    // Set
-inline constexpr quint32 kMciOpenTypeElement = 8704;  // Open: both are given
+inline constexpr quint32 kMciNotify = 1;                 // Play: without a window to notify
+inline constexpr quint32 kMciTo = 8;                     // Seek
+inline constexpr quint32 kMciSeekToStart = 256;          // Seek
+inline constexpr quint32 kMciStatusItem = 256;           // Status
+inline constexpr quint32 kMciSetTimeFormat = 1024;       // Set
+inline constexpr quint32 kMciOpenTypeElement = 8704;     // Open: both are given
+inline constexpr quint32 kMciSetAudioItem = 0x180'0000;  // SetAudio: item and value are given
+inline constexpr quint32 kMciAudioVolume = 0x4002;       // item of SetAudio
+inline constexpr quint32 kMciFullVolume = 1000;
 inline constexpr quint32 kMciFormatMilliseconds = 0;  // Set
 inline constexpr quint32 kMciStatusLength = 1;        // items of Status
 inline constexpr quint32 kMciStatusPosition = 2;
@@ -42,10 +46,10 @@ struct MciParameters {
     QString DeviceType{};    // Open
     QString Element{};       // Open: the name of a file in the current directory
     quint32 TimeFormat = 0;  // Set
-    quint32 Item = 0;        // Status
+    quint32 Item = 0;        // Status, SetAudio
     quint32 To = 0;          // Seek, ms
     quint32 Device = 0;      // the answer of Open
-    quint32 Value = 0;       // the answer of Status
+    quint32 Value = 0;       // SetAudio; the answer of Status
 };
 
 class MciInterface {

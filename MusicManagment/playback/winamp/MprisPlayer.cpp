@@ -15,6 +15,7 @@ namespace {
 constexpr QLatin1StringView kPrefix("org.mpris.MediaPlayer2.");
 constexpr QLatin1StringView kInstance(".instance");
 constexpr QLatin1StringView kOwnName("tunestead");
+const QString kPlayerInterface = u"org.mpris.MediaPlayer2.Player"_s;
 
 QDBusMessage Message(const QString& name, const QString& interface, const QString& method,
                      const QVariantList& arguments) {
@@ -71,7 +72,7 @@ QString MprisPlayer::PlainName() const {
 }
 
 QDBusMessage MprisPlayer::PlayerMessage(const QString& method, const QVariantList& arguments) const {
-    return Message(name_, u"org.mpris.MediaPlayer2.Player"_s, method, arguments);
+    return Message(name_, kPlayerInterface, method, arguments);
 }
 
 MprisPlayer::Answer MprisPlayer::Call(const QString& method, const QVariantList& arguments) const {
@@ -83,9 +84,13 @@ void MprisPlayer::Send(const QString& method, const QVariantList& arguments) con
     bus_.send(PlayerMessage(method, arguments));
 }
 
+void MprisPlayer::SendVolume(double volume) const {
+    bus_.send(PropertiesMessage(name_, u"Set"_s,
+                                {kPlayerInterface, u"Volume"_s, QVariant::fromValue(QDBusVariant(volume))}));
+}
+
 QDBusPendingCall MprisPlayer::AskState() const {
-    return bus_.asyncCall(PropertiesMessage(name_, u"GetAll"_s, {u"org.mpris.MediaPlayer2.Player"_s}),
-                          answerTimeout_);
+    return bus_.asyncCall(PropertiesMessage(name_, u"GetAll"_s, {kPlayerInterface}), answerTimeout_);
 }
 
 MprisPlayer::Answer MprisPlayer::ReadState(MprisState& state) const {

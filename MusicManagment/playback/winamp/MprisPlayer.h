@@ -44,6 +44,7 @@ class MprisPlayer {
 
     // These do not.
     void Send(const QString& method, const QVariantList& arguments = {}) const;
+    void SendVolume(double volume) const;  // 1 is the player's usual loudest
     QDBusPendingCall AskState() const;
     static Answer TakeState(const QDBusMessage& answer, MprisState& state);
 

@@ -4,6 +4,7 @@
 #include <QFileInfo>
 #include <QPointer>
 #include <QUrl>
+#include <cmath>
 #include <limits>
 
 #include "CommonRUKTools/Clock.h"
@@ -160,6 +161,11 @@ quint32 TWinAmpPlaySound::GetPosition() {
 quint32 TWinAmpPlaySound::GetLength() {
     Follow();
     return ToMilliseconds(state_.Length);
+}
+
+// Players understand volume as it is set on a slider: about the root of the amplitude.
+void TWinAmpPlaySound::SetGain(float gain) {
+    if (player_) player_->SendVolume(std::sqrt(static_cast<double>(gain)));
 }
 
 TPSStatus TWinAmpPlaySound::GetStatus() {

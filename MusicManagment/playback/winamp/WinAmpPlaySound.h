@@ -8,7 +8,7 @@
 #include <optional>
 
 #include "MusicManagment/playback/EngineErrors.h"
-#include "MusicManagment/playback/PlaySoundContainer.h"
+#include "MusicManagment/playback/GainBackend.h"
 #include "MusicManagment/playback/winamp/MprisPlayer.h"
 #include "MusicManagment/playback/winamp/PlayerProgram.h"
 
@@ -28,7 +28,7 @@ struct TWinAmpSettings {
 
 // A song in another music player of the desktop. What waits for that player keeps the interface alive and may
 // be overtaken by another song, or by the end of this object: it then throws EAbort.
-class TWinAmpPlaySound : public TPlaySoundContainer {
+class TWinAmpPlaySound : public TPlaySoundContainer, public GainBackend {
  public:
     explicit TWinAmpPlaySound(const TWinAmpSettings& settings = {}, QObject* parent = nullptr);
     ~TWinAmpPlaySound() override;
@@ -45,6 +45,7 @@ class TWinAmpPlaySound : public TPlaySoundContainer {
     quint32 GetPosition() override;
     quint32 GetLength() override;
     TPSStatus GetStatus() override;
+    void SetGain(float gain) override;
 
  private:
     using Player = std::shared_ptr<const MprisPlayer>;

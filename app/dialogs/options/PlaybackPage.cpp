@@ -100,6 +100,9 @@ void PlaybackPage::AddEngines() {
         fields_.BindBool(box, name, true);
         engines_.push_back(box);
     }
+    auto* apart = AddCheck(group, u"PSPlayExtern"_s, u"In einem eigenen Programm (TSPla&yer)"_s,
+                           u"Die Songs spielt dann ein zweites Programm, das dieses hier steuert."_s);
+    fields_.BindBool(apart, u"PSPlayExtern"_s, false);
 }
 
 void PlaybackPage::AddFmod() {

@@ -1,3 +1,4 @@
+#include "CommonRUKTools/RWReg.h"
 #include "tests/playback/control/PlayerRig.h"
 
 // Playing in a separate player program.
@@ -191,6 +192,17 @@ TEST_F(ExternalTest, SwitchingTakesTheSongAlong) {
     player_.SetPlayExtern(true);
     EXPECT_EQ(script_.Take(), QStringList(u"17 \"a.mp3\""_s));
     EXPECT_EQ(Open(), QString());
+}
+
+TEST_F(ExternalTest, WhereSongsPlayIsKeptWithTheSettings) {
+    TRWReg settings(u"Test"_s, folder_.Path(u"settings.conf"_s));
+    player_.SaveSettings(settings);
+    player_.SetPlayExtern(false);
+    player_.LoadSettings(settings);
+    EXPECT_TRUE(player_.PlayExtern());
+    settings.WriteBool(u"PSPlayExtern"_s, false);
+    player_.LoadSettings(settings);
+    EXPECT_FALSE(player_.PlayExtern());
 }
 
 TEST_F(ExternalTest, WithoutAPlaceForFeedbackAnExceptionSaysWhy) {

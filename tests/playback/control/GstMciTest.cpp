@@ -52,6 +52,7 @@ TEST_F(GstMciTest, SongPlaysPausesSeeksAndEnds) {
     EXPECT_EQ(sound_.GetPosition(), 0U);
 
     sound_.Play();
+    sound_.SetGain(0.5F);
     EXPECT_EQ(sound_.GetStatus(), psPlaying);
     PlayTo(50);
     sound_.PauseResume();

@@ -97,6 +97,17 @@ TEST_F(MciTest, OperationsAreCommands) {
     EXPECT_EQ(mci_.Log, QStringList({u"2052 0@5"_s}));
 }
 
+TEST_F(MciTest, ADeviceWithoutVolumePlaysOn) {
+    sound_.SetGain(0.5F);  // nothing is open
+    EXPECT_TRUE(mci_.Log.isEmpty());
+    OpenQuietly(u"a.mp3"_s);
+    mci_.Errors[MciCommand::SetAudio] = 1;
+    sound_.SetGain(0.5F);
+    EXPECT_EQ(mci_.Log, QStringList({u"2163 25165824@5"_s}));
+    EXPECT_EQ(mci_.Last.Item, 0x4002U);
+    EXPECT_EQ(mci_.Last.Value, 500U);
+}
+
 TEST_F(MciTest, SeekingPlaysWhateverItDidBefore) {
     OpenQuietly(u"a.mp3"_s);
     mci_.Values[4] = 529;

@@ -101,6 +101,17 @@ TEST_F(PlaySoundTest, StatusesNobodyCanSetAreIgnored) {
     EXPECT_EQ(player_.GetStatus(), psPlaying);
 }
 
+TEST_F(PlaySoundTest, LoudnessHoldsForTheSongAndThoseAfterIt) {
+    PlaySong(u"a.mp3"_s);
+    EXPECT_EQ(Any(u"a"_s).Gain, -1);  // another program keeps its own
+    player_.SetGain(0.5F);
+    EXPECT_EQ(Any(u"a"_s).Gain, 0.5F);
+    PlaySong(u"b.mp3"_s);
+    EXPECT_EQ(Any(u"b"_s).Gain, 0.5F);
+    player_.SetGain(7);
+    EXPECT_EQ(Any(u"b"_s).Gain, 1);
+}
+
 TEST_F(PlaySoundTest, MenuHasItsCommands) {
     QStringList rows;
     for (const auto& item : player_.Menu().Items())

@@ -7,6 +7,7 @@
 
 #include "CommonRUKTools/Clock.h"
 #include "MusicManagment/playback/FadingBackend.h"
+#include "MusicManagment/playback/GainBackend.h"
 #include "MusicManagment/playback/PlaySound.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
@@ -34,7 +35,7 @@ struct Stage {
 };
 
 // A song that plays as far as the test's clock has gone.
-class ScriptedBackend : public TPlaySoundContainer {
+class ScriptedBackend : public TPlaySoundContainer, public GainBackend {
  public:
     ScriptedBackend(Stage& stage, QString engine) : stage_(stage), engine_(std::move(engine)) {
         stage_.Alive.push_back(this);
@@ -46,6 +47,7 @@ class ScriptedBackend : public TPlaySoundContainer {
 
     TPSStatus Status = psClosed;
     quint32 Length = 180'000;
+    float Gain = -1;  // until one is set
     std::function<void()> OnPositionAsked;
 
     QString Song() const { return QFileInfo(BackendFile()).completeBaseName(); }
@@ -82,6 +84,7 @@ class ScriptedBackend : public TPlaySoundContainer {
     }
     quint32 GetLength() override { return Length; }
     TPSStatus GetStatus() override { return Status; }
+    void SetGain(float gain) override { Gain = gain; }
 
  protected:
     void Note(const char* what) {

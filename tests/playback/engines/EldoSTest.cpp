@@ -28,6 +28,7 @@ class RecordingOutput : public PushOutput {
         int rate = 0;
         int channels = 0;
         int opened = 0;
+        float gain = 1;
         bool paused = true;
         bool lost = false;
         bool canOpen = true;
@@ -51,6 +52,7 @@ class RecordingOutput : public PushOutput {
     std::size_t Queued() override { return record_.queued; }
     void Clear() override { record_.queued = 0; }
     void SetPaused(bool paused) override { record_.paused = paused; }
+    void SetGain(float gain) override { record_.gain = gain; }
     bool Failed() const override { return record_.lost; }
 
  private:
@@ -220,6 +222,14 @@ TEST_F(EldoSTest, PositionFollowsPauseStopAndTheTime) {
     timed.Play();
     clock.Now_ += 5000;
     EXPECT_EQ(timed.GetPosition(), 743U);
+}
+
+TEST_F(EldoSTest, LoudnessIsThatOfItsOutput) {
+    const auto sound = Sound(ToneFile(u".wav"_s));
+    sound->SetGain(0.5F);  // nothing is open
+    sound->Open();
+    sound->SetGain(0.5F);
+    EXPECT_EQ(record_.gain, 0.5F);
 }
 
 TEST_F(EldoSTest, ASongThatHasEndedBeginsAnew) {

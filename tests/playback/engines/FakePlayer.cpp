@@ -45,6 +45,10 @@ QDBusMessage FakePlayer::Answer(const QDBusMessage& message) {
         ++StatesTold;
         return message.createReply(State());
     }
+    if (message.member() == "Set"_L1 && message.arguments().value(1) == u"Volume"_s) {
+        Volume = message.arguments().value(2).value<QDBusVariant>().variant().toDouble();
+        return message.createReply();
+    }
     return message.createReply(QVariant::fromValue(QDBusVariant(Schemes)));
 }
 

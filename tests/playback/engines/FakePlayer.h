@@ -29,6 +29,7 @@ class FakePlayer : public QDBusVirtualObject {
     qint64 Length = 180 * 1000 * 1000;  // microseconds
     QStringList Calls;                  // of the player's own interface
     int StatesTold = 0;
+    double Volume = 0.8;
 
     void Appear();
     void Vanish();

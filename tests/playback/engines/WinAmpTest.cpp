@@ -159,6 +159,17 @@ TEST_F(WinAmpTest, WhatTheUserDoesInThePlayerIsNoticed) {
     EXPECT_EQ(sound->GetStatus(), psPlaying);
 }
 
+TEST_F(WinAmpTest, LoudnessIsThatOfTheOtherPlayersSlider) {
+    const auto sound = Playing();
+    sound->SetGain(0.25F);
+    EXPECT_TRUE(WaitUntil([this] { return player_.Volume == 0.5; }, kPatience));
+    sound->Close();
+    sound->SetGain(1);  // no longer ours
+    MprisState state;
+    MprisPlayer(client_, u"org.mpris.MediaPlayer2.fake"_s, 1000).ReadState(state);
+    EXPECT_EQ(player_.Volume, 0.5);
+}
+
 TEST_F(WinAmpTest, APlayerWithoutOpenUriIsStartedAgainWithTheFile) {
     PlayerScript script(folder_.filePath(u"fake"_s), [this](const QString& file) { player_.Load(file); });
     settings_.File = script.Path();
