@@ -1,6 +1,7 @@
 #!/usr/bin/env bash
-# Plays a tone through a sound server of its own, whose only sink is a virtual one, records what the sink was given and
-# looks for the tone in it. Argument: tunestead-cli. Runs itself again under a session bus of its own.
+# Plays a tone with every engine that sounds by itself, through a sound server of the test's whose only sink is a virtual
+# one, records what the sink was given and looks for the tone in it. Argument: tunestead-cli. Runs itself again under a
+# session bus of its own.
 set -euo pipefail
 cli=$(realpath "$1")
 if [ "${2:-}" != inside ]; then
@@ -30,22 +31,32 @@ done
 await sh -c 'pactl list short sinks | grep -q auto_null'
 
 sox -n -r 44100 -c 2 "$folder/tone.wav" synth 4 sine 660 gain -8
-parec -d auto_null.monitor --latency-msec=30 --rate=44100 --channels=2 --format=s16le >"$folder/heard.raw" &
-recorder=$!
-await test -s "$folder/heard.raw"
-"$cli" play --engine fmod --output pulseaudio "$folder/tone.wav"
-kill "$recorder"
-
-# The sound server begins and ends with silence.
-sox -r 44100 -c 2 -e signed -b 16 -t raw "$folder/heard.raw" "$folder/heard.wav" \
-    silence 1 0.05 1% reverse silence 1 0.05 1% reverse
-figures=$(sox "$folder/heard.wav" -n remix 1 stat 2>&1)  # of both channels at once it tells a wrong frequency
 value() { awk -F: -v name="$1" '{ gsub(/ +/, " ", $1) } $1 == name { print $2 + 0 }' <<<"$figures"; }
-length=$(value 'Length (seconds)')
-loudness=$(value 'RMS amplitude')
-pitch=$(value 'Rough frequency')
-echo "heard $length s, loudness $loudness, about $pitch Hz"
-awk -v length_="$length" -v loudness="$loudness" -v pitch="$pitch" 'BEGIN {
-    # -8 dB of a full sine is 0.281; the clock of a virtual sink may be some per cent off.
-    exit !(length_ > 3.5 && length_ < 4.5 && loudness > 0.25 && loudness < 0.31 && pitch > 640 && pitch < 680)
-}'
+
+# Arguments: those of the command line that play the tone.
+hear() {
+    local recorder figures length loudness pitch
+    rm -f "$folder/heard.raw"
+    parec -d auto_null.monitor --latency-msec=30 --rate=44100 --channels=2 --format=s16le >"$folder/heard.raw" &
+    recorder=$!
+    await test -s "$folder/heard.raw"
+    "$cli" play "$@" "$folder/tone.wav"
+    kill "$recorder"
+
+    # The sound server begins and ends with silence.
+    sox -r 44100 -c 2 -e signed -b 16 -t raw "$folder/heard.raw" "$folder/heard.wav" \
+        silence 1 0.05 1% reverse silence 1 0.05 1% reverse
+    figures=$(sox "$folder/heard.wav" -n remix 1 stat 2>&1)  # of both channels at once it tells a wrong frequency
+    length=$(value 'Length (seconds)')
+    loudness=$(value 'RMS amplitude')
+    pitch=$(value 'Rough frequency')
+    echo "$*: heard $length s, loudness $loudness, about $pitch Hz"
+    awk -v length_="$length" -v loudness="$loudness" -v pitch="$pitch" 'BEGIN {
+        # -8 dB of a full sine is 0.281; the clock of a virtual sink may be some per cent off.
+        exit !(length_ > 3.5 && length_ < 4.5 && loudness > 0.25 && loudness < 0.31 && pitch > 640 && pitch < 680)
+    }'
+}
+
+hear --engine fmod --output pulseaudio
+hear --engine eldos
+hear --engine mci
