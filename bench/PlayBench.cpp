@@ -3,7 +3,6 @@
 // its first sound; time and error of a seek. The output is one that takes the mix as fast as it comes.
 
 #include <benchmark/benchmark.h>
-#include <sys/resource.h>
 
 #include <QProcess>
 #include <QTemporaryDir>
@@ -14,6 +13,7 @@
 #include "MusicManagment/playback/fmod/FFmpegSource.h"
 #include "MusicManagment/playback/fmod/SinkOutput.h"
 #include "MusicManagment/playback/fmod/SoundLibrary.h"
+#include "bench/ProcessorTime.h"
 #include "tests/playback/SoundFiles.h"
 
 namespace {
@@ -56,17 +56,6 @@ QString Path(std::size_t file) {
     const QString path = folder.filePath(QString::fromLatin1(kFiles[file].name));
     if (!QFile::exists(path)) Encode(path, music, kFiles[file].encoding);
     return path;
-}
-
-// Processor time, ms: RUSAGE_SELF of this program, RUSAGE_CHILDREN of all that it has started and that have
-// ended.
-double TimeOf(int who) {
-    rusage usage{};
-    getrusage(who, &usage);
-    const auto ms = [](const timeval& time) {
-        return 1000.0 * static_cast<double>(time.tv_sec) + static_cast<double>(time.tv_usec) / 1000;
-    };
-    return ms(usage.ru_utime) + ms(usage.ru_stime);
 }
 
 // The library over an output that is pulled by hand.
@@ -119,9 +108,9 @@ constexpr int kHeardSeconds = 5;
 void MeasureRealTime(benchmark::State& state, const std::function<void()>& hear) {
     double spent = 0;
     for (auto _ : state) {
-        const double before = TimeOf(RUSAGE_SELF);
+        const double before = ProcessorTime(RUSAGE_SELF);
         hear();
-        spent += TimeOf(RUSAGE_SELF) - before;
+        spent += ProcessorTime(RUSAGE_SELF) - before;
     }
     state.counters["CPU ms a second"] = spent / static_cast<double>(state.iterations()) / kHeardSeconds;
     Name(state);
@@ -172,12 +161,12 @@ void DecodeOnly(benchmark::State& state) {
 void DecodeByProgram(benchmark::State& state) {
     const QString path = Path(static_cast<std::size_t>(state.range(0)));
     const QString command = QStringLiteral("ffmpeg -v quiet -threads 1 -i %1 -f null -").arg(path);
-    const double before = TimeOf(RUSAGE_CHILDREN);
+    const double before = ProcessorTime(RUSAGE_CHILDREN);
     for (auto _ : state) {
         if (QProcess::execute(QStringLiteral("/bin/sh"), {QStringLiteral("-c"), command}) != 0)
             return state.SkipWithError("no ffmpeg");
     }
-    const double spent = TimeOf(RUSAGE_CHILDREN) - before;
+    const double spent = ProcessorTime(RUSAGE_CHILDREN) - before;
     state.counters["CPU ms a second"] = spent / static_cast<double>(state.iterations()) / kSeconds;
     Name(state);
 }
