@@ -59,6 +59,7 @@ TVisPlaySound::TVisPlaySound(TPlaySound& player, const TPlayList& list, QWidget*
     setAccessibleName(u"Player"_s);
     SetUpSlider();
     SetUpCrossover();
+    layout_->setSizeConstraint(QLayout::SetNoConstraint);  // minimumSizeHint tells how small it can be
     layout_->setContentsMargins(8, 4, 8, 4);
     layout_->setSpacing(8);
     buttons_ = MakeButtons();
@@ -176,7 +177,8 @@ QSize TVisPlaySound::minimumSizeHint() const {
     int width = 0;
     for (int i = 0; i < layout_->count(); ++i)
         width = std::max(width, layout_->itemAt(i)->minimumSize().width());
-    return {width, QWidget::minimumSizeHint().height()};
+    const QMargins margins = layout_->contentsMargins();
+    return {margins.left() + width + margins.right(), QWidget::minimumSizeHint().height()};
 }
 
 void TVisPlaySound::Arrange() {
