@@ -237,6 +237,7 @@ void TVisPlaySound::ShowState() {
     play_->setToolTip(playing ? u"Pause (F6)"_s : u"Play (F5)"_s);
     stop_->setEnabled(playing || status == psPaused);
     previous_->setEnabled(list_.HasPrevious());
+    volume_->setEnabled(!player_.PlayExtern());  // the other program has its own
 }
 
 QString TVisPlaySound::EngineText() const {
