@@ -20,6 +20,20 @@ QString WithAccessKey(const QString& caption, QString& taken) {
     return text;
 }
 
+void AddAccessKeys(const QMenu& menu) {
+    QString taken;
+    QList<QAction*> unmarked;
+    for (QAction* action : menu.actions()) {
+        const qsizetype mark = action->text().indexOf(u'&');
+        if (mark >= 0)
+            taken += action->text().mid(mark + 1, 1).toLower();
+        else if (!action->isSeparator())
+            unmarked << action;
+    }
+    for (QAction* action : unmarked)
+        action->setText(WithAccessKey(action->text(), taken));
+}
+
 namespace {
 
 // The Enter key of the number block does what Return does.

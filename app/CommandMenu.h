@@ -13,6 +13,8 @@ class TMenuExItem;
 // A caption with a mark at its first letter that is not in `taken`, by which the keyboard chooses it; the
 // letter is taken then.
 QString WithAccessKey(const QString& caption, QString& taken);
+// Marks those items of a menu that have no such letter yet.
+void AddAccessKeys(const QMenu& menu);
 
 // The command menu of a component as the toolkit shows it.
 class CommandMenu {

@@ -21,6 +21,7 @@
 #include "MusicManagment/database/IntakeReport.h"
 #include "MusicManagment/database/Settings.h"
 #include "app/ArrangementCommands.h"
+#include "app/CommandMenu.h"
 #include "app/CommandRunner.h"
 #include "app/HelpMenu.h"
 #include "app/MainMenu.h"
@@ -159,6 +160,7 @@ void TTunesteadMainWnd::SetUpMenu() {
     playing_->AddTo(windows);
     arrangement_ = std::make_unique<ArrangementCommands>(*this, *list_);
     arrangement_->AddTo(windows);
+    AddAccessKeys(windows);
     AddHelpMenu(*menuBar(), *this);
     list_->OnContextMenu = [this](const QPoint& place) { menu_->SongMenu().popup(place); };
 }

@@ -469,4 +469,18 @@ TEST_F(MainWindowTest, WhatWasRemovedWithTheProgramDoesNotComeBack) {
     SetTrash(nullptr);
 }
 
+TEST_F(MainWindowTest, EveryMenuItemHasALetterOfItsOwn) {
+    Start();
+    for (const auto* menu : window_->menuBar()->findChildren<QMenu*>()) {
+        QStringList letters;
+        for (const QAction* action : menu->actions()) {
+            if (action->isSeparator()) continue;
+            const qsizetype mark = action->text().indexOf(u'&');
+            EXPECT_GE(mark, 0) << action->text().toStdString();
+            letters << action->text().mid(mark + 1, 1).toLower();
+        }
+        EXPECT_EQ(letters.removeDuplicates(), 0) << menu->title().toStdString();
+    }
+}
+
 }  // namespace
