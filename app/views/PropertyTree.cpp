@@ -13,6 +13,7 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
+constexpr int kLeastRows = 12;  // lines of text that can be seen
 constexpr int kNameColumn = 0;
 constexpr int kValueColumn = 1;
 
@@ -120,6 +121,8 @@ void PropertyTree::contextMenuEvent(QContextMenuEvent* event) {
 
 // No name is cut, whatever the font.
 void PropertyTree::FitToFont() {
+    // Beside other tool windows it would be given no more than a peephole.
+    setMinimumHeight(kLeastRows * fontMetrics().height());
     ensurePolished();
     const int widest = fontMetrics().horizontalAdvance(u"Änderungsdatum"_s);
     const int frame = 3 * fontMetrics().averageCharWidth();
