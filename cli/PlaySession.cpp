@@ -145,6 +145,7 @@ class Session {
         if (list_.Count() > 0) list_.PlayNext();
         options_.Fast ? WriteMix() : Listen();
         WriteBegun();
+        if (library_->OutputLost()) TellOutputLost();
         player_.SetFileName(QString());
         return complete && !dialogs_.Failed() ? esDone : esFailed;
     }
@@ -160,6 +161,16 @@ class Session {
         }
         return complete;
     }
+
+    // The sound stands still then, and no song would ever end.
+    void TellOutputLost() {
+        dialogs_.ShowMessage(
+            MessageKind::Error,
+            u"Die Ausgabe ist nicht vollständig, weil der Datenträger voll ist oder die Datei 4 GiB hat: "_s +
+                options_.Output->name);
+    }
+
+    bool GoesOn() { return !Over() && !InterruptRequested() && !library_->OutputLost(); }
 
     bool Over() {
         const PlayTimers& timers = player_.Timers();
@@ -178,7 +189,7 @@ class Session {
     void WriteMix() {
         MixClock clock;
         const auto frames = static_cast<std::size_t>(options_.Engines.FMODMixRate) * kLookEvery / 1000;
-        while (!Over() && !InterruptRequested()) {
+        while (GoesOn()) {
             WriteBegun();
             library_->Advance(frames);
             clock.Pass(kLookEvery);
@@ -191,7 +202,7 @@ class Session {
         if (line_.IsWatched()) keys.emplace();
         QTimer wake;
         wake.start(kLookEvery);
-        while (!Over() && !InterruptRequested()) {
+        while (GoesOn()) {
             WriteBegun();
             QCoreApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents);
             const auto key = keys ? keys->Read() : std::nullopt;
