@@ -151,14 +151,20 @@ class Session {
     }
 
  private:
-    // False when a path leads to nothing.
+    // False when a path or an entry of a playlist leads to nothing.
     bool FillList() {
         bool complete = true;
-        for (const QString& path : options_.Paths) {
-            if (list_.InsertFiles(list_.Count(), {path}) > 0) continue;
-            console_.Message(u"Nichts zum Abspielen gefunden: "_s + path);
+        const auto tell = [&](const QString& text) {
+            console_.Message(text);
             complete = false;
-        }
+        };
+        for (const QString& path : options_.Paths)
+            if (list_.InsertFiles(list_.Count(), {path}) == 0)
+                tell(u"Nichts zum Abspielen gefunden: "_s + path);
+        // Playing passes over them without a word.
+        for (int i = 0; i < list_.Count(); ++i)
+            if (!QFileInfo(list_.Entry(i).Name).isFile())
+                tell(u"Die Datei ist nicht verfügbar: "_s + list_.Entry(i).Name);
         return complete;
     }
 
