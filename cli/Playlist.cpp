@@ -32,7 +32,6 @@ void WriteJson(const TPlayList& list, Console& console) {
 }
 
 int RunPlaylist(const Arguments& arguments, Console& console) {
-    if (arguments.Operands().size() > 1) throw EUsageError(u"Es kann nur eine PlayList angegeben werden."_s);
     if (arguments.Has(u"--out") && arguments.Has(u"--json"))
         throw EUsageError(u"--out und --json schließen sich aus."_s);
     TPlayList list;
@@ -61,7 +60,7 @@ const CommandRow kPlaylistCommand = {
     u"Tabulatoren getrennt. Felder im JSON-Format: index, name und, wenn die PlayList sie enthält, die "
     u"Felder\n"
     u"des Datensatzes, wie der Befehl info sie zeigt.\n",
-    {u"DATEI", u"PlayList"},
+    {.Name = u"DATEI", .Help = u"PlayList", .Several = false},
     kOptions,
     RunPlaylist,
 };
