@@ -17,7 +17,7 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr qint64 kSilentTime = 300;  // ms
+constexpr qint64 kSilentTime = 100;  // ms
 constexpr std::size_t kEntriesPerProgressPoint = 5;
 
 // A drop that takes its time becomes a long operation of the database, so that the user sees how far it is

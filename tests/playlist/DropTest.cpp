@@ -7,15 +7,17 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-// At every look a second has passed.
-class SlowClock : public Clock {
+// At every look `Step` milliseconds have passed.
+class SteppingClock : public Clock {
  public:
-    SlowClock() { SetClock(this); }
-    ~SlowClock() override { SetClock(nullptr); }
-    SlowClock(const SlowClock&) = delete;
-    SlowClock& operator=(const SlowClock&) = delete;
+    SteppingClock() { SetClock(this); }
+    ~SteppingClock() override { SetClock(nullptr); }
+    SteppingClock(const SteppingClock&) = delete;
+    SteppingClock& operator=(const SteppingClock&) = delete;
 
-    qint64 Ticks() const override { return ticks_ += 1000; }
+    qint64 Step = 0;
+
+    qint64 Ticks() const override { return ticks_ += Step; }
     double Now() const override { return 0; }
 
  private:
@@ -65,6 +67,7 @@ TEST_F(DropTest, ADropThatTakesItsTimeIsALongOperationThatTheUserCanStop) {
     list_.SetMusicDatabase(&database);
     for (const QChar song : u"abcdefghijkl"_s)
         folder_.Add(u"sub/"_s + song + u".wav"_s, 1);
+    SteppingClock clock;
     int starts = 0;
     int ends = 0;
     qint64 stopAt = -1;
@@ -79,7 +82,7 @@ TEST_F(DropTest, ADropThatTakesItsTimeIsALongOperationThatTheUserCanStop) {
     EXPECT_EQ(starts, 0);  // at once, and nobody was told
 
     list_.Clear();
-    const SlowClock clock;
+    clock.Step = 1000;
     EXPECT_EQ(list_.InsertFiles(0, {folder_.Path(u"sub"_s)}), 12);
     list_.Clear();
     stopAt = 5;
