@@ -53,13 +53,11 @@ constexpr OptionRow kOptions[] = {
 const CommandRow kPlaylistCommand = {
     u"playlist",
     u"Zeigt eine PlayList oder wandelt sie um",
-    u"Das Format einer PlayList wird an ihren ersten Bytes erkannt, das Format von DATEI2 richtet sich nach\n"
-    u"der Endung: .rukpl und .rpl eigenes Format, .m3u und .extpl M3U, .pls und .inipl PLS, alles andere "
-    u"ein\n"
-    u"Pfad je Zeile. Eine Zeile je Eintrag: Nummer (ab 0), Interpret, Titel, Länge und Name, durch\n"
-    u"Tabulatoren getrennt. Felder im JSON-Format: index, name und, wenn die PlayList sie enthält, die "
-    u"Felder\n"
-    u"des Datensatzes, wie der Befehl info sie zeigt.\n",
+    u"Das Format einer PlayList wird an ihren ersten Bytes erkannt, das Format von DATEI2 richtet sich\n"
+    u"nach der Endung: .rukpl und .rpl eigenes Format, .m3u und .extpl M3U, .pls und .inipl PLS, alles\n"
+    u"andere ein Pfad je Zeile. Eine Zeile je Eintrag: Nummer (ab 0), Interpret, Titel, Länge und Name,\n"
+    u"durch Tabulatoren getrennt. Felder im JSON-Format: index, name und, wenn die PlayList sie enthält,\n"
+    u"die Felder des Datensatzes, wie der Befehl info sie zeigt.\n",
     {.Name = u"DATEI", .Help = u"PlayList", .Several = false},
     kOptions,
     RunPlaylist,
