@@ -20,7 +20,7 @@ class SilentDialogs : public Dialogs {
     std::optional<QString> OpenFile(const FileDialogOptions&) override { return std::nullopt; }
     QStringList OpenFiles(const FileDialogOptions&) override { return {}; }
     std::optional<QString> SaveFile(const FileDialogOptions&) override { return std::nullopt; }
-    std::optional<QString> ChooseFolder(const QString&) override { return std::nullopt; }
+    std::optional<QString> ChooseFolder(const QString&, const QString&) override { return std::nullopt; }
 };
 
 Dialogs*& Installed() {

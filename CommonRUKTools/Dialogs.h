@@ -31,7 +31,8 @@ class Dialogs {
     virtual std::optional<QString> OpenFile(const FileDialogOptions& options) = 0;
     virtual QStringList OpenFiles(const FileDialogOptions& options) = 0;
     virtual std::optional<QString> SaveFile(const FileDialogOptions& options) = 0;
-    virtual std::optional<QString> ChooseFolder(const QString& caption) = 0;
+    // `startFolder` is shown first; without one it is up to the dialog.
+    virtual std::optional<QString> ChooseFolder(const QString& caption, const QString& startFolder = {}) = 0;
 };
 
 // The dialogs in use. Before any are set, messages go to standard error and every question is cancelled.

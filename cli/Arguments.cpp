@@ -64,8 +64,8 @@ void Arguments::Check(std::span<const OptionRow> options, const OperandRow& oper
     const bool takesOperands = !QStringView(operands.Name).isEmpty();
     if (takesOperands && operands_.isEmpty())
         throw EUsageError(QString::fromUtf16(operands.Name) + u" fehlt."_s);
-    if (!takesOperands && !operands_.isEmpty())
-        throw EUsageError(u"Überzähliges Argument: "_s + operands_.first());
+    const qsizetype most = !takesOperands ? 0 : operands.Several ? operands_.size() : 1;
+    if (operands_.size() > most) throw EUsageError(u"Überzähliges Argument: "_s + operands_[most]);
     if (operands_.contains(QString())) throw EUsageError(u"Ein Dateiname ist leer."_s);
 }
 

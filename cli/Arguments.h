@@ -25,6 +25,7 @@ struct OptionRow {
 struct OperandRow {
     const char16_t* Name;  // empty: nothing may stand there; otherwise at least one must
     const char16_t* Help;
+    bool Several = true;  // whether more than one may stand there
 };
 
 // The words behind the command, sorted out.

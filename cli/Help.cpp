@@ -35,7 +35,8 @@ QString Synopsis(const CommandRow& command) {
     for (const auto& option : command.Options)
         line += option.Required ? u' ' + Word(option) : u" ["_s + Word(option) + u']';
     const QString operands = QString::fromUtf16(command.Operands.Name);
-    return operands.isEmpty() ? line : line + u' ' + operands + u"…"_s;
+    if (operands.isEmpty()) return line;
+    return line + u' ' + operands + (command.Operands.Several ? u"…"_s : QString());
 }
 
 }  // namespace

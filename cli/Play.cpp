@@ -97,12 +97,12 @@ constexpr OptionRow kOptions[] = {
     {u"--scan", u"MS", u"spielt jeden Song nur so viele Millisekunden an"},
     {u"--crossfade", u"MS", u"Dauer der Überblendung (Vorgabe 10000); unter 3000 wird nicht überblendet"},
     {u"--mode", u"ART",
-     u"wann überblendet wird: none, auto (am Ende eines Songs; Vorgabe), all\n(auch bei n und p) oder "
-     u"always"},
+     u"wann überblendet wird: none, auto (am Ende eines Songs; Vorgabe),\n"
+     u"all (auch bei n und p) oder always"},
     {u"--engine", u"ENGINE", u"nur diese: fmod, eldos, mci oder winamp (Vorgabe: fmod, ersatzweise mci)"},
     {u"--output", u"AUSGABE",
-     u"null, file:DATEI.wav oder ein Treiber wie pulseaudio, pipewire\noder alsa; sonst sucht das Programm "
-     u"selbst"},
+     u"null, file:DATEI.wav oder ein Treiber wie pulseaudio, pipewire\n"
+     u"oder alsa; sonst sucht das Programm selbst"},
     {u"--fast", u"", u"so schnell wie möglich; nur mit --output file:DATEI oder null"},
 };
 
@@ -111,9 +111,8 @@ constexpr OptionRow kOptions[] = {
 const CommandRow kPlayCommand = {
     u"play",
     u"Spielt Songs, Ordner und PlayLists ab",
-    u"Jeder Song, der beginnt, steht mit seinem Pfad auf der Standardausgabe. Am Terminal: Leertaste hält "
-    u"an\n"
-    u"und setzt fort, n und p spielen den nächsten und vorherigen Song, q und Strg-C beenden.\n",
+    u"Jeder Song, der beginnt, steht mit seinem Pfad auf der Standardausgabe. Am Terminal: Leertaste\n"
+    u"hält an und setzt fort, n und p spielen den nächsten und vorherigen Song, q und Strg-C beenden.\n",
     {u"PFAD", u"Musikdatei, Ordner oder PlayList"},
     kOptions,
     RunPlay,

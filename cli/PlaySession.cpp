@@ -145,21 +145,38 @@ class Session {
         if (list_.Count() > 0) list_.PlayNext();
         options_.Fast ? WriteMix() : Listen();
         WriteBegun();
+        if (library_->OutputLost()) TellOutputLost();
         player_.SetFileName(QString());
         return complete && !dialogs_.Failed() ? esDone : esFailed;
     }
 
  private:
-    // False when a path leads to nothing.
+    // False when a path or an entry of a playlist leads to nothing.
     bool FillList() {
         bool complete = true;
-        for (const QString& path : options_.Paths) {
-            if (list_.InsertFiles(list_.Count(), {path}) > 0) continue;
-            console_.Message(u"Nichts zum Abspielen gefunden: "_s + path);
+        const auto tell = [&](const QString& text) {
+            console_.Message(text);
             complete = false;
-        }
+        };
+        for (const QString& path : options_.Paths)
+            if (list_.InsertFiles(list_.Count(), {path}) == 0)
+                tell(u"Nichts zum Abspielen gefunden: "_s + path);
+        // Playing passes over them without a word.
+        for (int i = 0; i < list_.Count(); ++i)
+            if (!QFileInfo(list_.Entry(i).Name).isFile())
+                tell(u"Die Datei ist nicht verfügbar: "_s + list_.Entry(i).Name);
         return complete;
     }
+
+    // The sound stands still then, and no song would ever end.
+    void TellOutputLost() {
+        dialogs_.ShowMessage(
+            MessageKind::Error,
+            u"Die Ausgabe ist nicht vollständig, weil der Datenträger voll ist oder die Datei 4 GiB hat: "_s +
+                options_.Output->name);
+    }
+
+    bool GoesOn() { return !Over() && !InterruptRequested() && !library_->OutputLost(); }
 
     bool Over() {
         const PlayTimers& timers = player_.Timers();
@@ -178,7 +195,7 @@ class Session {
     void WriteMix() {
         MixClock clock;
         const auto frames = static_cast<std::size_t>(options_.Engines.FMODMixRate) * kLookEvery / 1000;
-        while (!Over() && !InterruptRequested()) {
+        while (GoesOn()) {
             WriteBegun();
             library_->Advance(frames);
             clock.Pass(kLookEvery);
@@ -191,7 +208,7 @@ class Session {
         if (line_.IsWatched()) keys.emplace();
         QTimer wake;
         wake.start(kLookEvery);
-        while (!Over() && !InterruptRequested()) {
+        while (GoesOn()) {
             WriteBegun();
             QCoreApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents);
             const auto key = keys ? keys->Read() : std::nullopt;

@@ -32,7 +32,6 @@ void WriteJson(const TPlayList& list, Console& console) {
 }
 
 int RunPlaylist(const Arguments& arguments, Console& console) {
-    if (arguments.Operands().size() > 1) throw EUsageError(u"Es kann nur eine PlayList angegeben werden."_s);
     if (arguments.Has(u"--out") && arguments.Has(u"--json"))
         throw EUsageError(u"--out und --json schließen sich aus."_s);
     TPlayList list;
@@ -54,14 +53,12 @@ constexpr OptionRow kOptions[] = {
 const CommandRow kPlaylistCommand = {
     u"playlist",
     u"Zeigt eine PlayList oder wandelt sie um",
-    u"Das Format einer PlayList wird an ihren ersten Bytes erkannt, das Format von DATEI2 richtet sich nach\n"
-    u"der Endung: .rukpl und .rpl eigenes Format, .m3u und .extpl M3U, .pls und .inipl PLS, alles andere "
-    u"ein\n"
-    u"Pfad je Zeile. Eine Zeile je Eintrag: Nummer (ab 0), Interpret, Titel, Länge und Name, durch\n"
-    u"Tabulatoren getrennt. Felder im JSON-Format: index, name und, wenn die PlayList sie enthält, die "
-    u"Felder\n"
-    u"des Datensatzes, wie der Befehl info sie zeigt.\n",
-    {u"DATEI", u"PlayList"},
+    u"Das Format einer PlayList wird an ihren ersten Bytes erkannt, das Format von DATEI2 richtet sich\n"
+    u"nach der Endung: .rukpl und .rpl eigenes Format, .m3u und .extpl M3U, .pls und .inipl PLS, alles\n"
+    u"andere ein Pfad je Zeile. Eine Zeile je Eintrag: Nummer (ab 0), Interpret, Titel, Länge und Name,\n"
+    u"durch Tabulatoren getrennt. Felder im JSON-Format: index, name und, wenn die PlayList sie enthält,\n"
+    u"die Felder des Datensatzes, wie der Befehl info sie zeigt.\n",
+    {.Name = u"DATEI", .Help = u"PlayList", .Several = false},
     kOptions,
     RunPlaylist,
 };

@@ -79,6 +79,6 @@ std::optional<QString> TerminalDialogs::SaveFile(const FileDialogOptions& option
     return answer == 0 ? path : std::nullopt;
 }
 
-std::optional<QString> TerminalDialogs::ChooseFolder(const QString& caption) {
-    return AskForPath(caption, QString());
+std::optional<QString> TerminalDialogs::ChooseFolder(const QString& caption, const QString& startFolder) {
+    return AskForPath(caption, startFolder);
 }

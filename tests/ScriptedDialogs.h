@@ -31,6 +31,7 @@ class ScriptedDialogs : public Dialogs {
     QStringList Prompts;
     std::vector<FileDialogOptions> FileDialogs;
     QStringList FolderCaptions;
+    QStringList StartFolders;
 
     void ShowMessage(MessageKind kind, const QString& text) override { Messages.emplace_back(kind, text); }
     int Ask(const QString& text, const QStringList& buttons, int cancelButton) override {
@@ -48,8 +49,9 @@ class ScriptedDialogs : public Dialogs {
         return Next(Files).value_or(QStringList());
     }
     std::optional<QString> SaveFile(const FileDialogOptions& options) override { return OneFile(options); }
-    std::optional<QString> ChooseFolder(const QString& caption) override {
+    std::optional<QString> ChooseFolder(const QString& caption, const QString& startFolder) override {
         FolderCaptions << caption;
+        StartFolders << startFolder;
         return Next(Folders);
     }
 

@@ -110,6 +110,6 @@ QStringList PlayerWindow::OpenFiles(const FileDialogOptions&) {
 std::optional<QString> PlayerWindow::SaveFile(const FileDialogOptions&) {
     return std::nullopt;
 }
-std::optional<QString> PlayerWindow::ChooseFolder(const QString&) {
+std::optional<QString> PlayerWindow::ChooseFolder(const QString&, const QString&) {
     return std::nullopt;
 }

@@ -31,7 +31,7 @@ class PlayerWindow : public QWidget, public PlayerPanel, public Dialogs {
     std::optional<QString> OpenFile(const FileDialogOptions& options) override;
     QStringList OpenFiles(const FileDialogOptions& options) override;
     std::optional<QString> SaveFile(const FileDialogOptions& options) override;
-    std::optional<QString> ChooseFolder(const QString& caption) override;
+    std::optional<QString> ChooseFolder(const QString& caption, const QString& startFolder) override;
 
  private:
     QWidget* Buttons();

@@ -1,48 +1,88 @@
 #include <QFileInfo>
 #include <algorithm>
+#include <optional>
 
 #include "CommonRUKTools/AbsolutePath.h"
+#include "CommonRUKTools/Clock.h"
 #include "MusicManagment/database/FolderWalk.h"
 #include "MusicManagment/database/Intake.h"
+#include "MusicManagment/database/Progress.h"
 #include "MusicManagment/playlist/ListRecognition.h"
 #include "MusicManagment/playlist/PlayList.h"
 #include "MusicManagment/playlist/PlayListFiles.h"
 
 // Files from outside become entries.
 
+using namespace Qt::StringLiterals;
+
 namespace {
 
-QStringList SongsBelow(const QString& folder) {
-    FolderWalk walk({.IsWanted = [](const QString& name) { return IsSongFile(name); }});
-    QStringList files;
-    walk.Walk(folder, files);
-    return files;
-}
+constexpr qint64 kSilentTime = 100;  // ms
+constexpr std::size_t kEntriesPerProgressPoint = 5;
 
-// A playlist stands for its entries, a folder for the songs in it; what is not there for nothing.
-std::vector<PlayListEntry> Expanded(const QString& path) {
+// A drop that takes its time becomes a long operation of the database, so that the user sees how far it is
+// and can stop it. Most drops are over before a window could be looked at.
+class DropProgress {
+ public:
+    // nullptr: nobody is told, and nobody can stop it.
+    explicit DropProgress(TMusicDatabase* database)
+        : database_(database), tellFrom_(CurrentClock().Ticks() + kSilentTime) {}
+
+    // True when the user wants to stop. Throws EAbort, after telling the user, when another operation is
+    // going.
+    bool Report(const ProgressPoint& point) {
+        if (database_ == nullptr || (!run_ && CurrentClock().Ticks() < tellFrom_)) return false;
+        if (!run_) run_.emplace(*database_, u"Nehme Songs in die PlayList auf"_s);
+        return database_->Progress(point);
+    }
+
+ private:
+    TMusicDatabase* database_;
+    qint64 tellFrom_;  // ticks of the clock
+    std::optional<ProgressRun> run_;
+};
+
+// Appends what a path stands for: a playlist for its entries, a folder for the songs in it, what is not there
+// for nothing. False when the user wants to stop.
+bool Expand(const QString& path, DropProgress& progress, std::vector<PlayListEntry>& entries) {
+    const auto report = [&progress](const QString& folder) {
+        return progress.Report({.Description = folder});
+    };
+    if (report(path)) return false;
     const QFileInfo info(path);
     if (info.isDir()) {
-        std::vector<PlayListEntry> entries;
-        for (const QString& file : SongsBelow(path))
+        FolderWalk walk({.IsWanted = &IsSongFile, .Progress = report});
+        QStringList files;
+        if (!walk.Walk(path, files)) return false;
+        for (const QString& file : files)
             entries.push_back({.Name = file});
-        return entries;
+    } else if (info.isFile() && IsPlayListName(path)) {
+        std::ranges::move(ReadPlayList(path), std::back_inserter(entries));
+    } else if (info.isFile()) {
+        entries.push_back({.Name = path});
     }
-    if (!info.isFile()) return {};
-    if (IsPlayListName(path)) return ReadPlayList(path);
-    return {{.Name = path}};
+    return true;
 }
 
 }  // namespace
 
+// What was read before the user stopped is kept.
 std::vector<PlayListEntry> TPlayList::EntriesFor(const QStringList& paths) const {
+    DropProgress progress(database_);
     std::vector<PlayListEntry> entries;
     for (const QString& path : paths)
-        for (PlayListEntry& entry : Expanded(AbsolutePath(path))) {
-            const bool isSong = IsSongFile(entry.Name) || (database_ && database_->Contains(entry.Name));
-            if (!entry.Record && isSong) entry.Record = FindRecord(entry.Name, -1);
-            entries.push_back(std::move(entry));
+        if (!Expand(AbsolutePath(path), progress, entries)) return {};
+    for (std::size_t i = 0; i < entries.size(); ++i) {
+        PlayListEntry& entry = entries[i];
+        if (i % kEntriesPerProgressPoint == 0 && progress.Report({.Cur = static_cast<qint64>(i),
+                                                                  .Max = static_cast<qint64>(entries.size()),
+                                                                  .Description = entry.Name})) {
+            entries.erase(entries.begin() + static_cast<std::ptrdiff_t>(i), entries.end());
+            break;
         }
+        const bool isSong = IsSongFile(entry.Name) || (database_ && database_->Contains(entry.Name));
+        if (!entry.Record && isSong) entry.Record = FindRecord(entry.Name, -1);
+    }
     return entries;
 }
 

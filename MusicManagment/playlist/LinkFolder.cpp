@@ -3,6 +3,8 @@
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
+#include <QHash>
+#include <QSet>
 
 #include "CommonRUKTools/Errors.h"
 
@@ -28,24 +30,45 @@ bool IsTaken(const QFileInfo& link) {
     return link.exists() || link.isSymLink();
 }
 
-void MakeLink(const QDir& folder, const QString& path) {
-    const QFileInfo song(path);
-    for (int number = 1;; ++number) {
-        const QFileInfo link(folder.filePath(LinkName(song, number)));
-        if (link.isSymLink() && link.symLinkTarget() == song.absoluteFilePath()) return;
-        if (IsTaken(link)) continue;
-        QFile file(song.absoluteFilePath());
-        if (!file.link(link.filePath()))
-            throw EStreamError(u"Kann die Verknüpfung nicht anlegen: "_s + link.filePath() + u": "_s +
-                               file.errorString());
-        return;
+// The folder while links are made in it. What is known of it is kept: of songs of one name, as programs for
+// ripping CDs give it, there may be thousands, and looking through all numbers for each would take minutes.
+class LinkFolder {
+ public:
+    explicit LinkFolder(const QDir& folder) : folder_(folder) {
+        const auto all = QDir::AllEntries | QDir::System | QDir::Hidden | QDir::NoDotAndDotDot;
+        for (const QFileInfo& entry : folder.entryInfoList(all, QDir::NoSort))
+            if (entry.isSymLink()) linked_.insert(entry.symLinkTarget());
     }
-}
+
+    void Add(const QFileInfo& song) {
+        const QString target = song.absoluteFilePath();
+        if (linked_.contains(target)) return;
+        const QString link = FreePath(song);
+        QFile file(target);
+        if (!file.link(link))
+            throw EStreamError(u"Kann die Verknüpfung nicht anlegen: "_s + link + u": "_s +
+                               file.errorString());
+        linked_.insert(target);
+    }
+
+ private:
+    QString FreePath(const QFileInfo& song) {
+        for (int& number = numbers_[song.fileName()];;) {
+            const QString path = folder_.filePath(LinkName(song, ++number));
+            if (!IsTaken(QFileInfo(path))) return path;
+        }
+    }
+
+    QDir folder_;
+    QSet<QString> linked_;         // songs with a link
+    QHash<QString, int> numbers_;  // of a song's name: the last that was tried
+};
 
 }  // namespace
 
 void WriteLinkFolder(const QString& folder, const QStringList& paths) {
     if (!QDir().mkpath(folder)) throw EStreamError(u"Kann den Ordner nicht anlegen: "_s + folder);
+    LinkFolder links{QDir(folder)};
     for (const QString& path : paths)
-        MakeLink(QDir(folder), path);
+        links.Add(QFileInfo(path));
 }

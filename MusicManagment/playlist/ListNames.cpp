@@ -75,15 +75,14 @@ bool IsAddress(const QString& text) {
     });
 }
 
-std::vector<ByteSpan> ListLines(ByteSpan bytes) {
-    std::vector<ByteSpan> lines;
+std::optional<ByteSpan> LineReader::Next() {
     const auto isLineEnd = [](std::uint8_t byte) { return byte == '\r' || byte == '\n'; };
-    for (auto begin = bytes.begin(); begin != bytes.end();) {
-        const auto end = std::find_if(begin, bytes.end(), isLineEnd);
-        if (end != begin) lines.emplace_back(begin, end);
-        begin = end == bytes.end() ? end : end + 1;
-    }
-    return lines;
+    const auto begin = std::ranges::find_if_not(rest_, isLineEnd);
+    if (begin == rest_.end()) return std::nullopt;
+    const auto end = std::find_if(begin, rest_.end(), isLineEnd);
+    const ByteSpan line(begin, end);
+    rest_ = ByteSpan(end, rest_.end());
+    return line;
 }
 
 QString NameFromList(const QString& text) {

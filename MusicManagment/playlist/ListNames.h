@@ -2,14 +2,23 @@
 
 #include <QByteArray>
 #include <QString>
-#include <vector>
+#include <optional>
 
 #include "CommonRUKTools/ByteReader.h"
 
 // What the playlists made of text have in common: lines, and how a song is named in them.
 
-// Cut at CR or LF; empty lines are left out.
-std::vector<ByteSpan> ListLines(ByteSpan bytes);
+// Gives one line after another, cut at CR or LF; empty ones are left out. A hostile file has more of them
+// than there is memory for a list of them.
+class LineReader {
+ public:
+    explicit LineReader(ByteSpan bytes) : rest_(bytes) {}
+    // Nothing at the end.
+    std::optional<ByteSpan> Next();
+
+ private:
+    ByteSpan rest_;
+};
 
 // "http://..." and its like.
 bool IsAddress(const QString& text);

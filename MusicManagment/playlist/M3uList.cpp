@@ -11,8 +11,9 @@ constexpr std::string_view kRemark = "#EXTINF:";
 
 std::vector<PlayListEntry> ParseM3uList(ByteSpan contents) {
     std::vector<PlayListEntry> entries;
-    for (const ByteSpan line : ListLines(contents))
-        if (!StartsWith(line, kRemark)) AppendEntry(entries, {.Name = NameFromList(line)});
+    LineReader lines(contents);
+    while (const auto line = lines.Next())
+        if (!StartsWith(*line, kRemark)) AppendEntry(entries, {.Name = NameFromList(*line)});
     return entries;
 }
 

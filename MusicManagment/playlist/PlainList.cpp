@@ -5,8 +5,9 @@
 
 std::vector<PlayListEntry> ParsePlainList(ByteSpan contents) {
     std::vector<PlayListEntry> entries;
-    for (const ByteSpan line : ListLines(contents))
-        AppendEntry(entries, {.Name = NameFromList(line)});
+    LineReader lines(contents);
+    while (const auto line = lines.Next())
+        AppendEntry(entries, {.Name = NameFromList(*line)});
     return entries;
 }
 

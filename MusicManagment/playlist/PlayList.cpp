@@ -93,7 +93,8 @@ void TPlayList::RefreshRecord(int index, SongIndex databaseHint) {
 
 int TPlayList::RemoveUnavailable() {
     const int before = Count();
-    for (int index = Count() - 1; index >= 0; --index)
+    // Who is told of a removal may remove others.
+    for (int index = before - 1; index >= 0; index = std::min(index, Count()) - 1)
         if (!IsThere(ResolvedPath(NameAt(index), kWithoutAsking))) Remove(index);
     return before - Count();
 }
@@ -103,8 +104,9 @@ std::optional<TID3Tag> TPlayList::FindRecord(const QString& name, SongIndex data
     if (database_) {
         const bool hintIsRight = databaseHint >= 0 && databaseHint < database_->Count() &&
                                  database_->Song(databaseHint).FileName == name;
-        const SongIndex song = hintIsRight ? databaseHint : database_->IndexOf(name);
-        if (song >= 0) return database_->Song(song);
+        // Where the song stands would be looked for in the whole collection.
+        const TID3Tag* song = hintIsRight ? &database_->Song(databaseHint) : database_->Songs().Find(name);
+        if (song != nullptr) return *song;
     }
     const QString path = ResolvedPath(name, kWithoutAsking);
     if (!IsThere(path)) return std::nullopt;

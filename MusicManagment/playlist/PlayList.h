@@ -49,8 +49,10 @@ class TPlayList : public QObject, public SettingsClient {
     void InsertSong(int position, SongIndex song);
     void Insert(int position, PlayListEntry entry);
     // What a drop brings (Drop.cpp): songs, folders with the songs in them, playlists with their entries. Of
-    // songs the record is taken from the database or read from the file. Returns how many entries were
-    // inserted. Throws EPlayListException or EStreamError for a playlist that cannot be read.
+    // songs the record is taken from the database or read from the file. One that takes its time is a long
+    // operation of the database, in which the list may change; when the user stops it, the entries that have
+    // been read come in. Returns how many were inserted. Throws EPlayListException or EStreamError for a
+    // playlist that cannot be read, EAbort while another operation of the database is going.
     int InsertFiles(int position, const QStringList& paths);
 
     void Remove(int index);

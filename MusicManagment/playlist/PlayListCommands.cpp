@@ -1,3 +1,5 @@
+#include <QDir>
+
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/playlist/LinkFolder.h"
 #include "MusicManagment/playlist/ListNames.h"
@@ -90,7 +92,8 @@ void TPlayList::OpenFromDialog() {
 }
 
 void TPlayList::ExportFromDialog() {
-    const auto folder = UserDialogs().ChooseFolder(u"PlayList als Link-Liste speichern"_s);
+    const auto folder =
+        UserDialogs().ChooseFolder(u"PlayList als Link-Liste speichern"_s, QDir::currentPath());
     if (folder && !folder->isEmpty()) ExportAsLinks(*folder);
 }
 

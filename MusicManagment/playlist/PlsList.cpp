@@ -37,8 +37,9 @@ void TakeKey(PlsSection& section, const QString& key, const QString& value) {
 PlsSection ReadSection(ByteSpan contents) {
     PlsSection section;
     bool isOurs = false;
-    for (const ByteSpan line : ListLines(contents)) {
-        const QString text = CodePage::FromSystem(line).trimmed();
+    LineReader lines(contents);
+    while (const auto line = lines.Next()) {
+        const QString text = CodePage::FromSystem(*line).trimmed();
         if (text.startsWith(u'[')) {
             const qsizetype end = text.indexOf(u']');
             isOurs = end > 0 && text.first(end).compare("[playlist"_L1, Qt::CaseInsensitive) == 0;

@@ -159,12 +159,14 @@ std::optional<QString> QtDialogs::SaveFile(const FileDialogOptions& options) {
     }
 }
 
-std::optional<QString> QtDialogs::ChooseFolder(const QString& caption) {
+std::optional<QString> QtDialogs::ChooseFolder(const QString& caption, const QString& startFolder) {
     QFileDialog dialog(Parent(), caption);
     dialog.setFileMode(QFileDialog::Directory);
     dialog.setOption(QFileDialog::ShowDirsOnly);
     SetUpFileDialog(dialog, u"Auswählen"_s);
-    ApplyOptions(dialog, {});
+    FileDialogOptions options;
+    options.Preset = startFolder;
+    ApplyOptions(dialog, options);
     dialog.setLabelText(QFileDialog::FileName, u"Ordner:"_s);
     const QStringList folders = Choose(dialog);
     return folders.isEmpty() ? std::nullopt : std::optional(folders.first());

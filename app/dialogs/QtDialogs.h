@@ -19,7 +19,7 @@ class QtDialogs : public Dialogs {
     std::optional<QString> OpenFile(const FileDialogOptions& options) override;
     QStringList OpenFiles(const FileDialogOptions& options) override;
     std::optional<QString> SaveFile(const FileDialogOptions& options) override;
-    std::optional<QString> ChooseFolder(const QString& caption) override;
+    std::optional<QString> ChooseFolder(const QString& caption, const QString& startFolder) override;
 
  private:
     QWidget* Parent() const;

@@ -6,6 +6,8 @@
 #include <QKeyEvent>
 #include <QPainter>
 #include <QScrollBar>
+#include <algorithm>
+#include <optional>
 
 #include "MusicManagment/playlist/PlayListMenu.h"
 #include "app/CommandRunner.h"
@@ -187,8 +189,12 @@ void TVisPlayList::MoveSelected(int step) {
 
 void TVisPlayList::Insert(int position, const DroppedSongs& drop) {
     RunCommand([&] {
-        const WaitCursor wait;
-        Select(position, InsertDrop(list_, position, drop));
+        // Reading files has a window of its own, with a button in it.
+        std::optional<WaitCursor> wait;
+        if (drop.Paths.isEmpty()) wait.emplace();
+        const int count = InsertDrop(list_, position, drop);
+        // Meanwhile the list may have become shorter.
+        Select(std::min(position, list_.Count() - count), count);
     });
 }
 

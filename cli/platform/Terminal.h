@@ -10,6 +10,8 @@
 void PrepareConsole();
 
 bool IsTerminal(std::FILE* stream);
+// How many characters a line of the terminal has; 0 when it does not say.
+int TerminalColumns(std::FILE* stream);
 
 // While one exists, the user's wish to stop (Ctrl-C, a polite kill) only sets a mark that the running
 // operation looks at; otherwise it ends the process at once.

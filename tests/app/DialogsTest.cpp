@@ -88,6 +88,18 @@ TEST(QtDialogs, FileDialogsSpeakGerman) {
         EXPECT_FALSE(seen.contains(english)) << english.toStdString();
 }
 
+TEST(QtDialogs, AFolderIsChosenFromWhereTheCommandSays) {
+    const QTemporaryDir folder;
+    QtDialogs dialogs;
+    QString shown;
+    WithNextDialog<QFileDialog>([&](QFileDialog& dialog) {
+        shown = dialog.directory().absolutePath();
+        dialog.reject();
+    });
+    EXPECT_FALSE(dialogs.ChooseFolder(u"Ordner"_s, folder.path()));
+    EXPECT_EQ(shown, folder.path());
+}
+
 TEST(FileFilters, BecomeNameFilters) {
     const std::pair<QString, QStringList> cases[] = {
         {u"Tunestead DataBases|*.tsdb|Alle Dateien|*.*"_s,

@@ -35,5 +35,5 @@ class ScriptedDialogs : public Dialogs {
         return File ? QStringList(*File) : QStringList();
     }
     std::optional<QString> SaveFile(const FileDialogOptions&) override { return File; }
-    std::optional<QString> ChooseFolder(const QString&) override { return File; }
+    std::optional<QString> ChooseFolder(const QString&, const QString&) override { return File; }
 };

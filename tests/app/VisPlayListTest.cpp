@@ -133,6 +133,17 @@ TEST_F(VisPlayListTest, FoldersFromAFileManagerBringTheirSongs) {
     EXPECT_TRUE(Order().endsWith(u"012345"_s));
 }
 
+TEST_F(VisPlayListTest, AListThatShrinksWhileADropIsReadGetsItAtItsEnd) {
+    const QTemporaryDir folder;
+    ASSERT_TRUE(QFile(folder.filePath(u"7.mp3"_s)).open(QIODevice::WriteOnly));
+    QMimeData data;
+    data.setUrls({QUrl::fromLocalFile(folder.path())});
+    QTimer::singleShot(0, [this] { list_.Remove({0, 1, 2, 3}); });  // before the drop is looked at
+    Drop(data, QPoint(20, view_.viewport()->height() - 2));
+    EXPECT_EQ(Order(), u"457"_s);
+    EXPECT_EQ(view_.SelectedEntries(), std::vector<int>({2}));
+}
+
 TEST_F(VisPlayListTest, ADamagedPlayListIsToldAndChangesNothing) {
     ScriptedDialogs dialogs;
     const QTemporaryDir folder;

@@ -102,6 +102,28 @@ TEST_F(PlayTest, WhatCannotBePlayedIsToldAndTheRestIsPlayed) {
     EXPECT_TRUE(result.Err.contains(u"Fehler beim Öffnen der Datei "_s + Path(u"bad.mp3"_s)));
 }
 
+TEST_F(PlayTest, EntriesWithoutAFileAreToldAndPassedOver) {
+    const QString a = AddLevel(u"a.wav"_s, 0.25, 2);
+    const QString gone = Path(u"gone.mp3"_s);
+    const QByteArray list = "#EXTM3U\r\n" + gone.toUtf8() + "\r\n" + a.toUtf8() + "\r\n";
+    Put(Path(u"list.m3u"_s), AsBytes(list.constData()));
+    const CommandResult result = WriteMix({Path(u"list.m3u"_s)});
+    EXPECT_EQ(result.Status, 1);
+    EXPECT_EQ(result.Out, a + u'\n');
+    EXPECT_EQ(result.Err, u"Die Datei ist nicht verfügbar: "_s + gone + u'\n');
+}
+
+TEST_F(PlayTest, AFullDiskEndsThePlaying) {
+    if (!QFile::exists(u"/dev/full"_s)) GTEST_SKIP();
+    const QString a = AddLevel(u"a.wav"_s, 0.25, 30);
+    for (const QStringList& pace : {QStringList(), QStringList(u"--fast"_s)}) {
+        const CommandResult result =
+            RunWords(QStringList{u"play"_s, u"--output"_s, u"file:/dev/full"_s, a} + pace);
+        EXPECT_EQ(result.Status, 1);
+        EXPECT_TRUE(result.Err.contains(u"nicht vollständig"_s)) << result.Err.toStdString();
+    }
+}
+
 TEST_F(PlayTest, OptionsThatDoNotFitTogetherAreRefused) {
     const QString a = AddLevel(u"a.wav"_s, 0.25, 1);
     const QStringList cases[] = {

@@ -75,7 +75,7 @@ TEST_F(PlaylistCommandTest, WhatCannotBeReadOrMeantIsSaid) {
         {{Path(u"cut.rukpl"_s), u"--out"_s, Path(u"l.rukpl"_s)}, esFailed, u"beschädigt"_s},
         {{Path(u"none.m3u"_s)}, esFailed, u"none.m3u"_s},
         {{}, esWrongUsage, u"DATEI fehlt."_s},
-        {{u"a"_s, u"b"_s}, esWrongUsage, u"nur eine PlayList"_s},
+        {{u"a"_s, u"b"_s}, esWrongUsage, u"Überzähliges Argument: b"_s},
         {{u"a"_s, u"--json"_s, u"--out"_s, u"b"_s}, esWrongUsage, u"schließen sich aus"_s},
     };
     for (const Case& test : cases) {

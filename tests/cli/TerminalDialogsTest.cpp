@@ -38,8 +38,8 @@ TEST_F(TerminalDialogsTest, AnEmptyAnswerTakesThePreset) {
     Answer(("\n" + longName + "\nÄ").constData());
     EXPECT_EQ(dialogs_.Input(u"Name"_s, u"Name"_s, {}, u"vorher"_s), u"vorher"_s);
     EXPECT_EQ(dialogs_.Input(u"Name"_s, u"Name"_s, {}, u"vorher"_s), QString::fromLatin1(longName));
-    EXPECT_EQ(dialogs_.ChooseFolder(u"Ordner"_s), u"Ä"_s);
-    EXPECT_EQ(dialogs_.ChooseFolder(u"Ordner"_s), std::nullopt);
+    EXPECT_EQ(dialogs_.ChooseFolder(u"Ordner"_s, {}), u"Ä"_s);
+    EXPECT_EQ(dialogs_.ChooseFolder(u"Ordner"_s, {}), std::nullopt);
 }
 
 TEST_F(TerminalDialogsTest, WithoutATerminalEveryQuestionIsCancelled) {

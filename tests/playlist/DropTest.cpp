@@ -1,8 +1,30 @@
+#include "CommonRUKTools/Clock.h"
 #include "CommonRUKTools/SafeFile.h"
 #include "MusicManagment/playlist/PlayListFiles.h"
 #include "tests/playlist/Playing.h"
 
 using namespace Qt::StringLiterals;
+
+namespace {
+
+// At every look `Step` milliseconds have passed.
+class SteppingClock : public Clock {
+ public:
+    SteppingClock() { SetClock(this); }
+    ~SteppingClock() override { SetClock(nullptr); }
+    SteppingClock(const SteppingClock&) = delete;
+    SteppingClock& operator=(const SteppingClock&) = delete;
+
+    qint64 Step = 0;
+
+    qint64 Ticks() const override { return ticks_ += Step; }
+    double Now() const override { return 0; }
+
+ private:
+    mutable qint64 ticks_ = 0;
+};
+
+}  // namespace
 
 class DropTest : public PlayingTest {
  protected:
@@ -38,6 +60,44 @@ TEST_F(DropTest, TheDatabaseKnowsBetterThanTheFile) {
     database.AddEntry(folder_.Add(u"x.wav"_s), song);
     EXPECT_EQ(list_.InsertFiles(0, {Path(u"x"_s)}), 1);
     EXPECT_EQ(list_.Entry(0).Record.value().Title, u"Aus der Sammlung"_s);
+}
+
+TEST_F(DropTest, ADropThatTakesItsTimeIsALongOperationThatTheUserCanStop) {
+    TMusicDatabase database;
+    list_.SetMusicDatabase(&database);
+    for (const QChar song : u"abcdefghijkl"_s)
+        folder_.Add(u"sub/"_s + song + u".wav"_s, 1);
+    SteppingClock clock;
+    int starts = 0;
+    int ends = 0;
+    qint64 stopAt = -1;
+    database.OnStartProgress = [&](TMusicDatabase&) { ++starts; };
+    database.OnEndProgress = [&](TMusicDatabase&) { ++ends; };
+    database.OnProgress = [&](TMusicDatabase& of, const ProgressPoint& point) {
+        EXPECT_EQ(list_.Count(), 0);
+        EXPECT_EQ(of.Caption(), u"MusicDatabase v6.0 - Nehme Songs in die PlayList auf"_s);
+        if (point.Cur >= stopAt && stopAt >= 0) of.RequestAbort();
+    };
+    EXPECT_EQ(list_.InsertFiles(0, {folder_.Path(u"sub"_s)}), 12);
+    EXPECT_EQ(starts, 0);  // at once, and nobody was told
+
+    list_.Clear();
+    clock.Step = 1000;
+    EXPECT_EQ(list_.InsertFiles(0, {folder_.Path(u"sub"_s)}), 12);
+    list_.Clear();
+    stopAt = 5;
+    EXPECT_EQ(list_.InsertFiles(0, {folder_.Path(u"sub"_s)}), 5);
+    EXPECT_EQ(list_.TotalSeconds(), 5);
+    list_.Clear();
+    stopAt = 0;  // while the folder is searched
+    EXPECT_EQ(list_.InsertFiles(0, {folder_.Path(u"sub"_s)}), 0);
+    EXPECT_EQ(starts, 3);
+    EXPECT_EQ(ends, 3);
+
+    const ProgressRun other(database, u"x"_s);
+    EXPECT_THROW(list_.InsertFiles(0, {folder_.Path(u"sub"_s)}), EAbort);
+    EXPECT_EQ(Messages().size(), 1);
+    EXPECT_EQ(list_.Count(), 0);
 }
 
 TEST_F(DropTest, ADamagedListIsSaidAndInsertsNothing) {

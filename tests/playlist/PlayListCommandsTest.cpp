@@ -139,5 +139,6 @@ TEST_F(PlayListCommandsTest, TheViewSaysWhichEntriesAreMeant) {
     dialogs_.Folders = {folder_.Path(u"links"_s)};
     list_.ClickMenuItem(pcExportAsLinks);
     EXPECT_EQ(dialogs_.FolderCaptions, QStringList{u"PlayList als Link-Liste speichern"_s});
+    EXPECT_EQ(dialogs_.StartFolders, QStringList{QDir::currentPath()});
     EXPECT_TRUE(QFile::exists(folder_.Path(u"links/c.wav"_s)));
 }

@@ -132,6 +132,15 @@ TEST_F(PlayListTest, WhatHasNoFileLeaves) {
     EXPECT_EQ(Changes(), u"5/2 3/2 1/2 0/2"_s);
 }
 
+TEST_F(PlayListTest, WhoIsToldOfARemovalMayEmptyTheList) {
+    Add(u"ABCD"_s);
+    list_.OnChange = [](TPlayList& list, int index, TChangeType) {
+        if (index == 3) list.Clear();
+    };
+    EXPECT_EQ(list_.RemoveUnavailable(), 4);
+    EXPECT_EQ(list_.Count(), 0);
+}
+
 TEST_F(PlayListTest, MarkingGoesToTheDatabase) {
     TMusicDatabase database;
     database.AddEntry(folder_.Add(u"b.wav"_s), TID3Tag());

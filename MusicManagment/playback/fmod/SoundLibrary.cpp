@@ -51,6 +51,10 @@ void SoundLibrary::Advance(std::size_t frames) {
     if (output_ != nullptr) output_->Advance(frames);
 }
 
+bool SoundLibrary::OutputLost() const {
+    return output_ != nullptr && output_->Failed() && !output_->Replaceable();
+}
+
 quint64 SoundLibrary::FramesPlayed() const {
     return mixer_ != nullptr ? mixer_->FramesPlayed() : 0;
 }

@@ -23,6 +23,8 @@ class SoundLibrary : public FmodLibrary {
     void SetMasterVolume(float gain);
     // Lets an output without a pace of its own take so many frames at the mix rate; nothing otherwise.
     void Advance(std::size_t frames);
+    // The output takes nothing any more and cannot be replaced: a file whose disk is full.
+    bool OutputLost() const;
     // Frames that have been mixed since FSOUND_Init, and those of them that lacked sound because a file was
     // not decoded in time.
     quint64 FramesPlayed() const;
