@@ -1,44 +1,15 @@
 #!/usr/bin/env bash
 # Plays a tone through a sound server of its own, whose only sink is a virtual one, records what the sink was given and
-# looks for the tone in it. Argument: tunestead-cli. Runs itself again under a session bus of its own.
-set -euo pipefail
+# looks for the tone in it. Argument: tunestead-cli.
+source "$(dirname "$0")/private_session.sh"
 cli=$(realpath "$1")
-if [ "${2:-}" != inside ]; then
-    exec dbus-run-session -- "$0" "$cli" inside
-fi
-
-folder=$(mktemp -d)
-export XDG_RUNTIME_DIR=$folder/run HOME=$folder
-unset XDG_CONFIG_HOME XDG_DATA_HOME XDG_STATE_HOME PULSE_SERVER TUNESTEAD_AUDIO
-mkdir -m 700 "$XDG_RUNTIME_DIR"
-trap 'kill $(jobs -p) 2>/dev/null || true; wait; rm -rf "$folder"' EXIT
-
-# Waits for a command to succeed; a minute at most, for busy machines.
-await() {
-    local attempt
-    for attempt in $(seq 1200); do
-        if "$@" >/dev/null 2>&1; then return 0; fi
-        sleep 0.05
-    done
-    echo "waited in vain for: $*" >&2
-    return 1
-}
-
-for server in pipewire wireplumber pipewire-pulse; do
-    "$server" >"$folder/$server.log" 2>&1 &
-done
-await sh -c 'pactl list short sinks | grep -q auto_null'
+start_sound_server
 
 sox -n -r 44100 -c 2 "$folder/tone.wav" synth 4 sine 660 gain -8
-parec -d auto_null.monitor --latency-msec=30 --rate=44100 --channels=2 --format=s16le >"$folder/heard.raw" &
-recorder=$!
-await test -s "$folder/heard.raw"
+start_recorder
 "$cli" play --engine fmod --output pulseaudio "$folder/tone.wav"
-kill "$recorder"
+stop_recorder
 
-# The sound server begins and ends with silence.
-sox -r 44100 -c 2 -e signed -b 16 -t raw "$folder/heard.raw" "$folder/heard.wav" \
-    silence 1 0.05 1% reverse silence 1 0.05 1% reverse
 figures=$(sox "$folder/heard.wav" -n remix 1 stat 2>&1)  # of both channels at once it tells a wrong frequency
 value() { awk -F: -v name="$1" '{ gsub(/ +/, " ", $1) } $1 == name { print $2 + 0 }' <<<"$figures"; }
 length=$(value 'Length (seconds)')
