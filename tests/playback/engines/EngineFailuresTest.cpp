@@ -5,6 +5,7 @@
 #include <QTemporaryDir>
 #include <random>
 
+#include "MusicManagment/playback/mci/MediaAddress.h"
 #include "tests/PrintQt.h"
 #include "tests/playback/SoundFiles.h"
 #include "tests/playback/engines/EngineRigs.h"
@@ -131,7 +132,6 @@ TEST(EngineFailuresTest, WithoutADeviceNothingIsOpened) {
               u"Fehler bei mciSendCommand mit MCI_OPEN.\r\nEs gibt keine Tonausgabe."_s);
 }
 
-// There is none in a machine for tests, or no disc is in it.
 TEST(EngineFailuresTest, ATrackOfADiscNeedsTheDisc) {
     const QTemporaryDir folder;
     const QString path = folder.filePath(u"Track02.cda"_s);
@@ -139,7 +139,11 @@ TEST(EngineFailuresTest, ATrackOfADiscNeedsTheDisc) {
     track.resize(44, '\0');
     WriteBytes(path, track);
     EXPECT_EQ(ChooseEngine(path, {}), TEngine::MCI);
-    EXPECT_TRUE(MakeRig(TEngine::MCI)->Refusal(path).startsWith(Refused(TEngine::MCI, path)));
+    EXPECT_EQ(MediaAddress(path), "cdda://2");
+    // Hardly a machine for tests has a drive, let alone a disc in it.
+    const QString message = MakeRig(TEngine::MCI)->Refusal(path);
+    EXPECT_TRUE(message.isEmpty() || message.startsWith(Refused(TEngine::MCI, path)))
+        << message.toStdString();
 }
 
 }  // namespace
