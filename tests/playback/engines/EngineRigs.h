@@ -25,7 +25,8 @@ class EngineRig {
     QString Refusal(const QString& path);
 };
 
-// FMOD, EldoS or MCI; `hasOutput` false: with a device that cannot be opened, which goes for MCI from then on.
+// FMOD, EldoS or MCI; `hasOutput` false: with a device that cannot be opened, which goes for MCI from then
+// on.
 std::unique_ptr<EngineRig> MakeRig(TEngine engine, bool hasOutput = true);
 
 // Only one engine is allowed.
