@@ -8,7 +8,7 @@ sound_packages=(timgm6mb-soundfont gstreamer1.0-plugins-base gstreamer1.0-plugin
     gstreamer1.0-plugins-bad gstreamer1.0-libav gstreamer1.0-alsa)
 desktop_packages=(libqt6svg6 qt6-translations-l10n breeze-icon-theme xdg-utils fonts-dejavu-core "${sound_packages[@]}")
 test_packages=(libgtest-dev libbenchmark-dev libtag1-dev libsqlite3-dev clang-format clang-tidy jq dbus
-    sox pipewire pipewire-pulse wireplumber pulseaudio-utils
+    sox pipewire pipewire-pulse wireplumber pulseaudio-utils audacious audacious-plugins
     desktop-file-utils appstream shared-mime-info man-db)
 
 # Installs those of the named packages that are missing.

@@ -124,21 +124,6 @@ class TrackReader {
     std::uint8_t running_ = 0;
 };
 
-// The data of a RIFF chunk; bytes that are no RIFF file pass through.
-ByteSpan Unwrapped(ByteSpan file) {
-    if (!StartsWith(file, "RIFF")) return file;
-    ByteReader reader(file);
-    reader.Seek(12);
-    while (reader.Remaining() >= 8) {
-        const bool isData = StartsWith(reader.Rest(), "data");
-        reader.Skip(4);
-        const std::uint32_t size = reader.U32Le();
-        if (isData) return reader.Rest().first(std::min<std::size_t>(size, reader.Remaining()));
-        reader.Skip(std::size_t{size} + size % 2);
-    }
-    return {};
-}
-
 Tracks ReadTracks(ByteReader reader) {
     Tracks tracks;
     while (reader.Remaining() >= 8) {
@@ -190,8 +175,22 @@ bool LooksLikeMidi(ByteSpan head) {
            (StartsWith(head, "RIFF") && head.size() >= 12 && StartsWith(head.subspan(8), "RMID"));
 }
 
+ByteSpan WithoutWrapper(ByteSpan file) {
+    if (!StartsWith(file, "RIFF")) return file;
+    ByteReader reader(file);
+    reader.Seek(12);
+    while (reader.Remaining() >= 8) {
+        const bool isData = StartsWith(reader.Rest(), "data");
+        reader.Skip(4);
+        const std::uint32_t size = reader.U32Le();
+        if (isData) return reader.Rest().first(std::min<std::size_t>(size, reader.Remaining()));
+        reader.Skip(std::size_t{size} + size % 2);
+    }
+    return {};
+}
+
 std::optional<MidiFile> ReadMidiFile(ByteSpan file) {
-    const ByteSpan midi = Unwrapped(file);
+    const ByteSpan midi = WithoutWrapper(file);
     if (!StartsWith(midi, "MThd")) return std::nullopt;
     ByteReader reader(midi);
     reader.Skip(4);

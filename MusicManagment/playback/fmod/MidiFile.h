@@ -24,6 +24,10 @@ struct MidiFile {
 // True for a Standard MIDI File and for one in a RIFF wrapper (RMI).
 bool LooksLikeMidi(ByteSpan head);
 
+// The Standard MIDI File within an RMI file; other bytes as they are. Empty when there is none in the
+// wrapper.
+ByteSpan WithoutWrapper(ByteSpan file);
+
 // Reads a Standard MIDI File (format 0 or 1) or RMI file. Damage ends the track that it is in; nothing when
 // the file has no header or no events. The events point into `file`.
 std::optional<MidiFile> ReadMidiFile(ByteSpan file);

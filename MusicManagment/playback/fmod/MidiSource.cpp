@@ -50,9 +50,7 @@ class MidiSong : public SongSource {
 
     std::size_t Read(float* stereo, std::size_t frames) override;
     std::uint64_t Seek(std::uint64_t frame) override;
-    std::uint64_t SeekOrder(int order) override {
-        return Seek(static_cast<std::uint64_t>(order) * kOrderMs * static_cast<std::uint64_t>(rate_) / 1000);
-    }
+    std::uint64_t SeekOrder(int order) override { return Seek(FirstFrameOf(order)); }
     std::uint64_t Length() const override { return length_; }
     FMUSIC_TYPES Type() const override { return FMUSIC_TYPE_MIDI; }
     int Orders() const override { return static_cast<int>((song_.length / 1000 + kOrderMs - 1) / kOrderMs); }
@@ -66,6 +64,11 @@ class MidiSong : public SongSource {
  private:
     std::uint64_t FrameAt(std::uint64_t microseconds) const {
         return microseconds * static_cast<std::uint64_t>(rate_) / 1'000'000;
+    }
+    // The frame before it still counts as the order before.
+    std::uint64_t FirstFrameOf(int order) const {
+        return (static_cast<std::uint64_t>(order) * kOrderMs * static_cast<std::uint64_t>(rate_) + 999) /
+               1000;
     }
     std::uint64_t End() const { return length_ + static_cast<std::uint64_t>(rate_) * kTailMs / 1000; }
     void Silence();

@@ -3,10 +3,11 @@
 #include <gst/gst.h>
 
 #include <QDir>
-#include <QUrl>
 #include <algorithm>
 #include <limits>
 #include <optional>
+
+#include "MusicManagment/playback/mci/MediaAddress.h"
 
 using namespace Qt::StringLiterals;
 
@@ -46,9 +47,15 @@ GstElement* MakeSilentSink() {
     return sink;
 }
 
-// Without a sound server the automatic choice quietly becomes a silent one; nothing better can be done then.
 GstElement* MakeAudioSink(MciSound sound) {
     return sound == MciSound::Silent ? MakeSilentSink() : gst_element_factory_make("autoaudiosink", nullptr);
+}
+
+// Without a sound server the automatic choice quietly becomes a sink that it calls so.
+bool PlaysToNobody(GstElement* sink) {
+    if (!GST_IS_BIN(sink)) return false;
+    const Element silent(gst_bin_get_by_name(GST_BIN(sink), "fake-audio-sink"));
+    return silent != nullptr;
 }
 
 }  // namespace
@@ -92,7 +99,7 @@ QString GstMci::Device::Open(const QString& path, MciSound sound) {
     GstElement* audio = MakeAudioSink(sound);
     GstElement* video = MakeSilentSink();
     if (audio == nullptr || video == nullptr) return u"GStreamer hat keine Ausgabe."_s;
-    const QByteArray uri = QUrl::fromLocalFile(path).toEncoded();
+    const QByteArray uri = MediaAddress(path);
     g_object_set(player, "uri", uri.constData(), "audio-sink", audio, "video-sink", video, nullptr);
 
     // Whether a file can be played shows when its beginning has been decoded.
@@ -100,6 +107,7 @@ QString GstMci::Device::Open(const QString& path, MciSound sound) {
     const auto result = gst_element_get_state(player, nullptr, nullptr, kOpenTimeout);
     ReadMessages();
     if (!failure_.isEmpty()) return failure_;
+    if (PlaysToNobody(audio)) return u"Es gibt keine Tonausgabe."_s;
     if (result == GST_STATE_CHANGE_ASYNC) return u"Zeitüberschreitung beim Öffnen der Datei."_s;
     return result == GST_STATE_CHANGE_FAILURE ? u"Die Datei kann nicht abgespielt werden."_s : QString();
 }

@@ -28,6 +28,7 @@ class PrivateBus {
         daemon_.waitForFinished();
     }
 
+    const QString& Address() const { return address_; }
     QDBusConnection Connect(const QString& name) const {
         return QDBusConnection::connectToBus(address_, name);
     }
