@@ -5,6 +5,7 @@
 #include <memory>
 #include <optional>
 
+#include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/MenuItem.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/Settings.h"
@@ -43,7 +44,8 @@ class TPlaySound : public TPlaySoundContainer,
     const QString& FileName() const { return fileName_; }
     // Closes the former song and opens this one, and plays it with AutoPlay. An empty name only closes. A
     // missing file opens nothing. Throws EPlaySoundException when no engine is allowed for the file, and what
-    // the last engine throws; nothing is open then.
+    // the last engine throws; nothing is open then. Throws EAbort when another song was opened, or this one
+    // closed, while it was being opened: engines and messages may let the event loop run.
     void SetFileName(const QString& path) override;
     void Open() override;
     void Close() override;
@@ -150,12 +152,14 @@ class TPlaySound : public TPlaySoundContainer,
 
     // PlaySoundOpen.cpp
     Backend MakeBackend(TEngine engine, const QString& path) const;
+    void OpenBackend(TEngine engine);
     void CreateBackend(TEngine engine, const QString& message);
     bool CreateBackendsAfter(TEngine failed, const QString& message);
     bool OpenExternally();
     bool UseExternal();
     bool ExternalRuns();
     void PlayInternally();
+    void TellWhileOpening(MessageKind kind, const QString& text);
     void CloseBackends();
     void ClearPanel();
 
@@ -201,6 +205,8 @@ class TPlaySound : public TPlaySoundContainer,
     QString fileName_;
     QString coFileName_;
     Backend current_;
+    Backend opening_;                 // on its way to be the current one
+    unsigned generation_ = 0;         // changes with every song that is opened or closed
     TEngine engine_ = TEngine::FMOD;  // of the current song
     Backend fading_;                  // the song that fades out
     PlayTimers timers_;

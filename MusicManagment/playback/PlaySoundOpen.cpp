@@ -1,6 +1,6 @@
+#include <QScopeGuard>
 #include <utility>
 
-#include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/playback/ExternalLink.h"
 #include "MusicManagment/playback/PlaySound.h"
@@ -29,6 +29,7 @@ void TPlaySound::Open() {
 }
 
 void TPlaySound::Close() {
+    ++generation_;
     if (ExternalRuns()) {
         external_->Send(ecClose);
         external_->Send(ecCloseFading);
@@ -39,6 +40,7 @@ void TPlaySound::Close() {
 void TPlaySound::CloseBackends() {
     StopTimers();
     current_.reset();
+    opening_.reset();
     fading_.reset();
 }
 
@@ -53,20 +55,28 @@ void TPlaySound::ClearPanel() {
 TPlaySound::Backend TPlaySound::MakeBackend(TEngine engine, const QString& path) const {
     Backend backend = engineTable_.Create(engine, settings_);
     backend->SetBackendFile(path);
-    backend->Open();
     return backend;
+}
+
+// Where others may close it while it waits for its engine.
+void TPlaySound::OpenBackend(TEngine engine) {
+    const auto forget = qScopeGuard([this] { opening_.reset(); });
+    opening_ = MakeBackend(engine, fileName_);
+    opening_->Open();
+    if (!opening_) throw EAbort();
+    current_ = std::move(opening_);
+    engine_ = engine;
 }
 
 // A message tells why another engine has refused. An engine that refuses here hands over to those behind it.
 void TPlaySound::CreateBackend(TEngine engine, const QString& message) {
     if (!message.isEmpty())
-        UserDialogs().ShowMessage(MessageKind::Warning, message + u"\r\nVersuche "_s + EngineName(engine));
+        TellWhileOpening(MessageKind::Warning, message + u"\r\nVersuche "_s + EngineName(engine));
     if (OpenExternally()) return;
     StopTimers();
     current_.reset();
     try {
-        current_ = MakeBackend(engine, fileName_);
-        engine_ = engine;
+        OpenBackend(engine);
     } catch (const EFMODException& error) {
         if (!CreateBackendsAfter(TEngine::FMOD, error.Message())) throw;
     } catch (const EEldoSException& error) {
@@ -133,6 +143,13 @@ bool TPlaySound::UseExternal() {
 void TPlaySound::PlayInternally() {
     playExtern_ = false;
     CloseBackends();
-    UserDialogs().ShowMessage(
-        MessageKind::Error, u"Kann das Programm TSPlayer nicht starten. Der Sound wird intern abgespielt."_s);
+    TellWhileOpening(MessageKind::Error,
+                     u"Kann das Programm TSPlayer nicht starten. Der Sound wird intern abgespielt."_s);
+}
+
+// Whoever opens or closes a song while the message stands has the last word.
+void TPlaySound::TellWhileOpening(MessageKind kind, const QString& text) {
+    const unsigned before = generation_;
+    UserDialogs().ShowMessage(kind, text);
+    if (generation_ != before) throw EAbort();
 }

@@ -94,7 +94,9 @@ void TPlaySound::CheckEnd(quint32 position, quint32 length) {
 
 void TPlaySound::CheckCrossFade(quint32 position, quint32 length) {
     if (!current_ || crossFadeStarted_ || IsStopping() || length == 0) return;
+    const unsigned before = generation_;
     if (!IsInLast(settings_.FMODCrossoverTime, position, length) || Crossover() == coNone) return;
+    if (generation_ != before) return;  // another song came while the mode was asked for
     crossFadeStarted_ = true;
     Raise(OnCrossover);
     if (AsFading(current_.get()) != nullptr && settings_.FMODCrossoverTime >= kShortestFade)

@@ -181,6 +181,27 @@ TEST_F(FadesTest, WhateverPreventsACrossFadeLeavesTheSongAlone) {
     EXPECT_TRUE(refuses(Add(u"b.mp3"_s)));
 }
 
+// A controller is another program: while it is asked it may go, which closes the song, or send commands.
+TEST_F(FadesTest, SongMayChangeWhileTheModeIsAskedFor) {
+    ScriptedController controller;
+    controller.Mode = coAutoChange;
+    length_ = 20'000;
+    PlaySong(u"a.mp3"_s);
+    player_.SetController(&controller);
+    controller.OnAsked = [this] { player_.Close(); };
+    EXPECT_FALSE(player_.PlayWithCrossFade(Add(u"b.mp3"_s)));
+    EXPECT_EQ(Open(), QString());
+
+    int crossovers = 0;
+    player_.OnCrossover = [&](TPlaySound&) { ++crossovers; };
+    controller.OnAsked = nullptr;
+    PlaySong(u"c.mp3"_s);
+    controller.OnAsked = [this] { player_.SetFileName(Add(u"d.mp3"_s)); };
+    Pass(12'000);
+    EXPECT_EQ(Open(), u"FMOD:d"_s);
+    EXPECT_EQ(crossovers, 0);
+}
+
 TEST_F(FadesTest, ListWaitsForTheEndWhereSongsCannotCross) {
     length_ = 20'000;
     List({u"a.mp3"_s, u"track.cda"_s});
