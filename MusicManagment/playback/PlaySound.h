@@ -192,11 +192,13 @@ class TPlaySound : public TPlaySoundContainer,
     void AskForNextSong(SongChange change);
     void PlayNextOfDatabase(SongChange change);
     void RunHandler(void (TPlaySound::*handler)());
+    static void RunGuarded(const std::function<void()>& action, const std::function<void()>& onFailure);
 
     // PlaySoundFeedback.cpp
     void Raise(const TNotifyEvent& event);
     void Feedback(FeedbackCode code, quint32 parameter = 0);
     void StateChanged();
+    void TakeFeedback(int code, quint32 parameter);
     qint64 HandleFeedback(int code, quint32 parameter) override;
     void HandleFeedbackText(int code, const QString& text) override;
 

@@ -20,15 +20,23 @@ bool IsInLast(quint32 zone, quint32 position, quint32 length) {
 
 // A timer's handler has nobody above it who could tell the user.
 void TPlaySound::RunHandler(void (TPlaySound::*handler)()) {
+    RunGuarded([this, handler] { (this->*handler)(); },
+               [this, handler] {
+                   // What a tick throws the next one throws again: the song is over. The message box lets
+                   // timers run, so that the next song need not wait for the user.
+                   timers_.StopTicks();
+                   if (handler == &TPlaySound::Tick) timers_.StartEnd();
+               });
+}
+
+// `onFailure` runs before the user is told.
+void TPlaySound::RunGuarded(const std::function<void()>& action, const std::function<void()>& onFailure) {
     try {
-        (this->*handler)();
+        action();
     } catch (const EAbort&) {
         return;  // the user has been told
     } catch (const ERukException& error) {
-        // What a tick throws the next one throws again: the song is over. The message box lets timers run, so
-        // that the next song need not wait for the user.
-        timers_.StopTicks();
-        if (handler == &TPlaySound::Tick) timers_.StartEnd();
+        if (onFailure) onFailure();
         UserDialogs().ShowMessage(MessageKind::Error, error.Message());
     }
 }
