@@ -44,7 +44,7 @@ void TPlaySound::Play() {
     }
     if (!current_ || EndFadesOfPlaying() || !FileSource::Exists(fileName_)) return;
     current_->Play();
-    if (fading_) fading_->Play();
+    ResumeFading();
     StartTimers();
     AnnounceSong();
 }
@@ -57,6 +57,11 @@ bool TPlaySound::EndFadesOfPlaying() {
     current->SetVolume(100);
     if (FadingBackend* fading = AsFading(fading_.get())) fading->CutFadeOut();
     return true;
+}
+
+// One that has come to its end in the meantime would begin anew.
+void TPlaySound::ResumeFading() {
+    if (fading_ && fading_->GetStatus() != psStopped) fading_->Play();
 }
 
 void TPlaySound::AnnounceSong() {
@@ -108,7 +113,7 @@ void TPlaySound::PauseResume() {
     if (!current_) return;
     if (current_->GetStatus() == psPaused) {
         current_->Play();
-        if (fading_) fading_->Play();
+        ResumeFading();
         StartTimers();
         Raise(OnPlayingResumed);
         Feedback(fbResumed);

@@ -53,7 +53,9 @@ class TPlaySound : public TPlaySoundContainer,
     // external player's.
     std::optional<TEngine> CurrentEngine() const { return current_ ? std::optional(engine_) : std::nullopt; }
 
-    // --- Playing. Without a song they do nothing. They throw what the engine throws ---
+    // --- Playing. Without a song they do nothing. They throw what the engine throws, but for the Get
+    // questions, which windows and the desktop ask at any time: a song whose engine fails is as good as
+    // closed, and the next tick or command tells why. ---
     void Play() override;
     void Stop() override { Stop(StopMode::AtOnce); }
     void Stop(StopMode mode);
@@ -164,7 +166,10 @@ class TPlaySound : public TPlaySoundContainer,
     void ClearPanel();
 
     // PlaySound.cpp
+    template <typename T>
+    T AskCurrent(T (TPlaySoundContainer::*question)(), T none) const;
     bool EndFadesOfPlaying();
+    void ResumeFading();
     void AnnounceSong();
     void FinishStop();
     void StartTimers();
@@ -177,6 +182,7 @@ class TPlaySound : public TPlaySoundContainer,
     // PlaySoundFades.cpp
     bool CanFade() const;
     bool CrossFadeTo(Backend next, const QString& path);
+    void FadeOutFormer();
 
     // PlaySoundTick.cpp
     void RunTick(TickKind kind);

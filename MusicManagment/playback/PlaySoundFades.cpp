@@ -48,9 +48,7 @@ bool TPlaySound::CrossFadeTo(Backend next, const QString& path) {
 
     ++generation_;
     fading_ = std::exchange(current_, std::move(next));
-    FadingBackend* fadingOut = AsFading(fading_.get());
-    fadingOut->SetFadeTime(settings_.FMODCrossoverTime);
-    fadingOut->StartFadeOut();
+    FadeOutFormer();
 
     // A song that is faded in counts as well, though its name does not go through SetFileName.
     if (path != fileName_) playCount_.Arm();
@@ -60,6 +58,14 @@ bool TPlaySound::CrossFadeTo(Backend next, const QString& path) {
     StartTimers();
     AnnounceSong();
     return true;
+}
+
+// One that is paused or stopped would only be heard again when the new song is paused and resumed.
+void TPlaySound::FadeOutFormer() {
+    if (fading_->GetStatus() != psPlaying) return fading_.reset();
+    FadingBackend* former = AsFading(fading_.get());
+    former->SetFadeTime(settings_.FMODCrossoverTime);
+    former->StartFadeOut();
 }
 
 QString TPlaySound::COFileName() {

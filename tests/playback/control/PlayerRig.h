@@ -48,6 +48,7 @@ class ScriptedBackend : public TPlaySoundContainer {
     TPSStatus Status = psClosed;
     quint32 Length = 180'000;
     std::function<void()> OnPositionAsked;
+    std::function<void()> OnStatusAsked;
     std::function<void()> OnOpening;  // what happens while the engine waits
 
     QString Song() const { return QFileInfo(BackendFile()).completeBaseName(); }
@@ -73,6 +74,7 @@ class ScriptedBackend : public TPlaySoundContainer {
     }
     void PauseResume() override {
         Note("pause");
+        if (Status != psPlaying) return;
         passed_ = GetPosition();
         Status = psPaused;
     }
@@ -86,7 +88,10 @@ class ScriptedBackend : public TPlaySoundContainer {
         started_ = CurrentClock().Ticks();
     }
     quint32 GetLength() override { return Length; }
-    TPSStatus GetStatus() override { return Status; }
+    TPSStatus GetStatus() override {
+        if (OnStatusAsked) OnStatusAsked();
+        return Status;
+    }
 
  protected:
     void Note(const char* what) {
