@@ -146,9 +146,18 @@ void TPlaySound::RestartAutoStop() {
     if (autoStop_ > 0) timers_.StartAutoStop(autoStop_);
 }
 
+template <typename T>
+T TPlaySound::AskCurrent(T (TPlaySoundContainer::*question)(), T none) const {
+    try {
+        return current_ ? (*current_.*question)() : none;
+    } catch (const ERukException&) {
+        return none;
+    }
+}
+
 quint32 TPlaySound::GetPosition() {
     if (playExtern_) return ExternalRuns() ? static_cast<quint32>(external_->Send(ecGetPosition)) : 0;
-    return current_ ? current_->GetPosition() : 0;
+    return AskCurrent<quint32>(&TPlaySoundContainer::GetPosition, 0);
 }
 
 void TPlaySound::SetPosition(quint32 milliseconds) {
@@ -161,11 +170,11 @@ void TPlaySound::SetPosition(quint32 milliseconds) {
 
 quint32 TPlaySound::GetLength() {
     if (playExtern_) return ExternalRuns() ? static_cast<quint32>(external_->Send(ecGetLength)) : 0;
-    return current_ ? current_->GetLength() : 0;
+    return AskCurrent<quint32>(&TPlaySoundContainer::GetLength, 0);
 }
 
 TPSStatus TPlaySound::GetStatus() {
-    if (!playExtern_) return current_ ? current_->GetStatus() : psClosed;
+    if (!playExtern_) return AskCurrent(&TPlaySoundContainer::GetStatus, psClosed);
     if (!ExternalRuns()) return psClosed;
     const qint64 answer = external_->Send(ecGetStatus);
     return answer >= psClosed && answer <= psSeeking ? static_cast<TPSStatus>(answer) : psClosed;

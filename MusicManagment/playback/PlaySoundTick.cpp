@@ -122,7 +122,7 @@ void TPlaySound::HandleEndOfSong() {
 
 // After a song that nothing has followed. One whose length was told too short plays on for a while.
 void TPlaySound::RestWhenOver() {
-    if (!current_ || current_->GetStatus() != psStopped) return;
+    if (!current_ || GetStatus() != psStopped) return;
     StopTimers();
     StateChanged();
 }
