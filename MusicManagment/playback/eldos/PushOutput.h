@@ -22,7 +22,7 @@ class PushOutput {
     // Forgets what is queued.
     virtual void Clear() = 0;
     virtual void SetPaused(bool paused) = 0;
-    // True once an open output has been lost. Opening it again may help.
+    // True from when an open output has been lost until it could be opened again.
     virtual bool Failed() const = 0;
 };
 
