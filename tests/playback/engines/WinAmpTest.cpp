@@ -130,6 +130,11 @@ TEST_F(WinAmpTest, PositionFollowsThePlayerAndTheTimeBetween) {
     EXPECT_EQ(sound->GetPosition(), 30000U);
     sound->SetPosition(999999);
     EXPECT_EQ(player_.Position, player_.Length);
+    // Nonsense is no more than the end.
+    player_.Position = std::numeric_limits<qint64>::max();
+    StatusAfter(*sound, 2000);
+    clock_.Now_ += 40;
+    EXPECT_EQ(sound->GetPosition(), sound->GetLength());
 
     sound->Stop();
     EXPECT_EQ(sound->GetStatus(), psStopped);
