@@ -181,14 +181,14 @@ TPSStatus TFMODPlaySound::GetStatus() {
     return library_.FSOUND_GetPaused(channel_) ? psPaused : psPlaying;
 }
 
-// Time of one pattern of the open song; 0 when its first pattern has no rows.
-quint32 TFMODPlaySound::RowTime() const {
+// Of the open song, in ms; 0 when its first pattern has no rows.
+quint32 TFMODPlaySound::PatternTime() const {
     return NotNegative(library_.FMUSIC_GetPatternLength(song_, 0)) * kRowTime;
 }
 
 quint32 TFMODPlaySound::GetPosition() {
     if (song_ != FMUSIC_MODULE::kNone)
-        return NotNegative(library_.FMUSIC_GetOrder(song_)) * RowTime() +
+        return NotNegative(library_.FMUSIC_GetOrder(song_)) * PatternTime() +
                NotNegative(library_.FMUSIC_GetRow(song_)) * kRowTime;
     if (stream_ != FSOUND_STREAM::kNone) return NotNegative(library_.FSOUND_Stream_GetTime(stream_));
     return 0;
@@ -196,7 +196,7 @@ quint32 TFMODPlaySound::GetPosition() {
 
 void TFMODPlaySound::SetPosition(quint32 milliseconds) {
     if (song_ != FMUSIC_MODULE::kNone) {
-        if (const quint32 pattern = RowTime(); pattern != 0)
+        if (const quint32 pattern = PatternTime(); pattern != 0)
             library_.FMUSIC_SetOrder(song_, static_cast<int>(milliseconds / pattern));
     } else if (stream_ != FSOUND_STREAM::kNone) {
         library_.FSOUND_Stream_SetTime(stream_, static_cast<int>(std::min<quint32>(milliseconds, INT_MAX)));
@@ -204,7 +204,8 @@ void TFMODPlaySound::SetPosition(quint32 milliseconds) {
 }
 
 quint32 TFMODPlaySound::GetLength() {
-    if (song_ != FMUSIC_MODULE::kNone) return NotNegative(library_.FMUSIC_GetNumOrders(song_)) * RowTime();
+    if (song_ != FMUSIC_MODULE::kNone)
+        return NotNegative(library_.FMUSIC_GetNumOrders(song_)) * PatternTime();
     if (stream_ != FSOUND_STREAM::kNone) return NotNegative(library_.FSOUND_Stream_GetLengthMs(stream_));
     return 0;
 }

@@ -53,7 +53,7 @@ class TFMODPlaySound : public TPlaySoundContainer, public FadingBackend {
     bool StartSong();
     bool StartStream();
     bool SetPaused(bool paused);
-    quint32 RowTime() const;
+    quint32 PatternTime() const;
 
     FmodLibrary& library_;
     TFMODSettings settings_;

@@ -45,7 +45,7 @@ void TPlaySound::Play() {
     }
     if (!current_ || EndFadesOfPlaying() || !FileSource::Exists(fileName_)) return;
     current_->Play();
-    if (fading_) fading_->Play();
+    ResumeFading();
     StartTimers();
     AnnounceSong();
 }
@@ -58,6 +58,11 @@ bool TPlaySound::EndFadesOfPlaying() {
     current->SetVolume(100);
     if (FadingBackend* fading = AsFading(fading_.get())) fading->CutFadeOut();
     return true;
+}
+
+// One that has come to its end in the meantime would begin anew.
+void TPlaySound::ResumeFading() {
+    if (fading_ && fading_->GetStatus() != psStopped) fading_->Play();
 }
 
 void TPlaySound::AnnounceSong() {
@@ -109,7 +114,7 @@ void TPlaySound::PauseResume() {
     if (!current_) return;
     if (current_->GetStatus() == psPaused) {
         current_->Play();
-        if (fading_) fading_->Play();
+        ResumeFading();
         StartTimers();
         Raise(OnPlayingResumed);
         Feedback(fbResumed);
@@ -142,9 +147,18 @@ void TPlaySound::RestartAutoStop() {
     if (autoStop_ > 0) timers_.StartAutoStop(autoStop_);
 }
 
+template <typename T>
+T TPlaySound::AskCurrent(T (TPlaySoundContainer::*question)(), T none) const {
+    try {
+        return current_ ? (*current_.*question)() : none;
+    } catch (const ERukException&) {
+        return none;
+    }
+}
+
 quint32 TPlaySound::GetPosition() {
     if (playExtern_) return ExternalRuns() ? static_cast<quint32>(external_->Send(ecGetPosition)) : 0;
-    return current_ ? current_->GetPosition() : 0;
+    return AskCurrent<quint32>(&TPlaySoundContainer::GetPosition, 0);
 }
 
 void TPlaySound::SetPosition(quint32 milliseconds) {
@@ -158,11 +172,11 @@ void TPlaySound::SetPosition(quint32 milliseconds) {
 
 quint32 TPlaySound::GetLength() {
     if (playExtern_) return ExternalRuns() ? static_cast<quint32>(external_->Send(ecGetLength)) : 0;
-    return current_ ? current_->GetLength() : 0;
+    return AskCurrent<quint32>(&TPlaySoundContainer::GetLength, 0);
 }
 
 TPSStatus TPlaySound::GetStatus() {
-    if (!playExtern_) return current_ ? current_->GetStatus() : psClosed;
+    if (!playExtern_) return AskCurrent(&TPlaySoundContainer::GetStatus, psClosed);
     if (!ExternalRuns()) return psClosed;
     const qint64 answer = external_->Send(ecGetStatus);
     return answer >= psClosed && answer <= psSeeking ? static_cast<TPSStatus>(answer) : psClosed;

@@ -5,6 +5,7 @@
 #include <memory>
 #include <optional>
 
+#include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/MenuItem.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/Settings.h"
@@ -43,7 +44,8 @@ class TPlaySound : public TPlaySoundContainer,
     const QString& FileName() const { return fileName_; }
     // Closes the former song and opens this one, and plays it with AutoPlay. An empty name only closes. A
     // missing file opens nothing. Throws EPlaySoundException when no engine is allowed for the file, and what
-    // the last engine throws; nothing is open then.
+    // the last engine throws; nothing is open then. Throws EAbort when another song was opened, or this one
+    // closed, while it was being opened: engines and messages may let the event loop run.
     void SetFileName(const QString& path) override;
     void Open() override;
     void Close() override;
@@ -51,7 +53,9 @@ class TPlaySound : public TPlaySoundContainer,
     // external player's.
     std::optional<TEngine> CurrentEngine() const { return current_ ? std::optional(engine_) : std::nullopt; }
 
-    // --- Playing. Without a song they do nothing. They throw what the engine throws ---
+    // --- Playing. Without a song they do nothing. They throw what the engine throws, but for the Get
+    // questions, which windows and the desktop ask at any time: a song whose engine fails is as good as
+    // closed, and the next tick or command tells why. ---
     void Play() override;
     void Stop() override { Stop(StopMode::AtOnce); }
     void Stop(StopMode mode);
@@ -155,17 +159,22 @@ class TPlaySound : public TPlaySoundContainer,
 
     // PlaySoundOpen.cpp
     Backend MakeBackend(TEngine engine, const QString& path) const;
+    void OpenBackend(TEngine engine);
     void CreateBackend(TEngine engine, const QString& message);
     bool CreateBackendsAfter(TEngine failed, const QString& message);
     bool OpenExternally();
     bool UseExternal();
     bool ExternalRuns();
     void PlayInternally();
+    void TellWhileOpening(MessageKind kind, const QString& text);
     void CloseBackends();
     void ClearPanel();
 
     // PlaySound.cpp
+    template <typename T>
+    T AskCurrent(T (TPlaySoundContainer::*question)(), T none) const;
     bool EndFadesOfPlaying();
+    void ResumeFading();
     void AnnounceSong();
     void FinishStop();
     void StartTimers();
@@ -178,6 +187,7 @@ class TPlaySound : public TPlaySoundContainer,
     // PlaySoundFades.cpp
     bool CanFade() const;
     bool CrossFadeTo(Backend next, const QString& path);
+    void FadeOutFormer();
 
     // PlaySoundTick.cpp
     void RunTick(TickKind kind);
@@ -193,11 +203,13 @@ class TPlaySound : public TPlaySoundContainer,
     void AskForNextSong(SongChange change);
     void PlayNextOfDatabase(SongChange change);
     void RunHandler(void (TPlaySound::*handler)());
+    static void RunGuarded(const std::function<void()>& action, const std::function<void()>& onFailure);
 
     // PlaySoundFeedback.cpp
     void Raise(const TNotifyEvent& event);
     void Feedback(FeedbackCode code, quint32 parameter = 0);
     void StateChanged();
+    void TakeFeedback(int code, quint32 parameter);
     qint64 HandleFeedback(int code, quint32 parameter) override;
     void HandleFeedbackText(int code, const QString& text) override;
 
@@ -206,6 +218,8 @@ class TPlaySound : public TPlaySoundContainer,
     QString fileName_;
     QString coFileName_;
     Backend current_;
+    Backend opening_;                 // on its way to be the current one
+    unsigned generation_ = 0;         // changes with every song that is opened or closed
     TEngine engine_ = TEngine::FMOD;  // of the current song
     Backend fading_;                  // the song that fades out
     PlayTimers timers_;

@@ -23,10 +23,13 @@ bool TPlaySound::PlayWithCrossFade(const QString& path) {
         RestartAutoStop();
         return true;
     }
-    if (AsFading(current_.get()) == nullptr || !CanFade()) return false;
+    // In this order: whoever is asked for the mode may close the song.
+    if (!CanFade() || AsFading(current_.get()) == nullptr) return false;
     if (!FileSource::Exists(path) || ChooseEngine(path, settings_) != TEngine::FMOD) return false;
     try {
-        return CrossFadeTo(MakeBackend(TEngine::FMOD, path), path);
+        Backend next = MakeBackend(TEngine::FMOD, path);
+        next->Open();
+        return CrossFadeTo(std::move(next), path);
     } catch (const EFMODException&) {
         // The song that plays is worth more than the reason; the hard change that follows tells it.
         return false;
@@ -43,10 +46,9 @@ bool TPlaySound::CrossFadeTo(Backend next, const QString& path) {
     next->Play();
     fadingIn->FadeStep();  // no moment at full volume before the first tick
 
+    ++generation_;
     fading_ = std::exchange(current_, std::move(next));
-    FadingBackend* fadingOut = AsFading(fading_.get());
-    fadingOut->SetFadeTime(settings_.FMODCrossoverTime);
-    fadingOut->StartFadeOut();
+    FadeOutFormer();
 
     // A song that is faded in counts as well, though its name does not go through SetFileName.
     if (path != fileName_) playCount_.Arm();
@@ -56,6 +58,14 @@ bool TPlaySound::CrossFadeTo(Backend next, const QString& path) {
     StartTimers();
     AnnounceSong();
     return true;
+}
+
+// One that is paused or stopped would only be heard again when the new song is paused and resumed.
+void TPlaySound::FadeOutFormer() {
+    if (fading_->GetStatus() != psPlaying) return fading_.reset();
+    FadingBackend* former = AsFading(fading_.get());
+    former->SetFadeTime(settings_.FMODCrossoverTime);
+    former->StartFadeOut();
 }
 
 QString TPlaySound::COFileName() {
@@ -80,6 +90,7 @@ void TPlaySound::SetCOFileName(const QString& path) {
         return;
     }
     Backend song = MakeBackend(TEngine::FMOD, path);
+    song->Open();
     if (FadingBackend* fading = AsFading(song.get())) {
         fading->SetFadeTime(settings_.FMODCrossoverTime);
         fading->StartFadeOut();

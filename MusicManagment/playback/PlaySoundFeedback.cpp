@@ -21,9 +21,17 @@ void TPlaySound::StateChanged() {
     Feedback(fbStateChanged, 1);
 }
 
+// It comes from the event loop, where nobody could tell the user. What an external player has said last may
+// come when songs play here again, and is not about them.
+qint64 TPlaySound::HandleFeedback(int code, quint32 parameter) {
+    if (code == fbCrossoverQuery) return controller_ != nullptr ? 1 : Crossover() & kModeMask;
+    if (playExtern_) RunGuarded([&] { TakeFeedback(code, parameter); }, nullptr);
+    return 0;
+}
+
 // With a controller of its own this program only sits in between: the end of a song and the counting are the
 // controller's then.
-qint64 TPlaySound::HandleFeedback(int code, quint32 parameter) {
+void TPlaySound::TakeFeedback(int code, quint32 parameter) {
     switch (code) {
         case fbEndOfSong:
             if (controller_ == nullptr) HandleEndOfSong();
@@ -56,14 +64,11 @@ qint64 TPlaySound::HandleFeedback(int code, quint32 parameter) {
         case fbResumed:
             Raise(OnPlayingResumed);
             break;
-        case fbCrossoverQuery:
-            return controller_ != nullptr ? 1 : Crossover() & kModeMask;
         default:
             break;
     }
-    return 0;
 }
 
 void TPlaySound::HandleFeedbackText(int code, const QString& text) {
-    if (code == fbFileName && panel_ != nullptr) panel_->ShowSong(text);
+    if (code == fbFileName && playExtern_ && panel_ != nullptr) panel_->ShowSong(text);
 }

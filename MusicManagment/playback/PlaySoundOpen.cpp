@@ -1,9 +1,8 @@
+#include <QScopeGuard>
 #include <utility>
 
-#include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/playback/ExternalLink.h"
-#include "MusicManagment/playback/GainBackend.h"
 #include "MusicManagment/playback/PlaySound.h"
 
 // Opening a song: in which engine, in which other engines when that one refuses, or in the external player.
@@ -30,6 +29,7 @@ void TPlaySound::Open() {
 }
 
 void TPlaySound::Close() {
+    ++generation_;
     if (ExternalRuns()) {
         external_->Send(ecClose);
         external_->Send(ecCloseFading);
@@ -40,6 +40,7 @@ void TPlaySound::Close() {
 void TPlaySound::CloseBackends() {
     StopTimers();
     current_.reset();
+    opening_.reset();
     fading_.reset();
 }
 
@@ -51,26 +52,33 @@ void TPlaySound::ClearPanel() {
 
 // --- Engines ---
 
-// Full loudness is what engines begin with; another program that plays may have one of its own, which stays.
 TPlaySound::Backend TPlaySound::MakeBackend(TEngine engine, const QString& path) const {
     Backend backend = engineTable_.Create(engine, settings_);
     backend->SetBackendFile(path);
-    backend->Open();
-    if (GainBackend* adjustable = AsGain(backend.get()); adjustable != nullptr && gain_ < 1)
-        adjustable->SetGain(gain_);
     return backend;
+}
+
+// Where others may close it while it waits for its engine. Full loudness is what engines begin with; another
+// program that plays may have one of its own, which stays.
+void TPlaySound::OpenBackend(TEngine engine) {
+    const auto forget = qScopeGuard([this] { opening_.reset(); });
+    opening_ = MakeBackend(engine, fileName_);
+    opening_->Open();
+    if (!opening_) throw EAbort();
+    current_ = std::move(opening_);
+    engine_ = engine;
+    if (gain_ < 1) SetGain(gain_);
 }
 
 // A message tells why another engine has refused. An engine that refuses here hands over to those behind it.
 void TPlaySound::CreateBackend(TEngine engine, const QString& message) {
     if (!message.isEmpty())
-        UserDialogs().ShowMessage(MessageKind::Warning, message + u"\r\nVersuche "_s + EngineName(engine));
+        TellWhileOpening(MessageKind::Warning, message + u"\r\nVersuche "_s + EngineName(engine));
     if (OpenExternally()) return;
     StopTimers();
     current_.reset();
     try {
-        current_ = MakeBackend(engine, fileName_);
-        engine_ = engine;
+        OpenBackend(engine);
     } catch (const EFMODException& error) {
         if (!CreateBackendsAfter(TEngine::FMOD, error.Message())) throw;
     } catch (const EEldoSException& error) {
@@ -137,6 +145,13 @@ bool TPlaySound::UseExternal() {
 void TPlaySound::PlayInternally() {
     playExtern_ = false;
     CloseBackends();
-    UserDialogs().ShowMessage(
-        MessageKind::Error, u"Kann das Programm TSPlayer nicht starten. Der Sound wird intern abgespielt."_s);
+    TellWhileOpening(MessageKind::Error,
+                     u"Kann das Programm TSPlayer nicht starten. Der Sound wird intern abgespielt."_s);
+}
+
+// Whoever opens or closes a song while the message stands has the last word.
+void TPlaySound::TellWhileOpening(MessageKind kind, const QString& text) {
+    const unsigned before = generation_;
+    UserDialogs().ShowMessage(kind, text);
+    if (generation_ != before) throw EAbort();
 }

@@ -27,7 +27,7 @@ struct NumberRow {
 
 constexpr NumberRow kNumbers[] = {
     {u"FMODMixRate", &EngineSettings::FMODMixRate, 4000, 192000},
-    {u"FMODSoftChannels", &EngineSettings::FMODSoftChannels, 1, 4093},
+    {u"FMODSoftChannels", &EngineSettings::FMODSoftChannels, 1, 1024},
     {u"FMODBufferSize", &EngineSettings::FMODBufferSize, 0, 10000},
     {u"EldoSBufferCount", &EngineSettings::EldoSBufferCount, 1, 64},
     {u"EldoSBufferSize", &EngineSettings::EldoSBufferSize, 1024, 1 << 22},

@@ -20,15 +20,23 @@ bool IsInLast(quint32 zone, quint32 position, quint32 length) {
 
 // A timer's handler has nobody above it who could tell the user.
 void TPlaySound::RunHandler(void (TPlaySound::*handler)()) {
+    RunGuarded([this, handler] { (this->*handler)(); },
+               [this, handler] {
+                   // What a tick throws the next one throws again: the song is over. The message box lets
+                   // timers run, so that the next song need not wait for the user.
+                   timers_.StopTicks();
+                   if (handler == &TPlaySound::Tick) timers_.StartEnd();
+               });
+}
+
+// `onFailure` runs before the user is told.
+void TPlaySound::RunGuarded(const std::function<void()>& action, const std::function<void()>& onFailure) {
     try {
-        (this->*handler)();
+        action();
     } catch (const EAbort&) {
         return;  // the user has been told
     } catch (const ERukException& error) {
-        // What a tick throws the next one throws again: the song is over. The message box lets timers run, so
-        // that the next song need not wait for the user.
-        timers_.StopTicks();
-        if (handler == &TPlaySound::Tick) timers_.StartEnd();
+        if (onFailure) onFailure();
         UserDialogs().ShowMessage(MessageKind::Error, error.Message());
     }
 }
@@ -94,7 +102,9 @@ void TPlaySound::CheckEnd(quint32 position, quint32 length) {
 
 void TPlaySound::CheckCrossFade(quint32 position, quint32 length) {
     if (!current_ || crossFadeStarted_ || IsStopping() || length == 0) return;
+    const unsigned before = generation_;
     if (!IsInLast(settings_.FMODCrossoverTime, position, length) || Crossover() == coNone) return;
+    if (generation_ != before) return;  // another song came while the mode was asked for
     crossFadeStarted_ = true;
     Raise(OnCrossover);
     if (AsFading(current_.get()) != nullptr && settings_.FMODCrossoverTime >= kShortestFade)
@@ -112,7 +122,7 @@ void TPlaySound::HandleEndOfSong() {
 
 // After a song that nothing has followed. One whose length was told too short plays on for a while.
 void TPlaySound::RestWhenOver() {
-    if (!current_ || current_->GetStatus() != psStopped) return;
+    if (!current_ || GetStatus() != psStopped) return;
     StopTimers();
     StateChanged();
 }

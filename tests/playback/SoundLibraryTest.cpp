@@ -173,6 +173,21 @@ TEST_F(SoundLibraryTest, WavFileHoldsWhatWasHeard) {
     }
 }
 
+TEST_F(SoundLibraryTest, NothingPlaysOnIntoAFileThatTakesNoMore) {
+    const QString full = u"/dev/full"_s;
+    if (!QFile::exists(full)) GTEST_SKIP() << "no device that is always full";
+    WriteWav(Path("a.wav"), Sine({}, 1));
+    SoundLibrary writing(
+        OutputsFor({.kind = OutputChoice::Kind::WavFile, .name = full, .floats = true, .unpaced = true}));
+    ASSERT_TRUE(writing.FSOUND_Init(44100, 32, 2));
+    const FSOUND_STREAM stream = writing.FSOUND_Stream_OpenFile(Path("a.wav"), 0x29);
+    const int channel = writing.FSOUND_Stream_PlayEx(stream, FSOUND_FREE, FSOUND_DSPUNIT::kNone, false);
+    EXPECT_TRUE(writing.FSOUND_IsPlaying(channel));
+    writing.Advance(22'050);
+    EXPECT_LT(writing.FSOUND_Stream_GetTime(stream), 500);
+    EXPECT_FALSE(writing.FSOUND_IsPlaying(channel));
+}
+
 TEST(SinkOutputTest, RealTimeOutputPullsByItself) {
     for (int i = 0; i < 3; ++i) {
         std::atomic<int> pulls = 0;

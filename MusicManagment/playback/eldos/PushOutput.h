@@ -24,7 +24,7 @@ class PushOutput {
     virtual void SetPaused(bool paused) = 0;
     // 0 to 1 of the amplitude; heard at once, also in what is queued.
     virtual void SetGain(float gain) = 0;
-    // True once an open output has been lost. Opening it again may help.
+    // True from when an open output has been lost until it could be opened again.
     virtual bool Failed() const = 0;
 };
 

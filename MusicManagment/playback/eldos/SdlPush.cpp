@@ -91,7 +91,7 @@ void SdlPush::SetPaused(bool paused) {
 
 // When its server ends SDL goes on taking samples, and only the device's status tells.
 bool SdlPush::Failed() const {
-    return device_ != 0 && !paused_ && SDL_GetAudioDeviceStatus(device_) != SDL_AUDIO_PLAYING;
+    return device_ == 0 || (!paused_ && SDL_GetAudioDeviceStatus(device_) != SDL_AUDIO_PLAYING);
 }
 
 void SdlPush::Close() {

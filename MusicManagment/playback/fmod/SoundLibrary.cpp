@@ -145,6 +145,12 @@ bool SoundLibrary::OutputWorks() {
     return OpenOutput();
 }
 
+// Sounds wait for a device that can come back. Into a file that takes no more nothing plays on.
+bool SoundLibrary::Sounds(int channel) {
+    const bool isOver = !OutputWorks() && output_ != nullptr;
+    return !isOver && mixer_->Playing(channel);
+}
+
 // Runs in the output's thread.
 void SoundLibrary::Render(float* stereo, std::size_t frames) {
     if (!output_->Unpaced()) return mixer_->Render(stereo, frames);
@@ -177,9 +183,7 @@ bool SoundLibrary::FSOUND_GetPaused(int channel) {
 }
 
 bool SoundLibrary::FSOUND_IsPlaying(int channel) {
-    if (!Initialised()) return false;
-    OutputWorks();
-    return mixer_->Playing(channel);
+    return Initialised() && Sounds(channel);
 }
 
 bool SoundLibrary::FSOUND_SetVolume(int channel, int volume) {

@@ -99,6 +99,7 @@ class SoundLibrary : public FmodLibrary {
 
     bool OpenOutput();
     bool OutputWorks();
+    bool Sounds(int channel);
     void Render(float* stereo, std::size_t frames);
     bool StartVoice(Voice& voice, float gain, bool paused);
     bool Rewind(Voice& voice);

@@ -52,9 +52,7 @@ bool SoundLibrary::FMUSIC_GetPaused(FMUSIC_MODULE song) {
 
 bool SoundLibrary::FMUSIC_IsPlaying(FMUSIC_MODULE song) {
     const Song* found = Find(songs_, song);
-    if (found == nullptr) return false;
-    OutputWorks();
-    return mixer_->Playing(found->channel);
+    return found != nullptr && Sounds(found->channel);
 }
 
 // Kept for a song that does not play yet.

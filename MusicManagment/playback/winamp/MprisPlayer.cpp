@@ -5,6 +5,7 @@
 #include <QDBusObjectPath>
 #include <QDBusVariant>
 #include <QUrl>
+#include <limits>
 
 #include "MusicManagment/playback/winamp/Waiting.h"
 
@@ -16,6 +17,7 @@ constexpr QLatin1StringView kPrefix("org.mpris.MediaPlayer2.");
 constexpr QLatin1StringView kInstance(".instance");
 constexpr QLatin1StringView kOwnName("tunestead");
 const QString kPlayerInterface = u"org.mpris.MediaPlayer2.Player"_s;
+constexpr qint64 kLongest = qint64{std::numeric_limits<quint32>::max()} * 1000;  // microseconds
 
 QDBusMessage Message(const QString& name, const QString& interface, const QString& method,
                      const QVariantList& arguments) {
@@ -54,10 +56,15 @@ QString TrackIdOf(const QVariant& value) {
     return value.toString();
 }
 
+// Within what is counted with, whatever the player says.
+qint64 TimeOf(const QVariant& microseconds) {
+    return qBound(qint64{0}, microseconds.toLongLong(), kLongest);
+}
+
 void TakeMetadata(const QVariantMap& metadata, MprisState& state) {
     const QUrl url(metadata.value(u"xesam:url"_s).toString());
     if (url.isLocalFile()) state.File = url.toLocalFile();
-    state.Length = qMax(qint64{0}, metadata.value(u"mpris:length"_s).toLongLong());
+    state.Length = TimeOf(metadata.value(u"mpris:length"_s));
     state.TrackId = TrackIdOf(metadata.value(u"mpris:trackid"_s));
 }
 
@@ -104,7 +111,7 @@ MprisPlayer::Answer MprisPlayer::TakeState(const QDBusMessage& answer, MprisStat
     const auto properties = qdbus_cast<QVariantMap>(answer.arguments().constFirst());
     state = {};
     state.Status = properties.value(u"PlaybackStatus"_s).toString();
-    state.Position = qMax(qint64{0}, properties.value(u"Position"_s).toLongLong());
+    state.Position = TimeOf(properties.value(u"Position"_s));
     state.CanSeek = properties.value(u"CanSeek"_s, true).toBool();
     TakeMetadata(qdbus_cast<QVariantMap>(properties.value(u"Metadata"_s)), state);
     return Answer::Done;

@@ -101,7 +101,7 @@ void TWinAmpPlaySound::Open() {
 void TWinAmpPlaySound::Close() {
     ++generation_;
     holdTimer_.stop();
-    if (player_ && wish_ != Wish::Nothing && !over_) player_->Send(u"Stop"_s);
+    if (player_ && !over_) player_->Send(u"Stop"_s);
     player_.reset();
     asked_.reset();
     wish_ = Wish::Nothing;
@@ -179,11 +179,13 @@ TPSStatus TWinAmpPlaySound::GetStatus() {
 void TWinAmpPlaySound::Load() {
     if (!settings_.Bus.isConnected())
         Throw(u"Es gibt keinen Sitzungsbus (D-Bus), über den ein Player gesteuert werden könnte."_s);
+    Player player = FindPlayer();
+    if (!player || !HandFileOver(player)) player = StartAndWait();
+    // From here on it is to be stopped when the song is closed; without one the former stays.
+    player_ = player;
     over_ = false;
     asked_.reset();
-    player_ = FindPlayer();
-    if (!player_ || !HandFileOver(player_)) player_ = StartAndWait();
-    WaitForFile(player_);
+    WaitForFile(player);
 }
 
 TWinAmpPlaySound::Player TWinAmpPlaySound::FindPlayer() {

@@ -260,6 +260,34 @@ TEST_F(ExternalTest, FeedbackAsksForTheModeAndTheNextSong) {
     EXPECT_EQ(script_.Take(), QStringList({u"13 0"_s, u"14 0"_s, u"17 \"c.mp3\""_s, u"15 0"_s}));
 }
 
+TEST_F(ExternalTest, ErrorThatFeedbackLeadsToIsToldTheUser) {
+    TMusicDatabase database;
+    database.SetSortType(stPath);
+    player_.SetMusicDatabase(&database);
+    for (const QString& song : {u"a.wav"_s, u"b.wav"_s})
+        database.AddSong(Add(song));
+    OpenThere(u"a.wav"_s);
+    Change([](EngineSettings& s) { s.UseFMOD = s.UseMCI = s.UseEldoS = s.UseWinAmp = false; });
+    EXPECT_EQ(script_.Receiver->HandleFeedback(1, 0), 0);
+    EXPECT_EQ(Messages(), QStringList{u"Keine Engine zum Verwenden freigegeben "
+                                      "(UseFMOD, UseMCI, UseEldoS, UseWinAmp, ...)"_s});
+}
+
+TEST_F(ExternalTest, FeedbackThatComesTooLateIsNotAboutTheSongThatPlaysHere) {
+    OpenThere(u"a.mp3"_s);
+    player_.SetPlayExtern(false);
+    player_.Play();
+    panel_.Log.clear();
+    int ends = 0;
+    player_.OnReachedEndOfSong = [&](TPlaySound&) { ++ends; };
+    for (const int code : {1, 3, 4, 5, 6})
+        script_.Receiver->HandleFeedback(code, 4711);
+    script_.Receiver->HandleFeedbackText(11, u"/m/x.mp3"_s);
+    EXPECT_EQ(ends, 0);
+    EXPECT_TRUE(panel_.Log.isEmpty());
+    EXPECT_NE(panel_.Position, 4711U);
+}
+
 TEST_F(ExternalTest, WithAControllerOfItsOwnTheEndAndTheCountAreNotItsBusiness) {
     TMusicDatabase database;
     player_.SetMusicDatabase(&database);

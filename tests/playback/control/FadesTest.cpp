@@ -158,6 +158,29 @@ TEST_F(FadesTest, BothSongsPauseAndGoOn) {
     EXPECT_EQ(Open(), u"FMOD:b"_s);
 }
 
+TEST_F(FadesTest, SongThatDoesNotSoundIsNotHeardAgainAfterAPause) {
+    // The song before has come to its end, a moment before its fade would.
+    PlaySong(u"a.mp3"_s);
+    player_.PlayWithCrossFade(Add(u"b.mp3"_s));
+    Any(u"a"_s).Status = psStopped;
+    player_.PauseResume();
+    player_.PauseResume();
+    EXPECT_EQ(Any(u"a"_s).Status, psStopped);
+    player_.PauseResume();
+    player_.Play();
+    EXPECT_EQ(Any(u"a"_s).Status, psStopped);
+    EXPECT_EQ(Any(u"b"_s).Status, psPlaying);
+
+    // It was paused, or stopped, when the next one was asked for.
+    player_.PauseResume();
+    EXPECT_TRUE(player_.PlayWithCrossFade(Add(u"c.mp3"_s)));
+    EXPECT_EQ(Open(), u"FMOD:c"_s);
+    player_.Stop();
+    EXPECT_TRUE(player_.PlayWithCrossFade(Add(u"d.mp3"_s)));
+    EXPECT_EQ(Open(), u"FMOD:d"_s);
+    EXPECT_TRUE(Fading(u"d"_s).IsFadingIn());
+}
+
 TEST_F(FadesTest, WhateverPreventsACrossFadeLeavesTheSongAlone) {
     PlaySong(u"a.mp3"_s);
     const auto refuses = [this](const QString& path) {
@@ -179,6 +202,27 @@ TEST_F(FadesTest, WhateverPreventsACrossFadeLeavesTheSongAlone) {
     panel_.Mode = coAutoChange;
     Change([](EngineSettings& s) { s.FMODCrossoverTime = 2999; });
     EXPECT_TRUE(refuses(Add(u"b.mp3"_s)));
+}
+
+// A controller is another program: while it is asked it may go, which closes the song, or send commands.
+TEST_F(FadesTest, SongMayChangeWhileTheModeIsAskedFor) {
+    ScriptedController controller;
+    controller.Mode = coAutoChange;
+    length_ = 20'000;
+    PlaySong(u"a.mp3"_s);
+    player_.SetController(&controller);
+    controller.OnAsked = [this] { player_.Close(); };
+    EXPECT_FALSE(player_.PlayWithCrossFade(Add(u"b.mp3"_s)));
+    EXPECT_EQ(Open(), QString());
+
+    int crossovers = 0;
+    player_.OnCrossover = [&](TPlaySound&) { ++crossovers; };
+    controller.OnAsked = nullptr;
+    PlaySong(u"c.mp3"_s);
+    controller.OnAsked = [this] { player_.SetFileName(Add(u"d.mp3"_s)); };
+    Pass(12'000);
+    EXPECT_EQ(Open(), u"FMOD:d"_s);
+    EXPECT_EQ(crossovers, 0);
 }
 
 TEST_F(FadesTest, ListWaitsForTheEndWhereSongsCannotCross) {

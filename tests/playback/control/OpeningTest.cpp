@@ -84,6 +84,45 @@ TEST_F(OpeningTest, ErrorOfTheLastEngineReachesTheCaller) {
     EXPECT_FALSE(player_.Timers().Ticking());
 }
 
+TEST_F(OpeningTest, WhoOpensAnotherSongWhileOneIsBeingOpenedHasTheLastWord) {
+    onOpening_ = [this] { PlaySong(u"b.mp3"_s); };
+    EXPECT_THROW(player_.SetFileName(Add(u"a.mp3"_s)), EAbort);
+    EXPECT_EQ(Open(), u"FMOD:b"_s);
+    EXPECT_EQ(player_.FileName(), folder_.Path(u"b.mp3"_s));
+    EXPECT_EQ(player_.GetStatus(), psPlaying);
+    EXPECT_TRUE(player_.Timers().Ticking());
+
+    onOpening_ = [this] {
+        player_.Play();  // there is nothing to play yet
+        EXPECT_FALSE(player_.Timers().Ticking());
+        player_.SetFileName(QString());
+    };
+    EXPECT_THROW(player_.SetFileName(Add(u"c.mp3"_s)), EAbort);
+    EXPECT_EQ(Open(), QString());
+}
+
+class InterruptingDialogs : public ScriptedDialogs {
+ public:
+    std::function<void()> OnMessage;
+    void ShowMessage(MessageKind kind, const QString& text) override {
+        ScriptedDialogs::ShowMessage(kind, text);
+        OnMessage();
+    }
+};
+
+TEST_F(OpeningTest, WhoOpensAnotherSongWhileAMessageStandsHasTheLastWord) {
+    InterruptingDialogs dialogs;
+    onCreate_[TEngine::FMOD] = Refuse<EFMODException>(u"f"_s);
+    dialogs.OnMessage = [this] {
+        onCreate_.clear();
+        PlaySong(u"b.mp3"_s);
+    };
+    EXPECT_THROW(player_.SetFileName(Add(u"a.mp3"_s)), EAbort);
+    EXPECT_EQ(dialogs.Messages.size(), 1U);
+    EXPECT_EQ(Open(), u"FMOD:b"_s);
+    EXPECT_EQ(player_.GetStatus(), psPlaying);
+}
+
 TEST_F(OpeningTest, ClosingRestsTheTimers) {
     player_.SetAutoStop(5000);
     PlaySong(u"a.mp3"_s);

@@ -167,6 +167,7 @@ TEST_F(PlaySoundTest, SettingsComeBackAndDamagedOnesAreLeftOut) {
         settings.WriteInteger(u"CrossoverTime"_s, 4000);
         settings.WriteInteger(u"FMODSoundOutput"_s, 99);
         settings.WriteInteger(u"FMODMixRate"_s, -1);
+        settings.WriteInteger(u"FMODSoftChannels"_s, 1025);
         settings.WriteString(u"WinAmpFileName"_s, u"mpv"_s);
         settings.WriteInteger(u"Crossover"_s, coAlways);
         LoadDatabaseSettings(database, settings);

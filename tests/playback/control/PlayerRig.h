@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <QPointer>
 #include <algorithm>
 #include <map>
 
@@ -49,12 +50,17 @@ class ScriptedBackend : public TPlaySoundContainer, public GainBackend {
     quint32 Length = 180'000;
     float Gain = -1;  // until one is set
     std::function<void()> OnPositionAsked;
+    std::function<void()> OnStatusAsked;
+    std::function<void()> OnOpening;  // what happens while the engine waits
 
     QString Song() const { return QFileInfo(BackendFile()).completeBaseName(); }
     const QString& Engine() const { return engine_; }
 
     void Open() override {
         Note("open");
+        const QPointer<ScriptedBackend> self(this);
+        if (const auto happens = std::exchange(OnOpening, nullptr)) happens();
+        if (self.isNull()) throw EAbort();
         Status = psStopped;
     }
     void Close() override { Status = psClosed; }
@@ -70,6 +76,7 @@ class ScriptedBackend : public TPlaySoundContainer, public GainBackend {
     }
     void PauseResume() override {
         Note("pause");
+        if (Status != psPlaying) return;
         passed_ = GetPosition();
         Status = psPaused;
     }
@@ -83,7 +90,10 @@ class ScriptedBackend : public TPlaySoundContainer, public GainBackend {
         started_ = CurrentClock().Ticks();
     }
     quint32 GetLength() override { return Length; }
-    TPSStatus GetStatus() override { return Status; }
+    TPSStatus GetStatus() override {
+        if (OnStatusAsked) OnStatusAsked();
+        return Status;
+    }
     void SetGain(float gain) override { Gain = gain; }
 
  protected:
@@ -161,7 +171,11 @@ class ScriptedController : public PlayController {
     void FeedbackFileName(const QString& fileName) override {
         Log << QStringLiteral("11 ") + QFileInfo(fileName).completeBaseName();
     }
-    TCrossover AskCrossover() override { return Mode; }
+    TCrossover AskCrossover() override {
+        if (OnAsked) OnAsked();
+        return Mode;
+    }
+    std::function<void()> OnAsked;
 };
 
 // A player over scripted engines, and a folder with songs.
@@ -216,7 +230,8 @@ class PlayerTest : public testing::Test {
     Stage stage_;
     // What an engine does before it makes a back end: throw, when it is to fail.
     std::map<TEngine, std::function<void()>> onCreate_;
-    quint32 length_ = 180'000;  // of the songs opened from now on
+    quint32 length_ = 180'000;         // of the songs opened from now on
+    std::function<void()> onOpening_;  // what happens while the next song is being opened
     TPlaySound player_;
 
  private:
@@ -234,6 +249,7 @@ class PlayerTest : public testing::Test {
         else
             backend = std::make_unique<ScriptedBackend>(stage_, EngineName(engine));
         backend->Length = length_;
+        backend->OnOpening = std::exchange(onOpening_, nullptr);
         return backend;
     }
 };

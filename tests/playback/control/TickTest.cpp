@@ -99,6 +99,22 @@ TEST_F(TickTest, ErrorWhilePlayingIsToldOnceAndEndsTheSong) {
     EXPECT_EQ(Open(), u"FMOD:b"_s);
 }
 
+TEST_F(TickTest, SongWhoseEngineFailsIsAsGoodAsClosedForThoseWhoAsk) {
+    HardChanges();
+    List({u"a.cda"_s});
+    list_.PlayNext();
+    ScriptedBackend& song = Any(u"a"_s);
+    song.OnPositionAsked = song.OnStatusAsked = [] { throw EMCIException(u"weg"_s); };
+    EXPECT_EQ(player_.GetPosition(), 0U);
+    EXPECT_EQ(player_.GetStatus(), psClosed);
+    EXPECT_THROW(player_.PauseResume(), EMCIException);
+    Pass(3000);
+    EXPECT_EQ(Messages(), (QStringList{u"weg"_s,
+                                       u"Es wurden alle in der PlayList enthaltenen Lieder "
+                                       "abgespielt."_s}));
+    EXPECT_FALSE(player_.Timers().Ticking());
+}
+
 TEST_F(TickTest, AutoStopFadesAndPlaysTheNextSong) {
     List({u"a.mp3"_s, u"b.mp3"_s});
     list_.SetScan(true);

@@ -8,6 +8,7 @@
 #include <numbers>
 
 #include "MusicManagment/playback/eldos/NullPush.h"
+#include "MusicManagment/playback/eldos/SdlPush.h"
 #include "tests/PrintQt.h"
 #include "tests/playback/control/PlayerRig.h"
 #include "tests/playback/engines/EncodedTone.h"
@@ -41,7 +42,7 @@ class RecordingOutput : public PushOutput {
         record_.rate = rate;
         record_.channels = channels;
         record_.queued = 0;
-        record_.lost = false;
+        record_.lost = !record_.canOpen;
         return record_.canOpen;
     }
     bool Queue(std::span<const std::int16_t> samples) override {
@@ -302,6 +303,19 @@ TEST_F(EldoSTest, ALostOutputIsOpenedAgainOrStopsTheSong) {
     record_.canOpen = false;
     sound->TopUp();
     EXPECT_EQ(sound->GetStatus(), psStopped);
+    const quint32 length = sound->GetLength();
+    sound->Play();
+    EXPECT_EQ(sound->GetStatus(), psStopped);
+    record_.canOpen = true;
+    sound->Play();
+    EXPECT_EQ(sound->GetStatus(), psPlaying);
+    EXPECT_EQ(sound->GetLength(), length);
+}
+
+TEST(SdlPushTest, AnOutputThatCannotBeOpenedStaysLost) {
+    SdlPush output({u"no such driver"_s});
+    EXPECT_FALSE(output.Open(44100, 2));
+    EXPECT_TRUE(output.Failed());
 }
 
 TEST_F(EldoSTest, WithoutAnOutputNothingIsOpened) {

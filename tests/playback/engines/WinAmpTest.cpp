@@ -130,6 +130,11 @@ TEST_F(WinAmpTest, PositionFollowsThePlayerAndTheTimeBetween) {
     EXPECT_EQ(sound->GetPosition(), 30000U);
     sound->SetPosition(999999);
     EXPECT_EQ(player_.Position, player_.Length);
+    // Nonsense is no more than the end.
+    player_.Position = std::numeric_limits<qint64>::max();
+    StatusAfter(*sound, 2000);
+    clock_.Now_ += 40;
+    EXPECT_EQ(sound->GetPosition(), sound->GetLength());
 
     sound->Stop();
     EXPECT_EQ(sound->GetStatus(), psStopped);
@@ -212,6 +217,23 @@ TEST_F(WinAmpTest, APlayerThatDoesNotRunIsStartedAndWaitedFor) {
     sound->Play();
     EXPECT_EQ(rounds, 10);
     EXPECT_EQ(sound->GetStatus(), psPlaying);
+}
+
+TEST_F(WinAmpTest, APlayerThatIsGoneForGoodIsAnErrorEachTime) {
+    settings_.ClassName = u"fake"_s;
+    const auto sound = Playing();
+    player_.Vanish();
+    EXPECT_TRUE(WaitUntil(
+        [&] {
+            clock_.Now_ += 100;
+            return sound->GetStatus() == psStopped;
+        },
+        kPatience));
+    for (int i = 0; i < 2; ++i) {
+        EXPECT_EQ(ErrorOf([&] { sound->Play(); }), u"Kann den Player fake nicht finden."_s);
+        clock_.Now_ += 5000;
+        EXPECT_EQ(sound->GetStatus(), psStopped);
+    }
 }
 
 TEST_F(WinAmpTest, AMovingPositionIsPlayingWhateverTheStatusSays) {
@@ -308,6 +330,8 @@ TEST_F(WinAmpTest, ASongThatGoesWhileItWaitsEndsTheCommandSilently) {
     QTimer::singleShot(50, [&] { sound.reset(); });
     EXPECT_THROW(sound->Open(), EAbort);
     EXPECT_EQ(sound, nullptr);
+    // The player is not left alone with what it was handed.
+    EXPECT_TRUE(WaitUntil([this] { return player_.Calls.contains(u"Stop"_s); }, kPatience));
 
     sound = Sound();
     QTimer::singleShot(50, [&] { sound->Close(); });
