@@ -97,12 +97,15 @@ std::size_t DecodeAhead::Take(float* stereo, std::size_t frames) {
     return count;
 }
 
+// What is written last is read last: it only grows, whatever the other threads do meanwhile.
 std::uint64_t DecodeAhead::Ahead() const {
-    return ring_.Written() - std::max(ring_.Taken(), start_.load(std::memory_order_acquire));
+    const std::uint64_t from = std::max(ring_.Taken(), start_.load(std::memory_order_acquire));
+    return ring_.Written() - from;
 }
 
 bool DecodeAhead::HasRoom() const {
-    return Ahead() + kChunk <= target_ && ring_.Written() - ring_.Taken() + kChunk <= ring_.Capacity();
+    const std::uint64_t taken = ring_.Taken();
+    return Ahead() + kChunk <= target_ && ring_.Written() - taken + kChunk <= ring_.Capacity();
 }
 
 void DecodeAhead::AddMark(std::uint64_t from, SongPlace place) {
