@@ -54,7 +54,7 @@ class LinkFolder {
  private:
     QString FreePath(const QFileInfo& song) {
         for (int& number = numbers_[song.fileName()];;) {
-            const QString path = folder_.filePath(LinkName(song, ++number));
+            QString path = folder_.filePath(LinkName(song, ++number));
             if (!IsTaken(QFileInfo(path))) return path;
         }
     }
