@@ -117,6 +117,7 @@ void Playing::JoinDesktop(QMainWindow& window) {
                      .Volume = [this] { return playerForm_->Panel().Volume().Part(); },
                      .SetVolume = [this](double volume) { playerForm_->Panel().Volume().SetPart(volume); }});
     mpris_->Register(QDBusConnection::sessionBus());
+    awake_ = std::make_unique<StayAwake>(QDBusConnection::sessionBus());
     const auto update = [this] { mpris_->Update(); };
     const QAbstractItemModel* list = listForm_->View().model();
     QObject::connect(list, &QAbstractItemModel::modelReset, mpris_.get(), update);
@@ -127,6 +128,7 @@ void Playing::JoinDesktop(QMainWindow& window) {
 // The list goes along with the songs that it plays.
 void Playing::FollowSong() {
     if (mpris_) mpris_->Update();
+    if (awake_) awake_->SetPlaying(player_.GetStatus() == psPlaying);
     if (list_.CurrentSong() == shownSong_) return;
     shownSong_ = list_.CurrentSong();
     listForm_->View().ShowEntry(list_.IndexOf());

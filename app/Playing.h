@@ -10,6 +10,7 @@
 #include "app/CommandMenu.h"
 #include "app/MenuIcons.h"
 #include "app/desktop/Mpris.h"
+#include "app/desktop/StayAwake.h"
 
 class QMainWindow;
 class QMenuBar;
@@ -85,5 +86,6 @@ class Playing {
     std::unique_ptr<SpectrumFeed> spectrumFeed_;
     QMenu* contextMenu_;
     std::unique_ptr<Mpris> mpris_;
+    std::unique_ptr<StayAwake> awake_;
     QString shownSong_;
 };

@@ -7,13 +7,13 @@
 #include <QDBusReply>
 #include <QDBusVariant>
 #include <QFile>
-#include <QProcess>
 #include <QTemporaryDir>
 #include <QTest>
 
 #include "MusicManagment/playback/PlaySound.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "tests/PrintQt.h"
+#include "tests/PrivateBus.h"
 #include "tests/app/ScriptedBackend.h"
 
 using namespace Qt::StringLiterals;
@@ -27,11 +27,7 @@ const QString kRoot = u"org.mpris.MediaPlayer2"_s;
 class MprisTest : public testing::Test {
  protected:
     void SetUp() override {
-        daemon_.start(u"dbus-daemon"_s, {u"--session"_s, u"--nofork"_s, u"--print-address"_s});
-        if (!daemon_.waitForStarted() || !daemon_.waitForReadyRead()) GTEST_SKIP() << "no dbus-daemon";
-        address_ = QString::fromLocal8Bit(daemon_.readLine()).trimmed();
-        desktop_ = QDBusConnection::connectToBus(address_, u"desktop"_s);
-        ASSERT_TRUE(mpris_.Register(QDBusConnection::connectToBus(address_, u"player"_s)));
+        ASSERT_TRUE(mpris_.Register(bus_.Connect(u"player"_s)));
         player_.SetPlayList(&list_);
         for (const QString& name : {u"a"_s, u"b"_s}) {
             QFile file(folder_.filePath(name + u".mp3"_s));
@@ -46,8 +42,6 @@ class MprisTest : public testing::Test {
     void TearDown() override {
         QDBusConnection::disconnectFromBus(u"player"_s);
         QDBusConnection::disconnectFromBus(u"desktop"_s);
-        daemon_.kill();
-        daemon_.waitForFinished();
     }
 
     // The player answers in this thread, so the desktop may not block.
@@ -66,9 +60,8 @@ class MprisTest : public testing::Test {
     QVariantMap Metadata() { return qdbus_cast<QVariantMap>(Property(u"Metadata"_s)); }
 
     QTemporaryDir folder_;
-    QProcess daemon_;
-    QString address_;
-    QDBusConnection desktop_{QString()};
+    PrivateBus bus_;
+    QDBusConnection desktop_ = bus_.Connect(u"desktop"_s);
     ScriptedSong song_;
     TPlayList list_;
     TPlaySound player_{ScriptedEngines(song_)};
@@ -161,7 +154,7 @@ TEST_F(MprisTest, OrderAndRepeatAreSetFromOutside) {
 
 TEST_F(MprisTest, ASecondProgramTakesANameOfItsOwn) {
     Mpris second(player_, list_, {});
-    EXPECT_TRUE(second.Register(QDBusConnection::connectToBus(address_, u"second"_s)));
+    EXPECT_TRUE(second.Register(bus_.Connect(u"second"_s)));
     EXPECT_TRUE(second.ServiceName().startsWith(u"org.mpris.MediaPlayer2.tunestead.instance"_s));
     QDBusConnection::disconnectFromBus(u"second"_s);
 }

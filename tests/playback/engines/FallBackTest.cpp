@@ -14,7 +14,7 @@
 #include "tests/playback/SoundFiles.h"
 #include "tests/playback/engines/FakePlayer.h"
 #include "tests/playback/engines/OtherProgram.h"
-#include "tests/playback/engines/PrivateBus.h"
+#include "tests/PrivateBus.h"
 
 using namespace Qt::StringLiterals;
 
