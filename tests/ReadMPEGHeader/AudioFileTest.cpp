@@ -5,9 +5,9 @@
 #include <QTemporaryDir>
 #include <cmath>
 
-#include "CommonRUKTools/Clock.h"
 #include "CommonRUKTools/Errors.h"
 #include "ReadMPEGHeader/MpegResults.h"
+#include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/AsfBuilder.h"
 #include "tests/ReadMPEGHeader/Builders.h"
@@ -279,14 +279,8 @@ TEST(AudioFile, ADamagedTagCostsOnlyItself) {
 }
 
 TEST(AudioFile, TheFileTimeIsTheCallersOrNow) {
-    class Fixed : public Clock {
-        qint64 Ticks() const override { return 0; }
-        double Now() const override { return 45000.25; }
-    };
-    const Fixed clock;
-    SetClock(&clock);
+    const HandClock clock;
     const auto song = Mp3Builder().Frames(2).Data();
-    EXPECT_EQ(Read(song, ReadOptions()).AddTime, 45000.25);
+    EXPECT_EQ(Read(song, ReadOptions()).AddTime, clock.Day);
     EXPECT_EQ(Read(song).AddTime, 1);
-    SetClock(nullptr);
 }

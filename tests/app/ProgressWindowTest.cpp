@@ -7,22 +7,12 @@
 #include <QPushButton>
 #include <QTest>
 
-#include "CommonRUKTools/Clock.h"
+#include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
-
-class HandClock : public Clock {
- public:
-    HandClock() { SetClock(this); }
-    ~HandClock() override { SetClock(nullptr); }
-    qint64 Ticks() const override { return Milliseconds; }
-    double Now() const override { return 45000; }
-
-    qint64 Milliseconds = 1'000'000;
-};
 
 class ProgressWindowTest : public testing::Test {
  protected:

@@ -8,10 +8,10 @@
 #include <QScrollBar>
 #include <QTest>
 
-#include "CommonRUKTools/Clock.h"
 #include "app/models/FilteredSongs.h"
 #include "app/models/SongColumns.h"
 #include "app/models/SongListModel.h"
+#include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 #include "tests/app/ScriptedDialogs.h"
 #include "tests/app/Songs.h"
@@ -208,18 +208,12 @@ TEST_F(SongListWidgetTest, FindingGoesOnFromTheFocusRoundTheEnd) {
 }
 
 TEST_F(SongListWidgetTest, LettersFindTheTextOfTheSortColumn) {
-    struct HandClock : Clock {
-        HandClock() { SetClock(this); }
-        ~HandClock() override { SetClock(nullptr); }
-        qint64 Ticks() const override { return Time; }
-        double Now() const override { return 40'000; }
-        qint64 Time = 100'000;
-    } clock;
+    HandClock clock;
     AddSong(database_, u"Ärger"_s);
     AddSong(database_, u"Alle"_s);
     model_.SyncViews();
     const auto type = [&](const QString& text) {
-        clock.Time += 10'000;
+        clock.Milliseconds += 10'000;
         QTest::keyClicks(&list_, text);
         return FocusedTitle();
     };

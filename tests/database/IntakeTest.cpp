@@ -2,8 +2,8 @@
 
 #include <gtest/gtest.h>
 
-#include "CommonRUKTools/Clock.h"
 #include "CommonRUKTools/Shell.h"
+#include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
 #include "tests/database/RecordingTrash.h"
@@ -339,15 +339,9 @@ TEST_F(IntakeTest, OneFileIsAddedWithWhatIsKnownBetter) {
 }
 
 TEST_F(IntakeTest, SongsAreDatedWithTheTimeOfTheirIntake) {
-    class FixedClock : public Clock {
-     public:
-        FixedClock() { SetClock(this); }
-        ~FixedClock() override { SetClock(nullptr); }
-        qint64 Ticks() const override { return 0; }
-        double Now() const override { return 45'000.25; }
-    } clock;
+    const HandClock clock;
     AddPaths(database_, AddSongs(6), true);
     ASSERT_EQ(database_.Count(), 6);
     for (const auto& song : database_.Songs())
-        EXPECT_EQ(song->AddTime, 45'000.25);
+        EXPECT_EQ(song->AddTime, clock.Day);
 }

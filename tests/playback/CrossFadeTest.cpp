@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include "MusicManagment/playback/FMODPlaySound.h"
+#include "tests/HandClock.h"
 #include "tests/playback/Listening.h"
 #include "tests/playback/ScriptedFmod.h"
 
@@ -25,7 +26,7 @@ class CrossFadeTest : public Listening {
         newSound.FadeStep();
         const bool ended = oldSound.FadeStep();
         Hear(kStep / 1000.0);
-        clock.ticks += kStep;
+        clock.Milliseconds += kStep;
         return ended;
     }
     void StartCrossFade() {
@@ -39,7 +40,7 @@ class CrossFadeTest : public Listening {
         faded = HeardFrames();
     }
 
-    TestClock clock;
+    HandClock clock;
     TFMODPlaySound oldSound{library, {.FadeTime = kFade, .OutputType = FSOUND_OUTPUT_NOSOUND}};
     TFMODPlaySound newSound{library, {.FadeTime = kFade, .OutputType = FSOUND_OUTPUT_NOSOUND}};
     std::size_t faded = 0;  // the frame at which the fade began

@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 #include "tests/playback/ScriptedFmod.h"
 
@@ -34,7 +35,7 @@ class FMODPlaySoundTest : public testing::Test {
         library.calls.clear();
     }
 
-    TestClock clock;
+    HandClock clock;
     ScriptedFmod library;
     TFMODPlaySound sound{library, {}};
 };
@@ -244,12 +245,12 @@ TEST_P(FadeTest, VolumeFollowsALineInWholePercent) {
     sound.SetFadeTime(3000);
     const auto [after, in, out] = GetParam();
     sound.StartFadeIn();
-    clock.ticks += after;
+    clock.Milliseconds += after;
     EXPECT_FALSE(sound.FadeStep());
     EXPECT_EQ(library.volume, (in * 256 + 50) / 100);
     sound.CancelFades();
     sound.StartFadeOut();
-    clock.ticks += after;
+    clock.Milliseconds += after;
     EXPECT_FALSE(sound.FadeStep());
     EXPECT_EQ(library.volume, (out * 256 + 50) / 100);
 }
@@ -262,20 +263,20 @@ INSTANTIATE_TEST_SUITE_P(Moments, FadeTest,
 TEST_F(FMODPlaySoundTest, FadesEndOnTheTickAfterTheirEnd) {
     PlayStream();
     sound.StartFadeIn();
-    clock.ticks += 10000;
+    clock.Milliseconds += 10000;
     EXPECT_FALSE(sound.FadeStep());
     EXPECT_TRUE(library.calls.isEmpty());
     EXPECT_TRUE(sound.IsFadingIn());
-    clock.ticks += 1;
+    clock.Milliseconds += 1;
     EXPECT_FALSE(sound.FadeStep());
     EXPECT_EQ(library.volume, 255);
     EXPECT_FALSE(sound.IsFadingIn());
 
     sound.StartFadeOut();
-    clock.ticks += 10000;
+    clock.Milliseconds += 10000;
     EXPECT_FALSE(sound.FadeStep());
     EXPECT_EQ(sound.GetStatus(), psPlaying);
-    clock.ticks += 1;
+    clock.Milliseconds += 1;
     EXPECT_TRUE(sound.FadeStep());
     EXPECT_EQ(sound.GetStatus(), psStopped);
     EXPECT_EQ(library.volume, 255);  // silence came from stopping, not from one last loud step

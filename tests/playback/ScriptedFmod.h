@@ -3,7 +3,6 @@
 #include <QStringList>
 #include <map>
 
-#include "CommonRUKTools/Clock.h"
 #include "MusicManagment/playback/fmod/FmodLibrary.h"
 
 // A sound library that plays nothing, answers as it is told to and notes what it is asked for.
@@ -120,18 +119,4 @@ class ScriptedFmod : public FmodLibrary {
     }
 
     unsigned mode_ = 0;
-};
-
-// Time stands still until a test moves it on.
-class TestClock : public Clock {
- public:
-    TestClock() { SetClock(this); }
-    ~TestClock() override { SetClock(nullptr); }
-    TestClock(const TestClock&) = delete;
-    TestClock& operator=(const TestClock&) = delete;
-
-    qint64 Ticks() const override { return ticks; }
-    double Now() const override { return 0; }
-
-    qint64 ticks = 1'000'000;
 };

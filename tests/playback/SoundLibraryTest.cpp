@@ -7,6 +7,7 @@
 #include <thread>
 
 #include "CommonRUKTools/ByteReader.h"
+#include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 #include "tests/playback/Listening.h"
 #include "tests/playback/ScriptedFmod.h"
@@ -265,7 +266,7 @@ TEST_F(SoundLibraryTest, EverythingMayHappenWhileAnotherThreadMixes) {
 
 TEST_F(SoundLibraryTest, LostDeviceIsOpenedAgainWhenItIsBack) {
     WriteWav(Path("a.wav"), Sine({}, 1));
-    TestClock clock;
+    HandClock clock;
     std::atomic<bool> lost = false;
     SoundLibrary playing([&](TFSoundOutputTypes) { return std::make_unique<GreedyOutput>(lost); });
     ASSERT_TRUE(playing.FSOUND_Init(44100, 3, 2));
@@ -281,7 +282,7 @@ TEST_F(SoundLibraryTest, LostDeviceIsOpenedAgainWhenItIsBack) {
     EXPECT_EQ(playing.FSOUND_GetError(), FMOD_ERR_PLAY);
     lost = false;
     EXPECT_EQ(play(), -1);  // not asked for at every call
-    clock.ticks += 5000;
+    clock.Milliseconds += 5000;
     EXPECT_GE(play(), 0);
     EXPECT_EQ(playing.FSOUND_Stream_GetTime(stream), 0);
     while (playing.FramesPlayed() == played)

@@ -1,30 +1,9 @@
-#include "CommonRUKTools/Clock.h"
 #include "CommonRUKTools/SafeFile.h"
 #include "MusicManagment/playlist/PlayListFiles.h"
+#include "tests/HandClock.h"
 #include "tests/playlist/Playing.h"
 
 using namespace Qt::StringLiterals;
-
-namespace {
-
-// At every look `Step` milliseconds have passed.
-class SteppingClock : public Clock {
- public:
-    SteppingClock() { SetClock(this); }
-    ~SteppingClock() override { SetClock(nullptr); }
-    SteppingClock(const SteppingClock&) = delete;
-    SteppingClock& operator=(const SteppingClock&) = delete;
-
-    qint64 Step = 0;
-
-    qint64 Ticks() const override { return ticks_ += Step; }
-    double Now() const override { return 0; }
-
- private:
-    mutable qint64 ticks_ = 0;
-};
-
-}  // namespace
 
 class DropTest : public PlayingTest {
  protected:
@@ -67,7 +46,7 @@ TEST_F(DropTest, ADropThatTakesItsTimeIsALongOperationThatTheUserCanStop) {
     list_.SetMusicDatabase(&database);
     for (const QChar song : u"abcdefghijkl"_s)
         folder_.Add(u"sub/"_s + song + u".wav"_s, 1);
-    SteppingClock clock;
+    HandClock clock;
     int starts = 0;
     int ends = 0;
     qint64 stopAt = -1;

@@ -6,26 +6,13 @@
 #include <algorithm>
 #include <map>
 
-#include "CommonRUKTools/Clock.h"
 #include "MusicManagment/playback/FadingBackend.h"
 #include "MusicManagment/playback/GainBackend.h"
 #include "MusicManagment/playback/PlaySound.h"
+#include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
 #include "tests/database/SongFolder.h"
-
-// Time stands still until a test moves it on.
-class HandClock : public Clock {
- public:
-    HandClock() { SetClock(this); }
-    ~HandClock() override { SetClock(nullptr); }
-    HandClock(const HandClock&) = delete;
-    HandClock& operator=(const HandClock&) = delete;
-
-    qint64 Ticks() const override { return Now_; }
-    double Now() const override { return 0; }
-    qint64 Now_ = 1'000'000;
-};
 
 class ScriptedBackend;
 
@@ -190,9 +177,9 @@ class PlayerTest : public testing::Test {
     }
     // The player's timers run on the way.
     void Pass(qint64 milliseconds) {
-        const qint64 end = clock_.Now_ + milliseconds;
-        while (clock_.Now_ < end) {
-            clock_.Now_ += std::min<qint64>(50, end - clock_.Now_);
+        const qint64 end = clock_.Milliseconds + milliseconds;
+        while (clock_.Milliseconds < end) {
+            clock_.Milliseconds += std::min<qint64>(50, end - clock_.Milliseconds);
             player_.RunDueTimers();
         }
     }

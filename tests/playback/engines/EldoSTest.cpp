@@ -203,25 +203,25 @@ TEST_F(EldoSTest, PositionFollowsPauseStopAndTheTime) {
     TEldoSPlaySound timed(settings_);
     timed.SetBackendFile(sound->BackendFile());
     timed.Open();
-    clock.Now_ += 5000;
+    clock.Milliseconds += 5000;
     EXPECT_EQ(timed.GetPosition(), 0U);
     timed.Play();
-    clock.Now_ += 300;
+    clock.Milliseconds += 300;
     EXPECT_EQ(timed.GetPosition(), 300U);
     timed.PauseResume();
     EXPECT_EQ(timed.GetStatus(), psPaused);
-    clock.Now_ += 5000;
+    clock.Milliseconds += 5000;
     EXPECT_EQ(timed.GetPosition(), 300U);
     timed.PauseResume();
     EXPECT_EQ(timed.GetStatus(), psPlaying);
-    clock.Now_ += 200;
+    clock.Milliseconds += 200;
     EXPECT_EQ(timed.GetPosition(), 500U);
     timed.Stop();
     EXPECT_EQ(timed.GetStatus(), psStopped);
     EXPECT_EQ(timed.GetPosition(), 0U);
     // The output ran dry: nobody topped it up for so long.
     timed.Play();
-    clock.Now_ += 5000;
+    clock.Milliseconds += 5000;
     EXPECT_EQ(timed.GetPosition(), 743U);
 }
 

@@ -65,7 +65,7 @@ class EldoSRig : public EngineRig {
     }
     QString OpenError(TPlaySoundContainer& sound) override { return OpenErrorOf<EEldoSException>(sound); }
     void Pass(TPlaySoundContainer& sound, int milliseconds) override {
-        clock_.Now_ += milliseconds;
+        clock_.Milliseconds += milliseconds;
         dynamic_cast<TEldoSPlaySound&>(sound).TopUp();
     }
 

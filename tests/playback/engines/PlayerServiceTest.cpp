@@ -55,7 +55,7 @@ class PlayerServiceTest : public testing::Test {
     void PassThere(qint64 milliseconds) {
         std::atomic<bool> passed = false;
         other_.Begin([&](PlayerProgram& program) {
-            clock_.Now_ += milliseconds;
+            clock_.Milliseconds += milliseconds;
             program.player.RunDueTimers();
             passed = true;
         });

@@ -8,7 +8,7 @@
 #include "tests/PrintQt.h"
 #include "tests/playback/control/PlayerRig.h"
 #include "tests/playback/engines/FakePlayer.h"
-#include "tests/playback/engines/PrivateBus.h"
+#include "tests/PrivateBus.h"
 
 using namespace Qt::StringLiterals;
 
@@ -44,7 +44,7 @@ class WinAmpTest : public testing::Test {
     }
     // Lets time pass, and the back end ask the player once and take the answer.
     int StatusAfter(TWinAmpPlaySound& sound, int milliseconds) {
-        clock_.Now_ += milliseconds;
+        clock_.Milliseconds += milliseconds;
         const int told = player_.StatesTold;
         sound.GetStatus();
         // A question of our own comes after that of the back end, and so does its answer.
@@ -85,7 +85,7 @@ TEST_F(WinAmpTest, AnOpenedSongIsHeldAtItsStartUntilItIsPlayed) {
     EXPECT_TRUE(WaitUntil([this] { return player_.Calls.contains(u"SetPosition"_s); }, kPatience));
     EXPECT_EQ(player_.Status, u"Paused"_s);
     EXPECT_EQ(player_.Position, 0);
-    clock_.Now_ += 5000;
+    clock_.Milliseconds += 5000;
     EXPECT_EQ(sound->GetPosition(), 0U);
 
     sound->Play();
@@ -108,7 +108,7 @@ TEST_F(WinAmpTest, PositionFollowsThePlayerAndTheTimeBetween) {
     player_.Position = 30'000'000;
     StatusAfter(*sound, 100);
     EXPECT_EQ(sound->GetPosition(), 30000U);
-    clock_.Now_ += 40;
+    clock_.Milliseconds += 40;
     EXPECT_EQ(sound->GetPosition(), 30040U);
 
     sound->PauseResume();
@@ -133,12 +133,12 @@ TEST_F(WinAmpTest, PositionFollowsThePlayerAndTheTimeBetween) {
     // Nonsense is no more than the end.
     player_.Position = std::numeric_limits<qint64>::max();
     StatusAfter(*sound, 2000);
-    clock_.Now_ += 40;
+    clock_.Milliseconds += 40;
     EXPECT_EQ(sound->GetPosition(), sound->GetLength());
 
     sound->Stop();
     EXPECT_EQ(sound->GetStatus(), psStopped);
-    clock_.Now_ += 5000;
+    clock_.Milliseconds += 5000;
     EXPECT_EQ(sound->GetPosition(), 0U);
     EXPECT_EQ(player_.Position, 0);
     EXPECT_FALSE(player_.Calls.contains(u"Stop"_s));
@@ -209,7 +209,7 @@ TEST_F(WinAmpTest, APlayerThatDoesNotRunIsStartedAndWaitedFor) {
     player_.Vanish();
     EXPECT_TRUE(WaitUntil(
         [&] {
-            clock_.Now_ += 100;
+            clock_.Milliseconds += 100;
             return sound->GetStatus() == psStopped;
         },
         kPatience));
@@ -225,13 +225,13 @@ TEST_F(WinAmpTest, APlayerThatIsGoneForGoodIsAnErrorEachTime) {
     player_.Vanish();
     EXPECT_TRUE(WaitUntil(
         [&] {
-            clock_.Now_ += 100;
+            clock_.Milliseconds += 100;
             return sound->GetStatus() == psStopped;
         },
         kPatience));
     for (int i = 0; i < 2; ++i) {
         EXPECT_EQ(ErrorOf([&] { sound->Play(); }), u"Kann den Player fake nicht finden."_s);
-        clock_.Now_ += 5000;
+        clock_.Milliseconds += 5000;
         EXPECT_EQ(sound->GetStatus(), psStopped);
     }
 }
