@@ -50,15 +50,16 @@ QString Seconds(int milliseconds) {
     throw EWinAmpException(message);
 }
 
-// Players that are known to work come first.
-void PreferKnown(QStringList& names) {
+// The place of a name on the bus among the players that are known to work, their number for another one.
+qsizetype RankOf(const QString& name) {
     const QStringList known = KnownPlayers();
-    const auto rank = [&known](const QString& name) {
-        const auto found = std::ranges::find_if(
-            known, [&name](const QString& player) { return IsPlayerNamed(name, player); });
-        return found - known.begin();
-    };
-    std::ranges::stable_sort(names, {}, rank);
+    const auto found =
+        std::ranges::find_if(known, [&name](const QString& player) { return IsPlayerNamed(name, player); });
+    return found - known.begin();
+}
+
+bool IsKnown(const QString& name) {
+    return RankOf(name) < KnownPlayers().size();
 }
 
 }  // namespace
@@ -194,11 +195,12 @@ TWinAmpPlaySound::Player TWinAmpPlaySound::FindPlayer() {
     QStringList names = Undisturbed([bus = settings_.Bus, timeout] { return RunningPlayers(bus, timeout); });
     if (!any)
         names.removeIf([this](const QString& name) { return !IsPlayerNamed(name, settings_.ClassName); });
-    PreferKnown(names);
+    std::ranges::stable_sort(names, {}, RankOf);
     for (const QString& name : names) {
         auto player = std::make_shared<const MprisPlayer>(settings_.Bus, name, timeout);
-        // A web browser, for instance, is a player on the bus that opens no files.
-        if (!any || Undisturbed([player] { return player->TakesFiles(); })) return player;
+        // A web browser, for instance, is a player on the bus that opens no files. Some that do name only the
+        // addresses that they take besides.
+        if (!any || IsKnown(name) || Undisturbed([player] { return player->TakesFiles(); })) return player;
     }
     return nullptr;
 }

@@ -280,6 +280,7 @@ TEST_F(WinAmpTest, OnlyAFittingPlayerIsTaken) {
     FakePlayer browser(bus_.Connect(u"browser"_s), u"browser"_s);
     browser.Schemes.clear();
     FakePlayer vlc(bus_.Connect(u"vlc"_s), u"vlc.instance7"_s);
+    vlc.Schemes = QStringList(u"http"_s);  // known to take files all the same
     ourselves.Appear();
     browser.Appear();
     player_.Appear();
