@@ -10,11 +10,11 @@
 #include "MusicManagment/playback/fmod/SoundLibrary.h"
 #include "MusicManagment/playback/mci/GstMci.h"
 #include "tests/PrintQt.h"
+#include "tests/PrivateBus.h"
 #include "tests/ScriptedDialogs.h"
 #include "tests/playback/SoundFiles.h"
 #include "tests/playback/engines/FakePlayer.h"
 #include "tests/playback/engines/OtherProgram.h"
-#include "tests/PrivateBus.h"
 
 using namespace Qt::StringLiterals;
 

@@ -6,9 +6,9 @@
 
 #include "MusicManagment/playback/winamp/Waiting.h"
 #include "tests/PrintQt.h"
+#include "tests/PrivateBus.h"
 #include "tests/playback/control/PlayerRig.h"
 #include "tests/playback/engines/FakePlayer.h"
-#include "tests/PrivateBus.h"
 
 using namespace Qt::StringLiterals;
 
