@@ -173,10 +173,9 @@ void TTunesteadMainWnd::SetUpToolWindows() {
     };
     connect(list_->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
             [this](const QModelIndex& song) { toolWindows_->ShowSong(shown_.SongAt(song.row())); });
-    playing_ = std::make_unique<Playing>(
-        *this, database_, *list_,
-        PlayingOptions{options_.Files.PlayList(), options_.Engines, options_.Spectrum, options_.SetVolume,
-                       options_.MakeExternalPlayer});
+    playing_ = std::make_unique<Playing>(*this, database_, *list_,
+                                         PlayingOptions{options_.Files.PlayList(), options_.Engines,
+                                                        options_.Spectrum, options_.MakeExternalPlayer});
     playing_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
 }
 

@@ -35,12 +35,11 @@ struct StartRequest;
 struct MainWindowOptions {
     StandardFiles Files{};
     QString SettingsFile{};
-    QStringList Arguments{};                      // of the command line, without the program's name
-    Installation* Setup = nullptr;                // none where the program cannot install itself
-    bool OfferWizard = false;                     // at the first start
-    EngineTable Engines{};                        // that songs are played with
-    SpectrumSource Spectrum{};                    // of what they play
-    std::function<void(float gain)> SetVolume{};  // 0 to 1
+    QStringList Arguments{};        // of the command line, without the program's name
+    Installation* Setup = nullptr;  // none where the program cannot install itself
+    bool OfferWizard = false;       // at the first start
+    EngineTable Engines{};          // that songs are played with
+    SpectrumSource Spectrum{};      // of what they play
     // Makes the way to a separate player program; none where it is empty.
     std::function<std::unique_ptr<ExternalPlayer>()> MakeExternalPlayer{};
 };

@@ -12,6 +12,7 @@
 #include "MusicManagment/playlist/PlayListMenu.h"
 #include "app/CommandRunner.h"
 #include "app/desktop/Icons.h"
+#include "app/desktop/RaiseWindow.h"
 #include "app/models/CollectionTotals.h"
 #include "app/views/DSPDraw.h"
 #include "app/views/PlayerForm.h"
@@ -49,7 +50,7 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
     list_.SetMusicDatabase(&database);
     player_.SetMusicDatabase(&database);
     player_.SetPlayList(&list_);
-    SetUpWindows(window, std::move(options.SetVolume));
+    SetUpWindows(window);
     SetUpSpectrum(window, std::move(options.Spectrum));
     SetUpContextMenu();
     JoinDesktop(window);
@@ -71,7 +72,7 @@ Playing::~Playing() {
     delete spectrumForm_;
 }
 
-void Playing::SetUpWindows(QMainWindow& window, std::function<void(float)> setVolume) {
+void Playing::SetUpWindows(QMainWindow& window) {
     window.addDockWidget(Qt::RightDockWidgetArea, listForm_);
     window.addDockWidget(Qt::BottomDockWidgetArea, playerForm_);
     TVisPlayList& view = listForm_->View();
@@ -80,8 +81,7 @@ void Playing::SetUpWindows(QMainWindow& window, std::function<void(float)> setVo
     TVisPlaySound& panel = playerForm_->Panel();
     panel.OnCommand = [this](int id) { RunPlayerCommand(id); };
     panel.OnChange = [this] { FollowSong(); };
-    panel.Volume().Follow([this, setVolume = std::move(setVolume)](float gain) {
-        if (setVolume) setVolume(gain);
+    panel.Volume().Follow([this](float gain) {
         player_.SetGain(gain);
         if (mpris_) mpris_->Update();
     });
@@ -107,12 +107,7 @@ void Playing::JoinDesktop(QMainWindow& window) {
         player_, list_,
         Mpris::Hooks{.Run = [this](int id) { RunPlayerCommand(id); },
                      .OpenSong = [this](const QString& path) { OpenSong(path); },
-                     .Raise =
-                         [&window] {
-                             window.setWindowState(window.windowState() & ~Qt::WindowMinimized);
-                             window.raise();
-                             window.activateWindow();
-                         },
+                     .Raise = [&window] { RaiseWindow(window, QString()); },
                      .Quit = [&window] { window.close(); },
                      .Volume = [this] { return playerForm_->Panel().Volume().Part(); },
                      .SetVolume = [this](double volume) { playerForm_->Panel().Volume().SetPart(volume); }});

@@ -24,8 +24,6 @@ struct PlayingOptions {
     QString StandardList{};     // the file that keeps the playlist between two runs
     EngineTable Engines{};      // that songs are played with
     SpectrumSource Spectrum{};  // of what they play; empty for none
-    // Sets how loud it is, 0 to 1; empty where that cannot be set.
-    std::function<void(float gain)> SetVolume{};
     // Makes the way to a separate player program; empty for none.
     std::function<std::unique_ptr<ExternalPlayer>()> MakeExternalPlayer{};
 };
@@ -60,7 +58,7 @@ class Playing {
     void Close(bool keepList);
 
  private:
-    void SetUpWindows(QMainWindow& window, std::function<void(float)> setVolume);
+    void SetUpWindows(QMainWindow& window);
     void SetUpSpectrum(QMainWindow& window, SpectrumSource source);
     void SetUpContextMenu();
     void JoinDesktop(QMainWindow& window);

@@ -127,15 +127,16 @@ int Start(QtDialogs& dialogs, const StartRequest& request) {
     Installation* setup = &forThisUser;
 #endif
     const auto sound = std::make_shared<SoundLibrary>();
+    EngineTable engines = MakeEngines(sound, std::make_shared<GstMci>());
+    engines.SetSharedGain = [sound](float gain) { sound->SetMasterVolume(gain); };
     return RunWindow(dialogs, instance,
                      {.Files = files,
                       .SettingsFile = TRWReg::DefaultFile(),
                       .Arguments = request.Arguments,
                       .Setup = setup,
                       .OfferWizard = true,
-                      .Engines = MakeEngines(sound, std::make_shared<GstMci>()),
+                      .Engines = std::move(engines),
                       .Spectrum = SpectrumOf(sound),
-                      .SetVolume = [sound](float gain) { sound->SetMasterVolume(gain); },
                       .MakeExternalPlayer = [] { return std::make_unique<LocalExternalPlayer>(); }});
 }
 

@@ -37,6 +37,10 @@ class EngineTable {
     // Throws EPlaySoundException when nothing is registered, and what the engine throws.
     std::unique_ptr<TPlaySoundContainer> Create(TEngine engine, const EngineSettings& settings) const;
 
+    // Sets how loud the back ends are that share a sound library, 0 to 1 of the amplitude; the others have a
+    // loudness each (GainBackend.h).
+    std::function<void(float gain)> SetSharedGain;
+
  private:
     std::map<TEngine, Maker> makers_;
 };

@@ -235,6 +235,7 @@ void TPlaySound::SetEngines(const EngineSettings& settings) {
 
 void TPlaySound::SetGain(float gain) {
     gain_ = std::clamp(gain, 0.0F, 1.0F);
+    if (engineTable_.SetSharedGain) engineTable_.SetSharedGain(gain_);
     if (GainBackend* current = AsGain(current_.get())) current->SetGain(gain_);
 }
 

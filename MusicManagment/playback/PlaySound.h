@@ -88,8 +88,7 @@ class TPlaySound : public TPlaySoundContainer,
     void SetAutoPlay(bool value) { autoPlay_ = value; }
     int TimerInterval() const { return timerInterval_; }
     void SetTimerInterval(int milliseconds);  // at least 1
-    // How loud songs play here, 0 to 1 of the amplitude: now and from now on. Songs of the sound library
-    // follow that library's own loudness instead.
+    // How loud songs play here, 0 to 1 of the amplitude: now and from now on.
     void SetGain(float gain);
     // The longest time a song plays, in milliseconds; 0 is no limit.
     int AutoStop() const { return autoStop_; }

@@ -106,6 +106,7 @@ TEST_F(PlaySoundTest, LoudnessHoldsForTheSongAndThoseAfterIt) {
     EXPECT_EQ(Any(u"a"_s).Gain, -1);  // another program keeps its own
     player_.SetGain(0.5F);
     EXPECT_EQ(Any(u"a"_s).Gain, 0.5F);
+    EXPECT_EQ(sharedGain_, 0.5F);
     PlaySong(u"b.mp3"_s);
     EXPECT_EQ(Any(u"b"_s).Gain, 0.5F);
     player_.SetGain(7);

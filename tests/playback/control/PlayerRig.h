@@ -218,12 +218,14 @@ class PlayerTest : public testing::Test {
     // What an engine does before it makes a back end: throw, when it is to fail.
     std::map<TEngine, std::function<void()>> onCreate_;
     quint32 length_ = 180'000;         // of the songs opened from now on
+    float sharedGain_ = -1;            // until one is set
     std::function<void()> onOpening_;  // what happens while the next song is being opened
     TPlaySound player_;
 
  private:
     EngineTable Table() {
         EngineTable table;
+        table.SetSharedGain = [this](float gain) { sharedGain_ = gain; };
         for (const TEngine engine : {TEngine::FMOD, TEngine::EldoS, TEngine::MCI, TEngine::WinAmp})
             table.Register(engine, [this, engine](const EngineSettings&) { return Make(engine); });
         return table;

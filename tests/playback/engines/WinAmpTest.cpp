@@ -54,6 +54,16 @@ class WinAmpTest : public testing::Test {
         same.ReadState(state);
         return sound.GetStatus();
     }
+    // The player ends, and the back end comes to notice it.
+    void Vanish(TWinAmpPlaySound& sound) {
+        player_.Vanish();
+        EXPECT_TRUE(WaitUntil(
+            [&] {
+                clock_.Milliseconds += 100;
+                return sound.GetStatus() == psStopped;
+            },
+            kPatience));
+    }
     template <typename Action>
     static QString ErrorOf(Action action) {
         try {
@@ -206,13 +216,7 @@ TEST_F(WinAmpTest, APlayerThatDoesNotRunIsStartedAndWaitedFor) {
     EXPECT_EQ(rounds, 10);
 
     // It ends in the middle of a song; the next one starts it again.
-    player_.Vanish();
-    EXPECT_TRUE(WaitUntil(
-        [&] {
-            clock_.Milliseconds += 100;
-            return sound->GetStatus() == psStopped;
-        },
-        kPatience));
+    Vanish(*sound);
     rounds = 0;
     sound->Play();
     EXPECT_EQ(rounds, 10);
@@ -222,13 +226,7 @@ TEST_F(WinAmpTest, APlayerThatDoesNotRunIsStartedAndWaitedFor) {
 TEST_F(WinAmpTest, APlayerThatIsGoneForGoodIsAnErrorEachTime) {
     settings_.ClassName = u"fake"_s;
     const auto sound = Playing();
-    player_.Vanish();
-    EXPECT_TRUE(WaitUntil(
-        [&] {
-            clock_.Milliseconds += 100;
-            return sound->GetStatus() == psStopped;
-        },
-        kPatience));
+    Vanish(*sound);
     for (int i = 0; i < 2; ++i) {
         EXPECT_EQ(ErrorOf([&] { sound->Play(); }), u"Kann den Player fake nicht finden."_s);
         clock_.Milliseconds += 5000;
