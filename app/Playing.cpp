@@ -95,6 +95,10 @@ void Playing::SetUpSpectrum(QMainWindow& window, SpectrumSource source) {
     database_.JoinSettings(*spectrumForm_);
     player_.SetDSPDraw(&spectrumForm_->Draw());
     if (!source.Get) return;
+    // A player in another program tells the block itself.
+    source.Get = [this, get = std::move(source.Get)]() -> const float* {
+        return player_.PlayExtern() ? nullptr : get();
+    };
     spectrumFeed_ = std::make_unique<SpectrumFeed>(std::move(source));
     spectrumForm_->Draw().OnDrawing = [this](bool drawing) {
         drawing ? spectrumFeed_->Start() : spectrumFeed_->Stop();

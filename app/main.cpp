@@ -92,14 +92,6 @@ int RunWindow(QtDialogs& dialogs, SingleInstance& instance, const MainWindowOpti
     return result;
 }
 
-static_assert(kSpectrumBands == FSOUND_SPECTRUM_SIZE);
-
-SpectrumSource SpectrumOf(const std::shared_ptr<FmodLibrary>& sound) {
-    return {.SetActive =
-                [sound](bool active) { sound->FSOUND_DSP_SetActive(sound->FSOUND_DSP_GetFFTUnit(), active); },
-            .Get = [sound] { return sound->FSOUND_DSP_GetSpectrum(); }};
-}
-
 int RefuseToStart(const SingleInstance& instance) {
     UserDialogs().ShowMessage(
         MessageKind::Error,

@@ -3,6 +3,8 @@
 
 #include "MusicManagment/playback/Engines.h"
 #include "MusicManagment/playback/extern/PlayerChannel.h"
+#include "MusicManagment/playback/fmod/SoundLibrary.h"
+#include "MusicManagment/playback/mci/GstMci.h"
 #include "tsplayer/PlayerService.h"
 #include "tsplayer/PlayerWindow.h"
 
@@ -22,7 +24,15 @@ int main(int argc, char** argv) {
     const bool hidden = QCoreApplication::arguments().contains(u"/NoVisible"_s, Qt::CaseInsensitive);
     QGuiApplication::setQuitOnLastWindowClosed(true);
 
-    TPlaySound player(MakeEngines());
+    const auto sound = std::make_shared<SoundLibrary>();
+    TPlaySound player(MakeEngines(sound, std::make_shared<GstMci>()));
+    // Only of what sounds here: the program that drives this one may play songs itself meanwhile.
+    SpectrumSource spectrum = SpectrumOf(sound);
+    spectrum.Get = [&player, get = std::move(spectrum.Get)]() -> const float* {
+        return player.GetStatus() == psPlaying ? get() : nullptr;
+    };
+    SpectrumFeed feed(std::move(spectrum));
+    feed.Watch();
     PlayerWindow window(player);
     SetUserDialogs(&window);
     ChannelServer server(QCoreApplication::applicationPid());

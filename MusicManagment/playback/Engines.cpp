@@ -2,8 +2,6 @@
 
 #include "MusicManagment/playback/FMODPlaySound.h"
 #include "MusicManagment/playback/eldos/EldoSPlaySound.h"
-#include "MusicManagment/playback/fmod/SoundLibrary.h"
-#include "MusicManagment/playback/mci/GstMci.h"
 #include "MusicManagment/playback/mci/MCIPlaySound.h"
 #include "MusicManagment/playback/winamp/WinAmpPlaySound.h"
 
@@ -52,6 +50,12 @@ EngineTable MakeEngines(const std::shared_ptr<FmodLibrary>& library,
     return table;
 }
 
-EngineTable MakeEngines() {
-    return MakeEngines(std::make_shared<SoundLibrary>(), std::make_shared<GstMci>());
+static_assert(kSpectrumBands == FSOUND_SPECTRUM_SIZE);
+
+SpectrumSource SpectrumOf(const std::shared_ptr<FmodLibrary>& library) {
+    return {.SetActive =
+                [library](bool active) {
+                    library->FSOUND_DSP_SetActive(library->FSOUND_DSP_GetFFTUnit(), active);
+                },
+            .Get = [library] { return library->FSOUND_DSP_GetSpectrum(); }};
 }

@@ -9,6 +9,7 @@ using namespace Qt::StringLiterals;
 // writes.
 struct SpectrumBlock::Contents {
     std::atomic<std::uint32_t> Counter;
+    std::atomic<std::uint32_t> Looks;
     std::array<std::atomic<float>, kSpectrumBands> Bands;
 };
 
@@ -50,6 +51,7 @@ void SpectrumBlock::Write(const SpectrumBands& bands) {
 bool SpectrumBlock::Read(SpectrumBands& bands) {
     Contents* shared = Shared();
     if (shared == nullptr) return false;
+    shared->Looks.fetch_add(1, std::memory_order_relaxed);
     const std::uint32_t before = shared->Counter.load(std::memory_order_acquire);
     if (before == seen_ || (before & 1U) != 0) return false;
     for (std::size_t i = 0; i < kSpectrumBands; ++i)
@@ -58,4 +60,9 @@ bool SpectrumBlock::Read(SpectrumBands& bands) {
     if (shared->Counter.load(std::memory_order_relaxed) != before) return false;
     seen_ = before;
     return true;
+}
+
+std::uint32_t SpectrumBlock::Looks() {
+    const Contents* shared = Shared();
+    return shared != nullptr ? shared->Looks.load(std::memory_order_relaxed) : 0;
 }

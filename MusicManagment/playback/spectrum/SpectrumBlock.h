@@ -24,6 +24,8 @@ class SpectrumBlock {
     void Write(const SpectrumBands& bands);
     // False when nothing has been written since the last successful call, or something is being written now.
     bool Read(SpectrumBands& bands);
+    // Counts the calls of Read by anybody; wraps. Whoever writes sees by it whether somebody looks.
+    std::uint32_t Looks();
 
  private:
     struct Contents;

@@ -20,10 +20,11 @@ void SpectrumFeed::SetUp() {
     timer_.setInterval(kStep);
     timer_.setTimerType(Qt::PreciseTimer);
     timer_.callOnTimeout([this] { Step(); });
+    watchTimer_.callOnTimeout([this] { Look(); });
 }
 
 void SpectrumFeed::Start() {
-    if (timer_.isActive() || !block_.Open()) return;
+    if (timer_.isActive()) return;
     source_.SetActive(true);
     timer_.start();
 }
@@ -35,7 +36,21 @@ void SpectrumFeed::Stop() {
     block_.Write({});  // whoever still looks sees silence
 }
 
+void SpectrumFeed::Watch() {
+    constexpr int kInterval = 500;  // milliseconds
+    watchTimer_.start(kInterval);
+}
+
+void SpectrumFeed::Look() {
+    if (!block_.Open()) return;
+    const std::uint32_t looks = block_.Looks();
+    looks != looks_ ? Start() : Stop();
+    looks_ = looks;
+}
+
+// The block is asked for each time: two that make it at once may both fail at first.
 void SpectrumFeed::Step() {
+    if (!block_.Open()) return;
     const float* amplitudes = source_.Get();
     if (amplitudes == nullptr) return;
     SpectrumBands bands;

@@ -23,6 +23,10 @@ class SpectrumFeed {
 
     void Start();
     void Stop();
+    // Starts whenever somebody looks, be it in another program, and stops when nobody does any more: Look()
+    // twice a second.
+    void Watch();
+    void Look();
     // One look at the source.
     void Step();
 
@@ -32,4 +36,6 @@ class SpectrumFeed {
     SpectrumSource source_;
     SpectrumBlock block_;
     QTimer timer_;
+    QTimer watchTimer_;
+    std::uint32_t looks_ = 0;  // at the last Look
 };

@@ -149,3 +149,28 @@ TEST(SpectrumCollectorTest, GivesWhatAFeedWritesAndEndsWhenAsked) {
     while (collector.Next(source.get_token())) {
     }
 }
+
+TEST(SpectrumFeedTest, AWatchingFeedWorksOnlyWhileSomebodyLooks) {
+    const QString key = OwnKey(u"watch"_s);
+    std::vector<bool> active;
+    const SpectrumBands bands = Tone(300, 1.0F);
+    SpectrumFeed feed(
+        {.SetActive = [&](bool on) { active.push_back(on); }, .Get = [&] { return bands.data(); }}, key);
+    SpectrumBlock reader(key);
+    feed.Look();
+    EXPECT_TRUE(active.empty());
+    ASSERT_TRUE(reader.Open());
+    SpectrumBands read{};
+    EXPECT_FALSE(reader.Read(read));
+    feed.Look();
+    EXPECT_EQ(active, std::vector<bool>{true});
+    feed.Step();
+    EXPECT_TRUE(reader.Read(read));
+    EXPECT_EQ(read, bands);
+    feed.Look();
+    EXPECT_EQ(active, std::vector<bool>{true});
+    feed.Look();
+    EXPECT_EQ(active, std::vector<bool>({true, false}));
+    EXPECT_TRUE(reader.Read(read));
+    EXPECT_EQ(read, SpectrumBands{});
+}
