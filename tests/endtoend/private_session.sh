@@ -11,26 +11,46 @@ unset XDG_CONFIG_HOME XDG_DATA_HOME XDG_STATE_HOME XDG_CACHE_HOME PULSE_SERVER T
 mkdir -m 700 "$XDG_RUNTIME_DIR"
 trap 'kill $(jobs -p) 2>/dev/null || true; wait; rm -rf "$folder"' EXIT
 
-# Waits for a command to succeed; a minute at most, for busy machines.
-await() {
-    local attempt
-    for attempt in $(seq 1200); do
+# Tries a command up to so many times, 50 ms apart, until it succeeds.
+poll() {
+    local attempt attempts=$1
+    shift
+    for attempt in $(seq "$attempts"); do
         if "$@" >/dev/null 2>&1; then return 0; fi
         sleep 0.05
     done
+    return 1
+}
+
+# Waits for a command to succeed; a minute at most, for busy machines.
+await() {
+    if poll 1200 "$@"; then return 0; fi
     echo "waited in vain for: $*" >&2
     return 1
 }
 
-# A sound server whose only sink is a virtual one, "auto_null". Its parts give up when they come before the first.
+# Arguments: the processes of its parts.
+serves() { kill -0 "$@" && timeout 5 pactl list short sinks | grep -q auto_null; }
+
+# A sound server whose only sink is a virtual one, "auto_null". Its parts give up when they come before the first, and now
+# and then they miss each other: then they are started again.
 start_sound_server() {
-    local part
+    local part parts attempt
     pipewire >"$folder/pipewire.log" 2>&1 &
     await pw-cli info 0
-    for part in wireplumber pipewire-pulse; do
-        "$part" >"$folder/$part.log" 2>&1 &
+    for attempt in 1 2 3 4; do
+        parts=()
+        for part in wireplumber pipewire-pulse; do
+            "$part" >"$folder/$part.log" 2>&1 &
+            parts+=($!)
+        done
+        if poll 200 serves "${parts[@]}"; then return 0; fi
+        kill "${parts[@]}" 2>/dev/null || true
+        wait "${parts[@]}" || true
     done
-    await sh -c 'pactl list short sinks | grep -q auto_null'
+    echo "the sound server does not start:" >&2
+    tail "$folder"/*.log >&2
+    return 1
 }
 
 # Writes down what the sink is given; returns when it does.
