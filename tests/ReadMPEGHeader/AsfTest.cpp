@@ -1,4 +1,4 @@
-#include "ReadMPEGHeader/Asf.h"
+#include "ReadMPEGHeader/asf/Asf.h"
 
 #include <gtest/gtest.h>
 

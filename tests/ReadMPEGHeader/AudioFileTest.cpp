@@ -6,7 +6,7 @@
 #include <cmath>
 
 #include "CommonRUKTools/Errors.h"
-#include "ReadMPEGHeader/MpegResults.h"
+#include "ReadMPEGHeader/mpeg/MpegResults.h"
 #include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/AsfBuilder.h"

@@ -1,4 +1,4 @@
-#include "ReadMPEGHeader/CoverArt.h"
+#include "ReadMPEGHeader/id3v2/CoverArt.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "ReadMPEGHeader/ID3v1.h"
+#include "ReadMPEGHeader/id3v1/ID3v1.h"
 
 #include <gtest/gtest.h>
 

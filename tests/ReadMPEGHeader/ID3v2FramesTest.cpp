@@ -1,9 +1,9 @@
-#include "ReadMPEGHeader/ID3v2Frames.h"
+#include "ReadMPEGHeader/id3v2/ID3v2Frames.h"
 
 #include <gtest/gtest.h>
 
-#include "ReadMPEGHeader/MediaType.h"
-#include "ReadMPEGHeader/PictureType.h"
+#include "ReadMPEGHeader/id3v2/MediaType.h"
+#include "ReadMPEGHeader/id3v2/PictureType.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Id3v2Builder.h"
 

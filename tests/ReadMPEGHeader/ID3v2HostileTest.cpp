@@ -4,7 +4,7 @@
 #include <QLoggingCategory>
 #include <random>
 
-#include "ReadMPEGHeader/ID3v2Reader.h"
+#include "ReadMPEGHeader/id3v2/ID3v2Reader.h"
 #include "tests/ReadMPEGHeader/Id3v2Builder.h"
 
 using namespace Qt::StringLiterals;

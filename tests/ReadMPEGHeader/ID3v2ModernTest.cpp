@@ -2,7 +2,7 @@
 
 #include <QByteArray>
 
-#include "ReadMPEGHeader/ID3v2Reader.h"
+#include "ReadMPEGHeader/id3v2/ID3v2Reader.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Id3v2Builder.h"
 

@@ -1,4 +1,4 @@
-#include "ReadMPEGHeader/ID3v2Reader.h"
+#include "ReadMPEGHeader/id3v2/ID3v2Reader.h"
 
 #include <gtest/gtest.h>
 

@@ -8,7 +8,7 @@
 #include <vector>
 
 #include "CommonRUKTools/ByteWriter.h"
-#include "ReadMPEGHeader/ID3v2Reader.h"
+#include "ReadMPEGHeader/id3v2/ID3v2Reader.h"
 
 // Puts an ID3v2 tag together frame by frame; sizes are written as the version wants them.
 class Id3v2Builder {

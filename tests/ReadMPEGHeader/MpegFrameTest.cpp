@@ -1,4 +1,4 @@
-#include "ReadMPEGHeader/MpegFrame.h"
+#include "ReadMPEGHeader/mpeg/MpegFrame.h"
 
 #include <gtest/gtest.h>
 

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include "ReadMPEGHeader/MpegResults.h"
+#include "ReadMPEGHeader/mpeg/MpegResults.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
 

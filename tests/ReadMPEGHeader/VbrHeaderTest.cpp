@@ -1,8 +1,8 @@
-#include "ReadMPEGHeader/VbrHeader.h"
+#include "ReadMPEGHeader/mpeg/VbrHeader.h"
 
 #include <gtest/gtest.h>
 
-#include "ReadMPEGHeader/MpegFrame.h"
+#include "ReadMPEGHeader/mpeg/MpegFrame.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
 

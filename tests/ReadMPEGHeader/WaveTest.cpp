@@ -1,4 +1,4 @@
-#include "ReadMPEGHeader/Wave.h"
+#include "ReadMPEGHeader/wave/Wave.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "ReadMPEGHeader/XrukFrame.h"
+#include "ReadMPEGHeader/id3v2/XrukFrame.h"
 
 #include <gtest/gtest.h>
 

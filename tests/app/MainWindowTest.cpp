@@ -19,7 +19,7 @@
 #include <QUrl>
 
 #include "CommonRUKTools/Trash.h"
-#include "MusicManagment/database/Menu.h"
+#include "MusicManagment/database/commands/Menu.h"
 #include "app/desktop/Installation.h"
 #include "app/desktop/SingleInstance.h"
 #include "app/dialogs/ProgressWindow.h"
@@ -98,6 +98,11 @@ class MainWindowTest : public testing::Test {
     }
 
     TMusicDatabase& Database() { return window_->Database(); }
+    // Depends on the fonts, and is all that fits on the screen with each of them.
+    QSize SmallestSize() {
+        window_->resize(1, 1);
+        return window_->size();
+    }
     template <typename T>
     T* Child(const QString& name) {
         return window_->findChild<T*>(name);
@@ -363,10 +368,10 @@ TEST_F(MainWindowTest, TheMenuFollowsADatabaseThatBecomesReadOnly) {
 
 TEST_F(MainWindowTest, TheWindowKeepsItsSizeBetweenTwoStarts) {
     Start();
-    window_->resize(800, 520);
+    const QSize size = SmallestSize();
     window_->close();
     Start();
-    EXPECT_EQ(window_->size(), QSize(800, 520));
+    EXPECT_EQ(window_->size(), size);
 }
 
 TEST_F(MainWindowTest, FindsSongsFromTheFilterLineAndGoesOn) {
@@ -405,14 +410,15 @@ TEST_F(MainWindowTest, AnArrangementOfTheWindowsIsSavedAndComesBack) {
         ADD_FAILURE() << caption.toStdString();
     };
     auto* overview = window_->findChildren<QDockWidget*>().first();
-    window_->resize(700, 500);
+    const QSize arranged = SmallestSize();
+    const QSize larger = arranged + QSize(20, 30);
     ASSERT_TRUE(overview->isVisible());
     dialogs_.File = folder_.filePath(u"meine.DF"_s);
     choose(u"Anordnung speichern unter..."_s);
     overview->hide();
-    window_->resize(900, 600);
+    window_->resize(larger);
     choose(u"Anordnung laden..."_s);
-    EXPECT_EQ(window_->size(), QSize(700, 500));
+    EXPECT_EQ(window_->size(), arranged);
     EXPECT_TRUE(overview->isVisible());
     EXPECT_TRUE(dialogs_.Messages.isEmpty());
 
@@ -423,10 +429,10 @@ TEST_F(MainWindowTest, AnArrangementOfTheWindowsIsSavedAndComesBack) {
     ASSERT_TRUE(damaged.open(QIODevice::Append));
     damaged.write("\nVersion=1\nMainForm=AAAA\nMainFormState=AAAA\nSongListColumns=AAAA\n");
     damaged.close();
-    window_->resize(800, 550);
+    window_->resize(larger);
     window_->TakeOver({{damaged.fileName()}, {}});
     EXPECT_TRUE(QTest::qWaitFor([this] { return !dialogs_.Messages.isEmpty(); }));
-    EXPECT_EQ(window_->size(), QSize(800, 550));
+    EXPECT_EQ(window_->size(), larger);
     EXPECT_TRUE(overview->isVisible());
 }
 

@@ -17,8 +17,8 @@
 
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/NamePattern.h"
-#include "MusicManagment/database/Settings.h"
+#include "MusicManagment/database/commands/Settings.h"
+#include "MusicManagment/database/songfiles/NamePattern.h"
 #include "app/dialogs/NamePatternTexts.h"
 #include "tests/PrintQt.h"
 #include "tests/app/LabelFit.h"

@@ -8,7 +8,7 @@
 #include <QTemporaryDir>
 #include <QTest>
 
-#include "MusicManagment/database/Menu.h"
+#include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "app/CommandRunner.h"
 #include "app/MainMenu.h"

@@ -1,4 +1,4 @@
-#include "MusicManagment/database/BannList.h"
+#include "MusicManagment/database/intake/BannList.h"
 
 #include <gtest/gtest.h>
 

@@ -3,8 +3,8 @@
 #include <QDir>
 #include <QTemporaryDir>
 
-#include "MusicManagment/database/DatabaseFile.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/tsdb/DatabaseFile.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
 

@@ -1,4 +1,4 @@
-#include "MusicManagment/database/DatabaseFile.h"
+#include "MusicManagment/database/tsdb/DatabaseFile.h"
 
 #include <gtest/gtest.h>
 

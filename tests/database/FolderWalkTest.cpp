@@ -1,8 +1,8 @@
-#include "MusicManagment/database/FolderWalk.h"
+#include "MusicManagment/database/intake/FolderWalk.h"
 
 #include <gtest/gtest.h>
 
-#include "MusicManagment/database/Intake.h"
+#include "MusicManagment/database/intake/Intake.h"
 #include "tests/PrintQt.h"
 #include "tests/database/SongFolder.h"
 

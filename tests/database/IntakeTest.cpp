@@ -1,4 +1,4 @@
-#include "MusicManagment/database/Intake.h"
+#include "MusicManagment/database/intake/Intake.h"
 
 #include <gtest/gtest.h>
 

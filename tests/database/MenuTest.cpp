@@ -1,4 +1,4 @@
-#include "MusicManagment/database/Menu.h"
+#include "MusicManagment/database/commands/Menu.h"
 
 #include <gtest/gtest.h>
 

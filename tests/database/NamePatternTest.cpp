@@ -1,4 +1,4 @@
-#include "MusicManagment/database/NamePattern.h"
+#include "MusicManagment/database/songfiles/NamePattern.h"
 
 #include <gtest/gtest.h>
 

@@ -1,12 +1,12 @@
-#include "MusicManagment/database/OldRecords.h"
+#include "MusicManagment/database/tsdb/OldRecords.h"
 
 #include <gtest/gtest.h>
 
 #include <QDir>
 #include <QTemporaryDir>
 
-#include "MusicManagment/database/DatabaseFile.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/tsdb/DatabaseFile.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
 #include "tests/database/DatabaseBuilder.h"

@@ -1,4 +1,4 @@
-#include "MusicManagment/database/Settings.h"
+#include "MusicManagment/database/commands/Settings.h"
 
 #include <gtest/gtest.h>
 

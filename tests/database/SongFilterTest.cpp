@@ -1,4 +1,4 @@
-#include "MusicManagment/database/SongFilter.h"
+#include "MusicManagment/database/search/SongFilter.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "MusicManagment/database/Sorting.h"
+#include "MusicManagment/database/sorting/Sorting.h"
 
 #include <gtest/gtest.h>
 

@@ -1,12 +1,12 @@
-#include "MusicManagment/database/Update.h"
+#include "MusicManagment/database/intake/Update.h"
 
 #include <gtest/gtest.h>
 
 #include <QDir>
 #include <QFile>
 
-#include "MusicManagment/database/CopySongs.h"
-#include "MusicManagment/database/Removal.h"
+#include "MusicManagment/database/songfiles/CopySongs.h"
+#include "MusicManagment/database/songfiles/Removal.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
 #include "tests/database/SongFolder.h"

@@ -1,4 +1,4 @@
-#include "MusicManagment/playback/FMODPlaySound.h"
+#include "MusicManagment/playback/fmod/FMODPlaySound.h"
 
 #include <gtest/gtest.h>
 

@@ -1,6 +1,6 @@
 #include <gtest/gtest.h>
 
-#include "MusicManagment/playback/FMODPlaySound.h"
+#include "MusicManagment/playback/fmod/FMODPlaySound.h"
 #include "MusicManagment/playback/fmod/MidiFile.h"
 #include "tests/PrintQt.h"
 #include "tests/playback/Listening.h"

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include "MusicManagment/playback/EngineErrors.h"
+#include "MusicManagment/playback/backend/EngineErrors.h"
 #include "tests/PrintQt.h"
 
 using namespace Qt::StringLiterals;

@@ -5,7 +5,7 @@
 #include <QThread>
 
 #include "CommonRUKTools/Clock.h"
-#include "MusicManagment/playback/EngineErrors.h"
+#include "MusicManagment/playback/backend/EngineErrors.h"
 #include "MusicManagment/playback/mci/MCIPlaySound.h"
 #include "tests/PrintQt.h"
 #include "tests/database/SongFolder.h"

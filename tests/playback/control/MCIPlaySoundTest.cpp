@@ -4,7 +4,7 @@
 
 #include <map>
 
-#include "MusicManagment/playback/EngineErrors.h"
+#include "MusicManagment/playback/backend/EngineErrors.h"
 #include "tests/PrintQt.h"
 #include "tests/database/SongFolder.h"
 

@@ -6,9 +6,9 @@
 #include <algorithm>
 #include <map>
 
-#include "MusicManagment/playback/FadingBackend.h"
-#include "MusicManagment/playback/GainBackend.h"
 #include "MusicManagment/playback/PlaySound.h"
+#include "MusicManagment/playback/backend/FadingBackend.h"
+#include "MusicManagment/playback/backend/GainBackend.h"
 #include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"

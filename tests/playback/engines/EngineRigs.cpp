@@ -3,10 +3,10 @@
 #include <QTemporaryDir>
 #include <QThread>
 
-#include "MusicManagment/playback/FMODPlaySound.h"
 #include "MusicManagment/playback/eldos/EldoSPlaySound.h"
 #include "MusicManagment/playback/eldos/NullPush.h"
 #include "MusicManagment/playback/eldos/SdlPush.h"
+#include "MusicManagment/playback/fmod/FMODPlaySound.h"
 #include "MusicManagment/playback/fmod/SinkOutput.h"
 #include "MusicManagment/playback/fmod/SoundLibrary.h"
 #include "MusicManagment/playback/mci/GstMci.h"

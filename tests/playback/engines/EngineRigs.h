@@ -4,7 +4,7 @@
 #include <memory>
 
 #include "MusicManagment/playback/EngineChoice.h"
-#include "MusicManagment/playback/PlaySoundContainer.h"
+#include "MusicManagment/playback/backend/PlaySoundContainer.h"
 
 // A real engine over an output that nobody hears. Its time passes when the test says so, as far as the engine
 // lets it.

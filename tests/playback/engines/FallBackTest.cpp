@@ -4,9 +4,9 @@
 
 #include <QDir>
 
-#include "MusicManagment/playback/EngineErrors.h"
 #include "MusicManagment/playback/Engines.h"
 #include "MusicManagment/playback/PlaySound.h"
+#include "MusicManagment/playback/backend/EngineErrors.h"
 #include "MusicManagment/playback/fmod/SoundLibrary.h"
 #include "MusicManagment/playback/mci/GstMci.h"
 #include "tests/PrintQt.h"
