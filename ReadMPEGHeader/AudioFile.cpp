@@ -6,14 +6,14 @@
 #include "CommonRUKTools/BufferedSource.h"
 #include "CommonRUKTools/Clock.h"
 #include "CommonRUKTools/Errors.h"
-#include "ReadMPEGHeader/Asf.h"
 #include "ReadMPEGHeader/FileNameTag.h"
 #include "ReadMPEGHeader/Genres.h"
-#include "ReadMPEGHeader/ID3v1.h"
-#include "ReadMPEGHeader/MpegFrame.h"
 #include "ReadMPEGHeader/ReadingProfile.h"
 #include "ReadMPEGHeader/TitleCleaning.h"
-#include "ReadMPEGHeader/Wave.h"
+#include "ReadMPEGHeader/asf/Asf.h"
+#include "ReadMPEGHeader/id3v1/ID3v1.h"
+#include "ReadMPEGHeader/mpeg/MpegFrame.h"
+#include "ReadMPEGHeader/wave/Wave.h"
 
 using namespace Qt::StringLiterals;
 

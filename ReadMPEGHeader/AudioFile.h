@@ -4,8 +4,8 @@
 #include <QStringList>
 
 #include "CommonRUKTools/FileSource.h"
-#include "ReadMPEGHeader/FrameListener.h"
 #include "ReadMPEGHeader/ID3Tag.h"
+#include "ReadMPEGHeader/id3v2/FrameListener.h"
 
 // How tags and frames are looked for.
 enum class ReadProfile {

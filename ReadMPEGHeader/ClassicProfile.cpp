@@ -1,9 +1,9 @@
 #include <algorithm>
 #include <array>
 
-#include "ReadMPEGHeader/MpegFrame.h"
 #include "ReadMPEGHeader/ReadingProfile.h"
 #include "ReadMPEGHeader/SearchRange.h"
+#include "ReadMPEGHeader/mpeg/MpegFrame.h"
 
 namespace {
 

@@ -2,11 +2,11 @@
 #include <cstring>
 #include <string_view>
 
-#include "ReadMPEGHeader/ID3v2Header.h"
-#include "ReadMPEGHeader/IsoFrame.h"
-#include "ReadMPEGHeader/MpegFrame.h"
 #include "ReadMPEGHeader/ReadingProfile.h"
 #include "ReadMPEGHeader/SearchRange.h"
+#include "ReadMPEGHeader/id3v2/ID3v2Header.h"
+#include "ReadMPEGHeader/mpeg/IsoFrame.h"
+#include "ReadMPEGHeader/mpeg/MpegFrame.h"
 
 namespace {
 

@@ -5,10 +5,10 @@
 #include <optional>
 
 #include "CommonRUKTools/FileSource.h"
-#include "ReadMPEGHeader/Asf.h"
 #include "ReadMPEGHeader/AudioFile.h"
-#include "ReadMPEGHeader/ID3v2Reader.h"
-#include "ReadMPEGHeader/VbrHeader.h"
+#include "ReadMPEGHeader/asf/Asf.h"
+#include "ReadMPEGHeader/id3v2/ID3v2Reader.h"
+#include "ReadMPEGHeader/mpeg/VbrHeader.h"
 
 // At most so many bytes of a file's head are searched for sound.
 inline constexpr std::int64_t kSearchBytes = 256 * 1024;

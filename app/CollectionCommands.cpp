@@ -5,10 +5,10 @@
 
 #include "CommonRUKTools/AbsolutePath.h"
 #include "CommonRUKTools/Dialogs.h"
-#include "MusicManagment/database/Intake.h"
-#include "MusicManagment/database/Menu.h"
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/Update.h"
+#include "MusicManagment/database/commands/Menu.h"
+#include "MusicManagment/database/intake/Intake.h"
+#include "MusicManagment/database/intake/Update.h"
 
 using namespace Qt::StringLiterals;
 

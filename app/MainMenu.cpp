@@ -4,8 +4,8 @@
 #include <QMenu>
 #include <QMenuBar>
 
-#include "MusicManagment/database/Menu.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/commands/Menu.h"
 #include "app/MenuIcons.h"
 #include "app/desktop/Icons.h"
 

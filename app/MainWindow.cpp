@@ -17,9 +17,9 @@
 
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/RWReg.h"
-#include "MusicManagment/database/Intake.h"
-#include "MusicManagment/database/IntakeReport.h"
-#include "MusicManagment/database/Settings.h"
+#include "MusicManagment/database/commands/Settings.h"
+#include "MusicManagment/database/intake/Intake.h"
+#include "MusicManagment/database/intake/IntakeReport.h"
 #include "app/ArrangementCommands.h"
 #include "app/CommandMenu.h"
 #include "app/CommandRunner.h"

@@ -2,7 +2,7 @@
 
 #include <span>
 
-#include "MusicManagment/database/Menu.h"
+#include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "MusicManagment/playlist/PlayListMenu.h"
 #include "app/desktop/Icons.h"

@@ -7,7 +7,7 @@
 #include <QSet>
 #include <algorithm>
 
-#include "MusicManagment/database/Menu.h"
+#include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "MusicManagment/playlist/PlayListMenu.h"
 #include "app/CommandRunner.h"

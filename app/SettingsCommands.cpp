@@ -2,8 +2,8 @@
 
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/Settings.h"
-#include "MusicManagment/database/Update.h"
+#include "MusicManagment/database/commands/Settings.h"
+#include "MusicManagment/database/intake/Update.h"
 #include "app/dialogs/options/OptionsForm.h"
 #include "app/dialogs/wizard/WizardForm.h"
 

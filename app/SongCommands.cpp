@@ -2,9 +2,9 @@
 
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/Shell.h"
-#include "MusicManagment/database/CopySongs.h"
-#include "MusicManagment/database/Menu.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/commands/Menu.h"
+#include "MusicManagment/database/songfiles/CopySongs.h"
 #include "app/models/CollectionTotals.h"
 #include "app/views/SongListWidget.h"
 

@@ -3,7 +3,7 @@
 #include <functional>
 #include <vector>
 
-#include "MusicManagment/database/Removal.h"
+#include "MusicManagment/database/songfiles/Removal.h"
 
 class SongListWidget;
 class TMusicDatabase;

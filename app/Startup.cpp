@@ -3,8 +3,8 @@
 #include <QFileInfo>
 
 #include "CommonRUKTools/Dialogs.h"
-#include "MusicManagment/database/Intake.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/intake/Intake.h"
 #include "app/CollectionCommands.h"
 #include "app/CommandRunner.h"
 #include "app/desktop/InstallationSteps.h"

@@ -3,8 +3,8 @@
 #include <QMainWindow>
 #include <QMenu>
 
-#include "MusicManagment/database/Menu.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/commands/Menu.h"
 #include "app/views/MusicOverview.h"
 #include "app/views/OverviewForm.h"
 #include "app/views/PropertyForm.h"

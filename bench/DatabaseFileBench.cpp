@@ -11,8 +11,8 @@
 #include <fstream>
 
 #include "CommonRUKTools/FileSource.h"
-#include "MusicManagment/database/DatabaseFile.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/tsdb/DatabaseFile.h"
 #include "bench/FakeSongs.h"
 #include "bench/SqliteSongs.h"
 

@@ -8,7 +8,7 @@
 #include "CommonRUKTools/ByteWriter.h"
 #include "CommonRUKTools/CodePage.h"
 #include "CommonRUKTools/Errors.h"
-#include "ReadMPEGHeader/ID3v1.h"
+#include "ReadMPEGHeader/id3v1/ID3v1.h"
 
 using namespace Qt::StringLiterals;
 

@@ -8,7 +8,7 @@
 
 #include "CommonRUKTools/Collation.h"
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/Sorting.h"
+#include "MusicManagment/database/sorting/Sorting.h"
 #include "bench/FakeSongs.h"
 
 namespace {

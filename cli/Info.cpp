@@ -2,7 +2,7 @@
 #include <vector>
 
 #include "ReadMPEGHeader/AudioFile.h"
-#include "ReadMPEGHeader/MpegResults.h"
+#include "ReadMPEGHeader/mpeg/MpegResults.h"
 #include "cli/CommandLine.h"
 #include "cli/Commands.h"
 #include "cli/InfoSheet.h"

@@ -3,9 +3,9 @@
 #include <QString>
 #include <vector>
 
-#include "ReadMPEGHeader/FrameListener.h"
 #include "ReadMPEGHeader/ID3Tag.h"
-#include "ReadMPEGHeader/MpegResults.h"
+#include "ReadMPEGHeader/id3v2/FrameListener.h"
+#include "ReadMPEGHeader/mpeg/MpegResults.h"
 
 // What is known of one file.
 struct FileInfo {

@@ -2,7 +2,7 @@
 #include <algorithm>
 
 #include "CommonRUKTools/FileSource.h"
-#include "MusicManagment/database/Intake.h"
+#include "MusicManagment/database/intake/Intake.h"
 #include "cli/CommandLine.h"
 #include "cli/Commands.h"
 #include "cli/JsonOutput.h"

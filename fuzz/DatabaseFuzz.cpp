@@ -10,8 +10,8 @@
 #include <vector>
 
 #include "CommonRUKTools/ByteWriter.h"
-#include "MusicManagment/database/DatabaseFile.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/tsdb/DatabaseFile.h"
 
 namespace {
 

@@ -2,7 +2,7 @@
 #include <cstdlib>
 
 #include "CommonRUKTools/Errors.h"
-#include "ReadMPEGHeader/ID3v2Reader.h"
+#include "ReadMPEGHeader/id3v2/ID3v2Reader.h"
 
 using namespace Qt::StringLiterals;
 

@@ -9,10 +9,10 @@
 #include "CommonRUKTools/Collation.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/FileSource.h"
-#include "MusicManagment/database/BannList.h"
-#include "MusicManagment/database/Menu.h"
-#include "MusicManagment/database/RecycleBin.h"
 #include "MusicManagment/database/Views.h"
+#include "MusicManagment/database/commands/Menu.h"
+#include "MusicManagment/database/intake/BannList.h"
+#include "MusicManagment/database/songfiles/RecycleBin.h"
 
 using namespace Qt::StringLiterals;
 

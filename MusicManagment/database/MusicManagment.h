@@ -11,12 +11,12 @@
 
 #include "CommonRUKTools/Errors.h"
 #include "CommonRUKTools/MenuItem.h"
-#include "MusicManagment/database/ConversionSettings.h"
 #include "MusicManagment/database/GroupLists.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/SongList.h"
 #include "MusicManagment/database/SongTypes.h"
-#include "MusicManagment/database/Sorting.h"
+#include "MusicManagment/database/commands/ConversionSettings.h"
+#include "MusicManagment/database/sorting/Sorting.h"
 #include "ReadMPEGHeader/AudioFile.h"
 
 class OverviewView;

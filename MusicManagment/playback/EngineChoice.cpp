@@ -4,7 +4,7 @@
 #include <array>
 #include <span>
 
-#include "MusicManagment/playback/EngineErrors.h"
+#include "MusicManagment/playback/backend/EngineErrors.h"
 
 using namespace Qt::StringLiterals;
 

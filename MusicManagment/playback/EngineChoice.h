@@ -8,8 +8,8 @@
 #include <optional>
 #include <vector>
 
-#include "MusicManagment/playback/PlaySoundContainer.h"
 #include "MusicManagment/playback/PlaySoundSettings.h"
+#include "MusicManagment/playback/backend/PlaySoundContainer.h"
 
 // The sound engines, in the order in which they are preferred.
 enum class TEngine { FMOD, EldoS, MCI, WinAmp };

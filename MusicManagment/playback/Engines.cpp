@@ -1,7 +1,7 @@
 #include "MusicManagment/playback/Engines.h"
 
-#include "MusicManagment/playback/FMODPlaySound.h"
 #include "MusicManagment/playback/eldos/EldoSPlaySound.h"
+#include "MusicManagment/playback/fmod/FMODPlaySound.h"
 #include "MusicManagment/playback/mci/MCIPlaySound.h"
 #include "MusicManagment/playback/winamp/WinAmpPlaySound.h"
 

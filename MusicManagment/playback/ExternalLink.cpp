@@ -1,6 +1,6 @@
 #include "MusicManagment/playback/ExternalLink.h"
 
-#include "MusicManagment/playback/EngineErrors.h"
+#include "MusicManagment/playback/backend/EngineErrors.h"
 
 using namespace Qt::StringLiterals;
 

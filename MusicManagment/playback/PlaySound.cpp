@@ -10,9 +10,9 @@
 #include "CommonRUKTools/FileSource.h"
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/playback/ExternalLink.h"
-#include "MusicManagment/playback/FadingBackend.h"
-#include "MusicManagment/playback/GainBackend.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
+#include "MusicManagment/playback/backend/FadingBackend.h"
+#include "MusicManagment/playback/backend/GainBackend.h"
 
 using namespace Qt::StringLiterals;
 

@@ -2,8 +2,8 @@
 
 #include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/playback/ExternalLink.h"
-#include "MusicManagment/playback/FadingBackend.h"
 #include "MusicManagment/playback/PlaySound.h"
+#include "MusicManagment/playback/backend/FadingBackend.h"
 
 // Two songs at once.
 

@@ -2,8 +2,8 @@
 
 #include "CommonRUKTools/Clock.h"
 #include "CommonRUKTools/Dialogs.h"
-#include "MusicManagment/playback/FadingBackend.h"
 #include "MusicManagment/playback/PlaySound.h"
+#include "MusicManagment/playback/backend/FadingBackend.h"
 
 // What happens while a song plays: the ticks, its end, and what comes after it.
 

@@ -4,9 +4,9 @@
 
 #include "CommonRUKTools/AbsolutePath.h"
 #include "CommonRUKTools/Clock.h"
-#include "MusicManagment/database/FolderWalk.h"
-#include "MusicManagment/database/Intake.h"
 #include "MusicManagment/database/Progress.h"
+#include "MusicManagment/database/intake/FolderWalk.h"
+#include "MusicManagment/database/intake/Intake.h"
 #include "MusicManagment/playlist/ListRecognition.h"
 #include "MusicManagment/playlist/PlayList.h"
 #include "MusicManagment/playlist/PlayListFiles.h"

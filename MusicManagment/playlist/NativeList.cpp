@@ -1,7 +1,7 @@
 #include <array>
 
 #include "CommonRUKTools/CodePage.h"
-#include "MusicManagment/database/PackedRecord.h"
+#include "MusicManagment/database/tsdb/PackedRecord.h"
 #include "MusicManagment/playlist/PlayListFiles.h"
 
 // The program's own lists (.rukpl): names as they are listed, each with the record of its song.

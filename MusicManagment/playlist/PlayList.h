@@ -13,7 +13,7 @@
 
 #include "CommonRUKTools/MenuItem.h"
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/Settings.h"
+#include "MusicManagment/database/commands/Settings.h"
 #include "MusicManagment/playlist/EntryList.h"
 #include "MusicManagment/playlist/PlayListTypes.h"
 

@@ -2,7 +2,7 @@
 
 #include <QRegularExpression>
 
-#include "MusicManagment/database/NamePattern.h"
+#include "MusicManagment/database/songfiles/NamePattern.h"
 
 using namespace Qt::StringLiterals;
 

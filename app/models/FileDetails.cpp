@@ -6,7 +6,7 @@
 
 #include "CommonRUKTools/BufferedSource.h"
 #include "CommonRUKTools/Errors.h"
-#include "ReadMPEGHeader/CoverArt.h"
+#include "ReadMPEGHeader/id3v2/CoverArt.h"
 #include "app/models/CoverImage.h"
 
 using namespace Qt::StringLiterals;

@@ -4,7 +4,7 @@
 #include <functional>
 #include <vector>
 
-#include "MusicManagment/database/SongFilter.h"
+#include "MusicManagment/database/search/SongFilter.h"
 #include "app/models/SongListModel.h"
 
 // The rows of the song list that a filter lets through, in their order. Without a filter every row is its own

@@ -4,7 +4,7 @@
 #include <QWidget>
 #include <functional>
 
-#include "MusicManagment/database/Settings.h"
+#include "MusicManagment/database/commands/Settings.h"
 #include "app/models/GroupSelection.h"
 #include "app/models/OverviewModel.h"
 

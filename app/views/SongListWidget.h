@@ -5,8 +5,8 @@
 #include <functional>
 #include <vector>
 
-#include "MusicManagment/database/SongFilter.h"
-#include "MusicManagment/database/Sorting.h"
+#include "MusicManagment/database/search/SongFilter.h"
+#include "MusicManagment/database/sorting/Sorting.h"
 #include "app/views/TypeAhead.h"
 
 class FilteredSongs;

@@ -2,7 +2,7 @@
 
 #include <QDockWidget>
 
-#include "MusicManagment/database/Settings.h"
+#include "MusicManagment/database/commands/Settings.h"
 
 class QActionGroup;
 class TDSPDraw;

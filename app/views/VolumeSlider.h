@@ -3,7 +3,7 @@
 #include <QSlider>
 #include <functional>
 
-#include "MusicManagment/database/Settings.h"
+#include "MusicManagment/database/commands/Settings.h"
 
 // How loud the program plays. Its value, 0 to 100 per cent, is kept with the settings.
 class VolumeSlider : public QSlider, public SettingsClient {

@@ -5,8 +5,8 @@
 #include <memory>
 #include <vector>
 
-#include "MusicManagment/playback/EngineErrors.h"
-#include "MusicManagment/playback/GainBackend.h"
+#include "MusicManagment/playback/backend/EngineErrors.h"
+#include "MusicManagment/playback/backend/GainBackend.h"
 #include "MusicManagment/playback/eldos/ModuleFiles.h"
 #include "MusicManagment/playback/eldos/PushOutput.h"
 

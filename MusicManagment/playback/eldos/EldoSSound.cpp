@@ -3,7 +3,7 @@
 #include <QFile>
 #include <array>
 
-#include "MusicManagment/playback/EngineErrors.h"
+#include "MusicManagment/playback/backend/EngineErrors.h"
 #include "MusicManagment/playback/eldos/ModuleFiles.h"
 
 using namespace Qt::StringLiterals;

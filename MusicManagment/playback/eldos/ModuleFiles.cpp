@@ -6,7 +6,7 @@
 #include <QLibrary>
 #include <array>
 
-#include "MusicManagment/playback/EngineErrors.h"
+#include "MusicManagment/playback/backend/EngineErrors.h"
 
 using namespace Qt::StringLiterals;
 

@@ -5,7 +5,7 @@
 #include <cmath>
 #include <utility>
 
-#include "MusicManagment/playback/EngineErrors.h"
+#include "MusicManagment/playback/backend/EngineErrors.h"
 
 using namespace Qt::StringLiterals;
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "CommonRUKTools/RWReg.h"
-#include "MusicManagment/playback/GainBackend.h"
+#include "MusicManagment/playback/backend/GainBackend.h"
 #include "MusicManagment/playback/mci/MciInterface.h"
 
 // The kind of device that plays files with this name: what the settings say under its extension ("MP3"), or

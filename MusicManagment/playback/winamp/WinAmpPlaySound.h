@@ -7,8 +7,8 @@
 #include <memory>
 #include <optional>
 
-#include "MusicManagment/playback/EngineErrors.h"
-#include "MusicManagment/playback/GainBackend.h"
+#include "MusicManagment/playback/backend/EngineErrors.h"
+#include "MusicManagment/playback/backend/GainBackend.h"
 #include "MusicManagment/playback/winamp/MprisPlayer.h"
 #include "MusicManagment/playback/winamp/PlayerProgram.h"
 

@@ -14,7 +14,7 @@
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/Settings.h"
+#include "MusicManagment/database/commands/Settings.h"
 #include "app/CommandRunner.h"
 #include "app/dialogs/PageScroller.h"
 #include "app/dialogs/options/CdsPage.h"

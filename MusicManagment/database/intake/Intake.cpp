@@ -1,0 +1,267 @@
+#include "MusicManagment/database/intake/Intake.h"
+
+#include <QFileInfo>
+#include <algorithm>
+#include <array>
+#include <utility>
+
+#include "CommonRUKTools/AbsolutePath.h"
+#include "CommonRUKTools/Clock.h"
+#include "CommonRUKTools/Dialogs.h"
+#include "MusicManagment/database/ListGuards.h"
+#include "MusicManagment/database/intake/FolderWalk.h"
+#include "MusicManagment/database/intake/IntakeReport.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+constexpr std::array kExtensions = {".mp3"_L1, ".mp2"_L1, ".wma"_L1, ".wav"_L1};
+constexpr int kFilesPerProgressPoint = 5;
+
+QString FileRunText() {
+    return u"Nehme Songs in die Datenbank auf"_s;
+}
+
+QString FolderRunText() {
+    return u"Dursuche Ordner nach neuen Songs"_s;
+}
+
+// Reading thousands of files only to have each refused would help nobody, so a database that cannot change
+// says so at once.
+void RefuseUnless(bool possible) {
+    if (!possible)
+        throw EMusicDatabaseException(u"Hinzufügen von Songs zur Datenbank ist momentan nicht möglich."_s);
+}
+
+bool TakesSongs(const TMusicDatabase& database) {
+    return !database.Busy() && !database.ReadOnly();
+}
+
+void RefuseWhenLocked(const TMusicDatabase& database) {
+    RefuseUnless(TakesSongs(database) && !database.ProgressRunning());
+}
+
+// A file is known under one spelling of its path only.
+QString StoredPath(const QString& path) {
+    return IsCdPath(path) ? path : AbsolutePath(path);
+}
+
+void NoteUnreadable(const QString& reason, IntakeResult& result) {
+    ++result.Unreadable;
+    result.UnreadableNames << reason;
+}
+
+void NoteUnreadable(const QStringList& reasons, IntakeResult& result) {
+    result.Unreadable += static_cast<int>(reasons.size());
+    result.UnreadableNames << reasons;
+}
+
+// Empty when the file was read, else why not.
+QString ReadSong(const QString& path, const ReadOptions& options, TID3Tag& record) {
+    try {
+        const QString refusal = ReadAudioFile(path, options, record);
+        return refusal.isEmpty() ? refusal : refusal + u": "_s + path;
+    } catch (const EStreamError& error) {
+        return error.Message();
+    }
+}
+
+bool TakeIn(TMusicDatabase& database, const QString& path, const ReadOptions& options, IntakeResult& result) {
+    TID3Tag record;
+    const QString reason = ReadSong(path, options, record);
+    if (!reason.isEmpty()) {
+        NoteUnreadable(reason, result);
+        return false;
+    }
+    if (database.AddEntry(path, record) >= 0) {
+        ++result.Added;
+        result.NewFiles << path;
+        return true;
+    }
+    if (database.IsBanned(record))
+        ++result.Banned;
+    else
+        NoteUnreadable(u"Nicht aufgenommen: "_s + path, result);
+    return false;
+}
+
+bool ReportCacheList(TMusicDatabase& database, std::size_t done) {
+    return database.Progress({.Cur = static_cast<qint64>(done),
+                              .Max = database.Count(),
+                              .Type = ptSearchFolders,
+                              .Description = u"Erstelle Cache-Liste"_s});
+}
+
+// The songs of a collection are found by an index over their paths. In a large one it takes its time, and the
+// user may do meanwhile whatever leaves the songs where they are.
+void MakePathIndex(TMusicDatabase& database) {
+    const BusyGuard unchanged(database);
+    database.Songs().IndexPaths([&database](std::size_t done) { return ReportCacheList(database, done); });
+}
+
+// Turns what the user gave into a list of song files.
+class Collector {
+ public:
+    Collector(TMusicDatabase& database, bool withSubfolders, IntakeResult& result)
+        : walk_({.WithSubfolders = withSubfolders,
+                 .IsWanted = &IsSongFile,
+                 .Progress =
+                     [&database](const QString& folder) {
+                         return database.Progress({.Type = ptSearchFolders, .Description = folder});
+                     }}),
+          result_(result) {}
+
+    void AddFolder(const QString& folder) {
+        if (!result_.Stopped) result_.Stopped = !walk_.Walk(folder, files_);
+    }
+
+    void AddFile(const QString& path, bool exists) {
+        if (IsSongFile(path))
+            files_ << path;
+        else
+            NoteUnreadable((exists ? u"Keine Musikdatei: "_s : u"Datei nicht gefunden: "_s) + path, result_);
+    }
+
+    QStringList Finish() {
+        NoteUnreadable(walk_.Unreadable(), result_);
+        return std::move(files_);
+    }
+
+ private:
+    FolderWalk walk_;
+    IntakeResult& result_;
+    QStringList files_;
+};
+
+struct GivenPath {
+    QString Path;
+    bool Exists;
+    bool IsFolder;
+};
+
+std::vector<GivenPath> LookAt(const QStringList& paths) {
+    std::vector<GivenPath> given;
+    for (const QString& path : paths) {
+        const QString stored = StoredPath(path);
+        const QFileInfo info(stored);
+        given.push_back({stored, info.exists(), info.isDir()});
+    }
+    return given;
+}
+
+// Walks and adds within one run.
+IntakeResult AddGiven(TMusicDatabase& database, const std::vector<GivenPath>& given, bool withSubfolders) {
+    const bool anyFolder =
+        std::any_of(given.begin(), given.end(), [](const GivenPath& path) { return path.IsFolder; });
+    const ProgressRun run(database, anyFolder ? FolderRunText() : FileRunText());
+    IntakeResult result;
+    Collector collector(database, withSubfolders, result);
+    if (anyFolder) ReportCacheList(database, 0);
+    MakePathIndex(database);
+    for (const GivenPath& path : given) {
+        if (path.IsFolder)
+            collector.AddFolder(path.Path);
+        else
+            collector.AddFile(path.Path, path.Exists);
+    }
+    QStringList files = collector.Finish();
+    if (!result.Stopped) AddFileList(database, files, true, nullptr, &result);
+    return result;
+}
+
+IntakeResult AddChosenFiles(TMusicDatabase& database, QStringList files) {
+    const ProgressRun run(database, FileRunText());
+    IntakeResult result;
+    MakePathIndex(database);
+    AddFileList(database, files, true, nullptr, &result);
+    return result;
+}
+
+QStringList AskForFiles() {
+    FileDialogOptions options;
+    options.Title = u"Songs zur Datenbank hinzufügen"_s;
+    options.Filter = u"Musik|"_s + AcceptedExtensions().replace(u'.', u"*."_s) + u"|Alle Dateien|*.*"_s;
+    return UserDialogs().OpenFiles(options);
+}
+
+QString AskForFolder(bool withSubfolders) {
+    const QString caption = u"Ordner zum Durchsuchen nach Songs auswählen ("_s +
+                            (withSubfolders ? u"inkl."_s : u"ohne"_s) + u" Unterordner):"_s;
+    return UserDialogs().ChooseFolder(caption).value_or(QString());
+}
+
+}  // namespace
+
+QString AcceptedExtensions() {
+    QString text;
+    for (const QLatin1StringView extension : kExtensions)
+        text += extension + u';';
+    return text;
+}
+
+bool IsSongFile(const QString& path) {
+    return std::any_of(kExtensions.begin(), kExtensions.end(), [&path](QLatin1StringView extension) {
+        return path.endsWith(extension, Qt::CaseInsensitive);
+    });
+}
+
+IntakeResult AddSongsFromDialog(TMusicDatabase& database, const QStringList& files) {
+    RefuseWhenLocked(database);
+    const QStringList chosen = files.isEmpty() ? AskForFiles() : files;
+    if (chosen.isEmpty()) return {};
+    IntakeResult result = AddChosenFiles(database, chosen);
+    ReportIntake(result);
+    database.SaveAfterCommand();
+    return result;
+}
+
+IntakeResult AddFolder(TMusicDatabase& database, const QString& folder, bool withSubfolders) {
+    RefuseWhenLocked(database);
+    const QString chosen = folder.isEmpty() ? AskForFolder(withSubfolders) : folder;
+    if (chosen.isEmpty()) return {};
+    IntakeResult result = AddGiven(database, {{AbsolutePath(chosen), true, true}}, withSubfolders);
+    ReportIntake(result);
+    database.SaveAfterCommand();
+    return result;
+}
+
+IntakeResult AddPaths(TMusicDatabase& database, const QStringList& paths, bool withSubfolders) {
+    RefuseWhenLocked(database);
+    IntakeResult result = AddGiven(database, LookAt(paths), withSubfolders);
+    database.SaveAfterCommand();
+    return result;
+}
+
+int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting, QStringList* newNames,
+                IntakeResult* result) {
+    RefuseUnless(TakesSongs(database));
+    IntakeResult unasked;
+    IntakeResult& outcome = result != nullptr ? *result : unasked;
+    const QStringList candidates = std::exchange(list, {});
+    ReadOptions options = database.AudioReadOptions();
+    for (qsizetype i = 0; i < candidates.size(); ++i) {
+        if (i % kFilesPerProgressPoint == 0) {
+            outcome.Stopped = database.Progress(
+                {.Cur = i, .Max = candidates.size(), .Type = ptAddSongs, .Description = candidates[i]});
+            if (outcome.Stopped) break;
+            // The local time costs several system calls, so it is asked for only here.
+            options.FileTime = CurrentClock().Now();
+        }
+        const QString path = StoredPath(candidates[i]);
+        if (checkExisting && database.Contains(path))
+            ++outcome.Known;
+        else if (TakeIn(database, path, options, outcome))
+            list << path;
+    }
+    if (newNames != nullptr) *newNames << list;
+    return static_cast<int>(list.size());
+}
+
+SongIndex AddSongFile(TMusicDatabase& database, const QString& path, const SongOverrides& overrides) {
+    try {
+        return database.AddSong(StoredPath(path), overrides);
+    } catch (const EStreamError&) {
+        return -1;  // the caller learns from the number that the song is not there
+    }
+}

@@ -1,0 +1,100 @@
+#include "MusicManagment/database/songfiles/CopySongs.h"
+
+#include <QDir>
+#include <QFileInfo>
+
+#include "CommonRUKTools/Dialogs.h"
+#include "CommonRUKTools/FileSource.h"
+#include "CommonRUKTools/SafeFile.h"
+#include "MusicManagment/database/Progress.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+constexpr std::size_t kBlock = 1 << 20;
+
+enum class Existing { Ask, Replace, Skip };
+
+// Asks once a file, or once for all.
+class CollisionPolicy {
+ public:
+    // Throws EAbort on cancel.
+    bool MayReplace(const QString& name) {
+        if (policy_ != Existing::Ask) return policy_ == Existing::Replace;
+        const int answer = UserDialogs().Ask(
+            u"Die Datei "_s + name + u" existiert bereits."_s,
+            {u"Ersetzen"_s, u"Alle ersetzen"_s, u"Überspringen"_s, u"Alle überspringen"_s, u"Abbrechen"_s},
+            4);
+        if (answer == 4) throw EAbort();
+        if (answer == 1) policy_ = Existing::Replace;
+        if (answer == 3) policy_ = Existing::Skip;
+        return answer < 2;
+    }
+
+ private:
+    Existing policy_ = Existing::Ask;
+};
+
+class Copier {
+ public:
+    Copier(TMusicDatabase& database, const QString& folder, int total)
+        : database_(database), folder_(folder), total_(total) {}
+
+    // False when the user asked to stop.
+    bool Copy(int number, const QString& path, CopyResult& result) {
+        const QString name = QFileInfo(path).fileName();
+        const QString target = folder_.filePath(name);
+        try {
+            FileSource source(path);
+            if (QFileInfo(target) == QFileInfo(path))
+                throw EStreamError(u"Quelle und Ziel sind dieselbe Datei"_s);
+            if (QFileInfo::exists(target) && !collisions_.MayReplace(name)) return true;
+            SafeFile file(target);
+            if (!CopyBytes(number, name, source, file)) return false;
+            file.Commit();
+            ++result.Copied;
+        } catch (const EStreamError& error) {
+            result.Failed << path + u": "_s + error.Message();
+        }
+        return true;
+    }
+
+ private:
+    bool CopyBytes(int number, const QString& name, ByteSource& source, SafeFile& target) {
+        std::vector<std::uint8_t> block(kBlock);
+        for (std::int64_t done = 0; done < source.Size();) {
+            if (database_.Progress({.Cur = number,
+                                    .Max = total_,
+                                    .CurSub = done,
+                                    .MaxSub = source.Size(),
+                                    .Type = ptCopySongs,
+                                    .Description = name}))
+                return false;
+            const auto count = source.ReadAt(done, block);
+            if (count == 0) throw EStreamError(u"Unerwartetes Ende der Datei"_s);
+            target.Write(ByteSpan(block).first(count));
+            done += static_cast<std::int64_t>(count);
+        }
+        return true;
+    }
+
+    TMusicDatabase& database_;
+    QDir folder_;
+    int total_;
+    CollisionPolicy collisions_;
+};
+
+}  // namespace
+
+CopyResult CopySongs(TMusicDatabase& database, const std::vector<SongIndex>& songs, const QString& folder) {
+    QStringList paths;
+    for (const SongIndex index : songs)
+        paths << database.Song(index).FileName;
+    const ProgressRun run(database, u"Kopiere die Songs an die Zielorte"_s);
+    Copier copier(database, folder, static_cast<int>(paths.size()));
+    CopyResult result;
+    for (int i = 0; i < paths.size() && !result.Stopped; ++i)
+        result.Stopped = !copier.Copy(i, paths[i], result);
+    return result;
+}

@@ -1,0 +1,53 @@
+#include "MusicManagment/database/songfiles/NamePattern.h"
+
+#include <utility>
+#include <vector>
+
+#include "CommonRUKTools/FileNames.h"
+#include "ReadMPEGHeader/DisplayTexts.h"
+#include "ReadMPEGHeader/Genres.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+// In the order in which they are replaced.
+std::vector<std::pair<QString, QString>> Values(const TID3Tag& info) {
+    return {
+        {u"%TITLE%"_s, info.Title},
+        {u"%ARTIST%"_s, info.Artist},
+        {u"%ALBUM%"_s, info.Album},
+        {u"%YEAR%"_s, info.Year},
+        {u"%COMMENT%"_s, info.Comment},
+        {u"%FORMAT%"_s, info.MPEGLayer},
+        {u"%LENGTHV%"_s, FormatLength(info.Length, false)},
+        {u"%LENGTHF%"_s, FormatLength(info.Length, true)},
+        {u"%ID3GENRE%"_s, GenreName(info.Genre)},
+        {u"%KBPS%"_s, QString::number(info.BitRate)},
+        {u"%FRQ%"_s, QString::number(info.SampleRate)},
+        {u"%CHANNELS%"_s, FormatChannelMode(info.ChannelMode)},
+        {u"%EMPHASIS%"_s, FormatEmphasis(info.Emphasis)},
+        {u"%TRACKNR%"_s, QString::number(info.Track)},
+        {u"%ID3FLAGS%"_s, FormatHeaderFlags(info)},
+        {u"%MAINGENRE%"_s, MainGenreLongName(info.MainGenre)},
+    };
+}
+
+}  // namespace
+
+QString BuildNameFromPattern(const QString& pattern, const QString& path, const TID3Tag& info) {
+    QString name = pattern;
+    for (const auto& [placeholder, value] : Values(info))
+        name.replace(placeholder, value);
+    const qsizetype slash = path.lastIndexOf(u'/');
+    const qsizetype dot = path.lastIndexOf(u'.');
+    const QString extension = dot > slash ? path.mid(dot) : QString();
+    return path.left(slash + 1) + MakeValidFileName(name) + extension;
+}
+
+QStringList NamePatternPlaceholders() {
+    QStringList names;
+    for (const auto& value : Values(TID3Tag()))
+        names << value.first;
+    return names;
+}

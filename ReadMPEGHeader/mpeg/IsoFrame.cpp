@@ -1,0 +1,53 @@
+#include "ReadMPEGHeader/mpeg/IsoFrame.h"
+
+#include <array>
+
+namespace {
+
+using BitRateRow = std::array<std::size_t, 15>;
+
+// kbit/s by index, 0 free format.
+constexpr std::array<BitRateRow, 3> kMpeg1 = {{
+    {0, 32, 64, 96, 128, 160, 192, 224, 256, 288, 320, 352, 384, 416, 448},  // Layer I
+    {0, 32, 48, 56, 64, 80, 96, 112, 128, 160, 192, 224, 256, 320, 384},
+    {0, 32, 40, 48, 56, 64, 80, 96, 112, 128, 160, 192, 224, 256, 320},
+}};
+// MPEG 2 and 2.5.
+constexpr std::array<BitRateRow, 3> kLowSampleRates = {{
+    {0, 32, 48, 56, 64, 80, 96, 112, 128, 144, 160, 176, 192, 224, 256},
+    {0, 8, 16, 24, 32, 40, 48, 56, 64, 80, 96, 112, 128, 144, 160},
+    {0, 8, 16, 24, 32, 40, 48, 56, 64, 80, 96, 112, 128, 144, 160},
+}};
+constexpr std::array<std::size_t, 3> kSampleRates = {44100, 48000, 32000};
+
+constexpr unsigned kMpeg1Code = 3;
+
+// Hz; MPEG 2 halves the rates of MPEG 1, MPEG 2.5 quarters them.
+std::size_t SampleRate(const IsoFrame& frame) {
+    const std::size_t divisor = frame.Version == kMpeg1Code ? 1 : frame.Version == 2 ? 2 : 4;
+    return kSampleRates[frame.SampleRateIndex] / divisor;
+}
+
+std::size_t FrameSize(const IsoFrame& frame, std::size_t bitRate, std::size_t padding) {
+    if (bitRate == 0) return 0;
+    const std::size_t bits = bitRate * 1000;
+    if (frame.Layer == 1) return (12 * bits / SampleRate(frame) + padding) * 4;
+    // Samples of a frame, in bytes: only Layer III has shorter frames at low sample rates.
+    const std::size_t coefficient = frame.Layer == 3 && frame.Version != kMpeg1Code ? 72 : 144;
+    return coefficient * bits / SampleRate(frame) + padding;
+}
+
+}  // namespace
+
+std::optional<IsoFrame> IsoFrame::Parse(ByteSpan bytes) {
+    if (bytes.size() < 4 || bytes[0] != 0xFF || (bytes[1] & 0xE0) != 0xE0) return std::nullopt;
+    const unsigned version = (bytes[1] >> 3) & 3u;
+    const unsigned layerCode = (bytes[1] >> 1) & 3u;
+    const unsigned bitRateIndex = bytes[2] >> 4;
+    const unsigned sampleRateIndex = (bytes[2] >> 2) & 3u;
+    if (version == 1 || layerCode == 0 || bitRateIndex == 15 || sampleRateIndex == 3) return std::nullopt;
+    IsoFrame frame{version, 4 - layerCode, sampleRateIndex, 0};
+    const auto& rows = version == kMpeg1Code ? kMpeg1 : kLowSampleRates;
+    frame.Size = FrameSize(frame, rows[frame.Layer - 1][bitRateIndex], (bytes[2] >> 1) & 1u);
+    return frame;
+}
