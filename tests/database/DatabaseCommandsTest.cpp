@@ -256,6 +256,6 @@ TEST_F(DatabaseCommandsTest, NothingIsTouchedWhileAnotherRunIsGoing) {
     database.EndBusy();
     EXPECT_EQ(database.Count(), 3);
     EXPECT_EQ(database.FileName(), Path(u"a.tsdb"_s));
-    EXPECT_EQ(dialogs_.Messages.size(), 3u);
+    EXPECT_EQ(dialogs_.Messages.size(), 3);
     EXPECT_EQ(FilesThere(), QStringList{u"a.tsdb"_s});
 }

@@ -296,9 +296,10 @@ TEST_F(MusicManagmentTest, ARunBeginsAndEndsWithItsObject) {
         EXPECT_EQ(log_.Take(), (QStringList{u"reset"_s, u"start"_s, u"caption MusicDatabase v6.0 - Test"_s}));
         EXPECT_TRUE(database_.ProgressRunning() && database_.MenuLocked());
         EXPECT_THROW(database_.StartProgress(u"second"_s, true), EAbort);
-        ASSERT_EQ(dialogs_.Messages.size(), 1u);
-        EXPECT_EQ(dialogs_.Messages[0].second,
-                  u"Warten Sie, bis der gerade laufende Vorgang beendet wurde oder brechen Sie ihn ab."_s);
+        EXPECT_EQ(
+            dialogs_.Messages,
+            QStringList{
+                u"Warten Sie, bis der gerade laufende Vorgang beendet wurde oder brechen Sie ihn ab."_s});
         EXPECT_EQ(log_.Take(), QStringList());
         database_.RequestAbort();
     }
@@ -377,7 +378,7 @@ TEST_F(MusicManagmentTest, TheAutomaticSaveNeedsANameAndDisturbsNoRun) {
 
     database_.SetFileName(songs.Path(u"no folder/x.tsdb"_s));
     database_.AutoSaveTick();
-    EXPECT_EQ(dialogs_.Messages.size(), 1u) << "a save that fails is told, as nobody called the command";
+    EXPECT_EQ(dialogs_.Messages.size(), 1) << "a save that fails is told, as nobody called the command";
     EXPECT_TRUE(database_.AutoSaveTimerActive());
 }
 
