@@ -77,9 +77,6 @@ TTunesteadMainWnd::~TTunesteadMainWnd() = default;
 
 void TTunesteadMainWnd::SetUpDatabase() {
     database_.SetModernTags(true);
-    database_.OnChange = [this](TMusicDatabase&, SongIndex index, TChangeType change) {
-        totals_.SongChanged(index, change);
-    };
     progress_.OnRunning = [this](bool running) { RunningChanged(running); };
     commands_.OnIntake = &ReportIntake;
     const auto follow = [this] { ListChanged(); };

@@ -24,7 +24,7 @@ class DatabaseCommandsTest : public testing::Test {
             song.Artist = u"Artist %1"_s.arg(i % 3);
             song.Year = u"1999"_s;
             song.AddTime = 1;
-            database.AddEntry(QString(), song, {.SkipChecks = true});
+            database.AddEntry(QString(), song, AddAs::Returning);
         }
         database.RecountGroups();
     }

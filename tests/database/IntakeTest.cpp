@@ -174,7 +174,7 @@ TEST_F(IntakeTest, StoppingTheWalkReadsNoSong) {
 
 TEST_F(IntakeTest, TheCacheListOfALargeCollectionIsMadeInSteps) {
     for (int i = 0; i < 20'000; ++i)
-        database_.AddEntry(u":00000000:\\"_s + QString::number(i), {}, {.SkipChecks = true});
+        database_.AddEntry(u":00000000:\\"_s + QString::number(i), {}, AddAs::Loaded);
     const QStringList files = AddSongs(1);
     database_.OnProgress = [&](TMusicDatabase& database, const ProgressPoint& point) {
         points_.push_back(point);
