@@ -12,6 +12,7 @@
 #include "CommonRUKTools/Errors.h"
 #include "CommonRUKTools/MenuItem.h"
 #include "MusicManagment/database/GroupLists.h"
+#include "MusicManagment/database/Operation.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/SongList.h"
 #include "MusicManagment/database/SongTypes.h"
@@ -152,12 +153,12 @@ class TMusicDatabase : public QObject {
     void SetUpdateFolders(const QStringList& folders) { updateFolders_ = folders; }
     SortedTextList& BannList() { return bannList_; }
     const SortedTextList& BannList() const { return bannList_; }
-    const QString& Caption() const { return caption_; }
+    QString Caption() const;
     int Compression() const { return compression_; }
     // A TCompressionLevel. Throws EMusicDatabaseException for any other number.
     void SetCompression(int level);
-    bool Asynchronous() const { return asynchronous_; }
-    void SetAsynchronous(bool value) { asynchronous_ = value; }
+    bool Asynchronous() const { return operation_.LetsInterfaceWork(); }
+    void SetAsynchronous(bool value) { operation_.SetLetsInterfaceWork(value); }
     bool AutoDelBannedFiles() const { return autoDelBannedFiles_; }
     void SetAutoDelBannedFiles(bool value) { autoDelBannedFiles_ = value; }
     TSortType SortType() const { return order_.SortType; }
@@ -207,18 +208,20 @@ class TMusicDatabase : public QObject {
     void SetOverviewView(OverviewView* view) { overviewView_ = view; }
 
     // --- Long operations ---
-    // Shows a message and throws EAbort when a run is going. Prefer the ProgressRun object of Progress.h.
+    // Whoever shows it subscribes to it; who works begins it with the ProgressRun object of Progress.h.
+    Operation& CurrentOperation() { return operation_; }
+    const Operation& CurrentOperation() const { return operation_; }
+    // The same in other words. The first shows a message and throws EAbort when a run is going; the second is
+    // true when the user asked to stop.
     void StartProgress(const QString& description, bool lockMenu);
-    // Raises OnProgress, lets the interface work when Asynchronous; true when the user asked to stop.
     bool Progress(const ProgressPoint& point, bool resetAbort = false, bool report = true);
     void EndProgress(bool unlockMenu);
-    void ResetProgress();
-    void RequestAbort() { abortRequested_ = true; }
-    bool ProgressRunning() const { return progressRunning_; }
-    bool MenuLocked() const { return menuLocked_; }
-    const ProgressPoint& LastProgress() const { return lastProgress_; }
-    int MainPercent() const { return mainPercent_; }  // -1 unknown
-    int SubPercent() const { return subPercent_; }
+    void RequestAbort() { operation_.RequestStop(); }
+    bool ProgressRunning() const { return operation_.Running(); }
+    bool MenuLocked() const { return operation_.CommandsRest(); }
+    const ProgressPoint& LastProgress() const { return operation_.LastPoint(); }
+    int MainPercent() const { return operation_.MainPercent(); }  // -1 unknown
+    int SubPercent() const { return operation_.SubPercent(); }
 
     // While above 0 the song list must not change.
     bool Busy() const { return busy_ > 0; }
@@ -291,7 +294,7 @@ class TMusicDatabase : public QObject {
     class GroupEvents;
     friend class GroupEvents;
 
-    void ReportProgress();
+    void SubscribeProgressSlots();
     bool Accepts(const TID3Tag& record, const AddOptions& options);
     void RaiseClear();
     SongOrder CurrentOrder() const;
@@ -304,7 +307,6 @@ class TMusicDatabase : public QObject {
     bool maybeUnsorted_ = false;  // after reading a file, until the order has been looked at
 
     QString fileName_;
-    QString caption_;
     QStringList updateFolders_;
     SortedTextList bannList_;
     std::vector<CdName> cdNames_;
@@ -317,7 +319,6 @@ class TMusicDatabase : public QObject {
     int autoSave_ = 0;
     TCompressionLevel compression_ = clFastest;
     bool modified_ = false;
-    bool asynchronous_ = true;
     bool autoDelBannedFiles_ = false;
     bool followFocus_ = true;
     bool moveMP3sAfterGenreChange_ = false;
@@ -333,12 +334,8 @@ class TMusicDatabase : public QObject {
     OverviewView* overviewView_ = nullptr;
     std::unique_ptr<QTimer> autoSaveTimer_;
 
-    ProgressPoint lastProgress_;
-    int mainPercent_ = -1;
-    int subPercent_ = -1;
-    bool progressRunning_ = false;
-    bool abortRequested_ = false;
-    bool menuLocked_ = false;
+    Operation operation_;
+    Subscriptions progressSlots_;
     int busy_ = 0;
     int loading_ = 0;
 };
