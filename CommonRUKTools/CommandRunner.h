@@ -6,8 +6,8 @@
 class QEvent;
 class QObject;
 
-// Where exceptions end. Behind a slot, a timer, an event handler or a callback of the bus nobody catches them,
-// so none may leave it; what is thrown there is shown to the user, and the program goes on.
+// Where exceptions end. Behind a slot, a timer, an event handler or a callback of the bus nobody catches
+// them, so none may leave it; what is thrown there is shown to the user, and the program goes on.
 
 // In a catch clause: shows what was caught as a message; EAbort is silent. While such a message is shown,
 // others wait until it has been read, each text once.
@@ -23,14 +23,15 @@ void RunCommand(Command&& command) {
     }
 }
 
-// A slot or listener that lets no exception out: connect(button, &QPushButton::clicked, this, Guarded([...] {})).
+// A slot or listener that lets no exception out: connect(button, &QPushButton::clicked, this, Guarded([...]
+// {})).
 template <typename Slot>
 class Guarded {
  public:
     explicit Guarded(Slot slot) : slot_(std::move(slot)) {}
 
     template <typename... Arguments>
-        requires std::invocable<Slot&, Arguments...>
+    requires std::invocable<Slot&, Arguments...>
     void operator()(Arguments&&... arguments) {
         RunCommand([&] { slot_(std::forward<Arguments>(arguments)...); });
     }

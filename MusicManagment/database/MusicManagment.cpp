@@ -9,7 +9,6 @@
 #include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/database/Views.h"
-#include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/database/intake/BannList.h"
 #include "MusicManagment/database/songfiles/RecycleBin.h"
 
@@ -337,24 +336,7 @@ ReadOptions TMusicDatabase::AudioReadOptions() const {
 void TMusicDatabase::SetReadOnly(bool value) {
     if (value == readOnly_) return;
     readOnly_ = value;
-    menu_.reset();
-    if (OnMenuChanged) OnMenuChanged(*this);
-}
-
-// --- Command menu ---
-
-TMenuExItem& TMusicDatabase::Menu() {
-    if (!menu_) menu_ = BuildDatabaseMenu(readOnly_);
-    UpdateDatabaseMenu(*menu_, *this);
-    return *menu_;
-}
-
-bool TMusicDatabase::ClickMenuItem(int id, void* platformItem) {
-    const TMenuExItem* item = Menu().Find(id);
-    if (item == nullptr || !item->Enabled()) return false;
-    bool proceed = true;
-    if (OnMenuItemClicked) OnMenuItemClicked(*this, *item, platformItem, id, proceed);
-    return !proceed || RunDatabaseCommand(*this, id);
+    ReadOnlyChanged.Tell();
 }
 
 // --- Automatic save ---

@@ -10,7 +10,7 @@
 #include <optional>
 
 #include "CommonRUKTools/Errors.h"
-#include "CommonRUKTools/MenuItem.h"
+#include "CommonRUKTools/Listeners.h"
 #include "MusicManagment/database/GroupLists.h"
 #include "MusicManagment/database/Operation.h"
 #include "MusicManagment/database/Progress.h"
@@ -20,9 +20,11 @@
 #include "MusicManagment/database/sorting/Sorting.h"
 #include "ReadMPEGHeader/AudioFile.h"
 
+class DatabaseMenu;
 class OverviewView;
 class SettingsClient;
 class SongListView;
+class TMenuExItem;
 class TMusicDatabase;
 
 class EMusicDatabaseException : public ERukException {
@@ -244,11 +246,12 @@ class TMusicDatabase : public QObject {
     // Saves at once when AutoSave is -1; called at the end of every command that changes songs.
     void SaveAfterCommand();
 
-    // --- Command menu (Menu.h) ---
+    // --- Command menu (commands/Menu.h, which knows the commands of all capabilities) ---
+    DatabaseMenu& Commands();
     // Built at the first call and kept until ReadOnly changes.
     TMenuExItem& Menu();
-    // Raises OnMenuItemClicked and then, unless the handler stops it, runs the operation behind the item.
-    // False when nobody knew the command. Throws what the operation throws.
+    // Raises OnMenuItemClicked and then, unless the handler stops it, runs the command behind the item. False
+    // when it can do nothing now. Throws what the command throws.
     bool ClickMenuItem(int id, void* platformItem = nullptr);
 
     // --- Settings (Settings.h) ---
@@ -264,7 +267,6 @@ class TMusicDatabase : public QObject {
 
     // --- Events ---
     TNotifyEvent OnModifiedChange;
-    TNotifyEvent OnMenuChanged;  // the menu has gone, the next call builds another
     TChangeEvent OnChange;
     TNotifyEvent OnClear;
     std::function<void(TMusicDatabase&, int count)> OnPrepareMultiAdd;
@@ -284,6 +286,8 @@ class TMusicDatabase : public QObject {
     std::function<void(TMusicDatabase&, SongIndex index)> OnMarkSong;
     // The playlist has played all its songs; `showException` is whether the user is told.
     std::function<void(TMusicDatabase&, bool& showException)> OnAllFilesPlayed;
+
+    Listeners<> ReadOnlyChanged;
 
     // Raising events whose cause lies in a capability beside this class.
     void RaiseChange(SongIndex index, TChangeType change);
@@ -310,7 +314,8 @@ class TMusicDatabase : public QObject {
     QStringList updateFolders_;
     SortedTextList bannList_;
     std::vector<CdName> cdNames_;
-    std::unique_ptr<TMenuExItem> menu_;
+    // Shared for the sake of its deleter: what it is need not be known here.
+    std::shared_ptr<DatabaseMenu> commands_;
     ConversionSettings conversion_;
     std::vector<SettingsClient*> settingsClients_;
     QString mp3MoveRootDir_;

@@ -4,6 +4,7 @@
 #include <QHeaderView>
 #include <QScopedValueRollback>
 #include <QScrollBar>
+#include <QSet>
 #include <algorithm>
 
 #include "CommonRUKTools/Dialogs.h"
@@ -200,13 +201,42 @@ bool SongListWidget::FocusNext(const SongFilter& filter) {
     return false;
 }
 
-bool SongListWidget::FocusSong(SongIndex song) {
+bool SongListWidget::FocusSong(SongIndex song, ScrollHint where) {
     songs_.Songs().SyncViews();
     const int row = songs_.RowOfSource(song);
     if (row < 0) return false;
     FocusRow(row);
-    scrollTo(currentIndex(), PositionAtCenter);
+    scrollTo(currentIndex(), where);
     return true;
+}
+
+QString SongListWidget::NextAfter(const QStringList& paths) const {
+    const QSet<QString> going(paths.begin(), paths.end());
+    const int focus = std::max(0, currentIndex().row());
+    const auto staying = [&](int row) -> const TID3Tag* {
+        const TID3Tag* song = songs_.SongAt(row);
+        return song != nullptr && !going.contains(song->FileName) ? song : nullptr;
+    };
+    for (int row = focus; row < songs_.rowCount(); ++row)
+        if (const TID3Tag* song = staying(row)) return song->FileName;
+    for (int row = focus - 1; row >= 0; --row)
+        if (const TID3Tag* song = staying(row)) return song->FileName;
+    return {};
+}
+
+std::size_t SongListWidget::MarkSongs(const QStringList& paths) {
+    songs_.Songs().SyncViews();
+    const QSet<QString> wanted(paths.begin(), paths.end());
+    std::vector<int> rows;
+    for (int row = 0; row < songs_.rowCount(); ++row) {
+        const TID3Tag* song = songs_.SongAt(row);
+        if (song != nullptr && wanted.contains(song->FileName)) rows.push_back(row);
+    }
+    if (rows.empty()) return 0;
+    FocusRow(rows.front());
+    MarkRows(*selectionModel(), RangesOf(rows));
+    scrollTo(currentIndex(), PositionAtCenter);
+    return rows.size();
 }
 
 void SongListWidget::Enter() {

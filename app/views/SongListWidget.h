@@ -41,7 +41,12 @@ class SongListWidget : public QTableView {
     // is none.
     bool FocusNext(const SongFilter& filter);
     // Gives the focus to a song and shows it. False when it is not shown.
-    bool FocusSong(SongIndex song);
+    bool FocusSong(SongIndex song, ScrollHint where = PositionAtCenter);
+    // The song that gets the focus when these have gone: the next one below the focus, else the next above.
+    QString NextAfter(const QStringList& paths) const;
+    // Marks these songs and no others, and shows the first of them, which gets the focus. Returns how many of
+    // them are shown.
+    std::size_t MarkSongs(const QStringList& paths);
     // Takes the keys; a list in which no song has the focus gives it to its first.
     void Enter();
 
