@@ -12,6 +12,18 @@
 
 using namespace Qt::StringLiterals;
 
+namespace {
+
+// Of those that are still there.
+QStringList PathsOf(const TMusicDatabase& database, const std::vector<SongHandle>& songs) {
+    QStringList paths;
+    for (const SongHandle song : songs)
+        if (const TID3Tag* record = database.Songs().Find(song)) paths << record->FileName;
+    return paths;
+}
+
+}  // namespace
+
 SongCommands::SongCommands(TMusicDatabase& database, SongListWidget& list)
     : database_(database), list_(list), undo_(database) {
     HandleCommands();
@@ -78,30 +90,25 @@ void SongCommands::SetOrder(int id) {
     list_.SetOrder(order);
 }
 
-QStringList SongCommands::Chosen() const {
-    QStringList songs;
-    for (const SongIndex index : list_.ChosenSongs())
-        songs << database_.Song(index).FileName;
-    return songs;
-}
-
-QString SongCommands::RemovalQuestion(const QStringList& songs) const {
+QString SongCommands::RemovalQuestion(const std::vector<SongHandle>& songs) const {
     if (songs.size() > 1)
-        return u"Sollen "_s + SongCountText(static_cast<std::size_t>(songs.size())) +
+        return u"Sollen "_s + SongCountText(songs.size()) +
                u" aus der Datenbank entfernt werden? Die Dateien bleiben erhalten."_s;
-    const TID3Tag song = database_.GetEntry(-1, songs.first());
+    const TID3Tag& song = *database_.Songs().Find(songs.front());
     return u"Soll \""_s + song.Artist + u" - "_s + song.Title +
            u"\" aus der Datenbank entfernt werden? Die Datei bleibt erhalten."_s;
 }
 
 void SongCommands::RemoveChosen() {
-    const QStringList songs = Chosen();
-    if (songs.isEmpty()) return;
-    if (UserDialogs().Ask(RemovalQuestion(songs), {u"Entfernen"_s, u"Abbrechen"_s}, 1) != 0) return;
-    const QString next = list_.NextAfter(songs);
+    const std::vector<SongHandle> songs = list_.ChosenHandles();
+    if (songs.empty()) return;
+    if (UserDialogs().Ask(
+            {.Text = RemovalQuestion(songs), .Buttons = {u"Entfernen"_s, u"Abbrechen"_s}, .Cancel = 1}) != 0)
+        return;
+    const SongHandle next = list_.NextAfter(songs);
     RemovedSongs removed = RemoveSongs(database_, songs);
     if (removed.empty()) return;
-    list_.FocusSong(database_.IndexOf(next), QAbstractItemView::EnsureVisible);
+    list_.FocusSong(database_.Songs().PositionOf(next), QAbstractItemView::EnsureVisible);
     const QString count = SongCountText(removed.size());
     Tell(count + u" aus der Datenbank entfernt. Strg+Z macht das rückgängig."_s);
     undo_.Add({count + u" entfernen"_s, [&database = database_, removed = std::move(removed)] {
@@ -115,12 +122,12 @@ void SongCommands::RemoveChosen() {
 }
 
 void SongCommands::CopyChosen() {
-    const QStringList songs = Chosen();
-    if (songs.isEmpty()) return;
+    const std::vector<SongHandle> songs = list_.ChosenHandles();
+    if (songs.empty()) return;
     const auto folder =
         UserDialogs().ChooseFolder(u"Ordner auswählen, in den die Songs kopiert werden sollen:"_s);
     if (!folder) return;
-    const CopyResult result = CopySongs(database_, songs, *folder);
+    const CopyResult result = CopySongs(database_, PathsOf(database_, songs), *folder);
     Tell(SongCountText(static_cast<std::size_t>(result.Copied)) + u" kopiert."_s);
     if (!result.Failed.isEmpty())
         UserDialogs().ShowMessage(MessageKind::Warning, u"Diese Dateien konnten nicht kopiert werden:\n"_s +

@@ -1,16 +1,18 @@
 #pragma once
 
-#include <QStringList>
+#include <QString>
 #include <functional>
+#include <vector>
 
 #include "CommonRUKTools/Listeners.h"
+#include "MusicManagment/database/SongList.h"
 #include "MusicManagment/database/songfiles/UndoList.h"
 
 class SongListWidget;
 class TMusicDatabase;
 
 // What the user can do with the songs of the list: handles the commands that are about them. Each may throw
-// what the database throws. Songs are named by their paths wherever a question is open: positions may be
+// what the database throws. Songs are held by their handles wherever a question is open: positions may be
 // other ones when it is answered.
 class SongCommands {
  public:
@@ -26,8 +28,7 @@ class SongCommands {
     void RemoveChosen();
     void CopyChosen();
     void OpenExternally();
-    QStringList Chosen() const;
-    QString RemovalQuestion(const QStringList& songs) const;
+    QString RemovalQuestion(const std::vector<SongHandle>& songs) const;
     void Undo();
     void Tell(const QString& sentence) const;
 

@@ -149,6 +149,13 @@ std::vector<SongIndex> SongListWidget::ChosenSongs() const {
     return songs;
 }
 
+std::vector<SongHandle> SongListWidget::ChosenHandles() const {
+    std::vector<SongHandle> handles;
+    for (const SongIndex song : ChosenSongs())
+        handles.push_back(database_.Songs().HandleOf(song));
+    return handles;
+}
+
 SongIndex SongListWidget::FocusedSong() const {
     return currentIndex().isValid() ? songs_.IndexAt(currentIndex().row()) : -1;
 }
@@ -210,18 +217,23 @@ bool SongListWidget::FocusSong(SongIndex song, ScrollHint where) {
     return true;
 }
 
-QString SongListWidget::NextAfter(const QStringList& paths) const {
-    const QSet<QString> going(paths.begin(), paths.end());
-    const int focus = std::max(0, currentIndex().row());
-    const auto staying = [&](int row) -> const TID3Tag* {
+SongHandle SongListWidget::NextAfter(const std::vector<SongHandle>& going) const {
+    QSet<const TID3Tag*> records;
+    for (const SongHandle song : going)
+        records.insert(database_.Songs().Find(song));
+    const auto stays = [&](int row) {
         const TID3Tag* song = songs_.SongAt(row);
-        return song != nullptr && !going.contains(song->FileName) ? song : nullptr;
+        return song != nullptr && !records.contains(song);
     };
-    for (int row = focus; row < songs_.rowCount(); ++row)
-        if (const TID3Tag* song = staying(row)) return song->FileName;
-    for (int row = focus - 1; row >= 0; --row)
-        if (const TID3Tag* song = staying(row)) return song->FileName;
-    return {};
+    const int focus = std::max(0, currentIndex().row());
+    int row = focus;
+    while (row < songs_.rowCount() && !stays(row))
+        ++row;
+    if (row == songs_.rowCount())
+        for (row = focus - 1; row >= 0 && !stays(row);)
+            --row;
+    return row >= 0 && row < songs_.rowCount() ? database_.Songs().HandleOf(*songs_.SongAt(row))
+                                               : SongHandle();
 }
 
 std::size_t SongListWidget::MarkSongs(const QStringList& paths) {

@@ -114,7 +114,7 @@ DatabaseMenu::DatabaseMenu(TMusicDatabase& database) : database_(database) {
     const auto tell = [this] { Changed.Tell(); };
     followed_ += database.CurrentOperation().Started.Subscribe(tell);
     followed_ += database.CurrentOperation().Ended.Subscribe(tell);
-    followed_ += database.ReadOnlyChanged.Subscribe(tell);
+    followed_ += database.Events().ReadOnlyChanged.Subscribe(tell);
 }
 
 // --- Who runs a command ---

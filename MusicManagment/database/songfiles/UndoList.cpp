@@ -2,12 +2,8 @@
 
 #include "MusicManagment/database/MusicManagment.h"
 
-UndoList::UndoList(TMusicDatabase& database) : database_(database) {
-    database_.OnClear = [this](TMusicDatabase&) { Clear(); };
-}
-
-UndoList::~UndoList() {
-    database_.OnClear = nullptr;
+UndoList::UndoList(TMusicDatabase& database) {
+    ends_ = database.Events().Cleared.Subscribe([this] { Clear(); });
 }
 
 void UndoList::Add(UndoStep step) {

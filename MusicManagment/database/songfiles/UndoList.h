@@ -21,9 +21,6 @@ struct UndoStep {
 class UndoList {
  public:
     explicit UndoList(TMusicDatabase& database);
-    ~UndoList();
-    UndoList(const UndoList&) = delete;
-    UndoList& operator=(const UndoList&) = delete;
 
     void Add(UndoStep step);
     bool IsEmpty() const { return steps_.empty(); }
@@ -36,6 +33,6 @@ class UndoList {
     Listeners<> Changed;
 
  private:
-    TMusicDatabase& database_;
     std::vector<UndoStep> steps_;
+    Subscription ends_;
 };
