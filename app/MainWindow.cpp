@@ -169,6 +169,10 @@ void TTunesteadMainWnd::HandleCommands() {
                                .Icon = u"application-exit"_s,
                                .Then = ShellCommand::DuringRuns::Stays},
                               {.Run = [this] { close(); }});
+    handlers_ += commands.Changed.Subscribe([this] {
+        const TMenuExItem* add = database_.Menu().Find(mcAddFolder);
+        empty_->SetCommandsEnabled(add != nullptr && add->Enabled());
+    });
 }
 
 void TTunesteadMainWnd::LoadSettings() {
@@ -239,7 +243,6 @@ bool TTunesteadMainWnd::TakeOver(const StartRequest& request) {
 // --- What follows the database ---
 
 void TTunesteadMainWnd::RunningChanged(bool running) {
-    empty_->SetCommandsEnabled(!running);
     list_->SetSortingAllowed(!running);
     if (running) return;
     songs_.SyncViews();

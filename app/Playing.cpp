@@ -61,7 +61,7 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
         if (!songs_.FocusSong(song) && OnDone) OnDone(u"Der Filter zeigt dieses Lied nicht."_s);
     };
     QObject::connect(&songs, &QAbstractItemView::doubleClicked, listForm_,
-                     [this] { RunCommand([this] { database_.ClickMenuItem(mcPlay); }); });
+                     Guarded([this] { database_.ClickMenuItem(mcPlay); }));
 }
 
 // The window would let its tool windows live longer than what they show.
