@@ -18,6 +18,8 @@ ProgressDisplay::ProgressDisplay(TMusicDatabase& database, QWidget& mainWindow)
     ShowCaption();
 }
 
+ProgressDisplay::~ProgressDisplay() = default;
+
 void ProgressDisplay::RunStarted() {
     if (!window_) {
         window_ = std::make_unique<TPrgForm>(&mainWindow_);

@@ -13,6 +13,7 @@ class TPrgForm;
 class ProgressDisplay {
  public:
     ProgressDisplay(TMusicDatabase& database, QWidget& mainWindow);
+    ~ProgressDisplay();
 
     // Told when a run begins and when it has ended.
     std::function<void(bool running)> OnRunning;
