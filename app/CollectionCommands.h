@@ -4,7 +4,7 @@
 #include <functional>
 
 #include "app/desktop/BannListFile.h"
-#include "app/desktop/StandardFiles.h"
+#include "CommonRUKTools/StandardFiles.h"
 
 class TMusicDatabase;
 struct IntakeResult;

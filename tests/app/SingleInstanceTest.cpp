@@ -11,7 +11,6 @@
 #include <QTimer>
 #include <memory>
 
-#include "app/desktop/StartMessage.h"
 #include "app/desktop/StartRequests.h"
 #include "tests/PrintQt.h"
 
@@ -107,23 +106,11 @@ TEST_F(SingleInstanceTest, AProgramThatIsEndingMakesPlace) {
 TEST_F(SingleInstanceTest, HangsUpOnWhatIsNoMessage) {
     const auto first = RunningProgram();
     EXPECT_TRUE(HangsUpOn("GET / HTTP/1.1\r\n"));
-    EXPECT_TRUE(HangsUpOn(QByteArray("TSI1\xff\xff\xff\xff", 8)));
-    EXPECT_TRUE(HangsUpOn(QByteArray("TSI1\3\0\0\0abc", 11)));  // a text without its end
+    EXPECT_TRUE(HangsUpOn(QByteArray("TSI1\xff\xff\xff\xff", 8)));  // longer than a message may be
+    EXPECT_TRUE(HangsUpOn(QByteArray("TSI1\3\0\0\0abc", 11)));      // a text without its end
     EXPECT_TRUE(HangsUpOn(QByteArray("TSI1\0\0\0\0", 8)));
     EXPECT_TRUE(received_.empty());
     EXPECT_EQ(Program()->Start({}), Role::HandedOver);
-}
-
-TEST(StartMessageTest, SaysNoMoreThanALaterStartMay) {
-    const auto head = [](quint32 size) {
-        QByteArray bytes = "TSI1";
-        for (int shift = 0; shift < 32; shift += 8)
-            bytes += static_cast<char>(size >> shift);
-        return bytes;
-    };
-    EXPECT_EQ(StartMessage::BodySize(head(StartMessage::kLargestBody)), StartMessage::kLargestBody);
-    EXPECT_EQ(StartMessage::BodySize(head(StartMessage::kLargestBody + 1)), std::nullopt);
-    EXPECT_EQ(StartMessage::BodySize("TSI"), std::nullopt);
 }
 
 TEST(StartRequestsTest, WaitUntilTheProgramCanAct) {
