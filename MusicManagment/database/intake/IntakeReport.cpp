@@ -1,10 +1,10 @@
 #include "MusicManagment/database/intake/IntakeReport.h"
 
-#include <QDir>
-#include <QFile>
-
 #include "CommonRUKTools/CodePage.h"
 #include "CommonRUKTools/Dialogs.h"
+#include "CommonRUKTools/Errors.h"
+#include "CommonRUKTools/PrivateFolder.h"
+#include "CommonRUKTools/SafeFile.h"
 #include "CommonRUKTools/Shell.h"
 
 using namespace Qt::StringLiterals;
@@ -19,19 +19,25 @@ void AppendLines(const QStringList& lines, QString& text) {
         text += line + u'\n';
 }
 
-bool WriteDetails(const QString& path, const QString& details) {
-    QFile file(path);
+// Returns its path. In a folder of the user's own: in the common one others could put a link under the name.
+QString WriteDetails(const QString& details) {
+    const QString path =
+        PrivateTemporaryFolder(u"Tunestead"_s) + u"/Tunestead - Änderungen in der Datenbank.txt"_s;
     const QByteArray bytes = CodePage::ToSystem(details);
-    return file.open(QIODevice::WriteOnly | QIODevice::Text) && file.write(bytes) == bytes.size() &&
-           file.flush();
+    SafeFile file(path);
+    file.Write(AsBytes({bytes.constData(), static_cast<std::size_t>(bytes.size())}));
+    file.Commit();
+    return path;
 }
 
 void ShowDetails(const QString& details) {
-    const QString path = QDir::temp().filePath(u"Tunestead - Änderungen in der Datenbank.txt"_s);
-    if (!WriteDetails(path, details))
-        UserDialogs().ShowMessage(MessageKind::Error, u"Kann die Datei nicht schreiben: "_s + path);
-    else if (!CurrentShell().OpenWithDefaultProgram(path))
-        UserDialogs().ShowMessage(MessageKind::Error, u"Kann die Datei nicht anzeigen: "_s + path);
+    try {
+        const QString path = WriteDetails(details);
+        if (!CurrentShell().OpenWithDefaultProgram(path))
+            UserDialogs().ShowMessage(MessageKind::Error, u"Kann die Datei nicht anzeigen: "_s + path);
+    } catch (const EStreamError& error) {
+        UserDialogs().ShowMessage(MessageKind::Error, error.Message());
+    }
 }
 
 }  // namespace
