@@ -67,6 +67,7 @@ bool Startup::OpenStandardDatabase() {
         }
     }
     database_.SetFileName(path);
+    database_.Lock().Claim(path);
     return true;
 }
 

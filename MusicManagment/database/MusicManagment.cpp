@@ -1,7 +1,6 @@
 #include "MusicManagment/database/MusicManagment.h"
 
 #include <QCoreApplication>
-#include <QStandardPaths>
 #include <algorithm>
 #include <cmath>
 
@@ -9,6 +8,7 @@
 #include "CommonRUKTools/Collation.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/FileSource.h"
+#include "CommonRUKTools/MusicFolder.h"
 #include "MusicManagment/database/Views.h"
 #include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/database/intake/BannList.h"
@@ -90,7 +90,7 @@ TMusicDatabase::TMusicDatabase(QObject* parent)
       groupEvents_(std::make_unique<GroupEvents>(*this)),
       mp3NamePattern_(u"%ARTIST% - %TITLE%"_s) {
     caption_ = u"MusicDatabase v6.0"_s;
-    SetMP3MoveRootDir(QStandardPaths::writableLocation(QStandardPaths::MusicLocation));
+    SetMP3MoveRootDir(MusicFolder());
     // The list of an earlier version, which a component has until settings are loaded; the setter adds the
     // rest.
     SetMP3MoveSubDirs({u"Unsorted"_s, u"Alternative, Psychedelic, Punk, Funk"_s, u"Comedy"_s,
@@ -379,7 +379,7 @@ void TMusicDatabase::SetAutoSave(int interval) {
 void TMusicDatabase::AutoSaveTick() {
     if (autoSaveTimer_) autoSaveTimer_->stop();
     // A run in progress is not disturbed; the next tick comes.
-    if (!fileName_.isEmpty() && !progressRunning_) {
+    if (!fileName_.isEmpty() && !progressRunning_ && !fileLock_.IsElsewhere()) {
         try {
             SaveDatabase(fileName_, true);
         } catch (const EAbort&) {
