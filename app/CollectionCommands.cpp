@@ -1,14 +1,11 @@
 #include "app/CollectionCommands.h"
 
 #include <QDir>
-#include <QFileInfo>
 
-#include "CommonRUKTools/AbsolutePath.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/database/intake/Intake.h"
-#include "MusicManagment/database/intake/Update.h"
 
 using namespace Qt::StringLiterals;
 
@@ -29,7 +26,9 @@ bool SavedOrGivenUp(const std::function<bool()>& save, const QString& loss) {
 }  // namespace
 
 CollectionCommands::CollectionCommands(TMusicDatabase& database, StandardFiles files)
-    : database_(database), files_(std::move(files)), bannList_(database.BannList(), files_) {}
+    : database_(database), files_(std::move(files)), bannList_(database.BannList(), files_) {
+    database_.Lock().SetWanted(true);
+}
 
 bool CollectionCommands::Run(int id) {
     switch (id) {
@@ -85,16 +84,11 @@ void CollectionCommands::AddFolder() {
     const auto folder =
         UserDialogs().ChooseFolder(u"Ordner zum Durchsuchen nach Songs auswählen (inkl. Unterordner):"_s);
     if (!folder) return;
-    ::AddFolder(database_, *folder, true);
-    RememberFolders(database_, {AbsolutePath(*folder)});
+    ::AddFolder(database_, *folder, true, GivenFolders::Remembered);
 }
 
 void CollectionCommands::AddPaths(const QStringList& paths) {
-    QStringList folders;
-    for (const QString& path : paths)
-        if (QFileInfo(path).isDir()) folders << AbsolutePath(path);
-    RememberFolders(database_, folders);
-    const IntakeResult result = ::AddPaths(database_, paths, true);
+    const IntakeResult result = ::AddPaths(database_, paths, true, GivenFolders::Remembered);
     if (OnIntake) OnIntake(result);
 }
 
