@@ -22,7 +22,7 @@ class DatabaseCommandsTest : public testing::Test {
             song.Artist = u"Artist %1"_s.arg(i % 3);
             song.Year = u"1999"_s;
             song.AddTime = 1;
-            database.AddEntry(QString(), song, {.SkipChecks = true});
+            database.AddEntry(QString(), song, AddAs::Returning);
         }
         database.RecountGroups();
     }
@@ -249,7 +249,7 @@ TEST_F(DatabaseCommandsTest, NothingIsTouchedWhileAnotherRunIsGoing) {
     database.EndBusy();
     EXPECT_EQ(database.Count(), 3);
     EXPECT_EQ(database.FileName(), Path(u"a.tsdb"_s));
-    EXPECT_EQ(dialogs_.Messages.size(), 3u);
+    EXPECT_EQ(dialogs_.Messages.size(), 3);
     EXPECT_EQ(FilesThere(), QStringList{u"a.tsdb"_s});
 }
 
@@ -264,8 +264,8 @@ TEST_F(DatabaseCommandsTest, OneProgramWritesAFileAndTheLaterOneReadsIt) {
         ASSERT_TRUE(later.OpenDatabase(Path(u"a.tsdb"_s)));
         EXPECT_EQ(later.Count(), 3);
         EXPECT_TRUE(later.ReadOnly());
-        ASSERT_EQ(dialogs_.Messages.size(), 1u);
-        EXPECT_TRUE(dialogs_.Messages[0].second.contains(u"(Prozess "_s));
+        ASSERT_EQ(dialogs_.Messages.size(), 1);
+        EXPECT_TRUE(dialogs_.Messages[0].contains(u"(Prozess "_s));
         EXPECT_NE(ErrorOf([&] { later.SaveDatabase(); }), QString());
         EXPECT_TRUE(later.SaveDatabase(Path(u"b.tsdb"_s)));
         EXPECT_FALSE(later.ReadOnly()) << "a file of its own";

@@ -106,7 +106,7 @@ TEST_P(OldRecordsTest, UnsetValuesKeepWhatTheAudioFileSaysAndListsComeFromTheFil
     EXPECT_EQ(database.Artists().At(0).Text, fromFile ? u"Liste"_s : u"Gruppe"_s);
     EXPECT_EQ(database.Artists().At(0).Number, fromFile ? 3 : 1);
     EXPECT_EQ(inserted, fromFile ? 0 : 4);
-    EXPECT_TRUE(dialogs_.Messages.empty());
+    EXPECT_TRUE(dialogs_.Messages.isEmpty());
 }
 
 TEST_P(OldRecordsTest, ASongWithoutItsFileGoesUnlessLostSongsAreKeptAndTheUserIsTold) {
@@ -128,9 +128,8 @@ TEST_P(OldRecordsTest, ASongWithoutItsFileGoesUnlessLostSongsAreKeptAndTheUserIs
     // Songs that went are not counted, wherever the lists came from.
     EXPECT_EQ(database.Genres()[0], 2);
     EXPECT_EQ(database.Artists().IndexOf(u"Liste"), -1);
-    ASSERT_EQ(dialogs_.Messages.size(), 1u);
-    EXPECT_TRUE(
-        dialogs_.Messages[0].second.contains(u"\n1 Song(s) dieser Datenbank wurden nicht übernommen"_s));
+    ASSERT_EQ(dialogs_.Messages.size(), 1);
+    EXPECT_TRUE(dialogs_.Messages[0].contains(u"\n1 Song(s) dieser Datenbank wurden nicht übernommen"_s));
 
     database.SetKeepLostSongs(true);
     ASSERT_TRUE(Load(database, records));
@@ -139,8 +138,8 @@ TEST_P(OldRecordsTest, ASongWithoutItsFileGoesUnlessLostSongsAreKeptAndTheUserIs
     EXPECT_EQ(database.Song(0).Title, u"Lied"_s) << "as the file's name tells";
     EXPECT_EQ(database.Song(0).Length, 90);
     EXPECT_EQ(database.Song(0).PlayCount, 7u);
-    ASSERT_EQ(dialogs_.Messages.size(), 2u);
-    EXPECT_TRUE(dialogs_.Messages[1].second.startsWith(u"Die Musikdateien von 3 Song(s)"_s));
+    ASSERT_EQ(dialogs_.Messages.size(), 2);
+    EXPECT_TRUE(dialogs_.Messages[1].startsWith(u"Die Musikdateien von 3 Song(s)"_s));
 }
 
 TEST_P(OldRecordsTest, BannedSongsAreRefusedWhereSongsAreChecked) {

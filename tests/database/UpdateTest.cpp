@@ -42,13 +42,13 @@ TEST_F(UpdateTest, NewSongsComeInAndGoneOnesLeaveAfterTheQuestion) {
     TakeIn({u"music/A - one.wav"_s, u"music/A - two.wav"_s});
     songs_.Add(u"music/A - three.wav"_s);
     QFile::remove(songs_.Path(u"music/A - one.wav"_s));
-    dialogs_.Buttons = {0, 0};  // remove; close the report
+    dialogs_.Answers = {0, 0};  // remove; close the report
     const UpdateResult result = UpdateDatabase(database_, UpdateTags::Keep);
     EXPECT_EQ(result.Intake.Added, 1);
     EXPECT_EQ(result.Removed, songs_.Paths({u"music/A - one.wav"_s}));
     EXPECT_EQ(Titles(), (QStringList{u"three"_s, u"two"_s}));
     ASSERT_FALSE(dialogs_.Questions.empty());
-    EXPECT_TRUE(dialogs_.Questions[0].Text.contains(songs_.Path(u"music/A - one.wav"_s)));
+    EXPECT_TRUE(dialogs_.Questions[0].contains(songs_.Path(u"music/A - one.wav"_s)));
     EXPECT_EQ(database_.Artists().At(0).Number, 2);
 }
 
@@ -56,7 +56,7 @@ TEST_F(UpdateTest, AnUnpluggedDiskNeverEmptiesTheCollection) {
     TakeIn({u"music/A - one.wav"_s, u"music/usb/A - two.wav"_s, u"music/usb/sub/A - three.wav"_s});
     QFile::link(songs_.Path(u"gone"_s), songs_.Path(u"music/link"_s));
     TID3Tag song = database_.Song(0);
-    database_.AddEntry(songs_.Path(u"music/link/A - four.wav"_s), song, {.SkipDiskChecks = true});
+    database_.AddEntry(songs_.Path(u"music/link/A - four.wav"_s), song, AddAs::Returning);
     // Below an update folder, and then the update folder itself: the mount point stays behind, empty, or goes
     // as well.
     for (const QString& disk : songs_.Paths({u"music/usb"_s, u"music"_s})) {
@@ -69,7 +69,7 @@ TEST_F(UpdateTest, AnUnpluggedDiskNeverEmptiesTheCollection) {
     QDir(songs_.Path(u"music"_s)).removeRecursively();
     EXPECT_EQ(UpdateDatabase(database_, UpdateTags::Keep).MissingFolders, songs_.Paths({u"music"_s}));
     EXPECT_EQ(database_.Count(), 4);
-    for (const auto& question : dialogs_.Questions)
+    for (const Question& question : dialogs_.Asked)
         EXPECT_FALSE(question.Buttons.contains(u"Entfernen"_s));
 }
 
@@ -79,14 +79,14 @@ TEST_F(UpdateTest, AFolderThatLostAllItsSongsIsAskedForInOtherWords) {
     QFile::remove(songs_.Path(u"music/A - one.wav"_s));
     QDir(songs_.Path(u"music/disk"_s)).removeRecursively();
     QFile::rename(songs_.Path(u"music/kept/cover/A - 3.wav"_s), songs_.Path(u"music/kept/cover/cover.jpg"_s));
-    dialogs_.Buttons = {0, 1, 0};  // the one song, not the folders; close the report
+    dialogs_.Answers = {0, 1, 0};  // the one song, not the folders; close the report
     EXPECT_EQ(UpdateDatabase(database_, UpdateTags::Keep).Removed, songs_.Paths({u"music/A - one.wav"_s}));
-    ASSERT_GE(dialogs_.Questions.size(), 2u);
-    EXPECT_FALSE(dialogs_.Questions[0].Text.contains(u"disk"_s));
-    EXPECT_TRUE(dialogs_.Questions[1].Text.contains(songs_.Path(u"music/disk"_s) + u" (2)\n"_s +
-                                                    songs_.Path(u"music/kept/cover"_s) + u" (1)"_s))
-        << dialogs_.Questions[1].Text.toStdString();
-    dialogs_.Buttons = {0, 0};
+    ASSERT_GE(dialogs_.Questions.size(), 2);
+    EXPECT_FALSE(dialogs_.Questions[0].contains(u"disk"_s));
+    EXPECT_TRUE(dialogs_.Questions[1].contains(songs_.Path(u"music/disk"_s) + u" (2)\n"_s +
+                                               songs_.Path(u"music/kept/cover"_s) + u" (1)"_s))
+        << dialogs_.Questions[1].toStdString();
+    dialogs_.Answers = {0, 0};
     EXPECT_EQ(UpdateDatabase(database_, UpdateTags::Keep).Removed.size(), 3);
     EXPECT_EQ(Titles(), QStringList{u"two"_s});
 }
@@ -141,11 +141,11 @@ TEST_F(UpdateTest, CopyingAsksBeforeItReplaces) {
     TakeIn({u"music/A - one.wav"_s, u"music/A - two.wav"_s});
     songs_.Add(u"target/A - one.wav"_s, 5);
     const qint64 before = QFileInfo(songs_.Path(u"target/A - one.wav"_s)).size();
-    dialogs_.Buttons = {2};  // leave it
+    dialogs_.Answers = {2};  // leave it
     CopyResult result = CopySongs(database_, {0, 1}, songs_.Path(u"target"_s));
     EXPECT_EQ(result.Copied, 1);
     EXPECT_EQ(QFileInfo(songs_.Path(u"target/A - one.wav"_s)).size(), before);
-    dialogs_.Buttons = {1};  // replace all
+    dialogs_.Answers = {1};  // replace all
     result = CopySongs(database_, {0, 1}, songs_.Path(u"target"_s));
     EXPECT_EQ(result.Copied, 2);
     EXPECT_NE(QFileInfo(songs_.Path(u"target/A - one.wav"_s)).size(), before);

@@ -90,7 +90,8 @@ QString FirstOf(const QStringList& lines) {
 }
 
 bool MayRemove(const QString& question) {
-    return UserDialogs().Ask(question, {u"Entfernen"_s, u"Behalten"_s}, 1) == 0;
+    return UserDialogs().Ask({.Text = question, .Buttons = {u"Entfernen"_s, u"Behalten"_s}, .Cancel = 1}) ==
+           0;
 }
 
 bool MayRemoveSongs(const QStringList& gone) {
@@ -138,6 +139,14 @@ void RequireFolders(const TMusicDatabase& database) {
             "Datenbank hinzu."_s);
 }
 
+std::vector<ReportSection> UpdateSections(const UpdateResult& result) {
+    std::vector<ReportSection> sections = IntakeSections(result.Intake);
+    sections.push_back({u"Geänderte Tags übernommen"_s, result.Changed});
+    sections.push_back({u"Aus der Datenbank entfernt"_s, result.Removed});
+    sections.push_back({u"Nicht erreichbare Ordner"_s, result.MissingFolders, true});
+    return sections;
+}
+
 void AppendLines(QString& text, const QString& heading, const QStringList& lines) {
     if (lines.isEmpty()) return;
     text += heading + u" ("_s + QString::number(lines.size()) + u"):\n"_s + lines.join(u'\n') + u"\n\n"_s;
@@ -164,14 +173,14 @@ UpdateResult UpdateDatabase(TMusicDatabase& database, UpdateTags tags) {
         result.Stopped = result.Intake.Stopped;
     }
     database.SaveAfterCommand();
-    ShowReport(UpdateMessage(result), UpdateDetails(result));
+    ShowReport(UpdateMessage(result), UpdateSections(result), UpdateDetails(result));
     return result;
 }
 
 IntakeResult SearchNewSongs(TMusicDatabase& database) {
     RequireFolders(database);
     IntakeResult result = AddPaths(database, MissingFiles(database.UpdateFolders()).FoldersThere(), true);
-    ShowReport(IntakeMessage(result), IntakeDetails(result));
+    ReportIntake(result);
     return result;
 }
 

@@ -62,12 +62,12 @@ std::size_t OldRecordSize(int version) {
 }
 
 void AddOldSong(TMusicDatabase& database, ByteSpan bytes, int version, bool isCounted, LostSongs& lost) {
-    const AddOptions options{.SkipChecks = isCounted, .KeepModified = true};
+    const AddAs as = isCounted ? AddAs::Loaded : AddAs::LoadedUncounted;
     const QString path = TextUpToZero(bytes.first(kFileNameField));
     const SongOverrides values = StoredValues(bytes, version);
     bool isThere = true;
     try {
-        if (database.AddSong(path, values, options) >= 0) return;
+        if (database.AddSong(path, values, as) >= 0) return;
         isThere = FileSource::Exists(path);
         if (isThere || !(IsCdPath(path) || database.KeepLostSongs())) {
             ++lost.Left;
@@ -77,8 +77,7 @@ void AddOldSong(TMusicDatabase& database, ByteSpan bytes, int version, bool isCo
         // The file is there but cannot be read now: rights, a bad sector. The song stays, as below.
     }
     // Such a song, and one on a medium that is not there, loses its tags but not its place in the collection.
-    AddOptions unseen = options;
-    unseen.SkipDiskChecks = !isThere;
+    const AddAs unseen = isThere || isCounted ? as : AddAs::Returning;
     const bool added = database.AddEntry(path, RecordOf(path, values, database), unseen) >= 0;
     ++(added ? lost.Kept : lost.Left);
 }
