@@ -68,7 +68,7 @@ bool Startup::OpenStandardDatabase() {
         }
     }
     database_.SetFileName(path);
-    database_.Lock().Claim(path);
+    if (!database_.Lock().IsElsewhere()) database_.Lock().Claim(path);  // there may be no file yet
     return true;
 }
 

@@ -52,29 +52,39 @@ QString ErrorOf(const std::function<void()>& command) {
 
 }  // namespace
 
-TEST_F(DatabaseCommandsTest, SavingAsksForANameOnlyWhenItMustOrIsTold) {
+TEST_F(DatabaseCommandsTest, TheNameIsAskedForOnlyWhenItMustAndKeptWhenTold) {
+    const QString a = Path(u"a.tsdb"_s);
     TMusicDatabase database;
+    AddSongs(database, 3);
     EXPECT_FALSE(database.SaveDatabase());  // no name yet, and the user cancels
+    EXPECT_FALSE(database.OpenDatabaseFromDialog());
     EXPECT_TRUE(FilesThere().isEmpty());
-    ASSERT_EQ(dialogs_.FileDialogs.size(), 1u);
+    ASSERT_EQ(dialogs_.FileDialogs.size(), 2u);
     EXPECT_EQ(dialogs_.FileDialogs[0].Title, u"Datenbank speichern unter"_s);
-    EXPECT_EQ(dialogs_.FileDialogs[0].DefaultExtension, u"tsdb"_s);
-    EXPECT_EQ(dialogs_.FileDialogs[0].Filter, u"Tunestead DataBases|*.tsdb|Alle Dateien|*.*"_s);
     EXPECT_TRUE(dialogs_.FileDialogs[0].ConfirmOverwrite);
+    EXPECT_EQ(dialogs_.FileDialogs[1].Title, u"Datenbank öffnen"_s);
 
-    dialogs_.Files.push_back({Path(u"a.tsdb"_s)});
+    dialogs_.Files.push_back({a});
     EXPECT_TRUE(database.SaveDatabase());
-    EXPECT_EQ(database.FileName(), Path(u"a.tsdb"_s));
     EXPECT_TRUE(database.SaveDatabase());  // by its name now
     EXPECT_TRUE(database.SaveDatabase(Path(u"b.tsdb"_s), true));
-    EXPECT_EQ(database.FileName(), Path(u"a.tsdb"_s));
-    EXPECT_EQ(dialogs_.FileDialogs.size(), 2u);
-
+    EXPECT_EQ(database.FileName(), a);
     dialogs_.Files.push_back({Path(u"c.tsdb"_s)});
     EXPECT_TRUE(database.SaveDatabase(Path(u"b.tsdb"_s), false, true));
-    EXPECT_EQ(dialogs_.FileDialogs[2].Preset, Path(u"b.tsdb"_s));
+    EXPECT_EQ(dialogs_.FileDialogs.back().Preset, Path(u"b.tsdb"_s));
     EXPECT_EQ(database.FileName(), Path(u"c.tsdb"_s));
     EXPECT_EQ(FilesThere(), (QStringList{u"a.tsdb"_s, u"b.tsdb"_s, u"c.tsdb"_s}));
+
+    dialogs_.Files.push_back({a});
+    EXPECT_TRUE(database.OpenDatabaseFromDialog());
+    EXPECT_EQ(database.FileName(), a);
+    EXPECT_TRUE(database.OpenDatabase(QString(), true));
+    EXPECT_EQ(database.Count(), 0);
+    EXPECT_EQ(database.FileName(), a);
+    EXPECT_TRUE(database.OpenDatabase(Path(u"b.tsdb"_s), true));
+    EXPECT_EQ(database.FileName(), a);
+    EXPECT_TRUE(database.OpenDatabase(QString()));
+    EXPECT_EQ(database.FileName(), QString());
 }
 
 TEST_F(DatabaseCommandsTest, AStoppedSaveLeavesTheOldFileAndNoTemporary) {
@@ -82,20 +92,14 @@ TEST_F(DatabaseCommandsTest, AStoppedSaveLeavesTheOldFileAndNoTemporary) {
     AddSongs(database, 120);
     ASSERT_TRUE(database.SaveDatabase(Path(u"a.tsdb"_s)));
     AddSongs(database, 30);
-    for (const int song : {0, 50, 100}) {
-        StopAt(database, song);
-        EXPECT_FALSE(database.SaveDatabase());
-        EXPECT_TRUE(database.Modified());
-        EXPECT_FALSE(database.Busy() || database.ProgressRunning());
-        EXPECT_EQ(FilesThere(), QStringList{u"a.tsdb"_s});
-        EXPECT_EQ(SongsIn(Path(u"a.tsdb"_s)), 120);
-    }
-}
-
-TEST_F(DatabaseCommandsTest, WhatAStoppedWriterLeavesHoldsTheSongsWritten) {
-    TMusicDatabase database;
-    AddSongs(database, 120);
     StopAt(database, 100);
+    EXPECT_FALSE(database.SaveDatabase());
+    EXPECT_TRUE(database.Modified());
+    EXPECT_FALSE(database.Busy() || database.ProgressRunning());
+    EXPECT_EQ(FilesThere(), QStringList{u"a.tsdb"_s});
+    EXPECT_EQ(SongsIn(Path(u"a.tsdb"_s)), 120);
+
+    // What the writer leaves then holds the songs written.
     SafeFile file(Path(u"part.tsdb"_s));
     EXPECT_FALSE(WriteDatabase(database, file));
     file.Commit();
@@ -175,51 +179,6 @@ TEST_F(DatabaseCommandsTest, AStoppedLoadKeepsItsSongsAndCountsThemButNotTheName
     EXPECT_EQ(database.FileName(), QString());
     EXPECT_EQ(changes, 1);
     EXPECT_FALSE(database.Loading() || database.ProgressRunning() || database.Modified());
-}
-
-// The lists come before the first song, and can be long.
-TEST_F(DatabaseCommandsTest, AStopIsHonouredBetweenTheRowsOfTheLists) {
-    TMusicDatabase database;
-    AddSongs(database, 10);
-    ASSERT_TRUE(database.SaveDatabase(Path(u"a.tsdb"_s)));
-    bool songsBegan = false;
-    database.OnProgress = [&](TMusicDatabase&, const ProgressPoint&) { songsBegan = true; };
-    const auto stopAtFirstTurn = [&] {
-        QMetaObject::invokeMethod(
-            &database, [&] { database.RequestAbort(); }, Qt::QueuedConnection);
-    };
-    stopAtFirstTurn();
-    EXPECT_FALSE(database.SaveDatabase(Path(u"b.tsdb"_s)));
-    EXPECT_EQ(FilesThere(), QStringList{u"a.tsdb"_s});
-    stopAtFirstTurn();
-    EXPECT_FALSE(database.OpenDatabase(Path(u"a.tsdb"_s)));
-    EXPECT_EQ(database.Count(), 0);
-    EXPECT_EQ(database.Artists().Count(), 0);
-    EXPECT_FALSE(songsBegan);
-}
-
-TEST_F(DatabaseCommandsTest, OpeningFollowsTheDialogAndTheNameRules) {
-    TMusicDatabase database;
-    AddSongs(database, 3);
-    database.SaveDatabase(Path(u"a.tsdb"_s));
-    EXPECT_FALSE(database.OpenDatabaseFromDialog());
-    EXPECT_EQ(dialogs_.FileDialogs.at(0).Title, u"Datenbank öffnen"_s);
-    EXPECT_EQ(database.Count(), 3);
-
-    TMusicDatabase other;
-    dialogs_.Files.push_back({Path(u"a.tsdb"_s)});
-    EXPECT_TRUE(other.OpenDatabaseFromDialog());
-    EXPECT_EQ(other.Count(), 3);
-    EXPECT_EQ(other.FileName(), Path(u"a.tsdb"_s));
-    EXPECT_TRUE(other.OpenDatabase(QString(), true));
-    EXPECT_EQ(other.Count(), 0);
-    EXPECT_EQ(other.FileName(), Path(u"a.tsdb"_s));
-    EXPECT_TRUE(other.OpenDatabase(QString()));
-    EXPECT_EQ(other.FileName(), QString());
-
-    other.SetFileName(u"kept"_s);
-    EXPECT_TRUE(other.OpenDatabase(Path(u"a.tsdb"_s), true));
-    EXPECT_EQ(other.FileName(), u"kept"_s);
 }
 
 TEST_F(DatabaseCommandsTest, AFileThatCannotBeOpenedLeavesTheDatabaseAsItIs) {

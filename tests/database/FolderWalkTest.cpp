@@ -127,17 +127,6 @@ TEST(FolderWalkTest, NamesThatAreNoTextAreShownWithTheirBytes) {
                                               u"Ungültiger Ordnername: "_s + songs.Path(u"M\\xFCsik"_s)}));
 }
 
-TEST(FolderWalkTest, AFolderThatMayNotBeReadIsNamedAndTheOthersAreWalked) {
-    if (::geteuid() == 0) GTEST_SKIP() << "nothing is closed to the superuser";
-    const SongFolder songs;
-    songs.Add({u"a/1.wav"_s, u"b/2.wav"_s});
-    ::chmod(QFile::encodeName(songs.Path(u"a"_s)).constData(), 0);
-    const Walked walked = WalkAll(songs.Path());
-    ::chmod(QFile::encodeName(songs.Path(u"a"_s)).constData(), 0700);
-    EXPECT_EQ(walked.Files, songs.Paths({u"b/2.wav"_s}));
-    EXPECT_EQ(walked.Unreadable.size(), 1);
-}
-
 TEST(FolderWalkTest, ATreeDeeperThanThePathsOfTheSystemEndsInAReason) {
     const SongFolder songs;
     songs.Add(u"z/1.wav"_s);

@@ -79,6 +79,7 @@ bool TakeIn(TMusicDatabase& database, const QString& path, const ReadOptions& op
     if (database.AddEntry(path, record) >= 0) {
         ++result.Added;
         result.NewFiles << path;
+        if (record.BitRate == 0) result.DamagedFiles << path;
         return true;
     }
     if (database.IsBanned(record)) {

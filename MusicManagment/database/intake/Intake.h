@@ -16,6 +16,7 @@ struct IntakeResult {
     bool Stopped = false;  // the user asked to stop; what was taken in stays
     QStringList NewFiles;  // in the order in which they were taken in
     QStringList BannedFiles;
+    QStringList DamagedFiles;     // taken in, but nothing was found in them that could be played
     QStringList UnreadableNames;  // each with the reason
 };
 

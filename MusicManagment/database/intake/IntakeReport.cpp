@@ -15,6 +15,12 @@ void AppendLines(const QStringList& lines, QString& text) {
         text += line + u'\n';
 }
 
+std::vector<ReportSection> Complaints(const IntakeResult& result) {
+    return {{u"Nicht gelesen werden konnte(n)"_s, result.UnreadableNames, true},
+            {u"Aufgenommen, aber ohne erkennbaren Ton"_s, result.DamagedFiles, true},
+            {u"Nicht aufgenommen, weil in der Bann-Liste"_s, result.BannedFiles, true}};
+}
+
 // Returns its path. In a folder of the user's own: in the common one others could put a link under the name.
 QString WriteDetails(const QString& details) {
     const QString path =
@@ -47,15 +53,18 @@ QString IntakeDetails(const IntakeResult& result) {
     QString text =
         u"Folgende(r) Song(s) ("_s + QString::number(result.Added) + u") wurde(n) neu aufgenommen:\n"_s;
     AppendLines(result.NewFiles, text);
-    if (result.Unreadable == 0) return text;
-    text += u"\nNicht gelesen werden konnte(n) ("_s + QString::number(result.Unreadable) + u"):\n"_s;
-    AppendLines(result.UnreadableNames, text);
+    for (const ReportSection& section : Complaints(result)) {
+        if (section.Lines.isEmpty()) continue;
+        text += u'\n' + section.Caption + u" ("_s + QString::number(section.Lines.size()) + u"):\n"_s;
+        AppendLines(section.Lines, text);
+    }
     return text;
 }
 
 std::vector<ReportSection> IntakeSections(const IntakeResult& result) {
-    return {{u"Neu aufgenommen"_s, result.NewFiles},
-            {u"Nicht gelesen oder nicht aufgenommen"_s, result.UnreadableNames, true}};
+    std::vector<ReportSection> sections = Complaints(result);
+    sections.insert(sections.begin(), {u"Neu aufgenommen"_s, result.NewFiles});
+    return sections;
 }
 
 void ShowReport(const QString& message, std::vector<ReportSection> sections, const QString& details) {

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "MusicManagment/database/ListGuards.h"
 #include "MusicManagment/database/MusicManagment.h"
 
 namespace {
@@ -33,10 +34,16 @@ void KnownSongs::Add(const QString& path) {
 
 // Only once a path is met that is not known as it stands.
 void KnownSongs::IndexNames() {
+    constexpr std::size_t kSongsPerTurn = 16'384;
+    const BusyGuard unchanged(database_);
     isIndexed_ = true;
     byName_.reserve(static_cast<std::size_t>(database_.Count()));
-    for (const auto& song : database_.Songs())
+    std::size_t done = 0;
+    for (const auto& song : database_.Songs()) {
         if (!IsCdPath(song->FileName)) byName_.emplace(Key(song->FileName), song->FileName);
+        // A wish to stop is met by whoever goes on.
+        if (++done % kSongsPerTurn == 0) database_.Progress({.Type = ptAddSongs}, false, false);
+    }
 }
 
 std::optional<FolderIdentity> KnownSongs::FolderOf(const QString& path) {

@@ -9,12 +9,12 @@
 
 class TMusicDatabase;
 
-// Tells whether a file is in the collection already, be it under another path that leads to the same folder:
-// through a link, or a folder that is mounted in two places.
+// Tells, within a run, whether a file is in the collection already, be it under another path that leads to
+// the same folder: through a link, or a folder that is mounted in two places.
 class KnownSongs {
  public:
     // `database` must live longer.
-    explicit KnownSongs(const TMusicDatabase& database) : database_(database) {}
+    explicit KnownSongs(TMusicDatabase& database) : database_(database) {}
 
     bool Contains(const QString& path);
     // A song has come into the collection.
@@ -25,7 +25,7 @@ class KnownSongs {
     std::optional<FolderIdentity> FolderOf(const QString& path);
     bool IsSameFile(const QString& a, const QString& b);
 
-    const TMusicDatabase& database_;
+    TMusicDatabase& database_;
     bool isIndexed_ = false;
     std::unordered_multimap<std::size_t, QString>
         byName_;  // paths, by the hash of the name behind the folder

@@ -77,7 +77,7 @@ void AddOldSong(TMusicDatabase& database, ByteSpan bytes, int version, bool isCo
         // The file is there but cannot be read now: rights, a bad sector. The song stays, as below.
     }
     // Such a song, and one on a medium that is not there, loses its tags but not its place in the collection.
-    const AddAs unseen = isThere || isCounted ? as : AddAs::Returning;
+    const AddAs unseen = isThere || isCounted || IsCdPath(path) ? as : AddAs::Returning;
     const bool added = database.AddEntry(path, RecordOf(path, values, database), unseen) >= 0;
     ++(added ? lost.Kept : lost.Left);
 }
