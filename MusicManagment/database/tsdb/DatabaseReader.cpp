@@ -291,6 +291,7 @@ bool ReadBody(TMusicDatabase& database, ByteSource& source, const Header& header
 // The songs that were read before the end stay; the lists, which count all songs of the file, cannot.
 void SettleForPart(TMusicDatabase& database) {
     database.RecountGroups();
+    database.SetModified(false);
     database.Events().Replaced.Tell();
 }
 
