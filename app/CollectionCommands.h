@@ -5,7 +5,7 @@
 
 #include "CommonRUKTools/Listeners.h"
 #include "app/desktop/BannListFile.h"
-#include "app/desktop/StandardFiles.h"
+#include "CommonRUKTools/StandardFiles.h"
 
 class TMusicDatabase;
 struct IntakeResult;

@@ -78,6 +78,7 @@ TTunesteadMainWnd::~TTunesteadMainWnd() = default;
 
 void TTunesteadMainWnd::SetUpDatabase() {
     database_.SetModernTags(true);
+    database_.SetKeepLostSongs(true);
     progress_.OnRunning = [this](bool running) { RunningChanged(running); };
     commands_.OnIntake = &ReportIntake;
     const auto follow = [this] { ListChanged(); };

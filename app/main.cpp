@@ -15,7 +15,7 @@
 #include "app/desktop/Icons.h"
 #include "app/desktop/Installation.h"
 #include "app/desktop/SingleInstance.h"
-#include "app/desktop/StandardFiles.h"
+#include "CommonRUKTools/StandardFiles.h"
 #include "app/desktop/Termination.h"
 #include "app/desktop/Translations.h"
 #include "app/dialogs/QtDialogs.h"

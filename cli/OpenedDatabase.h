@@ -1,12 +1,24 @@
 #pragma once
 
 #include "MusicManagment/database/MusicManagment.h"
+#include "cli/Arguments.h"
 #include "cli/Console.h"
 #include "cli/RunWatcher.h"
 
-// Makes the database one of a program without windows: modern reading profile, no events to wait for.
+// Makes the database one of a program without windows: modern rules, no events to wait for.
 void PrepareDatabase(TMusicDatabase& database);
+
+// Keeps other programs from writing the file that the command is going to write. Throws EAbort, after telling
+// the user, when one has it open.
+void ClaimFile(TMusicDatabase& database, const QString& fileName);
 
 // Reads the file into the database. Throws EMusicDatabaseException with the reason; also when the user
 // stopped.
 void ReadInto(TMusicDatabase& database, const QString& fileName, Console& console, StopBy stopBy);
+
+inline constexpr OptionRow kBannListOption = {
+    u"--bannlist", u"DATEI",
+    u"Bann-Liste (.str), deren Songs nicht aufgenommen werden; ohne die Option\n"
+    u"gilt für die Standard-Datenbank die Standard-Bann-Liste"};
+// Loads the ban list of that option. Throws EStreamError when it cannot be read.
+void LoadBannListFor(TMusicDatabase& database, const QString& fileName, const Arguments& arguments);

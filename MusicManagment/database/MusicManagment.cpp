@@ -1,6 +1,5 @@
 #include "MusicManagment/database/MusicManagment.h"
 
-#include <QStandardPaths>
 #include <algorithm>
 #include <cmath>
 
@@ -8,6 +7,7 @@
 #include "CommonRUKTools/Collation.h"
 #include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/FileSource.h"
+#include "CommonRUKTools/MusicFolder.h"
 #include "MusicManagment/database/intake/BannList.h"
 #include "MusicManagment/database/songfiles/RecycleBin.h"
 
@@ -62,7 +62,7 @@ void KeepLastOfEachSerial(std::vector<CdName>& names) {
 TMusicDatabase::TMusicDatabase(QObject* parent) : QObject(parent), mp3NamePattern_(u"%ARTIST% - %TITLE%"_s) {
     SubscribeSlots();
     SubscribeProgressSlots();
-    SetMP3MoveRootDir(QStandardPaths::writableLocation(QStandardPaths::MusicLocation));
+    SetMP3MoveRootDir(MusicFolder());
     // The list of an earlier version, which a component has until settings are loaded; the setter adds the
     // rest.
     SetMP3MoveSubDirs({u"Unsorted"_s, u"Alternative, Psychedelic, Punk, Funk"_s, u"Comedy"_s,
@@ -351,7 +351,8 @@ void TMusicDatabase::SetAutoSave(int interval) {
 void TMusicDatabase::AutoSaveTick() {
     if (autoSaveTimer_) autoSaveTimer_->stop();
     // A run in progress is not disturbed; the next tick comes.
-    if (!fileName_.isEmpty() && !ProgressRunning()) RunCommand([this] { SaveDatabase(fileName_, true); });
+    if (!fileName_.isEmpty() && !ProgressRunning() && !fileLock_.IsElsewhere())
+        RunCommand([this] { SaveDatabase(fileName_, true); });
     if (autoSaveTimer_ && autoSave_ > 0) autoSaveTimer_->start(autoSave_);
 }
 

@@ -11,6 +11,7 @@
 
 #include "CommonRUKTools/Errors.h"
 #include "MusicManagment/database/CollectionEvents.h"
+#include "MusicManagment/database/DatabaseLock.h"
 #include "MusicManagment/database/GroupLists.h"
 #include "MusicManagment/database/Operation.h"
 #include "MusicManagment/database/Progress.h"
@@ -128,6 +129,8 @@ class TMusicDatabase : public QObject {
     bool OpenDatabase(const QString& fileName, bool keepName = false);
     // Asks for the file first; false also when the user cancelled.
     bool OpenDatabaseFromDialog();
+    // Keeps other programs from writing the file meanwhile; the programs switch it on.
+    DatabaseLock& Lock() { return fileLock_; }
 
     // --- Summary lists: caption and number of songs of each row ---
     const GroupLists& Groups() const { return groups_; }
@@ -198,6 +201,10 @@ class TMusicDatabase : public QObject {
     // Whether files are read with the modern profile; off in a new component, switched on by the programs.
     bool ModernTags() const { return modernTags_; }
     void SetModernTags(bool value) { modernTags_ = value; }
+    // Whether songs of old database files stay when their audio files cannot be found; off in a new
+    // component, switched on by the programs.
+    bool KeepLostSongs() const { return keepLostSongs_; }
+    void SetKeepLostSongs(bool value) { keepLostSongs_ = value; }
 
     // Linked components; each reference clears itself when the other goes.
     QObject* PlayList() const { return playList_; }
@@ -330,6 +337,8 @@ class TMusicDatabase : public QObject {
     bool readOnly_ = false;
     bool renameAndMoveMP3s_ = true;
     bool modernTags_ = false;
+    bool keepLostSongs_ = false;
+    DatabaseLock fileLock_{*this};
 
     QPointer<QObject> playList_;
     QPointer<QObject> playSound_;

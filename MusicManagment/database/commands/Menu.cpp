@@ -22,7 +22,7 @@ constexpr int kEdit[] = {
     kWritableLine, mcRemoveFromDatabase, mcRemoveFromDisk, mcBan, mcCopyTo};
 constexpr int kSong[] = {mcPlay,        mcAddToPlayList,  mcOpenExternally, mcTakeGenre,  kLine,
                          mcSortSubmenu, mcSubSortSubmenu, mcReverse,        mcFollowFocus};
-constexpr int kSort[] = {411, 412, 413, 414, 415, 416, 417, 418, 419, 420, 421, 422};
+constexpr int kSort[] = {411, 412, 413, 414, 415, 416, 417, 418, 419, 420, 421, 422, 423};
 constexpr int kSubSort[] = {431, 432, 433};
 constexpr int kExtras[] = {mcFindDuplicates,
                            mcFindDuplicatesOfArtists,
