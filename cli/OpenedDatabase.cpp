@@ -2,9 +2,9 @@
 
 using namespace Qt::StringLiterals;
 
-void PrepareDatabase(TMusicDatabase& database) {
+void PrepareDatabase(TMusicDatabase& database, Rules rules) {
     database.SetAsynchronous(false);
-    database.SetModernTags(true);
+    UseRules(database, rules);
 }
 
 void ReadInto(TMusicDatabase& database, const QString& fileName, Console& console, StopBy stopBy) {

@@ -1,11 +1,13 @@
 #pragma once
 
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/commands/Rules.h"
 #include "cli/Console.h"
 #include "cli/RunWatcher.h"
 
-// Makes the database one of a program without windows: modern reading profile, no events to wait for.
-void PrepareDatabase(TMusicDatabase& database);
+// Makes the database one of a program without windows: no events to wait for, and the modern rules unless the
+// user wants the classic ones.
+void PrepareDatabase(TMusicDatabase& database, Rules rules = Rules::Modern);
 
 // Reads the file into the database. Throws EMusicDatabaseException with the reason; also when the user
 // stopped.

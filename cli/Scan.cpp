@@ -55,8 +55,7 @@ int RunScan(const Arguments& arguments, Console& console) {
     RequireWritableFolder(fileName);
     const InterruptGuard guard;
     TMusicDatabase database;
-    PrepareDatabase(database);
-    database.SetModernTags(!arguments.Has(u"--classic"));
+    PrepareDatabase(database, arguments.Has(u"--classic") ? Rules::Classic : Rules::Modern);
     const bool isNew = !FileSource::Exists(fileName);
     if (!isNew) ReadInto(database, fileName, console, StopBy::Interrupt);
 
