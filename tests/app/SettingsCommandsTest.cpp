@@ -20,7 +20,7 @@
 #include "app/dialogs/wizard/WizardForm.h"
 #include "app/views/WindowSettings.h"
 #include "tests/PrintQt.h"
-#include "tests/app/ScriptedDialogs.h"
+#include "tests/ScriptedDialogs.h"
 
 using namespace Qt::StringLiterals;
 
