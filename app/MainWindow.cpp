@@ -30,11 +30,13 @@
 #include "app/SongCommands.h"
 #include "app/ToolWindows.h"
 #include "app/desktop/Icons.h"
+#include "app/desktop/NewInstallation.h"
 #include "app/desktop/RaiseWindow.h"
 #include "app/desktop/SingleInstance.h"
 #include "app/views/EmptyState.h"
 #include "app/views/FilterField.h"
 #include "app/views/SongListWidget.h"
+#include "app/views/WindowSettings.h"
 
 using namespace Qt::StringLiterals;
 
@@ -77,8 +79,6 @@ TTunesteadMainWnd::TTunesteadMainWnd(MainWindowOptions options)
 TTunesteadMainWnd::~TTunesteadMainWnd() = default;
 
 void TTunesteadMainWnd::SetUpDatabase() {
-    database_.SetModernTags(true);
-    database_.SetKeepLostSongs(true);
     progress_.OnRunning = [this](bool running) { RunningChanged(running); };
     commands_.OnIntake = &ReportIntake;
     const auto follow = [this] { ListChanged(); };
@@ -178,30 +178,33 @@ void TTunesteadMainWnd::HandleCommands() {
 
 void TTunesteadMainWnd::LoadSettings() {
     TRWReg settings(kSettingsKey.toString(), options_.SettingsFile);
+    BeginInstallation(settings);
+    UseRules(database_, Rules::Modern);
     LoadDatabaseSettings(database_, settings);
-    linkPath_ = settings.ReadString(u"LinkPath"_s).value_or(QString());
+    linkPath_ = ReadSetting(settings, WindowSettings::kLinkPath).value_or(QString());
     // Absent counts as the first start; written back at once, so that a crash does not make it the first
     // again.
-    firstTime_ = settings.ReadBool(u"FirstTime"_s).value_or(true);
-    settings.WriteBool(u"FirstTime"_s, false);
-    if (const auto columns = settings.ReadBinary(u"SongListColumns"_s)) list_->RestoreColumns(*columns);
+    firstTime_ = ReadSetting(settings, WindowSettings::kFirstTime).value_or(true);
+    WriteSetting(settings, WindowSettings::kFirstTime, false);
+    if (const auto columns = ReadSetting(settings, WindowSettings::kSongListColumns))
+        list_->RestoreColumns(*columns);
     database_.Commands().Changed.Tell();
 }
 
 void TTunesteadMainWnd::StoreSettings() {
     TRWReg settings(kSettingsKey.toString(), options_.SettingsFile);
     SaveDatabaseSettings(database_, settings);
-    settings.WriteString(u"LinkPath"_s, linkPath_);
-    settings.WriteBinary(u"MainForm"_s, saveGeometry());
-    settings.WriteBinary(u"MainFormState"_s, saveState());
-    settings.WriteBinary(u"SongListColumns"_s, list_->SaveColumns());
+    WriteSetting(settings, WindowSettings::kLinkPath, linkPath_);
+    WriteSetting(settings, WindowSettings::kMainForm, saveGeometry());
+    WriteSetting(settings, WindowSettings::kMainFormState, saveState());
+    WriteSetting(settings, WindowSettings::kSongListColumns, list_->SaveColumns());
     settings.Flush();
 }
 
 void TTunesteadMainWnd::SetUpPlacement() {
     const TRWReg settings(kSettingsKey.toString(), options_.SettingsFile);
-    restoreState(settings.ReadBinary(u"MainFormState"_s).value_or(QByteArray()));
-    if (restoreGeometry(settings.ReadBinary(u"MainForm"_s).value_or(QByteArray()))) return;
+    restoreState(ReadSetting(settings, WindowSettings::kMainFormState).value_or(QByteArray()));
+    if (restoreGeometry(ReadSetting(settings, WindowSettings::kMainForm).value_or(QByteArray()))) return;
     constexpr int kWidth = 190;  // average characters
     constexpr int kHeight = 42;  // lines
     const QSize wanted(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
