@@ -7,10 +7,10 @@
 #include <thread>
 
 #include "CommonRUKTools/ByteReader.h"
+#include "MusicManagment/playback/fmod/FMODPlaySound.h"
 #include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 #include "tests/playback/Listening.h"
-#include "tests/playback/ScriptedFmod.h"
 
 using namespace Qt::StringLiterals;
 
@@ -208,15 +208,14 @@ TEST(SinkOutputTest, RealTimeOutputPullsByItself) {
     }
 }
 
-// A device that asks for frames all the time, and is lost when the test says so.
+// A device that asks for frames all the time.
 class GreedyOutput : public AudioOutput {
  public:
-    explicit GreedyOutput(const std::atomic<bool>& lost) : lost_(lost) {}
     ~GreedyOutput() override { GreedyOutput::Close(); }
     bool Open(int, std::size_t frames, Pull pull) override {
         buffer_.resize(2 * frames);
         pull_ = std::move(pull);
-        return !lost_;
+        return true;
     }
     void Start() override {
         thread_ = std::jthread([this](const std::stop_token& stop) {
@@ -226,11 +225,9 @@ class GreedyOutput : public AudioOutput {
     }
     void Stop() override { thread_ = {}; }
     void Close() override { Stop(); }
-    bool Failed() const override { return lost_; }
-    bool Replaceable() const override { return true; }
+    bool Failed() const override { return false; }
 
  private:
-    const std::atomic<bool>& lost_;
     Samples buffer_;
     Pull pull_;
     std::jthread thread_;
@@ -240,8 +237,7 @@ class GreedyOutput : public AudioOutput {
 TEST_F(SoundLibraryTest, EverythingMayHappenWhileAnotherThreadMixes) {
     Encode(Path("a.mp3"), Sweep(3), {.codec = "libmp3lame", .format = "mp3"});
     WriteWav(Path("b.wav"), Sweep(3));
-    const std::atomic<bool> lost = false;
-    SoundLibrary mixing([&](TFSoundOutputTypes) { return std::make_unique<GreedyOutput>(lost); });
+    SoundLibrary mixing([](TFSoundOutputTypes) { return std::make_unique<GreedyOutput>(); });
     ASSERT_TRUE(mixing.FSOUND_Init(44100, 3, 2));
     mixing.FSOUND_DSP_SetActive(FSOUND_DSPUNIT::kFft, true);
     for (int round = 0; round < 20; ++round) {
@@ -264,29 +260,46 @@ TEST_F(SoundLibraryTest, EverythingMayHappenWhileAnotherThreadMixes) {
     }
 }
 
-TEST_F(SoundLibraryTest, LostDeviceIsOpenedAgainWhenItIsBack) {
-    WriteWav(Path("a.wav"), Sine({}, 1));
-    HandClock clock;
-    std::atomic<bool> lost = false;
-    SoundLibrary playing([&](TFSoundOutputTypes) { return std::make_unique<GreedyOutput>(lost); });
-    ASSERT_TRUE(playing.FSOUND_Init(44100, 3, 2));
-    const FSOUND_STREAM stream = playing.FSOUND_Stream_OpenFile(Path("a.wav"), 0x29);
-    const int channel = playing.FSOUND_Stream_PlayEx(stream, FSOUND_FREE, FSOUND_DSPUNIT::kNone, true);
+// Takes what Advance pulls, unless it is lost.
+class LosableOutput : public SinkOutput {
+ public:
+    explicit LosableOutput(const bool& lost) : SinkOutput(Pace::Caller), lost_(lost) {}
+    ~LosableOutput() override { Close(); }
+    bool Replaceable() const override { return true; }
+
+ private:
+    bool Begin(int) override { return !lost_; }
+    bool Accept(std::span<const float>) override { return !lost_; }
+
+    const bool& lost_;
+};
+
+TEST_F(SoundLibraryTest, ALostDeviceKeepsThePlaceUntilItIsBack) {
+    WriteWav(Path("a.wav"), Sine({}, 3));
+    const HandClock clock;
+    bool lost = false;
+    SoundLibrary playing([&](TFSoundOutputTypes) { return std::make_unique<LosableOutput>(lost); });
+    TFMODPlaySound sound(playing, {});
+    sound.SetBackendFile(Path("a.wav"));
+    sound.Open();
+    sound.Play();
+    playing.Advance(kRate);
     lost = true;
-    EXPECT_TRUE(playing.FSOUND_IsPlaying(channel));
-    const quint64 played = playing.FramesPlayed();
-    const auto play = [&] {
-        return playing.FSOUND_Stream_PlayEx(stream, FSOUND_FREE, FSOUND_DSPUNIT::kNone, true);
-    };
-    EXPECT_EQ(play(), -1);
-    EXPECT_EQ(playing.FSOUND_GetError(), FMOD_ERR_PLAY);
+    playing.Advance(1024);
+    EXPECT_THROW(sound.GetStatus(), EOutputException);
+    EXPECT_THROW(sound.Play(), EOutputException);
+    const quint32 position = sound.GetPosition();
+    EXPECT_NEAR(position, 1000, 100);
+    sound.PauseResume();
+    EXPECT_EQ(sound.GetStatus(), psPaused);
+    sound.PauseResume();
     lost = false;
-    EXPECT_EQ(play(), -1);  // not asked for at every call
+    EXPECT_THROW(sound.GetStatus(), EOutputException);  // not looked for at every call
     clock.Milliseconds += 5000;
-    EXPECT_GE(play(), 0);
-    EXPECT_EQ(playing.FSOUND_Stream_GetTime(stream), 0);
-    while (playing.FramesPlayed() == played)
-        std::this_thread::yield();
+    EXPECT_EQ(sound.GetStatus(), psPlaying);
+    EXPECT_EQ(sound.GetPosition(), position);
+    playing.Advance(kRate);
+    EXPECT_EQ(sound.GetPosition(), position + 1000);
 }
 
 }  // namespace
