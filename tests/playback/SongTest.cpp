@@ -136,6 +136,7 @@ TEST_F(SongTest, VolumePauseAndSeparation) {
     const auto sideDifference = [&](float separation) {
         EXPECT_TRUE(library.FMUSIC_SetPanSeperation(song, separation));
         library.FMUSIC_StopSong(song);
+        Hear(0.1);  // what is left of it
         library.FMUSIC_PlaySong(song);
         from = HeardFrames();
         Hear(0.1);
@@ -224,6 +225,16 @@ TEST(MidiFileTest, CutAtAnyByteItIsReadOrRefused) {
         events = count;
     }
     EXPECT_EQ(events, 5U);
+}
+
+TEST(MidiFileTest, WhatComesAtOnceIsBounded) {
+    MidiTrack track;
+    for (int i = 0; i < 5000; ++i)
+        track.Note(0, 60, 0);
+    const auto song = ReadMidiFile(Span(Midi({track.Note(960, 64, 480)})));
+    ASSERT_TRUE(song);
+    EXPECT_EQ(song->events.size(), kMostMidiEvents + 2);
+    EXPECT_EQ(song->length, 1'500'000U);
 }
 
 TEST(MidiFileTest, HugeTimesAreBounded) {
