@@ -63,7 +63,8 @@ void Mixer::Release(int channel) {
     if (found == nullptr) return;
     DecodeAhead* source = found->source.load();
     Detach(*found);
-    if (source != nullptr) LeaveTail(*found, *source);
+    // What has ended may be somewhere else in its file by now.
+    if (source != nullptr && !found->over.load(std::memory_order_acquire)) LeaveTail(*found, *source);
 }
 
 // Where all tails sound still, many sounds end at once, and one more jump among them is not heard. Nobody

@@ -83,7 +83,6 @@ TEST_F(PlayerServiceTest, ASongIsPlayedThereAsIfItWereHere) {
     controller->Play();
     EXPECT_EQ(controller->GetStatus(), psPlaying);
     PassThere(300);
-    EXPECT_EQ(controller->GetPosition(), 300U);
     controller->SetPosition(5000);
     EXPECT_EQ(controller->GetPosition(), 5000U);
     controller->PauseResume();
