@@ -160,18 +160,6 @@ TEST_F(PlayerServiceTest, TheControllerDecidesAboutFadesWhileItWaits) {
     controller->SetPanel(nullptr);
 }
 
-TEST_F(PlayerServiceTest, TheEndOfASongIsHandledByTheController) {
-    const auto controller = Controller();
-    bool ended = false;
-    controller->OnReachedEndOfSong = [&](TPlaySound&) { ended = true; };
-    controller->SetFileName(folder_.Add(u"eins.mp3"_s));
-    controller->Play();
-    controller->SetPosition(179500);
-    PassThere(300);
-    PassThere(1300);
-    EXPECT_TRUE(WaitUntil([&] { return ended; }, kPatience));
-}
-
 TEST_F(PlayerServiceTest, FailuresStayThereAndTheSongEndsWithItsController) {
     auto controller = Controller();
     EngineSettings settings;

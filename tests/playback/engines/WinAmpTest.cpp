@@ -307,12 +307,17 @@ TEST_F(WinAmpTest, ASongThatGoesWhileItWaitsEndsTheCommandSilently) {
     player_.Appear();
     player_.OpensNothing = true;
     auto sound = Sound();
-    QTimer::singleShot(50, [&] { sound.reset(); });
+    QTimer look;
+    QObject::connect(&look, &QTimer::timeout, &look, [&] {
+        if (player_.Calls.contains(u"OpenUri"_s)) sound.reset();
+    });
+    look.start(10);
     EXPECT_THROW(sound->Open(), EAbort);
     EXPECT_EQ(sound, nullptr);
     // The player is not left alone with what it was handed.
     EXPECT_TRUE(WaitUntil([this] { return player_.Calls.contains(u"Stop"_s); }, kPatience));
 
+    look.stop();
     sound = Sound();
     QTimer::singleShot(50, [&] { sound->Close(); });
     EXPECT_THROW(sound->Open(), EAbort);
