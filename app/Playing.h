@@ -9,6 +9,7 @@
 #include "MusicManagment/playlist/PlayList.h"
 #include "app/CommandMenu.h"
 #include "app/MenuIcons.h"
+#include "app/ShownFollowers.h"
 #include "app/desktop/Mpris.h"
 #include "app/desktop/StayAwake.h"
 
@@ -62,11 +63,14 @@ class Playing {
     void SetUpSpectrum(QMainWindow& window, SpectrumSource source);
     void SetUpContextMenu();
     void JoinDesktop(QMainWindow& window);
+    void FollowPlayer();
     void FollowSong();
+    void PlayFromFocus();
     int Append(const std::vector<SongIndex>& songs);
     void PlayChosen();
     void AddChosen();
-    void PlayEntry(int index, SongIndex hint = -1);
+    void PlayChosenEntry(int index, SongIndex hint = -1);
+    void PlayEntry(int index, SongIndex hint);
     void RunPlayerCommand(int id);
     void RunPlayListCommand(int id);
 
@@ -76,6 +80,7 @@ class Playing {
     bool standardListIsUnread_ = true;
     TPlayList list_;
     TPlaySound player_;
+    ShownFollowers followers_{list_};
     CommandMenu listMenu_{[this](int id) { RunPlayListCommand(id); }, &PlayListIcon};
     CommandMenu playerMenu_{[this](int id) { RunPlayerCommand(id); }, &PlayerIcon};
     TPlaylistForm* listForm_;
@@ -86,4 +91,5 @@ class Playing {
     std::unique_ptr<Mpris> mpris_;
     std::unique_ptr<StayAwake> awake_;
     QString shownSong_;
+    Subscriptions subscriptions_;
 };

@@ -209,6 +209,18 @@ bool SongListWidget::FocusSong(SongIndex song) {
     return true;
 }
 
+std::vector<QString> SongListWidget::ShownFromFocus(std::size_t most) const {
+    std::vector<QString> paths;
+    if (!currentIndex().isValid()) return paths;
+    for (int row = currentIndex().row(); row < songs_.rowCount() && paths.size() < most; ++row)
+        if (const TID3Tag* song = songs_.SongAt(row)) paths.push_back(song->FileName);
+    return paths;
+}
+
+void SongListWidget::SetPlaying(const QString& path) {
+    songs_.Songs().SetPlaying(path);
+}
+
 void SongListWidget::Enter() {
     setFocus(Qt::OtherFocusReason);
     if (!currentIndex().isValid() && songs_.rowCount() > 0) FocusRow(0);

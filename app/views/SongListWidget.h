@@ -42,6 +42,10 @@ class SongListWidget : public QTableView {
     bool FocusNext(const SongFilter& filter);
     // Gives the focus to a song and shows it. False when it is not shown.
     bool FocusSong(SongIndex song);
+    // The focused song and those shown below it, by path; at most so many.
+    std::vector<QString> ShownFromFocus(std::size_t most) const;
+    // Marks the song that plays, by its path; empty for none.
+    void SetPlaying(const QString& path);
     // Takes the keys; a list in which no song has the focus gives it to its first.
     void Enter();
 
