@@ -133,6 +133,7 @@ class Session {
         // The end of the list needs no message here.
         list_.OnAllFilesPlayed = [](TPlayList&, bool&) {};
         player_.OnPlayingStarted = [this](TPlaySound&) { begun_ << list_.CurrentSong(); };
+        list_.SetModernLists(true);
         list_.SetPlayOrder(options.Order);
         list_.SetRepeatAll(options.Repeat);
         if (options.ScanTime) list_.SetScanTime(*options.ScanTime);
