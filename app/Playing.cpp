@@ -50,6 +50,8 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
     player_.SetQuietFailures(true);
     // Before the settings, which may ask for it.
     if (options.MakeExternalPlayer) player_.SetExternalPlayer(options.MakeExternalPlayer());
+    list_.SetModernLists(true);
+    list_.SetStandardFileName(standardList_);
     list_.SetMusicDatabase(&database);
     player_.SetMusicDatabase(&database);
     player_.SetPlayList(&list_);
@@ -264,7 +266,7 @@ void Playing::OpenStandardList() {
 }
 
 void Playing::OpenPlayList(const QString& path) {
-    list_.SetPlayListFileName(path);
+    if (list_.MayBeReplaced()) list_.SetPlayListFileName(path);
 }
 
 // It plays without being in the list, where "Nächstes" goes on.

@@ -138,6 +138,7 @@ class Session {
             begun_ << list_.CurrentSong();
             heard_ = true;
         };
+        list_.SetModernLists(!options.Classic);
         list_.SetPlayOrder(options.Order);
         list_.SetRepeatAll(options.Repeat);
         if (options.ScanTime) list_.SetScanTime(*options.ScanTime);
