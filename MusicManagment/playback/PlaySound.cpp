@@ -8,7 +8,6 @@
 #include <utility>
 
 #include "CommonRUKTools/Clock.h"
-#include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/playback/ExternalTarget.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 
