@@ -29,31 +29,12 @@ bool SavedOrGivenUp(const std::function<bool()>& save, const QString& loss) {
 CollectionCommands::CollectionCommands(TMusicDatabase& database, StandardFiles files)
     : database_(database), files_(std::move(files)), bannList_(database.BannList(), files_) {
     database_.Lock().SetWanted(true);
-}
-
-bool CollectionCommands::Run(int id) {
-    switch (id) {
-        case mcNew:
-            New();
-            return true;
-        case mcOpen:
-            Open();
-            return true;
-        case mcSave:
-            Save();
-            return true;
-        case mcSaveAs:
-            SaveAs();
-            return true;
-        case mcAddSongs:
-            AddSongs();
-            return true;
-        case mcAddFolder:
-            AddFolder();
-            return true;
-        default:
-            return false;
-    }
+    const std::pair<int, void (CollectionCommands::*)()> commands[] = {
+        {mcNew, &CollectionCommands::New},           {mcOpen, &CollectionCommands::Open},
+        {mcSave, &CollectionCommands::Save},         {mcSaveAs, &CollectionCommands::SaveAs},
+        {mcAddSongs, &CollectionCommands::AddSongs}, {mcAddFolder, &CollectionCommands::AddFolder}};
+    for (const auto& [id, command] : commands)
+        handlers_ += database_.Commands().Handle(id, {.Run = [this, command] { (this->*command)(); }});
 }
 
 void CollectionCommands::New() {

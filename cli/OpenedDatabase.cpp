@@ -7,10 +7,9 @@
 
 using namespace Qt::StringLiterals;
 
-void PrepareDatabase(TMusicDatabase& database) {
+void PrepareDatabase(TMusicDatabase& database, Rules rules) {
     database.SetAsynchronous(false);
-    database.SetModernTags(true);
-    database.SetKeepLostSongs(true);
+    UseRules(database, rules);
 }
 
 void ClaimFile(TMusicDatabase& database, const QString& fileName) {

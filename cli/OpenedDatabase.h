@@ -1,12 +1,14 @@
 #pragma once
 
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/commands/Rules.h"
 #include "cli/Arguments.h"
 #include "cli/Console.h"
 #include "cli/RunWatcher.h"
 
-// Makes the database one of a program without windows: modern rules, no events to wait for.
-void PrepareDatabase(TMusicDatabase& database);
+// Makes the database one of a program without windows: no events to wait for, and the modern rules unless the
+// user wants the classic ones.
+void PrepareDatabase(TMusicDatabase& database, Rules rules = Rules::Modern);
 
 // Keeps other programs from writing the file that the command is going to write. Throws EAbort, after telling
 // the user, when one has it open.

@@ -56,8 +56,7 @@ int RunScan(const Arguments& arguments, Console& console) {
     RequireWritableFolder(fileName);
     const InterruptGuard guard;
     TMusicDatabase database;
-    PrepareDatabase(database);
-    database.SetModernTags(!arguments.Has(u"--classic"));
+    PrepareDatabase(database, arguments.Has(u"--classic") ? Rules::Classic : Rules::Modern);
     LoadBannListFor(database, fileName, arguments);
     ClaimFile(database, fileName);
     const bool isNew = !FileSource::Exists(fileName);

@@ -141,17 +141,18 @@ TEST_F(UpdateTest, CopyingAsksBeforeItReplaces) {
     TakeIn({u"music/A - one.wav"_s, u"music/A - two.wav"_s});
     songs_.Add(u"target/A - one.wav"_s, 5);
     const qint64 before = QFileInfo(songs_.Path(u"target/A - one.wav"_s)).size();
+    const QStringList both{songs_.Path(u"music/A - one.wav"_s), songs_.Path(u"music/A - two.wav"_s)};
     dialogs_.Answers = {2};  // leave it
-    CopyResult result = CopySongs(database_, {0, 1}, songs_.Path(u"target"_s));
+    CopyResult result = CopySongs(database_, both, songs_.Path(u"target"_s));
     EXPECT_EQ(result.Copied, 1);
     EXPECT_EQ(QFileInfo(songs_.Path(u"target/A - one.wav"_s)).size(), before);
     dialogs_.Answers = {1};  // replace all
-    result = CopySongs(database_, {0, 1}, songs_.Path(u"target"_s));
+    result = CopySongs(database_, both, songs_.Path(u"target"_s));
     EXPECT_EQ(result.Copied, 2);
     EXPECT_NE(QFileInfo(songs_.Path(u"target/A - one.wav"_s)).size(), before);
     // Onto itself, and from a file that is gone.
     QFile::remove(songs_.Path(u"music/A - two.wav"_s));
-    result = CopySongs(database_, {0, 1}, songs_.Path(u"music"_s));
+    result = CopySongs(database_, both, songs_.Path(u"music"_s));
     EXPECT_EQ(result.Copied, 0);
     EXPECT_EQ(result.Failed.size(), 2);
     EXPECT_TRUE(QFile::exists(songs_.Path(u"music/A - one.wav"_s)));
@@ -161,6 +162,7 @@ TEST_F(UpdateTest, AStoppedCopyLeavesNothingBehind) {
     TakeIn({u"music/A - one.wav"_s});
     QDir().mkpath(songs_.Path(u"target"_s));
     database_.OnProgress = [](TMusicDatabase& database, const ProgressPoint&) { database.RequestAbort(); };
-    EXPECT_TRUE(CopySongs(database_, {0}, songs_.Path(u"target"_s)).Stopped);
+    EXPECT_TRUE(
+        CopySongs(database_, {songs_.Path(u"music/A - one.wav"_s)}, songs_.Path(u"target"_s)).Stopped);
     EXPECT_TRUE(QDir(songs_.Path(u"target"_s)).isEmpty());
 }
