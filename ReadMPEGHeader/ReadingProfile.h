@@ -5,7 +5,7 @@
 #include <optional>
 
 #include "CommonRUKTools/FileSource.h"
-#include "ReadMPEGHeader/AudioFile.h"
+#include "ReadMPEGHeader/SongReading.h"
 #include "ReadMPEGHeader/asf/Asf.h"
 #include "ReadMPEGHeader/id3v2/ID3v2Reader.h"
 #include "ReadMPEGHeader/mpeg/VbrHeader.h"

@@ -97,12 +97,16 @@ inline ReadOptions InProfile(ReadProfile profile) {
     return options;
 }
 
+inline SongReading ReadingOf(ByteSpan bytes, ReadProfile profile = ReadProfile::Classic,
+                             const QString& path = QStringLiteral("/music/Folder/name.mp3")) {
+    MemorySource source(bytes);
+    return ReadSong(source, path, InProfile(profile));
+}
+
 inline TID3Tag Read(ByteSpan bytes, const ReadOptions& options = InProfile(ReadProfile::Classic),
                     const QString& path = QStringLiteral("/music/Folder/name.mp3")) {
     MemorySource source(bytes);
-    TID3Tag tag;
-    ReadAudioStream(source, path, options, tag);
-    return tag;
+    return ReadSong(source, path, options).Tag;
 }
 
 inline TID3Tag ReadModern(ByteSpan bytes) {

@@ -2,7 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include "ReadMPEGHeader/mpeg/MpegResults.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
 

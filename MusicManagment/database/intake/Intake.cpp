@@ -57,29 +57,18 @@ void NoteUnreadable(const QStringList& reasons, IntakeResult& result) {
     result.UnreadableNames << reasons;
 }
 
-// Empty when the file was read, else why not.
-QString ReadSong(const QString& path, const ReadOptions& options, TID3Tag& record) {
-    try {
-        const QString refusal = ReadAudioFile(path, options, record);
-        return refusal.isEmpty() ? refusal : refusal + u": "_s + path;
-    } catch (const EStreamError& error) {
-        return error.Message();
-    }
-}
-
 bool TakeIn(TMusicDatabase& database, const QString& path, const ReadOptions& options, IntakeResult& result) {
-    TID3Tag record;
-    const QString reason = ReadSong(path, options, record);
-    if (!reason.isEmpty()) {
-        NoteUnreadable(reason, result);
+    const SongReading reading = ReadSong(path, options);
+    if (!reading.Succeeded()) {
+        NoteUnreadable(reading.Refusal.isEmpty() ? reading.Error : reading.Refusal + u": "_s + path, result);
         return false;
     }
-    if (database.AddEntry(path, record) >= 0) {
+    if (database.AddEntry(path, reading.Tag) >= 0) {
         ++result.Added;
         result.NewFiles << path;
         return true;
     }
-    if (database.IsBanned(record))
+    if (database.IsBanned(reading.Tag))
         ++result.Banned;
     else
         NoteUnreadable(u"Nicht aufgenommen: "_s + path, result);

@@ -99,17 +99,14 @@ QStringList AllPaths(const TMusicDatabase& database) {
 }
 
 void RereadSong(TMusicDatabase& database, const QString& path, UpdateResult& result) {
-    TID3Tag read;
-    try {
-        if (!ReadAudioFile(path, database.AudioReadOptions(), read).isEmpty()) return;
-    } catch (const EStreamError& error) {
-        result.Intake.UnreadableNames << path + u": "_s + error.Message();
+    SongReading reading = ReadSong(path, database.AudioReadOptions());
+    if (!reading.Error.isEmpty()) {
+        result.Intake.UnreadableNames << path + u": "_s + reading.Error;
         ++result.Intake.Unreadable;
-        return;
     }
     const TID3Tag* known = database.Songs().Find(path);
-    if (known == nullptr) return;
-    read = WithCollectionFields(std::move(read), *known);
+    if (!reading.Succeeded() || known == nullptr) return;
+    TID3Tag read = WithCollectionFields(std::move(reading.Tag), *known);
     if (SameSong(read, *known)) return;
     if (database.UpdateEntry(database.IndexOf(path), std::move(read)) >= 0) result.Changed << path;
 }
