@@ -4,6 +4,7 @@
 #include <QStringList>
 
 #include "MusicManagment/database/MusicManagment.h"
+#include "ReadMPEGHeader/SongFileKinds.h"
 
 // How songs enter the collection.
 
@@ -17,10 +18,6 @@ struct IntakeResult {
     QStringList NewFiles;         // in the order in which they were taken in
     QStringList UnreadableNames;  // each with the reason
 };
-
-// ".mp3;.mp2;.wma;.wav;": the extensions that make a file a song.
-QString AcceptedExtensions();
-bool IsSongFile(const QString& path);
 
 // Lets the user pick files (unless some are given), adds them and reports. What the user picks is read
 // whatever its extension. Each command here saves when AutoSave is -1, and throws EMusicDatabaseException
@@ -36,7 +33,7 @@ IntakeResult AddPaths(TMusicDatabase& database, const QStringList& paths, bool w
 
 // Adds every file of `list` inside a run that is already going; afterwards `list` holds only those taken in.
 // With `checkExisting` files that are in the collection are passed over. Every 5th file is a progress point,
-// where the user can stop. Returns how many were taken in.
+// where the user can stop; while a slow disk is waited for, too. Returns how many were taken in.
 int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
                 QStringList* newNames = nullptr, IntakeResult* result = nullptr);
 // Adds one file; -1 when it does not exist or could not be taken in.
