@@ -6,6 +6,7 @@
 #include "CommonRUKTools/BufferedSource.h"
 #include "CommonRUKTools/Clock.h"
 #include "CommonRUKTools/Errors.h"
+#include "ReadMPEGHeader/DerivedGenre.h"
 #include "ReadMPEGHeader/FileNameTag.h"
 #include "ReadMPEGHeader/Genres.h"
 #include "ReadMPEGHeader/ReadingProfile.h"
@@ -60,6 +61,7 @@ class AudioFileReading {
         CleanSources();
         MergeSources();
         if (result_.Genre == kNoGenre) result_.Genre = MainGenreGenre(result_.MainGenre);
+        if (options_.DeriveMainGenre && result_.MainGenre == 0) result_.MainGenre = DerivedMainGenre();
     }
 
  private:
@@ -176,6 +178,12 @@ class AudioFileReading {
         } else if (!wma_) {
             MergeTag(result_, fileName_, MergeMode::Tags);
         }
+    }
+
+    // The text of the genre says more than its number, where the tags come from an ID3v2 tag.
+    quint8 DerivedMainGenre() const {
+        if (HasTitleAndArtist(id3v2_) && id3v2_->MainGenre != 0) return id3v2_->MainGenre;
+        return MainGenreOfGenre(result_.Genre);
     }
 
     ByteSource& stream_;

@@ -19,6 +19,7 @@ struct ReadOptions {
     bool RemoveJunkTexts = false;       // discard titles and artists that are advertising or place-holders
     bool TakeTrackNumbers = false;      // a leading "(7)" of a title becomes the track
     QStringList ExcludedArtistFolders;  // names in capitals of folders that must not become an artist
+    bool DeriveMainGenre = false;       // from the tag's genre where the record has no main genre
     double FileTime = -1;               // day count for the record's AddTime; -1: now
     FrameListener OnFrame;              // called in the thread that reads
 };

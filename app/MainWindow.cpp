@@ -78,6 +78,7 @@ TTunesteadMainWnd::~TTunesteadMainWnd() = default;
 
 void TTunesteadMainWnd::SetUpDatabase() {
     database_.SetModernTags(true);
+    database_.SetDerivedGenres(true);
     database_.OnChange = [this](TMusicDatabase&, SongIndex index, TChangeType change) {
         totals_.SongChanged(index, change);
     };

@@ -15,6 +15,7 @@ FileInfo ReadInfo(const QString& path, ReadProfile profile) {
     FileInfo info;
     ReadOptions options;
     options.Profile = profile;
+    options.DeriveMainGenre = profile == ReadProfile::Modern;
     options.OnFrame = [&info](const FrameReport& frame) { info.Frames.push_back(frame); };
     info.Reading = ReadSong(path, options);
     if (info.Reading.Tag.FileName.isEmpty()) info.Reading.Tag.FileName = path;

@@ -5,6 +5,7 @@ using namespace Qt::StringLiterals;
 void PrepareDatabase(TMusicDatabase& database) {
     database.SetAsynchronous(false);
     database.SetModernTags(true);
+    database.SetDerivedGenres(true);
 }
 
 void ReadInto(TMusicDatabase& database, const QString& fileName, Console& console, StopBy stopBy) {

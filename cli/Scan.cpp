@@ -57,6 +57,7 @@ int RunScan(const Arguments& arguments, Console& console) {
     TMusicDatabase database;
     PrepareDatabase(database);
     database.SetModernTags(!arguments.Has(u"--classic"));
+    database.SetDerivedGenres(!arguments.Has(u"--classic"));
     const bool isNew = !FileSource::Exists(fileName);
     if (!isNew) ReadInto(database, fileName, console, StopBy::Interrupt);
 

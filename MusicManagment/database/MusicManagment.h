@@ -193,6 +193,10 @@ class TMusicDatabase : public QObject {
     // Whether files are read with the modern profile; off in a new component, switched on by the programs.
     bool ModernTags() const { return modernTags_; }
     void SetModernTags(bool value) { modernTags_ = value; }
+    // Whether a song that comes in without a main genre gets the one that its tag's genre belongs to; off in a
+    // new component, switched on by the programs.
+    bool DerivedGenres() const { return derivedGenres_; }
+    void SetDerivedGenres(bool value) { derivedGenres_ = value; }
 
     // Linked components; each reference clears itself when the other goes.
     QObject* PlayList() const { return playList_; }
@@ -325,6 +329,7 @@ class TMusicDatabase : public QObject {
     bool readOnly_ = false;
     bool renameAndMoveMP3s_ = true;
     bool modernTags_ = false;
+    bool derivedGenres_ = false;
 
     QPointer<QObject> playList_;
     QPointer<QObject> playSound_;

@@ -125,6 +125,7 @@ void ID3v2Frames::TakeGenre(FrameBody& body) {
     const GenreText genre = ParseGenre(rules_, body.Values());
     if (genre.Genre) tag_.Genre = *genre.Genre;
     if (genre.Remix) tag_.Remix = true;
+    tag_.MainGenre = genre.MainGenre;
 }
 
 void ID3v2Frames::TakeComment(FrameBody& body) {

@@ -52,6 +52,7 @@ TEST(ID3v2Modern, Version22HasShortFrames) {
     expected.Comment = u"Gut"_s;
     expected.Track = 4;
     expected.Genre = 9;
+    expected.MainGenre = 14;
     expected.Length = 60;
     expected.PlayCount = 5;
     EXPECT_EQ(outcome.Tag, expected);
