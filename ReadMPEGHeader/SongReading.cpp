@@ -141,7 +141,7 @@ class AudioFileReading {
         const auto frame =
             profile_.FindFirstFrame(stream_, [this](std::int64_t position) { return ReadTag(position); });
         if (!frame) return;
-        reading_.Mpeg = AnalyseMpegFrame(stream_, *frame, profile_.VbrHeaderFinder(), result_);
+        reading_.Mpeg = AnalyseMpegFrame(stream_, *frame, profile_.FrameRules(), result_);
         hasTechnicalData_ = true;
     }
 

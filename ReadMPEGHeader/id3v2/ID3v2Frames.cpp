@@ -65,7 +65,7 @@ ID3v2Frames::Effect ID3v2Frames::EffectOf(std::string_view id) {
 }
 
 bool ID3v2Frames::NeedsBody(std::string_view id) const {
-    return listener_ || EffectOf(id) != nullptr;
+    return listener_ || FillsRecord(id);
 }
 
 void ID3v2Frames::Take(std::string_view id, const QString& shownId, ByteSpan body) {

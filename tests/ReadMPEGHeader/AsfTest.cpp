@@ -96,15 +96,6 @@ TEST(Asf, TimesThatCannotBeAreNotTaken) {
     EXPECT_EQ(tagOf(UINT64_MAX, 0, 0, 0, AsfLength::AsStored).AddTime, 0);
 }
 
-TEST(Asf, EachChannelCountHasItsMode) {
-    const std::vector<std::pair<quint16, int>> cases = {{1, 1}, {2, 2}, {3, 0}, {4, 5}, {6, 6}, {8, 7}};
-    for (const auto& [channels, mode] : cases) {
-        TASFInfo info;
-        info.Channels = channels;
-        EXPECT_EQ(TagFromAsf(info, AsfLength::AsStored).ChannelMode, mode) << channels;
-    }
-}
-
 struct AttributeCase {
     Attributes attributes;
     const char16_t* year;

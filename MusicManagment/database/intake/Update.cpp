@@ -71,9 +71,10 @@ TID3Tag WithCollectionFields(TID3Tag read, const TID3Tag& known) {
     read.PlayCount = known.PlayCount;
     read.Reserved = known.Reserved;
     read.Flags = known.Flags;
-    read.MainGenre = known.MainGenre;
+    if ((known.Flags & sfLengthCorrect) != 0) read.Length = known.Length;
+    if (known.MainGenre != 0) read.MainGenre = known.MainGenre;
     read.AddTime = known.AddTime;
-    if (read.Genre == kNoGenre || read.Genre == MainGenreGenre(read.MainGenre)) read.Genre = known.Genre;
+    if (read.Genre == kNoGenre || read.Genre == MainGenreGenre(known.MainGenre)) read.Genre = known.Genre;
     return read;
 }
 
