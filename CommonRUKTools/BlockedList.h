@@ -3,12 +3,20 @@
 #include <algorithm>
 #include <cassert>
 #include <cstddef>
+#include <cstdint>
 #include <iterator>
 #include <vector>
 
+// For lists whose items need not know where they are.
+struct NoPlacement {
+    template <typename T>
+    static void Put(T&, std::uint32_t) {}
+};
+
 // A sequence with access by position in O(log blocks), and insertion and removal anywhere without moving the
-// whole sequence: it is kept in blocks of some 16 KiB.
-template <typename T>
+// whole sequence: it is kept in blocks of some 16 KiB. `Placement::Put` tells an item the number of the block
+// in which it lies, by which PositionIn finds it again.
+template <typename T, typename Placement = NoPlacement>
 class BlockedList {
  public:
     class const_iterator {
@@ -22,10 +30,10 @@ class BlockedList {
         const_iterator() = default;
         const_iterator(const BlockedList* list, std::size_t block, std::size_t offset)
             : list_(list), block_(block), offset_(offset) {}
-        reference operator*() const { return list_->blocks_[block_][offset_]; }
+        reference operator*() const { return list_->blocks_[block_].Items[offset_]; }
         pointer operator->() const { return &**this; }
         const_iterator& operator++() {
-            if (++offset_ == list_->blocks_[block_].size()) {
+            if (++offset_ == list_->blocks_[block_].Items.size()) {
                 ++block_;
                 offset_ = 0;
             }
@@ -51,16 +59,28 @@ class BlockedList {
 
     const T& operator[](std::size_t index) const {
         const auto block = BlockOf(index);
-        return blocks_[block][index - starts_[block]];
+        return blocks_[block].Items[index - starts_[block]];
     }
     T& operator[](std::size_t index) {
         const auto block = BlockOf(index);
-        return blocks_[block][index - starts_[block]];
+        return blocks_[block].Items[index - starts_[block]];
+    }
+
+    // Position of the item in block number `number` for which `isIt` is true; it must be there.
+    template <typename Predicate>
+    std::size_t PositionIn(std::uint32_t number, Predicate isIt) const {
+        const std::size_t block = placeOf_[number];
+        const auto& items = blocks_[block].Items;
+        const auto found = std::find_if(items.begin(), items.end(), isIt);
+        assert(found != items.end());
+        return starts_[block] + static_cast<std::size_t>(found - items.begin());
     }
 
     void clear() {
         blocks_.clear();
         starts_.clear();
+        placeOf_.clear();
+        freeNumbers_.clear();
         size_ = 0;
     }
 
@@ -69,12 +89,10 @@ class BlockedList {
     // Before the item at `index`; `index` may be size().
     void insert(std::size_t index, T item) {
         assert(index <= size_);
-        if (blocks_.empty()) {
-            blocks_.emplace_back();
-            starts_.push_back(0);
-        }
+        if (blocks_.empty()) InsertBlock(0, {}, 0);
         const auto block = index == size_ ? blocks_.size() - 1 : BlockOf(index);
-        auto& items = blocks_[block];
+        Placement::Put(item, blocks_[block].Number);
+        auto& items = blocks_[block].Items;
         items.insert(items.begin() + static_cast<std::ptrdiff_t>(index - starts_[block]), std::move(item));
         ++size_;
         for (std::size_t later = block + 1; later < starts_.size(); ++later)
@@ -85,15 +103,12 @@ class BlockedList {
     void removeAt(std::size_t index) {
         assert(index < size_);
         const auto block = BlockOf(index);
-        auto& items = blocks_[block];
+        auto& items = blocks_[block].Items;
         items.erase(items.begin() + static_cast<std::ptrdiff_t>(index - starts_[block]));
         --size_;
         for (std::size_t later = block + 1; later < starts_.size(); ++later)
             --starts_[later];
-        if (items.empty()) {
-            blocks_.erase(blocks_.begin() + static_cast<std::ptrdiff_t>(block));
-            starts_.erase(starts_.begin() + static_cast<std::ptrdiff_t>(block));
-        }
+        if (items.empty()) EraseBlock(block);
     }
 
     // Empties the list and returns its items in their order.
@@ -101,8 +116,8 @@ class BlockedList {
         std::vector<T> items;
         items.reserve(size_);
         for (auto& block : blocks_)
-            items.insert(items.end(), std::make_move_iterator(block.begin()),
-                         std::make_move_iterator(block.end()));
+            items.insert(items.end(), std::make_move_iterator(block.Items.begin()),
+                         std::make_move_iterator(block.Items.end()));
         clear();
         return items;
     }
@@ -112,9 +127,10 @@ class BlockedList {
         clear();
         for (std::size_t from = 0; from < items.size(); from += kBlockLimit / 2) {
             const auto to = std::min(items.size(), from + kBlockLimit / 2);
-            starts_.push_back(from);
-            blocks_.emplace_back(std::make_move_iterator(items.begin() + static_cast<std::ptrdiff_t>(from)),
-                                 std::make_move_iterator(items.begin() + static_cast<std::ptrdiff_t>(to)));
+            InsertBlock(blocks_.size(),
+                        {std::make_move_iterator(items.begin() + static_cast<std::ptrdiff_t>(from)),
+                         std::make_move_iterator(items.begin() + static_cast<std::ptrdiff_t>(to))},
+                        from);
         }
         size_ = items.size();
     }
@@ -129,21 +145,57 @@ class BlockedList {
         return static_cast<std::size_t>(next - starts_.begin()) - 1;
     }
 
+    struct Block {
+        std::vector<T> Items;
+        std::uint32_t Number;  // its own as long as it lives
+    };
+
+    void InsertBlock(std::size_t block, std::vector<T> items, std::size_t start) {
+        const std::uint32_t number = NewNumber();
+        for (T& item : items)
+            Placement::Put(item, number);
+        blocks_.insert(blocks_.begin() + static_cast<std::ptrdiff_t>(block), {std::move(items), number});
+        starts_.insert(starts_.begin() + static_cast<std::ptrdiff_t>(block), start);
+        NotePlacesFrom(block);
+    }
+
+    void EraseBlock(std::size_t block) {
+        freeNumbers_.push_back(blocks_[block].Number);
+        blocks_.erase(blocks_.begin() + static_cast<std::ptrdiff_t>(block));
+        starts_.erase(starts_.begin() + static_cast<std::ptrdiff_t>(block));
+        NotePlacesFrom(block);
+    }
+
+    std::uint32_t NewNumber() {
+        if (freeNumbers_.empty()) {
+            placeOf_.push_back(0);
+            return static_cast<std::uint32_t>(placeOf_.size() - 1);
+        }
+        const std::uint32_t number = freeNumbers_.back();
+        freeNumbers_.pop_back();
+        return number;
+    }
+
+    void NotePlacesFrom(std::size_t block) {
+        for (; block < blocks_.size(); ++block)
+            placeOf_[blocks_[block].Number] = block;
+    }
+
     void Split(std::size_t block) {
         // Appending (reading a file, adding at the end) leaves full blocks behind; elsewhere both halves get
         // room.
         const bool last = block + 1 == blocks_.size();
         const auto keep = last ? kBlockLimit - 1 : kBlockLimit / 2;
-        auto& items = blocks_[block];
+        auto& items = blocks_[block].Items;
         const auto cut = items.begin() + static_cast<std::ptrdiff_t>(keep);
         std::vector<T> tail(std::make_move_iterator(cut), std::make_move_iterator(items.end()));
         items.erase(cut, items.end());
-        const auto start = starts_[block] + keep;
-        blocks_.insert(blocks_.begin() + static_cast<std::ptrdiff_t>(block) + 1, std::move(tail));
-        starts_.insert(starts_.begin() + static_cast<std::ptrdiff_t>(block) + 1, start);
+        InsertBlock(block + 1, std::move(tail), starts_[block] + keep);
     }
 
-    std::vector<std::vector<T>> blocks_;
-    std::vector<std::size_t> starts_;  // position of each block's first item
+    std::vector<Block> blocks_;
+    std::vector<std::size_t> starts_;   // position of each block's first item
+    std::vector<std::size_t> placeOf_;  // where the block of each number stands
+    std::vector<std::uint32_t> freeNumbers_;
     std::size_t size_ = 0;
 };

@@ -1,6 +1,9 @@
 #include "CommonRUKTools/Dialogs.h"
 
+#include <algorithm>
 #include <cstdio>
+
+using namespace Qt::StringLiterals;
 
 namespace {
 
@@ -9,9 +12,9 @@ class SilentDialogs : public Dialogs {
     void ShowMessage(MessageKind, const QString& text) override {
         std::fprintf(stderr, "%s\n", text.toUtf8().constData());
     }
-    int Ask(const QString& text, const QStringList&, int cancelButton) override {
-        std::fprintf(stderr, "%s\n", text.toUtf8().constData());
-        return cancelButton;
+    int Ask(const Question& question) override {
+        std::fprintf(stderr, "%s\n", question.Text.toUtf8().constData());
+        return question.Cancel;
     }
     std::optional<QString> Input(const QString&, const QString&, const QStringList&,
                                  const QString&) override {
@@ -29,6 +32,17 @@ Dialogs*& Installed() {
 }
 
 }  // namespace
+
+bool Report::HasComplaints() const {
+    return std::ranges::any_of(Sections, &ReportSection::Complaint);
+}
+
+void Dialogs::ShowReport(const Report& report) {
+    constexpr int kOk = 0;
+    constexpr int kDetails = 1;
+    const int answer = Ask({.Text = report.Message, .Buttons = {u"OK"_s, u"Details"_s}, .Cancel = kOk});
+    if (answer == kDetails && report.OpenAsText) report.OpenAsText();
+}
 
 Dialogs& UserDialogs() {
     static SilentDialogs silent;

@@ -2,7 +2,9 @@
 
 #include <QString>
 #include <QStringList>
+#include <functional>
 #include <optional>
+#include <vector>
 
 // The engine's way to the user. The desktop program answers with windows, the command line at the terminal, a
 // test with a script.
@@ -17,13 +19,43 @@ struct FileDialogOptions {
     bool ConfirmOverwrite = false;
 };
 
+// Buttons are named by their place. Captions are plain: letters to reach them by are the dialog's business.
+struct Question {
+    QString Text;
+    QStringList Buttons;
+    int Cancel = 0;  // the answer when the dialog is closed in another way
+    // The answer of the Return key; Cancel unless another is named. Never one that destroys something.
+    std::optional<int> Default{};
+
+    int DefaultButton() const { return Default.value_or(Cancel); }
+};
+
+// One kind of thing that a report tells of: the songs that are new, the files that could not be read.
+struct ReportSection {
+    QString Caption;
+    QStringList Lines;
+    bool Complaint = false;  // something that did not go as the user wished
+};
+
+// What came of a command that handled many things.
+struct Report {
+    QString Message;  // the sum of it in a sentence
+    std::vector<ReportSection> Sections;
+    // Opens the report as a text; may be called long after the command has ended.
+    std::function<void()> OpenAsText;
+
+    bool HasComplaints() const;
+};
+
 class Dialogs {
  public:
     virtual ~Dialogs() = default;
 
     virtual void ShowMessage(MessageKind kind, const QString& text) = 0;
-    // The index of the chosen button; `cancelButton` when the dialog is closed in another way.
-    virtual int Ask(const QString& text, const QStringList& buttons, int cancelButton) = 0;
+    // The place of the chosen button.
+    virtual int Ask(const Question& question) = 0;
+    // Unless dialogs know better, the message with a button that opens the text.
+    virtual void ShowReport(const Report& report);
     // The text entered or chosen; nothing on cancel. With choices the text is one of them.
     virtual std::optional<QString> Input(const QString& caption, const QString& prompt,
                                          const QStringList& choices, const QString& preset) = 0;

@@ -43,23 +43,25 @@ class Listeners {
     // `listener` is told from the next time on.
     [[nodiscard]] Subscription Subscribe(Listener listener) {
         auto kept = std::make_shared<Listener>(std::move(listener));
-        std::erase_if(listeners_, [](const auto& gone) { return gone.expired(); });
-        listeners_.push_back(kept);
+        // Whoever is being told just now goes on with the list as it was.
+        auto list = std::make_shared<List>(*list_);
+        std::erase_if(*list, [](const auto& gone) { return gone.expired(); });
+        list->push_back(kept);
+        list_ = std::move(list);
         return Subscription(kept);
     }
 
     void Tell(Arguments... arguments) const {
-        // A copy: the list, and what holds it, may change or go meanwhile.
-        const auto told = listeners_;
-        for (const auto& each : told)
+        const auto told = list_;
+        for (const auto& each : *told)
             if (const auto listener = each.lock()) (*listener)(arguments...);
     }
 
     bool Empty() const {
-        return std::all_of(listeners_.begin(), listeners_.end(),
-                           [](const auto& gone) { return gone.expired(); });
+        return std::all_of(list_->begin(), list_->end(), [](const auto& gone) { return gone.expired(); });
     }
 
  private:
-    std::vector<std::weak_ptr<Listener>> listeners_;
+    using List = std::vector<std::weak_ptr<Listener>>;
+    std::shared_ptr<const List> list_ = std::make_shared<List>();
 };

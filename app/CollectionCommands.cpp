@@ -22,7 +22,8 @@ bool SavedOrGivenUp(const std::function<bool()>& save, const QString& loss) {
         return false;
     } catch (const ERukException& error) {
         const QString question = error.Message() + u"\n\n"_s + loss + u" Trotzdem beenden?"_s;
-        return UserDialogs().Ask(question, {u"Beenden"_s, u"Abbrechen"_s}, 1) == 0;
+        return UserDialogs().Ask(
+                   {.Text = question, .Buttons = {u"Beenden"_s, u"Abbrechen"_s}, .Cancel = 1}) == 0;
     }
 }
 
@@ -105,7 +106,8 @@ bool CollectionCommands::KeepChanges() {
                              ? u"Die neue Datenbank"_s
                              : u"Die Datenbank "_s + QDir::toNativeSeparators(database_.FileName());
     const QString question = name + u" enthält Änderungen. Sollen sie gespeichert werden?"_s;
-    const int answer = UserDialogs().Ask(question, {u"Ja"_s, u"Nein"_s, u"Abbrechen"_s}, 2);
+    const int answer = UserDialogs().Ask(
+        {.Text = question, .Buttons = {u"Ja"_s, u"Nein"_s, u"Abbrechen"_s}, .Cancel = 2, .Default = 0});
     if (answer == 0) return SaveCurrent();
     return answer == 1;
 }

@@ -18,7 +18,6 @@
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/database/commands/Settings.h"
-#include "MusicManagment/database/intake/Intake.h"
 #include "MusicManagment/database/intake/IntakeReport.h"
 #include "app/ArrangementCommands.h"
 #include "app/CommandMenu.h"
@@ -79,11 +78,8 @@ TTunesteadMainWnd::~TTunesteadMainWnd() = default;
 void TTunesteadMainWnd::SetUpDatabase() {
     database_.SetModernTags(true);
     database_.SetDerivedGenres(true);
-    database_.OnChange = [this](TMusicDatabase&, SongIndex index, TChangeType change) {
-        totals_.SongChanged(index, change);
-    };
     progress_.OnRunning = [this](bool running) { RunningChanged(running); };
-    commands_.OnIntake = [this](const IntakeResult& result) { ShowIntake(result); };
+    commands_.OnIntake = &ReportIntake;
     const auto follow = [this] { ListChanged(); };
     connect(&songs_, &QAbstractItemModel::modelReset, this, follow);
     connect(&songs_, &QAbstractItemModel::rowsInserted, this, follow);
@@ -273,12 +269,6 @@ void TTunesteadMainWnd::ListChanged() {
     wanted->setFocus();
 }
 
-// A box only where there is something to worry about.
-void TTunesteadMainWnd::ShowIntake(const IntakeResult& result) {
-    statusBar()->showMessage(IntakeMessage(result));
-    if (result.Unreadable > 0) ReportIntake(result);
-}
-
 void TTunesteadMainWnd::FindNext() {
     const QString text = filter_->SearchText();
     if (text.isEmpty()) return filter_->Activate();
@@ -341,8 +331,9 @@ void TTunesteadMainWnd::End() {
 
 void TTunesteadMainWnd::OfferToStop() {
     const int answer = UserDialogs().Ask(
-        u"Es wird noch eine Aktion ausgeführt. Brechen Sie diese zuerst ab, bevor Sie das Programm beenden. "
-        "Aktion jetzt abbrechen?"_s,
-        {u"Ja"_s, u"Nein"_s}, 1);
+        {.Text = u"Es wird noch eine Aktion ausgeführt. Brechen Sie diese zuerst ab, bevor Sie das Programm "
+                 "beenden. Aktion jetzt abbrechen?"_s,
+         .Buttons = {u"Ja"_s, u"Nein"_s},
+         .Cancel = 1});
     if (answer == 0) database_.RequestAbort();
 }

@@ -81,7 +81,6 @@ class TTunesteadMainWnd : public QMainWindow {
     void StartOnce();
     void RunningChanged(bool running);
     void ListChanged();
-    void ShowIntake(const IntakeResult& result);
     void OfferToStop();
 
     const MainWindowOptions options_;

@@ -77,7 +77,8 @@ void SongCommands::RemoveChosen() {
                                        u"\" aus der Datenbank entfernt werden? Die Datei bleibt erhalten."_s
                                  : u"Sollen "_s + SongCountText(songs.size()) +
                                        u" aus der Datenbank entfernt werden? Die Dateien bleiben erhalten."_s;
-    if (UserDialogs().Ask(question, {u"Entfernen"_s, u"Abbrechen"_s}, 1) != 0) return;
+    if (UserDialogs().Ask({.Text = question, .Buttons = {u"Entfernen"_s, u"Abbrechen"_s}, .Cancel = 1}) != 0)
+        return;
     RemovedSongs removed = RemoveSongs(database_, songs);
     if (removed.empty()) return;
     Tell(SongCountText(removed.size()) + u" aus der Datenbank entfernt."_s);

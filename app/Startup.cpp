@@ -56,11 +56,12 @@ bool Startup::OpenStandardDatabase() {
     const bool complete = !QFileInfo::exists(path) || ReadStandardDatabase();
     if (!complete) {
         const int answer = UserDialogs().Ask(
-            u"Die Standard-Datenbank wurde nicht komplett importiert. Wenn Sie nun fortfahren, wird beim "
-            "Beenden die Standard-Datenbank auf der Festplatte mit der nur halb importierten überschrieben "
-            "=> "
-            "Die noch nicht importierten Songs gehen (in der Datenbank) verloren. Trotzdem fortfahren?"_s,
-            {u"Ja"_s, u"Nein"_s}, 1);
+            {.Text = u"Die Standard-Datenbank wurde nicht komplett importiert. Wenn Sie nun fortfahren, wird "
+                     "beim Beenden die Standard-Datenbank auf der Festplatte mit der nur halb importierten "
+                     "überschrieben => Die noch nicht importierten Songs gehen (in der Datenbank) verloren. "
+                     "Trotzdem fortfahren?"_s,
+             .Buttons = {u"Ja"_s, u"Nein"_s},
+             .Cancel = 1});
         if (answer != 0) {
             database_.Clear();  // so that the half of it is not saved
             return false;
@@ -129,6 +130,8 @@ void Startup::OpenFile(FileKind kind, const QString& path) {
 
 void Startup::OfferDatabase(const QString& path) {
     const QString question = u"Soll diese Datenbank nun geladen werden:\r\n"_s + path;
-    if (UserDialogs().Ask(question, {u"Ja"_s, u"Nein"_s}, 1) != 0) return;
+    const int answer =
+        UserDialogs().Ask({.Text = question, .Buttons = {u"Ja"_s, u"Nein"_s}, .Cancel = 1, .Default = 0});
+    if (answer != 0) return;
     RunCommand([&] { commands_.OpenFile(path); });
 }

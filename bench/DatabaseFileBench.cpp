@@ -27,7 +27,7 @@ constexpr std::size_t kBuffer = std::size_t{256} * 1024;
 void Fill(TMusicDatabase& database, int count) {
     database.BeginLoading();
     for (TID3Tag& song : MakeFakeSongs(count))
-        database.AddEntry(QString(), std::move(song), {.SkipChecks = true});
+        database.AddEntry(QString(), std::move(song), AddAs::Loaded);
     database.EndLoading();
     database.Resort();
     database.RecountGroups();

@@ -22,7 +22,7 @@ struct Window {
     Window() {
         database.BeginLoading();
         for (const TID3Tag& song : MakeFakeSongs(kSongs))
-            database.AddEntry(QString(), song, {.SkipChecks = true});
+            database.AddEntry(QString(), song, AddAs::Loaded);
         database.EndLoading();
         database.SetSortType(stTitle);
         songs.SyncViews();

@@ -83,7 +83,7 @@ void Sort(benchmark::State& state, void (*sort)(Entries&)) {
 void FillCollection(TMusicDatabase& database) {
     database.BeginLoading();
     for (std::size_t i = 0; i < kSongs; ++i)
-        database.AddEntry(QString(), Songs()[i], {.SkipChecks = true});
+        database.AddEntry(QString(), Songs()[i], AddAs::Loaded);
     database.EndLoading();
     database.EnsureSorted();
 }
@@ -93,7 +93,7 @@ void TakeOneSongIn(benchmark::State& state) {
     FillCollection(database);
     std::size_t next = kSongs;
     for (auto _ : state)
-        benchmark::DoNotOptimize(database.AddEntry(QString(), Songs()[next++], {.SkipChecks = true}));
+        benchmark::DoNotOptimize(database.AddEntry(QString(), Songs()[next++], AddAs::Loaded));
 }
 
 BENCHMARK_CAPTURE(Sort, SortSongs, SortSongsInPlace)->Unit(benchmark::kMillisecond)->Iterations(4);

@@ -25,7 +25,7 @@ constexpr int kRuns = 5;
 constexpr int kWaitLimit = 60'000;  // milliseconds
 
 // Without it paths of songs that are not there would be looked for on the disk.
-constexpr AddOptions kAsItIs{.SkipChecks = true};
+constexpr AddAs kAsItIs = AddAs::Loaded;
 
 void SaveCollection(const StandardFiles& files, int songs) {
     TMusicDatabase database;

@@ -30,10 +30,13 @@ std::optional<QString> TerminalDialogs::ReadLine(const QString& prompt) {
     return CodePage::FromSystem(AsBytes({line.constData(), static_cast<std::size_t>(line.size())}));
 }
 
-std::optional<int> TerminalDialogs::Choose(const QStringList& choices, const QString& prompt) {
+std::optional<int> TerminalDialogs::Choose(const QStringList& choices, const QString& prompt,
+                                           std::optional<int> preset) {
     for (qsizetype i = 0; i < choices.size(); ++i)
         Print(u"  %1) %2\n"_s.arg(i + 1).arg(choices[i]));
-    const auto answer = ReadLine(prompt);
+    const QString hint = preset ? u" [%1]"_s.arg(*preset + 1) : QString();
+    const auto answer = ReadLine(prompt + hint + u": "_s);
+    if (answer && answer->isEmpty()) return preset;
     const int number = answer ? answer->toInt() : 0;
     return number >= 1 && number <= choices.size() ? std::optional<int>(number - 1) : std::nullopt;
 }
@@ -50,16 +53,16 @@ void TerminalDialogs::ShowMessage(MessageKind, const QString& text) {
     Print(text + u'\n');
 }
 
-int TerminalDialogs::Ask(const QString& text, const QStringList& buttons, int cancelButton) {
-    Print(text + u'\n');
-    return Choose(buttons, u"Auswahl: "_s).value_or(cancelButton);
+int TerminalDialogs::Ask(const Question& question) {
+    Print(question.Text + u'\n');
+    return Choose(question.Buttons, u"Auswahl"_s, question.DefaultButton()).value_or(question.Cancel);
 }
 
 std::optional<QString> TerminalDialogs::Input(const QString& caption, const QString& prompt,
                                               const QStringList& choices, const QString& preset) {
     Print(caption + u'\n');
     if (choices.isEmpty()) return AskForPath(prompt, preset);
-    const auto choice = Choose(choices, prompt + u": "_s);
+    const auto choice = Choose(choices, prompt);
     return choice ? std::optional<QString>(choices[*choice]) : std::nullopt;
 }
 
@@ -75,7 +78,8 @@ QStringList TerminalDialogs::OpenFiles(const FileDialogOptions& options) {
 std::optional<QString> TerminalDialogs::SaveFile(const FileDialogOptions& options) {
     auto path = AskForPath(options.Title, options.Preset);
     if (!path || !options.ConfirmOverwrite || !QFileInfo::exists(*path)) return path;
-    const int answer = Ask(*path + u" überschreiben?"_s, {u"Ja"_s, u"Nein"_s}, 1);
+    const int answer =
+        Ask({.Text = *path + u" überschreiben?"_s, .Buttons = {u"Ja"_s, u"Nein"_s}, .Cancel = 1});
     return answer == 0 ? path : std::nullopt;
 }
 

@@ -12,7 +12,7 @@ class TerminalDialogs : public Dialogs {
     TerminalDialogs(std::FILE* questions, std::FILE* answers) : questions_(questions), answers_(answers) {}
 
     void ShowMessage(MessageKind kind, const QString& text) override;
-    int Ask(const QString& text, const QStringList& buttons, int cancelButton) override;
+    int Ask(const Question& question) override;
     std::optional<QString> Input(const QString& caption, const QString& prompt, const QStringList& choices,
                                  const QString& preset) override;
     std::optional<QString> OpenFile(const FileDialogOptions& options) override;
@@ -24,8 +24,10 @@ class TerminalDialogs : public Dialogs {
     void Print(const QString& text);
     // Nothing at the end of the input.
     std::optional<QString> ReadLine(const QString& prompt);
-    // A number of a list that is shown from 1; nothing when the answer is none of them.
-    std::optional<int> Choose(const QStringList& choices, const QString& prompt);
+    // A number of a list that is shown from 1; an empty line takes `preset`. Nothing when the answer is none
+    // of them.
+    std::optional<int> Choose(const QStringList& choices, const QString& prompt,
+                              std::optional<int> preset = std::nullopt);
     std::optional<QString> AskForPath(const QString& caption, const QString& preset);
 
     std::FILE* questions_;

@@ -2,7 +2,6 @@
 
 #include <deque>
 #include <utility>
-#include <vector>
 
 #include "CommonRUKTools/Dialogs.h"
 
@@ -10,33 +9,33 @@
 // its own lifetime. What nothing is put ready for is cancelled.
 class ScriptedDialogs : public Dialogs {
  public:
-    struct Question {
-        QString Text;
-        QStringList Buttons;
-    };
-
     ScriptedDialogs() { SetUserDialogs(this); }
     ~ScriptedDialogs() override { SetUserDialogs(nullptr); }
 
-    // Answers, each given once.
-    std::deque<int> Buttons;
+    // Each is given once.
+    std::deque<int> Answers;  // places of buttons
     std::deque<QString> Inputs;
-    std::deque<QStringList>
-        Files;  // for every dialog that asks for a file; one that takes one takes the first
+    std::deque<QStringList> Files;  // a dialog for one file takes the first
     std::deque<QString> Folders;
 
     // What was said and asked.
-    std::vector<std::pair<MessageKind, QString>> Messages;
-    std::vector<Question> Questions;
+    QStringList Messages;
+    std::vector<MessageKind> MessageKinds;
+    QStringList Questions;
+    std::vector<Question> Asked;  // the same with their buttons
     QStringList Prompts;
     std::vector<FileDialogOptions> FileDialogs;
     QStringList FolderCaptions;
     QStringList StartFolders;
 
-    void ShowMessage(MessageKind kind, const QString& text) override { Messages.emplace_back(kind, text); }
-    int Ask(const QString& text, const QStringList& buttons, int cancelButton) override {
-        Questions.push_back({text, buttons});
-        return Next(Buttons).value_or(cancelButton);
+    void ShowMessage(MessageKind kind, const QString& text) override {
+        Messages << text;
+        MessageKinds.push_back(kind);
+    }
+    int Ask(const Question& question) override {
+        Questions << question.Text;
+        Asked.push_back(question);
+        return Next(Answers).value_or(question.Cancel);
     }
     std::optional<QString> Input(const QString&, const QString& prompt, const QStringList&,
                                  const QString&) override {

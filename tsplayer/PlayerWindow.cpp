@@ -90,9 +90,9 @@ void PlayerWindow::ShowMessage(MessageKind, const QString& text) {
     show();
 }
 
-int PlayerWindow::Ask(const QString& text, const QStringList&, int cancelButton) {
-    ShowMessage(MessageKind::Warning, text);
-    return cancelButton;
+int PlayerWindow::Ask(const Question& question) {
+    ShowMessage(MessageKind::Warning, question.Text);
+    return question.Cancel;
 }
 
 std::optional<QString> PlayerWindow::Input(const QString&, const QString& prompt, const QStringList&,

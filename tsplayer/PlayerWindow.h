@@ -25,7 +25,7 @@ class PlayerWindow : public QWidget, public PlayerPanel, public Dialogs {
 
     // Dialogs: a message brings the window to light; whatever is asked is cancelled.
     void ShowMessage(MessageKind kind, const QString& text) override;
-    int Ask(const QString& text, const QStringList& buttons, int cancelButton) override;
+    int Ask(const Question& question) override;
     std::optional<QString> Input(const QString& caption, const QString& prompt, const QStringList& choices,
                                  const QString& preset) override;
     std::optional<QString> OpenFile(const FileDialogOptions& options) override;

@@ -122,16 +122,28 @@ void GroupLists::Clear() {
     genres_.fill(0);
 }
 
-void GroupLists::Add(const TID3Tag& song, GroupListener* listener) {
+void GroupLists::Add(const TID3Tag& song) {
     for (const TOVType type : kTextTypes)
-        CountUp(type, GroupCaption(type, song), listener);
-    CountGenre(song, 1, listener);
+        CountUp(type, GroupCaption(type, song));
+    CountGenre(GenreRowOf(song), 1);
 }
 
-void GroupLists::Remove(const TID3Tag& song, GroupListener* listener) {
+void GroupLists::Remove(const TID3Tag& song) {
     for (const TOVType type : kTextTypes)
-        CountDown(type, GroupCaption(type, song), listener);
-    CountGenre(song, -1, listener);
+        CountDown(type, GroupCaption(type, song));
+    CountGenre(GenreRowOf(song), -1);
+}
+
+void GroupLists::Change(const TID3Tag& before, const TID3Tag& after) {
+    for (const TOVType type : kTextTypes) {
+        const QString caption = GroupCaption(type, after);
+        if (caption == GroupCaption(type, before)) continue;
+        CountDown(type, GroupCaption(type, before));
+        CountUp(type, caption);
+    }
+    if (GenreRowOf(before) == GenreRowOf(after)) return;
+    CountGenre(GenreRowOf(before), -1);
+    CountGenre(GenreRowOf(after), 1);
 }
 
 void GroupLists::AddRow(TOVType type, const QString& caption, int count) {
@@ -158,37 +170,33 @@ int GroupLists::RowSongCount(TOVType type, int row) const {
     return type == ovGenre ? genres_[static_cast<std::size_t>(row)] : lists_[type].At(row).Number;
 }
 
-void GroupLists::CountUp(TOVType type, const QString& caption, GroupListener* listener) {
+void GroupLists::CountUp(TOVType type, const QString& caption) {
     SortedTextList& list = lists_[type];
     const int before = list.Count();
     const int row = list.Insert(caption, 1);
-    if (list.Count() > before) {
-        if (listener != nullptr) listener->RowInserted(type, row, caption, 1);
-        return;
-    }
-    list.SetNumber(row, list.At(row).Number + 1);
-    if (listener != nullptr) listener->RowUpdated(type, row, list.At(row).Number);
+    if (list.Count() > before) return events_.Inserted.Tell(type, row, caption, 1);
+    const int count = list.At(row).Number + 1;
+    list.SetNumber(row, count);
+    events_.Updated.Tell(type, row, count);
 }
 
-void GroupLists::CountDown(TOVType type, const QString& caption, GroupListener* listener) {
+void GroupLists::CountDown(TOVType type, const QString& caption) {
     SortedTextList& list = lists_[type];
     const int row = list.IndexOf(caption);
     if (row < 0) return;  // the lists came from a file that counted differently
     const int left = list.At(row).Number - 1;
     if (left > 0) {
         list.SetNumber(row, left);
-        if (listener != nullptr) listener->RowUpdated(type, row, left);
-        return;
+        return events_.Updated.Tell(type, row, left);
     }
     list.RemoveAt(row);
-    if (listener != nullptr) listener->RowDeleted(type, row);
+    events_.Deleted.Tell(type, row);
 }
 
-void GroupLists::CountGenre(const TID3Tag& song, int change, GroupListener* listener) {
-    const int row = GenreRowOf(song);
+void GroupLists::CountGenre(int row, int change) {
     int& count = genres_[static_cast<std::size_t>(row)];
     count = std::max(0, count + change);
-    if (listener != nullptr) listener->RowUpdated(ovGenre, row, count);
+    events_.Updated.Tell(ovGenre, row, count);
 }
 
 void GroupTally::Add(const TID3Tag& song) {

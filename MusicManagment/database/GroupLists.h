@@ -4,6 +4,7 @@
 #include <QString>
 #include <array>
 
+#include "CommonRUKTools/Listeners.h"
 #include "CommonRUKTools/SortedTextList.h"
 #include "MusicManagment/database/SongTypes.h"
 #include "ReadMPEGHeader/Genres.h"
@@ -32,13 +33,12 @@ class TLengthList : public SortedTextList {
     TLengthList();
 };
 
-// Is told each change of a row.
-class GroupListener {
- public:
-    virtual ~GroupListener() = default;
-    virtual void RowInserted(TOVType type, int row, const QString& caption, int count) = 0;
-    virtual void RowDeleted(TOVType type, int row) = 0;
-    virtual void RowUpdated(TOVType type, int row, int count) = 0;
+// What happens to the rows of the lists.
+struct GroupEvents {
+    Listeners<TOVType, int, const QString&, int> Inserted;  // row, caption, number of songs
+    Listeners<TOVType, int> Deleted;                        // row
+    Listeners<TOVType, int, int> Updated;                   // row, number of songs
+    Listeners<> Rebuilt;                                    // all of them
 };
 
 // The five summary lists: how many songs each artist, album, year bucket, length bucket and main genre has.
@@ -46,10 +46,17 @@ class GroupLists {
  public:
     GroupLists();
 
+    GroupEvents& Events() { return events_; }
+
+    // Nobody is told of a Clear and of added rows until TellRebuilt.
     void Clear();  // genre rows stay, with count 0
-    // Counts a song in or out; `listener` may be nullptr.
-    void Add(const TID3Tag& song, GroupListener* listener);
-    void Remove(const TID3Tag& song, GroupListener* listener);
+    void TellRebuilt() const { events_.Rebuilt.Tell(); }
+
+    // Counts a song in or out.
+    void Add(const TID3Tag& song);
+    void Remove(const TID3Tag& song);
+    // The same for a song that changes; rows in which it stays are left alone.
+    void Change(const TID3Tag& before, const TID3Tag& after);
 
     // Rows as a database file gives them; a text that is there already adds to its number. A number that no
     // collection can reach is taken as the nearest that one can.
@@ -68,12 +75,13 @@ class GroupLists {
     int RowSongCount(TOVType type, int row) const;
 
  private:
-    void CountUp(TOVType type, const QString& caption, GroupListener* listener);
-    void CountDown(TOVType type, const QString& caption, GroupListener* listener);
-    void CountGenre(const TID3Tag& song, int change, GroupListener* listener);
+    void CountUp(TOVType type, const QString& caption);
+    void CountDown(TOVType type, const QString& caption);
+    void CountGenre(int row, int change);
 
     std::array<SortedTextList, 4> lists_;
     GenreCounts genres_{};
+    GroupEvents events_;
 };
 
 // Counts many songs at once: a row is looked for once for each caption instead of once for each song.

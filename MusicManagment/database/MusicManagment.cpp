@@ -9,7 +9,6 @@
 #include "CommonRUKTools/Collation.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/FileSource.h"
-#include "MusicManagment/database/Views.h"
 #include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/database/intake/BannList.h"
 #include "MusicManagment/database/songfiles/RecycleBin.h"
@@ -62,33 +61,8 @@ void KeepLastOfEachSerial(std::vector<CdName>& names) {
 
 }  // namespace
 
-// Turns changes of the group lists into the database's events.
-class TMusicDatabase::GroupEvents : public GroupListener {
- public:
-    explicit GroupEvents(TMusicDatabase& database) : database_(database) {}
-
-    void RowInserted(TOVType type, int row, const QString& caption, int count) override {
-        if (database_.OnOverviewInsert) database_.OnOverviewInsert(database_, type, row, caption, count);
-        if (database_.overviewView_ != nullptr)
-            database_.overviewView_->OverviewInserted(type, row, caption, count);
-    }
-    void RowDeleted(TOVType type, int row) override {
-        if (database_.OnOverviewDelete) database_.OnOverviewDelete(database_, type, row);
-        if (database_.overviewView_ != nullptr) database_.overviewView_->OverviewDeleted(type, row);
-    }
-    void RowUpdated(TOVType type, int row, int count) override {
-        if (database_.OnOverviewUpdate) database_.OnOverviewUpdate(database_, type, row, count);
-        if (database_.overviewView_ != nullptr) database_.overviewView_->OverviewUpdated(type, row, count);
-    }
-
- private:
-    TMusicDatabase& database_;
-};
-
-TMusicDatabase::TMusicDatabase(QObject* parent)
-    : QObject(parent),
-      groupEvents_(std::make_unique<GroupEvents>(*this)),
-      mp3NamePattern_(u"%ARTIST% - %TITLE%"_s) {
+TMusicDatabase::TMusicDatabase(QObject* parent) : QObject(parent), mp3NamePattern_(u"%ARTIST% - %TITLE%"_s) {
+    SubscribeSlots();
     caption_ = u"MusicDatabase v6.0"_s;
     SetMP3MoveRootDir(QStandardPaths::writableLocation(QStandardPaths::MusicLocation));
     // The list of an earlier version, which a component has until settings are loaded; the setter adds the
@@ -105,7 +79,7 @@ TMusicDatabase::~TMusicDatabase() = default;
 
 SongIndex TMusicDatabase::IndexOf(const QString& fileName) const {
     const TID3Tag* record = songs_.Find(fileName);
-    return record != nullptr ? songs_.PositionOf(record) : -1;
+    return record != nullptr ? songs_.PositionOf(*record) : -1;
 }
 
 TID3Tag TMusicDatabase::GetEntry(SongIndex index, const QString& fileName) const {
@@ -141,8 +115,7 @@ void TMusicDatabase::MarkSong(SongIndex index) {
 }
 
 // The looks at the disk and at the ban list before a song is taken in.
-bool TMusicDatabase::Accepts(const TID3Tag& record, const AddOptions& options) {
-    if (options.SkipChecks || options.SkipDiskChecks) return true;
+bool TMusicDatabase::Accepts(const TID3Tag& record) {
     const QString path = ResolveSongPath(record.FileName, kOriginalOnly);
     if (!path.isEmpty() && !FileSource::Exists(path)) return false;
     if (!IsBanned(record)) return true;
@@ -150,65 +123,81 @@ bool TMusicDatabase::Accepts(const TID3Tag& record, const AddOptions& options) {
     return false;
 }
 
-SongIndex TMusicDatabase::AddEntry(const QString& fileName, TID3Tag record, const AddOptions& options) {
-    if (!fileName.isEmpty()) record.FileName = fileName;
-    return AddEntry(std::make_unique<TID3Tag>(std::move(record)), options);
-}
-
-SongIndex TMusicDatabase::AddEntry(std::unique_ptr<TID3Tag> entry, const AddOptions& options) {
+SongIndex TMusicDatabase::AddEntry(const QString& fileName, TID3Tag record, AddAs as) {
     if (Busy() || (readOnly_ && !Loading())) return -1;
-    if (entry->MainGenre > kHighestGenre) entry->MainGenre = 0;
-    if (options.CountOnly) {
-        if (!options.KeepModified) SetModified(true);
-        groups_.Add(*entry, groupEvents_.get());
+    if (!fileName.isEmpty()) record.FileName = fileName;
+    if (record.MainGenre > kHighestGenre) record.MainGenre = 0;
+    const bool fromFile = as == AddAs::Loaded || as == AddAs::LoadedUncounted;
+    if (as == AddAs::CountedOnly) {
+        SetModified(true);
+        groups_.Add(record);
         return -1;
     }
-    if (!Accepts(*entry, options)) return -1;
+    if ((as == AddAs::New || as == AddAs::LoadedUncounted) && !Accepts(record)) return -1;
 
-    if (!options.KeepModified) SetModified(true);
+    if (!fromFile) SetModified(true);
     if (!Loading()) EnsureSorted();
-    entry->AddTime = ValidAddTime(entry->AddTime);
-    entry->MainGenre = ValidMainGenre(entry->MainGenre);
-    const TID3Tag& added = *entry;
-    songs_.Append(std::move(entry));
-    if (!options.SkipChecks) groups_.Add(added, groupEvents_.get());
-    SongIndex index = Count() - 1;
-    if (Loading()) return index;
-    index = Replace(index);
-    if (!options.SkipChecks) RaiseChange(index, ctInserted);
+    record.AddTime = ValidAddTime(record.AddTime);
+    record.MainGenre = ValidMainGenre(record.MainGenre);
+    const SongHandle song = songs_.Append(std::move(record));
+    if (as != AddAs::Loaded) groups_.Add(*songs_.Find(song));
+    if (Loading()) return Count() - 1;
+    const SongIndex index = Replace(Count() - 1);
+    if (as != AddAs::Loaded) events_.Inserted.Tell(index);
     return index;
 }
 
-SongIndex TMusicDatabase::AddSong(const QString& path, const SongOverrides& overrides,
-                                  const AddOptions& options) {
+SongIndex TMusicDatabase::AddSong(const QString& path, const SongOverrides& overrides, AddAs as) {
     const QString resolved = ResolveSongPath(path, kOriginalOnly);
     TID3Tag record;
     if (!ReadAudioFile(resolved, AudioReadOptions(), record).isEmpty()) return -1;
     ApplyOverrides(overrides, record);
-    return AddEntry(path, std::move(record), options);
+    return AddEntry(path, std::move(record), as);
 }
 
 SongIndex TMusicDatabase::UpdateEntry(SongIndex index, TID3Tag record) {
-    if (Busy() || readOnly_ || index < 0 || index >= Count()) return -1;
-    record.MainGenre = ValidMainGenre(record.MainGenre);
+    if (!TakesChanges() || index < 0 || index >= Count()) return -1;
+    const SongHandle song = songs_.HandleOf(index);
     EnsureSorted();
-    groups_.Remove(Song(index), groupEvents_.get());
-    groups_.Add(record, groupEvents_.get());
-    songs_.Set(index, std::move(record));
-    SetModified(true);
-    const SongIndex place = Replace(index);
-    if (place != index && songListView_ != nullptr) songListView_->SongMoved(index, place);
-    RaiseChange(place, ctChanged);
+    return ChangeSong(songs_.PositionOf(song), std::move(record));
+}
+
+// In a list that is in order.
+SongIndex TMusicDatabase::ChangeSong(SongIndex index, TID3Tag record) {
+    const TID3Tag before = PutRecord(index, std::move(record));
+    // One that is as before to the order has its place already.
+    const SongIndex place = CompareSongs(order_, before, Song(index)) == 0 ? index : Replace(index);
+    if (place != index) events_.Moved.Tell(index, place);
+    TellChanged(place, before);
     return place;
 }
 
-bool TMusicDatabase::RemoveEntry(SongIndex index) {
-    if (Busy() || readOnly_ || index < 0 || index >= Count()) return false;
-    groups_.Remove(Song(index), groupEvents_.get());
-    songs_.Remove(index);
+TID3Tag TMusicDatabase::PutRecord(SongIndex index, TID3Tag record) {
+    record.MainGenre = ValidMainGenre(record.MainGenre);
+    TID3Tag before = songs_.Exchange(index, std::move(record));
+    groups_.Change(before, Song(index));
     SetModified(true);
-    RaiseChange(index, ctRemoved);
+    return before;
+}
+
+void TMusicDatabase::TellChanged(SongIndex place, const TID3Tag& before) {
+    const TID3Tag after = Song(place);
+    events_.Changed.Tell(place, before, after);
+    if (before.FileName != after.FileName) events_.Renamed.Tell(before.FileName, after.FileName);
+}
+
+bool TMusicDatabase::RemoveEntry(SongIndex index) {
+    if (!TakesChanges() || index < 0 || index >= Count()) return false;
+    RemoveSong(index);
     return true;
+}
+
+TID3Tag TMusicDatabase::RemoveSong(SongIndex index) {
+    TID3Tag removed = songs_.Remove(index);
+    groups_.Remove(removed);
+    SetModified(true);
+    events_.Removed.Tell(index, removed);
+    return removed;
 }
 
 void TMusicDatabase::Clear(bool notify, bool keepFileName) {
@@ -219,10 +208,8 @@ void TMusicDatabase::Clear(bool notify, bool keepFileName) {
     groups_.Clear();
     maybeUnsorted_ = false;
     SetModified(false);
-    RaiseOverviewChanged();
-    if (!notify) return;
-    RaiseChange(-1, ctRemoved);
-    RaiseClear();
+    groups_.TellRebuilt();
+    if (notify) events_.Cleared.Tell();
 }
 
 void TMusicDatabase::RecountGroups() {
@@ -231,19 +218,13 @@ void TMusicDatabase::RecountGroups() {
         tally.Add(*song);
     groups_.Clear();
     tally.WriteTo(groups_);
-    RaiseOverviewChanged();
+    groups_.TellRebuilt();
 }
 
 // --- Order ---
 
-SongOrder TMusicDatabase::CurrentOrder() const {
-    SongOrder order = order_;
-    order.ShownFlag = songListView_ != nullptr ? songListView_->ShownFlag() : 0;
-    return order;
-}
-
 SongIndex TMusicDatabase::Replace(SongIndex index) {
-    const SongIndex target = TargetPosition(CurrentOrder(), songs_, index);
+    const SongIndex target = TargetPosition(order_, songs_, index);
     if (target == index) return index;
     const SongIndex place = target > index ? target - 1 : target;
     songs_.Move(index, place);
@@ -252,16 +233,17 @@ SongIndex TMusicDatabase::Replace(SongIndex index) {
 
 void TMusicDatabase::Resort() {
     if (Busy()) throw EMusicDatabaseException(u"Umsortieren der Datenbank ist momentan nicht möglich."_s);
+    events_.Reordering.Tell();
     auto entries = songs_.TakeAll();
-    SortSongs(CurrentOrder(), entries);
+    SortSongs(order_, entries);
     songs_.PutAll(std::move(entries));
     maybeUnsorted_ = false;
-    RaiseChange(-1, ctChanged);
+    events_.Reordered.Tell();
 }
 
 void TMusicDatabase::EnsureSorted() {
     if (!maybeUnsorted_) return;
-    if (!IsSorted(CurrentOrder(), songs_)) return Resort();
+    if (!IsSorted(order_, songs_)) return Resort();
     maybeUnsorted_ = false;
 }
 
@@ -290,12 +272,21 @@ void TMusicDatabase::SetSortBackwards(bool backwards) {
     SetOrder(order);
 }
 
+void TMusicDatabase::SetShownFlag(quint32 flag) {
+    SongOrder order = order_;
+    order.ShownFlag = flag;
+    if (order_.SortType == stFlags)
+        SetOrder(order);
+    else
+        order_ = order;
+}
+
 // --- Properties ---
 
 void TMusicDatabase::SetModified(bool modified) {
     if (modified == modified_) return;
     modified_ = modified;
-    if (OnModifiedChange) OnModifiedChange(*this);
+    events_.ModifiedChanged.Tell();
 }
 
 void TMusicDatabase::SetCompression(int level) {
@@ -460,22 +451,38 @@ void TMusicDatabase::ResetProgress() {
 
 // --- Events ---
 
-void TMusicDatabase::RaiseChange(SongIndex index, TChangeType change) {
-    if (OnChange) OnChange(*this, index, change);
-    if (songListView_ != nullptr) songListView_->SongChanged(index, change);
-}
-
-void TMusicDatabase::RaiseClear() {
-    if (OnClear) OnClear(*this);
-    if (songListView_ != nullptr) songListView_->DatabaseCleared();
-}
-
-void TMusicDatabase::RaisePrepareMultiAdd(int count) {
-    if (OnPrepareMultiAdd) OnPrepareMultiAdd(*this, count);
-    if (songListView_ != nullptr) songListView_->PrepareMultiAdd(count);
-}
-
-void TMusicDatabase::RaiseOverviewChanged() {
-    if (OnOverviewChanged) OnOverviewChanged(*this);
-    if (overviewView_ != nullptr) overviewView_->OverviewChanged();
+void TMusicDatabase::SubscribeSlots() {
+    const auto change = [this](SongIndex index, TChangeType type) {
+        if (OnChange) OnChange(*this, index, type);
+    };
+    slots_ += events_.Inserted.Subscribe([change](SongIndex index) { change(index, ctInserted); });
+    slots_ += events_.Changed.Subscribe(
+        [change](SongIndex index, const TID3Tag&, const TID3Tag&) { change(index, ctChanged); });
+    slots_ +=
+        events_.Removed.Subscribe([change](SongIndex index, const TID3Tag&) { change(index, ctRemoved); });
+    slots_ += events_.Reordered.Subscribe([change] { change(-1, ctChanged); });
+    slots_ += events_.Replaced.Subscribe([change] { change(-1, ctChanged); });
+    slots_ += events_.Cleared.Subscribe([this, change] {
+        change(-1, ctRemoved);
+        if (OnClear) OnClear(*this);
+    });
+    slots_ += events_.Reserve.Subscribe([this](int count) {
+        if (OnPrepareMultiAdd) OnPrepareMultiAdd(*this, count);
+    });
+    slots_ += events_.ModifiedChanged.Subscribe([this] {
+        if (OnModifiedChange) OnModifiedChange(*this);
+    });
+    GroupEvents& groups = groups_.Events();
+    slots_ += groups.Rebuilt.Subscribe([this] {
+        if (OnOverviewChanged) OnOverviewChanged(*this);
+    });
+    slots_ += groups.Inserted.Subscribe([this](TOVType type, int row, const QString& caption, int count) {
+        if (OnOverviewInsert) OnOverviewInsert(*this, type, row, caption, count);
+    });
+    slots_ += groups.Deleted.Subscribe([this](TOVType type, int row) {
+        if (OnOverviewDelete) OnOverviewDelete(*this, type, row);
+    });
+    slots_ += groups.Updated.Subscribe([this](TOVType type, int row, int count) {
+        if (OnOverviewUpdate) OnOverviewUpdate(*this, type, row, count);
+    });
 }

@@ -11,6 +11,7 @@
 
 #include "CommonRUKTools/Errors.h"
 #include "CommonRUKTools/MenuItem.h"
+#include "MusicManagment/database/CollectionEvents.h"
 #include "MusicManagment/database/GroupLists.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/SongList.h"
@@ -19,9 +20,8 @@
 #include "MusicManagment/database/sorting/Sorting.h"
 #include "ReadMPEGHeader/AudioFile.h"
 
-class OverviewView;
+class CollectionEdit;
 class SettingsClient;
-class SongListView;
 class TMusicDatabase;
 
 class EMusicDatabaseException : public ERukException {
@@ -37,13 +37,13 @@ using TMenuItemClickedEvent = std::function<void(TMusicDatabase&, const TMenuExI
                                                  qint64 userId, bool& proceed)>;
 using TProgressEvent = std::function<void(TMusicDatabase&, const ProgressPoint&)>;
 
-// How an entry is added.
-struct AddOptions {
-    bool CountOnly = false;       // only count it in the summary lists
-    bool SkipDiskChecks = false;  // no look at disk and ban list: songs that the user brings back
-    bool SkipChecks =
-        false;  // no look at disk and ban list, no counting, no event: reading a file that has its lists
-    bool KeepModified = false;  // do not mark the database modified
+// Why an entry is added, which decides what is checked, counted and told.
+enum class AddAs {
+    New,        // its file must be there, and it must not be banned
+    Returning,  // brought back by the user: no look at disk and ban list
+    Loaded,     // from a file that has its lists: not checked, counted or told; nothing is modified by it
+    LoadedUncounted,  // from a file without lists: like New, but nothing is modified by it
+    CountedOnly,      // not added at all, only counted in the summary lists
 };
 
 // Values that replace what was read from an audio file; absent keeps what was read.
@@ -94,18 +94,17 @@ class TMusicDatabase : public QObject {
 
     // Adds an entry, its path first taken from `fileName`. Returns its place, or -1 when it was only counted
     // or refused (database busy or read-only, file missing, song banned).
-    SongIndex AddEntry(const QString& fileName, TID3Tag record, const AddOptions& options = {});
-    // The same for an entry that holds its path.
-    SongIndex AddEntry(std::unique_ptr<TID3Tag> entry, const AddOptions& options);
+    SongIndex AddEntry(const QString& fileName, TID3Tag record, AddAs as = AddAs::New);
     // Reads the file and adds it; -1 when it does not exist or was refused. Throws EStreamError when it
     // cannot be read.
-    SongIndex AddSong(const QString& path, const SongOverrides& overrides = {},
-                      const AddOptions& options = {});
-    // Replaces an entry, counts its groups anew and puts it in its place; returns the new place, -1 when
-    // refused.
+    SongIndex AddSong(const QString& path, const SongOverrides& overrides = {}, AddAs as = AddAs::New);
+    // Single edits; several that belong together are a CollectionEdit.
+    // Replaces an entry and puts it in its place; returns the new place, -1 when refused.
     SongIndex UpdateEntry(SongIndex index, TID3Tag record);
     // Removes an entry from the collection; the file stays. False when refused.
     bool RemoveEntry(SongIndex index);
+    // Whether songs may be changed and removed now.
+    bool TakesChanges() const { return !Busy() && !readOnly_; }
     // Empties the database; does nothing while it is busy.
     void Clear(bool notify = true, bool keepFileName = false);
     bool IsBanned(const TID3Tag& record) const;
@@ -136,7 +135,7 @@ class TMusicDatabase : public QObject {
     const SortedTextList& Years() const { return groups_.Years(); }
     const SortedTextList& Lengths() const { return groups_.Lengths(); }
     const GenreCounts& Genres() const { return groups_.Genres(); }
-    // Counts everything anew from the songs and raises OnOverviewChanged.
+    // Counts everything anew from the songs and tells that the lists were rebuilt.
     void RecountGroups();
 
     // --- Properties ---
@@ -169,8 +168,12 @@ class TMusicDatabase : public QObject {
     void SetSubSortType(TSubSortType type);
     void SetSortBackwards(bool backwards);
     const SongOrder& Order() const { return order_; }
-    // All three in one sort.
+    // All of it in one sort.
     void SetOrder(const SongOrder& order);
+    // The flag bit that the flag column of the song list shows, which alone counts when sorting by flags; 0:
+    // the whole flags.
+    quint32 ShownFlag() const { return order_.ShownFlag; }
+    void SetShownFlag(quint32 flag);
     bool FollowFocus() const { return followFocus_; }
     void SetFollowFocus(bool value) { followFocus_ = value; }
     bool MoveMP3sAfterGenreChange() const { return moveMP3sAfterGenreChange_; }
@@ -205,10 +208,6 @@ class TMusicDatabase : public QObject {
     void SetPlaySound(QObject* component) { playSound_ = component; }
     QObject* RemoteControl() const { return remoteControl_; }
     void SetRemoteControl(QObject* component) { remoteControl_ = component; }
-
-    // The linked views, told after the events; the view clears the link before it goes.
-    void SetSongListView(SongListView* view) { songListView_ = view; }
-    void SetOverviewView(OverviewView* view) { overviewView_ = view; }
 
     // --- Long operations ---
     // Shows a message and throws EAbort when a run is going. Prefer the ProgressRun object of Progress.h.
@@ -264,6 +263,11 @@ class TMusicDatabase : public QObject {
     ReadOptions AudioReadOptions() const;
 
     // --- Events ---
+    // Everybody who wants to know subscribes here.
+    CollectionEvents& Events() { return events_; }
+    GroupEvents& GroupChanges() { return groups_.Events(); }
+
+    // One slot each, told before all who have subscribed since.
     TNotifyEvent OnModifiedChange;
     TNotifyEvent OnMenuChanged;  // the menu has gone, the next call builds another
     TChangeEvent OnChange;
@@ -286,24 +290,22 @@ class TMusicDatabase : public QObject {
     // The playlist has played all its songs; `showException` is whether the user is told.
     std::function<void(TMusicDatabase&, bool& showException)> OnAllFilesPlayed;
 
-    // Raising events whose cause lies in a capability beside this class.
-    void RaiseChange(SongIndex index, TChangeType change);
-    void RaisePrepareMultiAdd(int count);
-    void RaiseOverviewChanged();
-
  private:
-    class GroupEvents;
-    friend class GroupEvents;
+    friend class CollectionEdit;
 
     void ReportProgress();
-    bool Accepts(const TID3Tag& record, const AddOptions& options);
-    void RaiseClear();
-    SongOrder CurrentOrder() const;
+    bool Accepts(const TID3Tag& record);
+    TID3Tag PutRecord(SongIndex index, TID3Tag record);
+    SongIndex ChangeSong(SongIndex index, TID3Tag record);
     SongIndex Replace(SongIndex index);
+    void TellChanged(SongIndex place, const TID3Tag& before);
+    TID3Tag RemoveSong(SongIndex index);
+    void SubscribeSlots();
 
     SongList songs_;
     GroupLists groups_;
-    std::unique_ptr<GroupEvents> groupEvents_;
+    CollectionEvents events_;
+    Subscriptions slots_;
     SongOrder order_;
     bool maybeUnsorted_ = false;  // after reading a file, until the order has been looked at
 
@@ -334,8 +336,6 @@ class TMusicDatabase : public QObject {
     QPointer<QObject> playList_;
     QPointer<QObject> playSound_;
     QPointer<QObject> remoteControl_;
-    SongListView* songListView_ = nullptr;
-    OverviewView* overviewView_ = nullptr;
     std::unique_ptr<QTimer> autoSaveTimer_;
 
     ProgressPoint lastProgress_;

@@ -13,7 +13,7 @@ using namespace Qt::StringLiterals;
 namespace {
 
 bool Agrees(const QString& question) {
-    return UserDialogs().Ask(question, {u"Ja"_s, u"Nein"_s}, 1) == 0;
+    return UserDialogs().Ask({.Text = question, .Buttons = {u"Ja"_s, u"Nein"_s}, .Cancel = 1}) == 0;
 }
 
 bool AnyExists(const QStringList& files) {

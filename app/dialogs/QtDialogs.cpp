@@ -1,6 +1,5 @@
 #include "app/dialogs/QtDialogs.h"
 
-#include <QAbstractButton>
 #include <QApplication>
 #include <QDir>
 #include <QFileDialog>
@@ -40,6 +39,22 @@ QMessageBox::Icon IconOf(MessageKind kind) {
 QMessageBox::ButtonRole RoleOf(int button, int cancelButton) {
     if (button == cancelButton) return QMessageBox::RejectRole;
     return button == 0 ? QMessageBox::YesRole : QMessageBox::NoRole;
+}
+
+// The first letter of each caption that no other before it has taken.
+QStringList WithAccessKeys(QStringList captions) {
+    QString taken;
+    for (QString& caption : captions) {
+        caption.replace(u'&', u"&&"_s);
+        for (qsizetype i = 0; i < caption.size(); ++i) {
+            const QChar letter = caption[i].toLower();
+            if (!letter.isLetter() || taken.contains(letter)) continue;
+            taken += letter;
+            caption.insert(i, u'&');
+            break;
+        }
+    }
+    return captions;
 }
 
 // Captions are set here and not left to Qt's translation, which may not be installed.
@@ -94,19 +109,20 @@ void QtDialogs::ShowMessage(MessageKind kind, const QString& text) {
     box.exec();
 }
 
-int QtDialogs::Ask(const QString& text, const QStringList& buttons, int cancelButton) {
+int QtDialogs::Ask(const Question& question) {
     QMessageBox box(Parent());
     box.setWindowTitle(QString::fromUtf16(kTitle));
     box.setIcon(QMessageBox::Question);
-    SetText(box, text);
-    QList<QAbstractButton*> made;
-    for (int i = 0; i < buttons.size(); ++i)
-        made << box.addButton(buttons[i], RoleOf(i, cancelButton));
-    if (cancelButton >= 0 && cancelButton < made.size()) box.setEscapeButton(made[cancelButton]);
-    if (auto* first = qobject_cast<QPushButton*>(made.value(0))) box.setDefaultButton(first);
+    SetText(box, question.Text);
+    const QStringList captions = WithAccessKeys(question.Buttons);
+    QList<QPushButton*> made;
+    for (int i = 0; i < captions.size(); ++i)
+        made << box.addButton(captions[i], RoleOf(i, question.Cancel));
+    box.setEscapeButton(made.value(question.Cancel));
+    box.setDefaultButton(made.value(question.DefaultButton()));
     box.exec();
     const auto chosen = static_cast<int>(made.indexOf(box.clickedButton()));
-    return chosen >= 0 ? chosen : cancelButton;
+    return chosen >= 0 ? chosen : question.Cancel;
 }
 
 std::optional<QString> QtDialogs::Input(const QString& caption, const QString& prompt,
@@ -155,7 +171,8 @@ std::optional<QString> QtDialogs::SaveFile(const FileDialogOptions& options) {
         if (!options.ConfirmOverwrite || !QFileInfo::exists(files.first())) return files.first();
         const QString question = u"Die Datei "_s + QDir::toNativeSeparators(files.first()) +
                                  u" ist schon vorhanden. Soll sie ersetzt werden?"_s;
-        if (Ask(question, {u"Ersetzen"_s, u"Abbrechen"_s}, 1) == 0) return files.first();
+        if (Ask({.Text = question, .Buttons = {u"Ersetzen"_s, u"Abbrechen"_s}, .Cancel = 1}) == 0)
+            return files.first();
     }
 }
 

@@ -13,7 +13,7 @@ class QtDialogs : public Dialogs {
     void SetMainWindow(QWidget* window) { mainWindow_ = window; }
 
     void ShowMessage(MessageKind kind, const QString& text) override;
-    int Ask(const QString& text, const QStringList& buttons, int cancelButton) override;
+    int Ask(const Question& question) override;
     std::optional<QString> Input(const QString& caption, const QString& prompt, const QStringList& choices,
                                  const QString& preset) override;
     std::optional<QString> OpenFile(const FileDialogOptions& options) override;

@@ -24,11 +24,19 @@ QString SongCountText(std::size_t count) {
     return count == 1 ? u"1 Song"_s : QString::number(count) + u" Songs"_s;
 }
 
-void CollectionTotals::SongChanged(SongIndex index, TChangeType change) {
-    if (index >= 0 && change == ctInserted)
-        seconds_ += database_.Song(index).Length;
-    else
-        stale_ = true;
+CollectionTotals::CollectionTotals(TMusicDatabase& database) : database_(database) {
+    CollectionEvents& events = database.Events();
+    subscriptions_ +=
+        events.Inserted.Subscribe([this](SongIndex index) { seconds_ += database_.Song(index).Length; });
+    subscriptions_ +=
+        events.Removed.Subscribe([this](SongIndex, const TID3Tag& record) { seconds_ -= record.Length; });
+    subscriptions_ +=
+        events.Changed.Subscribe([this](SongIndex, const TID3Tag& before, const TID3Tag& after) {
+            seconds_ += after.Length - before.Length;
+        });
+    const auto forget = [this] { stale_ = true; };
+    subscriptions_ += events.Replaced.Subscribe(forget);
+    subscriptions_ += events.Cleared.Subscribe(forget);
 }
 
 qint64 CollectionTotals::Seconds() {

@@ -2,7 +2,7 @@
 
 #include <QString>
 
-#include "MusicManagment/database/SongTypes.h"
+#include "CommonRUKTools/Listeners.h"
 
 class TMusicDatabase;
 
@@ -11,13 +11,12 @@ QString SongCountText(std::size_t count);
 // "2 Songs, Spielzeit 7:05"
 QString TotalsText(qint64 songs, qint64 seconds);
 
-// How long all songs together play. Follows insertions song by song; after any other change the songs are
-// added up anew when the sum is asked for.
+// How long all songs together play. Follows the collection song by song; when others have come all at once
+// they are added up anew as the sum is asked for.
 class CollectionTotals {
  public:
-    explicit CollectionTotals(const TMusicDatabase& database) : database_(database) {}
+    explicit CollectionTotals(TMusicDatabase& database);
 
-    void SongChanged(SongIndex index, TChangeType change);
     qint64 Seconds();
     QString Text();
 
@@ -25,4 +24,5 @@ class CollectionTotals {
     const TMusicDatabase& database_;
     qint64 seconds_ = 0;
     bool stale_ = true;
+    Subscriptions subscriptions_;
 };

@@ -42,12 +42,8 @@ QVariant StandInLook(int role) {
 OverviewModel::OverviewModel(TMusicDatabase& database) : database_(&database) {
     syncTimer_.setSingleShot(true);
     QObject::connect(&syncTimer_, &QTimer::timeout, this, &OverviewModel::SyncViews);
-    database_->SetOverviewView(this);
+    Subscribe();
     groups_ = ReadGroups(totals_);
-}
-
-OverviewModel::~OverviewModel() {
-    if (database_ != nullptr) database_->SetOverviewView(nullptr);
 }
 
 void OverviewModel::SetType(TOVType type) {
@@ -105,20 +101,12 @@ QVariant OverviewModel::headerData(int section, Qt::Orientation orientation, int
 
 // --- What the database tells ---
 
-void OverviewModel::OverviewChanged() {
-    ScheduleSync(type_);
-}
-
-void OverviewModel::OverviewInserted(TOVType type, int, const QString&, int) {
-    ScheduleSync(type);
-}
-
-void OverviewModel::OverviewDeleted(TOVType type, int) {
-    ScheduleSync(type);
-}
-
-void OverviewModel::OverviewUpdated(TOVType type, int, int) {
-    ScheduleSync(type);
+void OverviewModel::Subscribe() {
+    GroupEvents& groups = database_->GroupChanges();
+    subscriptions_ += groups.Rebuilt.Subscribe([this] { ScheduleSync(type_); });
+    subscriptions_ += groups.Inserted.Subscribe([this](TOVType type, auto&&...) { ScheduleSync(type); });
+    subscriptions_ += groups.Deleted.Subscribe([this](TOVType type, int) { ScheduleSync(type); });
+    subscriptions_ += groups.Updated.Subscribe([this](TOVType type, int, int) { ScheduleSync(type); });
 }
 
 void OverviewModel::ScheduleSync(TOVType type) {

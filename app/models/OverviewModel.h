@@ -5,18 +5,16 @@
 #include <vector>
 
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/Views.h"
 
 // One of the summary lists as a table of captions and song counts; the first row stands for all groups. A
 // scan changes the lists thousands of times a second, so the model shows the list as it was when its views
 // were told last, which happens a few times a second at most.
-class OverviewModel : public QAbstractTableModel, public OverviewView {
+class OverviewModel : public QAbstractTableModel {
  public:
     enum Column { CaptionColumn, SongsColumn, ColumnCount };
     static constexpr int kAllRow = 0;
 
     explicit OverviewModel(TMusicDatabase& database);
-    ~OverviewModel() override;
 
     TOVType Type() const { return type_; }
     void SetType(TOVType type);
@@ -35,11 +33,6 @@ class OverviewModel : public QAbstractTableModel, public OverviewView {
     QVariant data(const QModelIndex& index, int role = Qt::DisplayRole) const override;
     QVariant headerData(int section, Qt::Orientation orientation, int role = Qt::DisplayRole) const override;
 
-    void OverviewChanged() override;
-    void OverviewInserted(TOVType type, int row, const QString& caption, int count) override;
-    void OverviewDeleted(TOVType type, int row) override;
-    void OverviewUpdated(TOVType type, int row, int count) override;
-
  private:
     struct Group {
         QString Caption;
@@ -55,6 +48,7 @@ class OverviewModel : public QAbstractTableModel, public OverviewView {
     static std::size_t GroupPlace(int row) { return static_cast<std::size_t>(row - 1); }
     QString Text(int row, int column) const;
     Groups ReadGroups(Totals& totals) const;
+    void Subscribe();
     void ScheduleSync(TOVType type);
     void PlaceRows(Groups groups);
     QModelIndexList NewPlaces(const QModelIndexList& held, std::size_t known, const Groups& groups) const;
@@ -67,4 +61,5 @@ class OverviewModel : public QAbstractTableModel, public OverviewView {
     Totals totals_;
     QTimer syncTimer_;
     qint64 nextSync_ = 0;  // ticks of the clock
+    Subscriptions subscriptions_;
 };

@@ -1,7 +1,6 @@
 #include "app/models/SongListModel.h"
 
 #include <algorithm>
-#include <unordered_map>
 
 #include "CommonRUKTools/Clock.h"
 #include "app/models/SongColumns.h"
@@ -28,25 +27,22 @@ QVariant CellAlignment(const SongColumn& column) {
 
 }  // namespace
 
-// While it lives all songs may change their rows; its end tells the views where each of theirs has gone.
+// While it lives all songs may change their rows; its end tells the views where each of theirs has gone. What
+// is selected stays selected.
 class SongListModel::Reordering {
  public:
     explicit Reordering(SongListModel& model) : model_(model) {
         Q_EMIT model_.layoutAboutToBeChanged({}, VerticalSortHint);
         before_ = model_.persistentIndexList();
-        for (const QModelIndex& index : std::as_const(before_)) {
-            songs_.push_back(model_.SongAt(index.row()));
-            rows_.emplace(songs_.back(), -1);
-        }
-        model_.reordering_ = true;
+        for (const QModelIndex& index : std::as_const(before_))
+            songs_.push_back(model_.database_.Songs().HandleOf(model_.IndexAt(index.row())));
     }
     ~Reordering() {
-        model_.reordering_ = false;
-        FindRows();
+        const SongList& songs = model_.database_.Songs();
         QModelIndexList after;
         after.reserve(before_.size());
         for (qsizetype i = 0; i < before_.size(); ++i)
-            after << model_.index(rows_.at(songs_[static_cast<std::size_t>(i)]), before_[i].column());
+            after << model_.index(songs.PositionOf(songs_[static_cast<std::size_t>(i)]), before_[i].column());
         model_.changePersistentIndexList(before_, after);
         Q_EMIT model_.layoutChanged({}, VerticalSortHint);
     }
@@ -54,32 +50,19 @@ class SongListModel::Reordering {
     Reordering& operator=(const Reordering&) = delete;
 
  private:
-    void FindRows() {
-        if (rows_.empty()) return;
-        int row = 0;
-        for (const auto& song : model_.database_.Songs()) {
-            const auto found = rows_.find(song.get());
-            if (found != rows_.end()) found->second = row;
-            ++row;
-        }
-    }
-
     SongListModel& model_;
-    QModelIndexList before_;             // what the views hold on to
-    std::vector<const TID3Tag*> songs_;  // the song of each
-    std::unordered_map<const TID3Tag*, int> rows_;
+    QModelIndexList before_;         // what the views hold on to
+    std::vector<SongHandle> songs_;  // the song of each
 };
 
 SongListModel::SongListModel(TMusicDatabase& database) : database_(database) {
     syncTimer_.setSingleShot(true);
     QObject::connect(&syncTimer_, &QTimer::timeout, this, &SongListModel::SyncViews);
-    database_.SetSongListView(this);
+    Subscribe();
     Reset();
 }
 
-SongListModel::~SongListModel() {
-    database_.SetSongListView(nullptr);
-}
+SongListModel::~SongListModel() = default;
 
 // --- What views ask ---
 
@@ -128,43 +111,38 @@ void SongListModel::SetOrder(const SongOrder& order) {
     // A run goes through the list by position and must not find it in another order.
     if (database_.ProgressRunning())
         throw EMusicDatabaseException(u"Umsortieren der Datenbank ist momentan nicht möglich."_s);
-    SyncViews();
-    const Reordering reordering(*this);
     database_.SetOrder(order);
 }
 
 // --- What the database tells ---
 
-void SongListModel::SongChanged(SongIndex index, TChangeType change) {
-    if (reordering_) return;
-    if (index < 0) return Reset();
-    switch (change) {
-        case ctInserted:
-            journal_.Insert(index);
-            break;
-        case ctRemoved:
-            journal_.Remove(index);
-            break;
-        case ctChanged:
-            contentChanged_ = true;
-            break;
-    }
-    ScheduleSync();
-}
-
-void SongListModel::SongMoved(SongIndex from, SongIndex to) {
-    journal_.Move(from, to);
-    ScheduleSync();
-}
-
-void SongListModel::DatabaseCleared() {
-    Reset();
-}
-
-void SongListModel::PrepareMultiAdd(int) {}  // rows cost nothing here
-
-quint32 SongListModel::ShownFlag() const {
-    return 0;  // no column shows a single flag
+void SongListModel::Subscribe() {
+    CollectionEvents& events = database_.Events();
+    subscriptions_ += events.Inserted.Subscribe([this](SongIndex index) {
+        journal_.Insert(index);
+        ScheduleSync();
+    });
+    subscriptions_ += events.Removed.Subscribe([this](SongIndex index, const TID3Tag&) {
+        journal_.Remove(index);
+        ScheduleSync();
+    });
+    subscriptions_ += events.Moved.Subscribe([this](SongIndex from, SongIndex to) {
+        journal_.Move(from, to);
+        ScheduleSync();
+    });
+    const auto redraw = [this] {
+        contentChanged_ = true;
+        ScheduleSync();
+    };
+    subscriptions_ += events.Changed.Subscribe([redraw](auto&&...) { redraw(); });
+    subscriptions_ += events.MediaChanged.Subscribe(redraw);
+    subscriptions_ += events.Reordering.Subscribe([this] {
+        SyncViews();
+        reordering_ = std::make_unique<Reordering>(*this);
+    });
+    subscriptions_ += events.Reordered.Subscribe([this] { reordering_.reset(); });
+    subscriptions_ += events.Replaced.Subscribe([this] { Reset(); });
+    subscriptions_ += events.Cleared.Subscribe([this] { Reset(); });
 }
 
 // --- Telling the views ---

@@ -4,13 +4,12 @@
 #include <QTimer>
 
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/Views.h"
 #include "app/models/RowJournal.h"
 
 // The songs of the database as rows of a table; nothing is copied. A scan inserts thousands of songs a
 // second, so views are told a few times a second at most: until then every row goes on showing the song that
 // the views were told it shows, wherever that song stands by now.
-class SongListModel : public QAbstractTableModel, public SongListView {
+class SongListModel : public QAbstractTableModel {
  public:
     explicit SongListModel(TMusicDatabase& database);
     ~SongListModel() override;
@@ -19,7 +18,7 @@ class SongListModel : public QAbstractTableModel, public SongListView {
     const TID3Tag* SongAt(int row) const;
     // Its position in the database; -1 when it has been removed.
     SongIndex IndexAt(int row) const;
-    // Sorts the database; what is selected stays selected. Throws EMusicDatabaseException while a long
+    // Sorts the database. Throws EMusicDatabaseException while a long
     // operation runs.
     void SetOrder(const SongOrder& order);
     // Tells the views at once what has changed.
@@ -31,15 +30,10 @@ class SongListModel : public QAbstractTableModel, public SongListView {
     QVariant data(const QModelIndex& index, int role = Qt::DisplayRole) const override;
     QVariant headerData(int section, Qt::Orientation orientation, int role = Qt::DisplayRole) const override;
 
-    void SongChanged(SongIndex index, TChangeType change) override;
-    void SongMoved(SongIndex from, SongIndex to) override;
-    void DatabaseCleared() override;
-    void PrepareMultiAdd(int count) override;
-    quint32 ShownFlag() const override;
-
  private:
     class Reordering;
 
+    void Subscribe();
     void Reset();
     void ScheduleSync();
     void SyncRows();
@@ -47,9 +41,10 @@ class SongListModel : public QAbstractTableModel, public SongListView {
 
     TMusicDatabase& database_;
     RowJournal journal_;
-    int rows_ = 0;                 // as the views know it
-    bool contentChanged_ = false;  // of a song that stayed where it was
-    bool reordering_ = false;
+    int rows_ = 0;                            // as the views know it
+    bool contentChanged_ = false;             // of a song that stayed where it was
+    std::unique_ptr<Reordering> reordering_;  // while all songs change their places
     QTimer syncTimer_;
     qint64 nextSync_ = 0;  // ticks of the clock
+    Subscriptions subscriptions_;
 };

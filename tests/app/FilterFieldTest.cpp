@@ -92,7 +92,7 @@ TEST_F(FilterFieldTest, TellsTheFields) {
 TEST_F(FilterFieldTest, InALargeCollectionReturnDoesNotWaitForThePause) {
     database_.BeginLoading();
     for (int i = 0; i < 50'000; ++i)
-        database_.AddEntry(QString(), CdSong(u"Viele %1"_s.arg(i)), {.SkipChecks = true});
+        database_.AddEntry(QString(), CdSong(u"Viele %1"_s.arg(i)), AddAs::Loaded);
     database_.EndLoading();
     database_.SetSortType(stTitle);
     songs_.SyncViews();

@@ -13,7 +13,7 @@
 #include "app/desktop/InstallationSteps.h"
 #include "app/desktop/MimeTypes.h"
 #include "tests/PrintQt.h"
-#include "tests/app/ScriptedDialogs.h"
+#include "tests/ScriptedDialogs.h"
 
 using namespace Qt::StringLiterals;
 

@@ -25,8 +25,8 @@
 #include "app/dialogs/ProgressWindow.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
+#include "tests/ScriptedDialogs.h"
 #include "tests/app/ScriptedBackend.h"
-#include "tests/app/ScriptedDialogs.h"
 
 using namespace Qt::StringLiterals;
 
@@ -298,11 +298,12 @@ TEST_F(MainWindowTest, AnotherDatabasesChangesAreOnlyLostWhenTheUserSaysSo) {
     EXPECT_FALSE(window_->close());
     EXPECT_EQ(Database().Count(), 3);
 
-    dialogs_.File = folder_.filePath(u"neu.tsdb"_s);
+    const QString file = folder_.filePath(u"neu.tsdb"_s);
+    dialogs_.Files = {{file}, {file}};
     dialogs_.Answers = {kYes};
     Command(u"Neue Datenbank"_s)->trigger();
     EXPECT_EQ(Database().Count(), 0);
-    EXPECT_TRUE(QFile::exists(*dialogs_.File));
+    EXPECT_TRUE(QFile::exists(file));
     EXPECT_TRUE(ShowsEmptyState());
 
     Command(u"Datenbank öffnen..."_s)->trigger();
@@ -398,7 +399,7 @@ TEST_F(MainWindowTest, FindsSongsFromTheFilterLineAndGoesOn) {
     found.removeDuplicates();
     found.sort();
     EXPECT_EQ(found, QStringList({u"Lied 110"_s, u"Lied 111"_s}));
-    dialogs_.Text = u"titel:105"_s;
+    dialogs_.Inputs = {u"titel:105"_s};
     Database().ClickMenuItem(mcMarkByFilter);
     EXPECT_EQ(list->selectionModel()->selectedRows().size(), 1);
     Database().ClickMenuItem(mcInvertMarks);
@@ -418,7 +419,8 @@ TEST_F(MainWindowTest, AnArrangementOfTheWindowsIsSavedAndComesBack) {
     const QSize arranged = SmallestSize();
     const QSize larger = arranged + QSize(20, 30);
     ASSERT_TRUE(overview->isVisible());
-    dialogs_.File = folder_.filePath(u"meine.DF"_s);
+    const QString file = folder_.filePath(u"meine.DF"_s);
+    dialogs_.Files = {{file}, {file}};
     choose(u"Anordnung speichern unter..."_s);
     overview->hide();
     window_->resize(larger);

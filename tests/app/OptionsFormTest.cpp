@@ -21,8 +21,8 @@
 #include "MusicManagment/database/songfiles/NamePattern.h"
 #include "app/dialogs/NamePatternTexts.h"
 #include "tests/PrintQt.h"
+#include "tests/ScriptedDialogs.h"
 #include "tests/app/LabelFit.h"
-#include "tests/app/ScriptedDialogs.h"
 
 using namespace Qt::StringLiterals;
 
@@ -389,7 +389,7 @@ TEST_F(OptionsFormTest, FoldersAreAddedAndRemovedAndNoneLiesBelowAnother) {
     auto& list = Field<QListWidget>(u"UpdateFolders"_s, u"folders"_s);
     EXPECT_FALSE(Field<QPushButton>(u"removeFolder"_s).isEnabled());
     for (const QString& folder : {u"/musik/"_s, u"/musik/pop"_s}) {
-        dialogs_.File = folder;
+        dialogs_.Folders = {folder};
         Click(u"addFolder"_s);
     }
     EXPECT_EQ(list.count(), 2);

@@ -17,8 +17,8 @@
 #include "app/views/SongListWidget.h"
 #include "app/views/VisPlayList.h"
 #include "tests/PrintQt.h"
+#include "tests/ScriptedDialogs.h"
 #include "tests/app/ScriptedBackend.h"
-#include "tests/app/ScriptedDialogs.h"
 
 using namespace Qt::StringLiterals;
 

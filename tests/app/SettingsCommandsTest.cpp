@@ -16,7 +16,7 @@
 #include "app/dialogs/options/OptionsForm.h"
 #include "app/dialogs/wizard/WizardForm.h"
 #include "tests/PrintQt.h"
-#include "tests/app/ScriptedDialogs.h"
+#include "tests/ScriptedDialogs.h"
 
 using namespace Qt::StringLiterals;
 

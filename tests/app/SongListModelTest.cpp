@@ -9,7 +9,7 @@
 
 #include "app/models/SongColumns.h"
 #include "tests/PrintQt.h"
-#include "tests/app/ScriptedDialogs.h"
+#include "tests/ScriptedDialogs.h"
 #include "tests/app/Songs.h"
 
 using namespace Qt::StringLiterals;

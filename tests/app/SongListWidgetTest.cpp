@@ -13,7 +13,7 @@
 #include "app/models/SongListModel.h"
 #include "tests/HandClock.h"
 #include "tests/PrintQt.h"
-#include "tests/app/ScriptedDialogs.h"
+#include "tests/ScriptedDialogs.h"
 #include "tests/app/Songs.h"
 
 using namespace Qt::StringLiterals;
@@ -153,7 +153,7 @@ TEST_F(SongListWidgetTest, MarksAndFocusAreTwoThings) {
 TEST_F(SongListWidgetTest, OnlyShownSongsAreMarked) {
     ScriptedDialogs dialogs;
     shown_.SetText(u"11"_s);
-    dialogs.Text = u"-5"_s;
+    dialogs.Inputs = {u"-5"_s};
     list_.MarkByFilter();
     EXPECT_EQ(MarkedTitles().join(u','),
               u"Lied 110,Lied 111,Lied 112,Lied 113,Lied 114,Lied 116,Lied 117,Lied 118,Lied 119,Lied 211,"
@@ -161,8 +161,7 @@ TEST_F(SongListWidgetTest, OnlyShownSongsAreMarked) {
     list_.InvertMarks();
     EXPECT_EQ(MarkedTitles(), QStringList{u"Lied 115"_s});
 
-    dialogs.Text = std::nullopt;  // cancelled
-    list_.MarkByFilter();
+    list_.MarkByFilter();  // cancelled
     EXPECT_EQ(MarkedTitles(), QStringList{u"Lied 115"_s});
     shown_.SetText(QString());
     EXPECT_EQ(MarkedTitles(), QStringList{u"Lied 115"_s});

@@ -11,7 +11,7 @@
 #include "app/desktop/InstallationSteps.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
-#include "tests/app/ScriptedDialogs.h"
+#include "tests/ScriptedDialogs.h"
 
 using namespace Qt::StringLiterals;
 

@@ -15,7 +15,7 @@
 
 #include "app/views/PlaylistForm.h"
 #include "tests/PrintQt.h"
-#include "tests/app/ScriptedDialogs.h"
+#include "tests/ScriptedDialogs.h"
 #include "tests/app/ScriptedPlayer.h"
 #include "tests/app/Songs.h"
 

@@ -14,8 +14,8 @@
 
 #include "MusicManagment/database/MusicManagment.h"
 #include "tests/PrintQt.h"
+#include "tests/ScriptedDialogs.h"
 #include "tests/app/LabelFit.h"
-#include "tests/app/ScriptedDialogs.h"
 
 using namespace Qt::StringLiterals;
 
@@ -74,7 +74,7 @@ TEST_F(WizardFormTest, EscapeEndsItFromAnyPage) {
 TEST_F(WizardFormTest, TheChoicesAreSummedUpAndHandedBack) {
     Open(Start());
     GoTo(1);
-    dialogs_.File = u"/hörspiele"_s;
+    dialogs_.Folders = {u"/hörspiele"_s};
     Child<QPushButton>(u"addFolder"_s).click();
     GoTo(2);
     Child<QRadioButton>(u"rename"_s).setChecked(true);

@@ -24,11 +24,11 @@ class TerminalDialogsTest : public testing::Test {
 }  // namespace
 
 TEST_F(TerminalDialogsTest, AnswersAreNumbersOfAList) {
-    Answer("2\r\n7\nx\n1\n");
+    Answer("2\r\n7\nx\n\n1\n");
     const QStringList buttons = {u"Ja"_s, u"Nein"_s, u"Abbrechen"_s};
-    EXPECT_EQ(dialogs_.Ask(u"Weiter?"_s, buttons, 2), 1);
-    EXPECT_EQ(dialogs_.Ask(u"Weiter?"_s, buttons, 2), 2);
-    EXPECT_EQ(dialogs_.Ask(u"Weiter?"_s, buttons, 2), 2);
+    const Question question = {.Text = u"Weiter?"_s, .Buttons = buttons, .Cancel = 2, .Default = 0};
+    for (const int answer : {1, 2, 2, 0})
+        EXPECT_EQ(dialogs_.Ask(question), answer);
     EXPECT_EQ(dialogs_.Input(u"Genre"_s, u"Welches"_s, buttons, {}), u"Ja"_s);
     EXPECT_TRUE(Contents(questions_.get()).contains("Weiter?\n  1) Ja\n  2) Nein\n  3) Abbrechen\n"));
 }
@@ -44,7 +44,7 @@ TEST_F(TerminalDialogsTest, AnEmptyAnswerTakesThePreset) {
 
 TEST_F(TerminalDialogsTest, WithoutATerminalEveryQuestionIsCancelled) {
     TerminalDialogs dialogs(questions_.get(), nullptr);
-    EXPECT_EQ(dialogs.Ask(u"?"_s, {u"Ja"_s, u"Nein"_s}, 1), 1);
+    EXPECT_EQ(dialogs.Ask({.Text = u"?"_s, .Buttons = {u"Ja"_s, u"Nein"_s}, .Cancel = 1, .Default = 0}), 1);
     EXPECT_EQ(dialogs.Input(u"?"_s, u"?"_s, {}, u"preset"_s), std::nullopt);
     EXPECT_TRUE(dialogs.OpenFiles({}).isEmpty());
     EXPECT_EQ(dialogs.OpenFile({}), std::nullopt);

@@ -24,7 +24,7 @@ class DatabaseCommandsTest : public testing::Test {
             song.Artist = u"Artist %1"_s.arg(i % 3);
             song.Year = u"1999"_s;
             song.AddTime = 1;
-            database.AddEntry(QString(), song, {.SkipChecks = true});
+            database.AddEntry(QString(), song, AddAs::Returning);
         }
         database.RecountGroups();
     }
@@ -256,6 +256,6 @@ TEST_F(DatabaseCommandsTest, NothingIsTouchedWhileAnotherRunIsGoing) {
     database.EndBusy();
     EXPECT_EQ(database.Count(), 3);
     EXPECT_EQ(database.FileName(), Path(u"a.tsdb"_s));
-    EXPECT_EQ(dialogs_.Messages.size(), 3u);
+    EXPECT_EQ(dialogs_.Messages.size(), 3);
     EXPECT_EQ(FilesThere(), QStringList{u"a.tsdb"_s});
 }

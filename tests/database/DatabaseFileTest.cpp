@@ -74,12 +74,12 @@ class DatabaseFileTest : public testing::Test {
         return file.ReadExactly(0, static_cast<std::size_t>(file.Size()));
     }
     static void Add(TMusicDatabase& database, const TID3Tag& song) {
-        database.AddEntry(QString(), song, {.SkipChecks = true});
+        database.AddEntry(QString(), song, AddAs::Loaded);
         database.RecountGroups();
     }
     static void AddMany(TMusicDatabase& database, int count) {
         for (int i = 0; i < count; ++i)
-            database.AddEntry(QStringLiteral("/m/%1.mp3").arg(i, 5), FullSong(), {.SkipChecks = true});
+            database.AddEntry(QStringLiteral("/m/%1.mp3").arg(i, 5), FullSong(), AddAs::Loaded);
         database.RecountGroups();
     }
     QTemporaryDir folder_;
@@ -223,7 +223,7 @@ TEST_F(DatabaseFileTest, SongsKeepTheOrderOfTheFileUntilOneIsPlaced) {
     EXPECT_EQ(database.Song(2).FileName, u"b"_s);
     TID3Tag song;
     song.Artist = u"AB"_s;
-    EXPECT_EQ(database.AddEntry(u"ab"_s, song, {.SkipChecks = true}), 1);
+    EXPECT_EQ(database.AddEntry(u"ab"_s, song, AddAs::Loaded), 1);
     EXPECT_EQ(database.Song(3).FileName, u"c"_s);
 }
 

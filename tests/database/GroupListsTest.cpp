@@ -9,14 +9,18 @@ using namespace Qt::StringLiterals;
 namespace {
 
 // Writes down every change of a row: "+Artist 0 Abba 1", "=Year 2 5", "-Album 1".
-class Recorder : public GroupListener {
+class Recorder {
  public:
-    void RowInserted(TOVType type, int row, const QString& caption, int count) override {
-        Note(u'+', type, row, u' ' + caption + u' ' + QString::number(count));
-    }
-    void RowDeleted(TOVType type, int row) override { Note(u'-', type, row, QString()); }
-    void RowUpdated(TOVType type, int row, int count) override {
-        Note(u'=', type, row, u' ' + QString::number(count));
+    explicit Recorder(GroupLists& groups) {
+        GroupEvents& events = groups.Events();
+        subscriptions_ += events.Inserted.Subscribe([this](TOVType type, int row, auto& caption, int count) {
+            Note(u'+', type, row, u' ' + caption + u' ' + QString::number(count));
+        });
+        subscriptions_ +=
+            events.Deleted.Subscribe([this](TOVType type, int row) { Note(u'-', type, row, QString()); });
+        subscriptions_ += events.Updated.Subscribe([this](TOVType type, int row, int count) {
+            Note(u'=', type, row, u' ' + QString::number(count));
+        });
     }
     QStringList Take() { return std::exchange(changes_, {}); }
 
@@ -26,6 +30,7 @@ class Recorder : public GroupListener {
         changes_ << sign + names[type] + u' ' + QString::number(row) + rest;
     }
     QStringList changes_;
+    Subscriptions subscriptions_;
 };
 
 TID3Tag Song(const QString& artist, const QString& album, const QString& year, quint16 length, quint8 genre) {
@@ -107,24 +112,28 @@ TEST(GroupListsTest, AYearThatIsNoNumberIsUnknown) {
 
 TEST(GroupListsTest, ASongIsCountedInEachListAndTold) {
     GroupLists groups;
-    Recorder recorder;
-    groups.Add(Song(u"Queen"_s, u"Jazz"_s, u"1978"_s, 200, 8), &recorder);
+    Recorder recorder(groups);
+    groups.Add(Song(u"Queen"_s, u"Jazz"_s, u"1978"_s, 200, 8));
     EXPECT_EQ(recorder.Take(),
               (QStringList{u"+Artist 0 Queen 1"_s, u"+Album 0 Jazz 1"_s, u"+Year 0 In den 70ern 1"_s,
                            u"+Length 0 3 bis 4 Minuten 1"_s, u"=Genre 8 1"_s}));
-    groups.Add(Song(u"Abba"_s, u"Jazz"_s, u"0000"_s, 61, 8), &recorder);
+    groups.Add(Song(u"Abba"_s, u"Jazz"_s, u"0000"_s, 61, 8));
     EXPECT_EQ(recorder.Take(), (QStringList{u"+Artist 0 Abba 1"_s, u"=Album 0 2"_s, u"+Year 0 Unbekannt 1"_s,
                                             u"+Length 0 1 bis 2 Minuten 1"_s, u"=Genre 8 2"_s}));
-    groups.Remove(Song(u"Abba"_s, u"Jazz"_s, u"0000"_s, 61, 8), &recorder);
+    groups.Remove(Song(u"Abba"_s, u"Jazz"_s, u"0000"_s, 61, 8));
     EXPECT_EQ(recorder.Take(),
               (QStringList{u"-Artist 0"_s, u"=Album 0 1"_s, u"-Year 0"_s, u"-Length 0"_s, u"=Genre 8 1"_s}));
+    // Only what a change changes is told.
+    groups.Change(Song(u"Queen"_s, u"Jazz"_s, u"1978"_s, 200, 8),
+                  Song(u"Queen"_s, u"Live"_s, u"1979"_s, 200, 8));
+    EXPECT_EQ(recorder.Take(), (QStringList{u"-Album 0"_s, u"+Album 0 Live 1"_s}));
 }
 
 TEST(GroupListsTest, ArtistsAndAlbumsAreSortedAndTellCasesApart) {
     GroupLists groups;
     for (const QString& name : {u"zz top"_s, u"Ärzte"_s, u"abba"_s, u"ZZ Top"_s, u"Abba"_s, u"Bap"_s, u""_s})
-        groups.Add(Song(name, name, QString(), 0, 0), nullptr);
-    groups.Add(Song(u"abba"_s, u"neu"_s, QString(), 0, 0), nullptr);
+        groups.Add(Song(name, name, QString(), 0, 0));
+    groups.Add(Song(u"abba"_s, u"neu"_s, QString(), 0, 0));
     const QStringList expected{u""_s, u"abba"_s, u"Abba"_s, u"Ärzte"_s, u"Bap"_s, u"zz top"_s, u"ZZ Top"_s};
     EXPECT_EQ(Texts(groups.Artists()), expected);
     EXPECT_EQ(groups.RowSongCount(ovArtist, 1), 2);
@@ -137,11 +146,11 @@ TEST(GroupListsTest, ManySongsAreCountedAsIfOneByOne) {
     QHash<QString, int> expected;
     for (unsigned i = 0; i < 5000; ++i) {
         const QString artist = QString::number(i * 7919 % 613);
-        groups.Add(Song(artist, QString(), QString(), 0, 0), nullptr);
+        groups.Add(Song(artist, QString(), QString(), 0, 0));
         ++expected[artist];
         if (i % 3 != 0) continue;
         const QString other = QString::number(i % 613);
-        groups.Remove(Song(other, QString(), QString(), 0, 0), nullptr);
+        groups.Remove(Song(other, QString(), QString(), 0, 0));
         if (expected.contains(other) && --expected[other] == 0) expected.remove(other);
     }
     ASSERT_EQ(groups.RowCount(ovArtist), expected.size());
@@ -151,9 +160,9 @@ TEST(GroupListsTest, ManySongsAreCountedAsIfOneByOne) {
 
 TEST(GroupListsTest, GenreRowsAreAlwaysTwentyAndNeverBelowZero) {
     GroupLists groups;
-    groups.Add(Song(QString(), QString(), QString(), 0, 200), nullptr);
+    groups.Add(Song(QString(), QString(), QString(), 0, 200));
     EXPECT_EQ(groups.RowSongCount(ovGenre, 0), 1) << "a number that is no main genre counts as unknown";
-    groups.Remove(Song(QString(), QString(), QString(), 0, 3), nullptr);
+    groups.Remove(Song(QString(), QString(), QString(), 0, 3));
     EXPECT_EQ(groups.RowSongCount(ovGenre, 3), 0);
     groups.Clear();
     EXPECT_EQ(groups.RowCount(ovGenre), 20);
@@ -166,7 +175,7 @@ TEST(GroupListsTest, RowsOfAFileAddUpAndMayBeWrong) {
     groups.AddRow(ovArtist, u"Queen"_s, 3);
     groups.AddRow(ovArtist, u"Queen"_s, 2);
     EXPECT_EQ(groups.RowSongCount(ovArtist, 0), 5);
-    Recorder recorder;
-    groups.Remove(Song(u"not in the file"_s, QString(), QString(), 0, 0), &recorder);
+    Recorder recorder(groups);
+    groups.Remove(Song(u"not in the file"_s, QString(), QString(), 0, 0));
     EXPECT_EQ(recorder.Take(), QStringList{u"=Genre 0 0"_s});
 }

@@ -99,9 +99,9 @@ TEST_F(IntakeTest, PickedFilesAreReadPlacedAndReported) {
     ASSERT_EQ(dialogs_.FileDialogs.size(), 1u);
     EXPECT_EQ(dialogs_.FileDialogs[0].Title, u"Songs zur Datenbank hinzufügen"_s);
     EXPECT_EQ(dialogs_.FileDialogs[0].Filter, u"Musik|*.mp3;*.mp2;*.wma;*.wav;|Alle Dateien|*.*"_s);
-    ASSERT_EQ(dialogs_.Questions.size(), 1u);
-    EXPECT_EQ(dialogs_.Questions[0].Text, u"Es wurde(n) 2 neue(r) Song(s) in die Datenbank aufgenommen."_s);
-    EXPECT_EQ(dialogs_.Questions[0].Buttons, (QStringList{u"OK"_s, u"Details"_s}));
+    ASSERT_EQ(dialogs_.Questions.size(), 1);
+    EXPECT_EQ(dialogs_.Questions[0], u"Es wurde(n) 2 neue(r) Song(s) in die Datenbank aufgenommen."_s);
+    EXPECT_EQ(dialogs_.Asked[0].Buttons, (QStringList{u"OK"_s, u"Details"_s}));
     EXPECT_TRUE(dialogs_.Messages.empty()) << "a file that cannot be read is passed over without a word";
 }
 
@@ -129,7 +129,7 @@ TEST_F(IntakeTest, AFolderIsSearchedWithOrWithoutItsSubfolders) {
     EXPECT_EQ(result.Known, 1);
     EXPECT_EQ(result.Unreadable, 0);
     EXPECT_EQ(runs_.last(), u"MusicDatabase v6.0 - Dursuche Ordner nach neuen Songs"_s);
-    EXPECT_EQ(dialogs_.Questions.size(), 2u);
+    EXPECT_EQ(dialogs_.Questions.size(), 2);
 
     QStringList descriptions;
     for (const ProgressPoint& point : points_)
@@ -203,7 +203,7 @@ TEST_F(IntakeTest, StoppingTheWalkReadsNoSong) {
 
 TEST_F(IntakeTest, TheCacheListOfALargeCollectionIsMadeInSteps) {
     for (int i = 0; i < 20'000; ++i)
-        database_.AddEntry(u":00000000:\\"_s + QString::number(i), {}, {.SkipChecks = true});
+        database_.AddEntry(u":00000000:\\"_s + QString::number(i), {}, AddAs::Loaded);
     const QStringList files = AddSongs(1);
     database_.OnProgress = [&](TMusicDatabase& database, const ProgressPoint& point) {
         points_.push_back(point);
@@ -307,7 +307,7 @@ TEST_F(IntakeTest, BannedSongsAreCountedAndThrownAwayWhenWanted) {
 
 TEST_F(IntakeTest, DetailsNameTheSongsAndWhatWasUnreadable) {
     const RecordingShell shell;
-    dialogs_.Buttons.push_back(1);
+    dialogs_.Answers.push_back(1);
     const QStringList files = AddSongs(2) + songs_.Paths({u"gone.mp3"_s});
     AddSongsFromDialog(database_, files);
     ASSERT_EQ(shell.Opened,
@@ -324,10 +324,10 @@ TEST_F(IntakeTest, DetailsNameTheSongsAndWhatWasUnreadable) {
 TEST_F(IntakeTest, DetailsThatCannotBeShownAreToldAndTheSongsStay) {
     RecordingShell shell;
     shell.Works = false;
-    dialogs_.Buttons.push_back(1);
+    dialogs_.Answers.push_back(1);
     EXPECT_EQ(AddSongsFromDialog(database_, AddSongs(1)).Added, 1);
-    ASSERT_EQ(dialogs_.Messages.size(), 1u);
-    EXPECT_TRUE(dialogs_.Messages[0].second.startsWith(u"Kann die Datei nicht anzeigen: "_s));
+    ASSERT_EQ(dialogs_.Messages.size(), 1);
+    EXPECT_TRUE(dialogs_.Messages[0].startsWith(u"Kann die Datei nicht anzeigen: "_s));
     QFile::remove(shell.Opened[0]);
 }
 

@@ -75,7 +75,7 @@ std::vector<SongOrder> AllOrders() {
 SongList ListOf(const std::vector<TID3Tag>& songs) {
     SongList list;
     for (const TID3Tag& song : songs)
-        list.Append(std::make_unique<TID3Tag>(song));
+        list.Append(song);
     return list;
 }
 

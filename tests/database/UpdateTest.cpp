@@ -42,20 +42,20 @@ TEST_F(UpdateTest, NewSongsComeInAndGoneOnesLeaveAfterTheQuestion) {
     TakeIn({u"music/A - one.wav"_s, u"music/A - two.wav"_s});
     songs_.Add(u"music/A - three.wav"_s);
     QFile::remove(songs_.Path(u"music/A - one.wav"_s));
-    dialogs_.Buttons = {0, 0};  // remove; close the report
+    dialogs_.Answers = {0, 0};  // remove; close the report
     const UpdateResult result = UpdateDatabase(database_, UpdateTags::Keep);
     EXPECT_EQ(result.Intake.Added, 1);
     EXPECT_EQ(result.Removed, songs_.Paths({u"music/A - one.wav"_s}));
     EXPECT_EQ(Titles(), (QStringList{u"three"_s, u"two"_s}));
     ASSERT_FALSE(dialogs_.Questions.empty());
-    EXPECT_TRUE(dialogs_.Questions[0].Text.contains(songs_.Path(u"music/A - one.wav"_s)));
+    EXPECT_TRUE(dialogs_.Questions[0].contains(songs_.Path(u"music/A - one.wav"_s)));
     EXPECT_EQ(database_.Artists().At(0).Number, 2);
 }
 
 TEST_F(UpdateTest, GoneSongsStayWhenTheUserSaysSo) {
     TakeIn({u"music/A - one.wav"_s, u"music/A - two.wav"_s});
     QFile::remove(songs_.Path(u"music/A - one.wav"_s));
-    dialogs_.Buttons = {1, 0};
+    dialogs_.Answers = {1, 0};
     EXPECT_TRUE(UpdateDatabase(database_, UpdateTags::Keep).Removed.isEmpty());
     EXPECT_EQ(database_.Count(), 2);
 }
@@ -72,7 +72,7 @@ TEST_F(UpdateTest, AnUnpluggedDiskNeverEmptiesTheCollection) {
     QDir(songs_.Path(u"music"_s)).removeRecursively();
     result = UpdateDatabase(database_, UpdateTags::Keep);
     EXPECT_EQ(database_.Count(), 2);
-    for (const auto& question : dialogs_.Questions)
+    for (const Question& question : dialogs_.Asked)
         EXPECT_FALSE(question.Buttons.contains(u"Entfernen"_s));
 }
 
@@ -128,11 +128,11 @@ TEST_F(UpdateTest, CopyingAsksBeforeItReplaces) {
     TakeIn({u"music/A - one.wav"_s, u"music/A - two.wav"_s});
     songs_.Add(u"target/A - one.wav"_s, 5);
     const qint64 before = QFileInfo(songs_.Path(u"target/A - one.wav"_s)).size();
-    dialogs_.Buttons = {2};  // leave it
+    dialogs_.Answers = {2};  // leave it
     CopyResult result = CopySongs(database_, {0, 1}, songs_.Path(u"target"_s));
     EXPECT_EQ(result.Copied, 1);
     EXPECT_EQ(QFileInfo(songs_.Path(u"target/A - one.wav"_s)).size(), before);
-    dialogs_.Buttons = {1};  // replace all
+    dialogs_.Answers = {1};  // replace all
     result = CopySongs(database_, {0, 1}, songs_.Path(u"target"_s));
     EXPECT_EQ(result.Copied, 2);
     EXPECT_NE(QFileInfo(songs_.Path(u"target/A - one.wav"_s)).size(), before);

@@ -205,8 +205,8 @@ TEST_F(NextTest, OneBadFileNeitherEndsTheRoundNorIsToldTwice) {
     Add(u"abcd"_s);
     player_.Broken = {u"b"_s, u"c"_s};
     EXPECT_EQ(PlayOn(), u"ad"_s);
-    ASSERT_EQ(dialogs_.Messages.size(), 2u);
-    EXPECT_EQ(dialogs_.Messages[0].first, MessageKind::Error);
+    ASSERT_EQ(Messages().size(), 2);
+    EXPECT_EQ(dialogs_.MessageKinds[0], MessageKind::Error);
     EXPECT_EQ(Messages()[0], u"Engine: b\r\n"_s + Path(u"b"_s) + u"\r\n\r\nEngine: c\r\n"_s + Path(u"c"_s));
     EXPECT_EQ(Messages()[1], kAllPlayed);
     EXPECT_EQ(Names(list_.History()), u"da"_s);

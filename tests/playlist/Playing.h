@@ -98,12 +98,7 @@ class PlayingTest : public testing::Test {
         }
         return player_.Played.join(QString());
     }
-    QStringList Messages() const {
-        QStringList texts;
-        for (const auto& message : dialogs_.Messages)
-            texts << message.second;
-        return texts;
-    }
+    const QStringList& Messages() const { return dialogs_.Messages; }
 
     SongFolder folder_;
     ScriptedDialogs dialogs_;

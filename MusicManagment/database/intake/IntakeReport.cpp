@@ -4,15 +4,11 @@
 #include <QFile>
 
 #include "CommonRUKTools/CodePage.h"
-#include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/Shell.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
-
-constexpr int kOkButton = 0;
-constexpr int kDetailsButton = 1;
 
 void AppendLines(const QStringList& lines, QString& text) {
     for (const QString& line : lines)
@@ -51,11 +47,16 @@ QString IntakeDetails(const IntakeResult& result) {
     return text;
 }
 
-void ShowReport(const QString& message, const QString& details) {
-    if (UserDialogs().Ask(message, {u"OK"_s, u"Details"_s}, kOkButton) == kDetailsButton)
-        ShowDetails(details);
+std::vector<ReportSection> IntakeSections(const IntakeResult& result) {
+    return {{u"Neu aufgenommen"_s, result.NewFiles},
+            {u"Nicht gelesen oder nicht aufgenommen"_s, result.UnreadableNames, true}};
+}
+
+void ShowReport(const QString& message, std::vector<ReportSection> sections, const QString& details) {
+    std::erase_if(sections, [](const ReportSection& section) { return section.Lines.isEmpty(); });
+    UserDialogs().ShowReport({message, std::move(sections), [details] { ShowDetails(details); }});
 }
 
 void ReportIntake(const IntakeResult& result) {
-    ShowReport(IntakeMessage(result), IntakeDetails(result));
+    ShowReport(IntakeMessage(result), IntakeSections(result), IntakeDetails(result));
 }

@@ -140,7 +140,7 @@ bool ConfirmRemoval(const QStringList& gone) {
         text += u'\n' + path;
     if (gone.size() > kListedSongs)
         text += u"\n... und "_s + QString::number(gone.size() - kListedSongs) + u" weitere"_s;
-    return UserDialogs().Ask(text, {u"Entfernen"_s, u"Behalten"_s}, 1) == 0;
+    return UserDialogs().Ask({.Text = text, .Buttons = {u"Entfernen"_s, u"Behalten"_s}, .Cancel = 1}) == 0;
 }
 
 void RequireFolders(const TMusicDatabase& database) {
@@ -151,6 +151,14 @@ void RequireFolders(const TMusicDatabase& database) {
             u"Es ist noch kein Ordner eingetragen, in dem nach Songs gesucht werden soll. Fügen Sie zuerst "
             u"einen Ordner zur "
             "Datenbank hinzu."_s);
+}
+
+std::vector<ReportSection> UpdateSections(const UpdateResult& result) {
+    std::vector<ReportSection> sections = IntakeSections(result.Intake);
+    sections.push_back({u"Geänderte Tags übernommen"_s, result.Changed});
+    sections.push_back({u"Aus der Datenbank entfernt"_s, result.Removed});
+    sections.push_back({u"Nicht erreichbare Ordner"_s, result.MissingFolders, true});
+    return sections;
 }
 
 void AppendLines(QString& text, const QString& heading, const QStringList& lines) {
@@ -181,7 +189,7 @@ UpdateResult UpdateDatabase(TMusicDatabase& database, UpdateTags tags) {
         RemoveSongs(database, gone);
         result.Removed = gone;
     }
-    ShowReport(UpdateMessage(result), UpdateDetails(result));
+    ShowReport(UpdateMessage(result), UpdateSections(result), UpdateDetails(result));
     database.SaveAfterCommand();
     return result;
 }
@@ -205,7 +213,7 @@ void RememberFolders(TMusicDatabase& database, const QStringList& folders) {
 IntakeResult SearchNewSongs(TMusicDatabase& database) {
     RequireFolders(database);
     IntakeResult result = AddPaths(database, SplitFolders(database.UpdateFolders()).There, true);
-    ShowReport(IntakeMessage(result), IntakeDetails(result));
+    ReportIntake(result);
     database.SaveAfterCommand();
     return result;
 }

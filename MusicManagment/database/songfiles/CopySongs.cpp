@@ -22,10 +22,12 @@ class CollisionPolicy {
     // Throws EAbort on cancel.
     bool MayReplace(const QString& name) {
         if (policy_ != Existing::Ask) return policy_ == Existing::Replace;
-        const int answer = UserDialogs().Ask(
-            u"Die Datei "_s + name + u" existiert bereits."_s,
-            {u"Ersetzen"_s, u"Alle ersetzen"_s, u"Überspringen"_s, u"Alle überspringen"_s, u"Abbrechen"_s},
-            4);
+        const int answer =
+            UserDialogs().Ask({.Text = u"Die Datei "_s + name + u" existiert bereits."_s,
+                               .Buttons = {u"Ersetzen"_s, u"Alle ersetzen"_s, u"Überspringen"_s,
+                                           u"Alle überspringen"_s, u"Abbrechen"_s},
+                               .Cancel = 4,
+                               .Default = 2});
         if (answer == 4) throw EAbort();
         if (answer == 1) policy_ = Existing::Replace;
         if (answer == 3) policy_ = Existing::Skip;

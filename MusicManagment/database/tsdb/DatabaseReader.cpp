@@ -120,7 +120,7 @@ class BodyReader {
     bool Read() {
         if (!ReadUpdateFolders()) return false;
         if (header_.HasLists() && !ReadLists()) return false;
-        database_.RaisePrepareMultiAdd(PossibleSongs());
+        database_.Events().Reserve.Tell(PossibleSongs());
         if (!ReadSongs()) return false;
         if (endIsKnown_) stream_.ExpectEnd();
         return true;
@@ -232,11 +232,11 @@ bool BodyReader::ReadSongs() {
 }
 
 void BodyReader::ReadSong() {
-    auto song = std::make_unique<TID3Tag>();
+    TID3Tag song;
     ByteReader numbers(Take(kPackedRecordSize));
-    song->Year = years_.Get(ReadPackedRecord(numbers, *song));
-    ReadTexts(*song);
-    database_.AddEntry(std::move(song), {.SkipChecks = true, .KeepModified = true});
+    song.Year = years_.Get(ReadPackedRecord(numbers, song));
+    ReadTexts(song);
+    database_.AddEntry(QString(), std::move(song), AddAs::Loaded);
 }
 
 void BodyReader::ReadTexts(TID3Tag& song) {
@@ -265,14 +265,14 @@ bool ReadBody(TMusicDatabase& database, ByteSource& source, const Header& header
     if (!reader.ListsAreValid())
         database.RecountGroups();
     else if (header.HasLists())
-        database.RaiseOverviewChanged();
+        database.Groups().TellRebuilt();
     return true;
 }
 
 // The songs that were read before the end stay; the lists, which count all songs of the file, cannot.
 void SettleForPart(TMusicDatabase& database) {
     database.RecountGroups();
-    database.RaiseChange(-1, ctChanged);
+    database.Events().Replaced.Tell();
 }
 
 }  // namespace
@@ -292,7 +292,7 @@ bool ReadDatabase(TMusicDatabase& database, ByteSource& stream) {
         SettleForPart(database);
         return false;
     }
-    database.RaiseChange(-1, ctChanged);
+    database.Events().Replaced.Tell();
     database.SetModified(false);
     return true;
 }

@@ -56,15 +56,15 @@ std::size_t OldRecordSize(int version) {
 }
 
 bool AddOldSong(TMusicDatabase& database, ByteSpan bytes, int version, bool isCounted) {
-    const AddOptions options{.SkipChecks = isCounted, .KeepModified = true};
+    const AddAs as = isCounted ? AddAs::Loaded : AddAs::LoadedUncounted;
     const QString path = TextUpToZero(bytes.first(kFileNameField));
     const SongOverrides values = StoredValues(bytes, version);
     try {
-        if (database.AddSong(path, values, options) >= 0) return true;
+        if (database.AddSong(path, values, as) >= 0) return true;
         if (!IsCdPath(path)) return false;
     } catch (const EStreamError&) {
         // The file is there but cannot be read now: rights, a bad sector. The song stays, as below.
     }
     // Such a song, and one on a CD that is not inserted, loses its tags but not its place in the collection.
-    return database.AddEntry(path, RecordOf(values), options) >= 0;
+    return database.AddEntry(path, RecordOf(values), as) >= 0;
 }

@@ -118,7 +118,7 @@ TEST_F(OpeningTest, WhoOpensAnotherSongWhileAMessageStandsHasTheLastWord) {
         PlaySong(u"b.mp3"_s);
     };
     EXPECT_THROW(player_.SetFileName(Add(u"a.mp3"_s)), EAbort);
-    EXPECT_EQ(dialogs.Messages.size(), 1U);
+    EXPECT_EQ(dialogs.Messages.size(), 1);
     EXPECT_EQ(Open(), u"FMOD:b"_s);
     EXPECT_EQ(player_.GetStatus(), psPlaying);
 }

@@ -199,12 +199,7 @@ class PlayerTest : public testing::Test {
             names << backend->Engine() + QLatin1Char(':') + backend->Song();
         return names.join(QLatin1Char(' '));
     }
-    QStringList Messages() const {
-        QStringList texts;
-        for (const auto& message : dialogs_.Messages)
-            texts << message.second;
-        return texts;
-    }
+    const QStringList& Messages() const { return dialogs_.Messages; }
     void Change(const std::function<void(EngineSettings&)>& change) {
         EngineSettings settings = player_.Engines();
         change(settings);

@@ -68,8 +68,8 @@ class FallBackTest : public testing::Test {
     // "reason>engine tried next" of what the user was shown, each reason cut to its first words.
     QStringList Told() const {
         QStringList told;
-        for (const auto& message : dialogs_.Messages) {
-            const QStringList parts = message.second.split(u"\r\nVersuche "_s);
+        for (const QString& message : dialogs_.Messages) {
+            const QStringList parts = message.split(u"\r\nVersuche "_s);
             told << parts.first().section(u' ', 0, 2) + u'>' + parts.value(1);
         }
         return told;
