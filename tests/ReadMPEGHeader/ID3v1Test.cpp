@@ -3,7 +3,6 @@
 #include <gtest/gtest.h>
 
 #include "CommonRUKTools/CodePage.h"
-#include "CommonRUKTools/Errors.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
 
@@ -42,19 +41,6 @@ TEST(ID3v1, TrackNeedsAZeroBeforeIt) {
     bytes[126] = 'y';
     EXPECT_EQ(ReadBack(bytes).Track, 0);
     EXPECT_EQ(ReadBack(bytes).Comment, QString(28, u'k') + u"xy"_s);
-}
-
-TEST(ID3v1, IsGoodWithTitleAndArtistOnly) {
-    const auto good = Id3v1Bytes("t", "a", "", "", "", 0);
-    const auto bad = Id3v1Bytes("t", " ", "Album", "1999", "k", 0);
-    MemorySource goodSource(good), badSource(bad);
-    TID3Tag tag;
-    tag.Album = u"alt"_s;
-    EXPECT_TRUE(ReadID3v1(goodSource, 0, tag));
-    EXPECT_EQ(tag.Album, QString());
-    EXPECT_FALSE(ReadID3v1(badSource, 0, tag));
-    EXPECT_EQ(tag.Album, u"Album"_s);
-    EXPECT_THROW(ReadID3v1(goodSource, 1, tag), EStreamError);
 }
 
 TEST(ID3v1, WritingCutsTheRecordToWhatTheFileHolds) {

@@ -17,33 +17,6 @@ std::optional<XrukFrame> Parse(std::string_view body) {
 
 }  // namespace
 
-TEST(XrukFrame, KeepsEveryTechnicalField) {
-    TID3Tag technical;
-    technical.MPEGLayer = u"MPEG 1.0 Layer III"_s;
-    technical.BitRate = 320;
-    technical.SampleRate = 44100;
-    technical.ChannelMode = 3;
-    technical.Emphasis = 4;
-    technical.Protected = technical.Original = technical.Padding = true;
-    technical.FrameSize = 1044;
-    const auto addCollection = [](TID3Tag tag) {
-        tag.Reserved = 0xBEEF;
-        tag.Flags = 0x80000009;
-        tag.MainGenre = 131;
-        tag.Remix = true;
-        tag.AddTime = 38000.25;
-        return tag;
-    };
-    const auto frame = Parse(XrukBody(addCollection(technical)));
-    ASSERT_TRUE(frame);
-    TID3Tag found;
-    frame->ApplyTechnicalFields(found);
-    EXPECT_EQ(found, technical);
-    found = TID3Tag();
-    frame->ApplyCollectionFields(found);
-    EXPECT_EQ(found, addCollection({}));
-}
-
 TEST(XrukFrame, AnImpossibleFileTimeIsNotTaken) {
     constexpr double kInfinity = std::numeric_limits<double>::infinity();
     for (const double time : {std::numeric_limits<double>::quiet_NaN(), kInfinity, -kInfinity, -1.0, 1e300}) {
