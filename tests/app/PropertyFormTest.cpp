@@ -119,18 +119,6 @@ TEST_F(PropertyFormTest, ReadsNothingWhileItCannotBeSeen) {
     EXPECT_EQ(form_.Properties().topLevelItemCount(), 0);
 }
 
-TEST_F(PropertyFormTest, WaitsForTheEndOfALongOperation) {
-    Show(TaggedSong());
-    {
-        const ProgressRun run(database_, u"Test"_s);
-        form_.ReadFile();
-        EXPECT_TRUE(form_.ReadPending());
-        EXPECT_FALSE(Lines().contains(u"TIT2: Lied"_s));
-    }
-    form_.ReadFile();
-    EXPECT_TRUE(Lines().contains(u"TIT2: Lied"_s));
-}
-
 TEST_F(PropertyFormTest, AnUnreadableFileIsToldInALine) {
     Show(CdSong(u"Lied"_s));
     EXPECT_TRUE(Lines().contains(u"Name: Lied.mp3"_s));

@@ -140,6 +140,35 @@ TEST_F(IntakeTest, EveryFifthFileIsAProgressPointWhereStoppingKeepsWhatWasTakenI
     EXPECT_EQ(database_.Count(), 5);
 }
 
+TEST_F(IntakeTest, ReadingAheadChangesNothing) {
+    const HandClock clock;
+    QStringList files;
+    for (int i = 0; i < 300; ++i) {
+        const QString name = u"Band %1 - Title.%2"_s.arg(i % 7).arg(i);
+        // Whole, damaged in its head, empty, not there, a folder, offered a second time.
+        const QString path = i % 6 == 3 ? songs_.Path(name + u".mp3"_s) : songs_.Add(name + u".wav"_s, 1);
+        if (i % 6 == 1) QFile::resize(path, 20);
+        if (i % 6 == 2) QFile::resize(path, 0);
+        if (i % 6 == 4) QDir().mkpath(songs_.Path(name + u".mp2"_s));
+        files << (i % 6 == 4 ? songs_.Path(name + u".mp2"_s) : i % 6 == 5 ? files[i - 5] : path);
+    }
+    TMusicDatabase oneByOne;
+    QStringList expected;
+    for (const QString& path : files)
+        if (!oneByOne.Contains(path) && AddSongFile(oneByOne, path) >= 0) expected << path;
+    IntakeResult result;
+    QStringList list = files;
+    EXPECT_EQ(AddFileList(database_, list, true, nullptr, &result), 150);
+    EXPECT_EQ(list, expected);
+    EXPECT_EQ(result.NewFiles, expected);
+    EXPECT_EQ(result.Known, 50);
+    EXPECT_EQ(result.UnreadableNames.size(), 100);
+    EXPECT_EQ(result.UnreadableNames[0], u"Datei nicht gefunden: "_s + files[3]);
+    ASSERT_EQ(database_.Count(), oneByOne.Count());
+    for (int i = 0; i < oneByOne.Count(); ++i)
+        EXPECT_TRUE(database_.Song(i) == oneByOne.Song(i)) << i;
+}
+
 TEST_F(IntakeTest, StoppingTheWalkReadsNoSong) {
     AddSongs(3);
     songs_.Add(u"sub/Band - Last.wav"_s);
