@@ -208,12 +208,14 @@ void TTunesteadMainWnd::StoreSettings() {
 
 void TTunesteadMainWnd::SetUpPlacement() {
     const TRWReg settings(kSettingsKey.toString(), options_.SettingsFile);
+    if (!restoreGeometry(settings.ReadBinary(u"MainForm"_s).value_or(QByteArray()))) {
+        constexpr int kWidth = 190;  // average characters
+        constexpr int kHeight = 42;  // lines
+        const QSize wanted(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
+        resize(wanted.boundedTo(screen()->availableSize() * 0.9));
+    }
+    // After the window's size: the docks' are parts of it.
     restoreState(settings.ReadBinary(u"MainFormState"_s).value_or(QByteArray()));
-    if (restoreGeometry(settings.ReadBinary(u"MainForm"_s).value_or(QByteArray()))) return;
-    constexpr int kWidth = 190;  // average characters
-    constexpr int kHeight = 42;  // lines
-    const QSize wanted(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
-    resize(wanted.boundedTo(screen()->availableSize() * 0.9));
 }
 
 // --- Starting ---

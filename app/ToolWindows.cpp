@@ -5,6 +5,7 @@
 
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/commands/Menu.h"
+#include "app/views/DockAction.h"
 #include "app/views/MusicOverview.h"
 #include "app/views/OverviewForm.h"
 #include "app/views/PropertyForm.h"
@@ -27,9 +28,27 @@ ToolWindows::ToolWindows(QMainWindow& window, TMusicDatabase& database)
     };
     overview_->Overview().OnTypeChanged = [this](TOVType) { MarkMenu(); };
     MarkMenu();
+    FollowSong();
+}
+
+void ToolWindows::FollowSong() {
+    CollectionEvents& events = database_.Events();
+    subscriptions_ += events.Changed.Subscribe([this](SongIndex index, const TID3Tag&, const TID3Tag& song) {
+        if (index == database_.Songs().PositionOf(song_)) Show(&song);
+    });
+    const auto forget = [this] {
+        if (database_.Songs().Find(song_) == nullptr) Show(nullptr);
+    };
+    subscriptions_ += events.Replaced.Subscribe(forget);
+    subscriptions_ += events.Cleared.Subscribe(forget);
 }
 
 void ToolWindows::ShowSong(const TID3Tag* song) {
+    song_ = song != nullptr ? database_.Songs().HandleOf(*song) : SongHandle();
+    Show(song);
+}
+
+void ToolWindows::Show(const TID3Tag* song) {
     properties_->ShowSong(song);
     tag_->ShowSong(song);
 }
@@ -45,7 +64,7 @@ bool ToolWindows::Run(int id) {
 void ToolWindows::AddTo(QMenu& menu) {
     for (QDockWidget* window : {static_cast<QDockWidget*>(overview_), static_cast<QDockWidget*>(properties_),
                                 static_cast<QDockWidget*>(tag_)})
-        menu.addAction(window->toggleViewAction());
+        AddDockAction(menu, *window);
 }
 
 void ToolWindows::MarkMenu() {

@@ -2,8 +2,8 @@
 
 #include <functional>
 
-#include "MusicManagment/database/SongTypes.h"
-#include "ReadMPEGHeader/ID3Tag.h"
+#include "CommonRUKTools/Listeners.h"
+#include "MusicManagment/database/SongList.h"
 #include "app/models/GroupSelection.h"
 
 class QMainWindow;
@@ -22,7 +22,8 @@ class ToolWindows {
     // Told when other groups are chosen in the overview.
     std::function<void(const GroupSelection&)> OnSelectionChanged;
 
-    // Shows a song in the windows that are about one; nullptr for none.
+    // Shows a song of the database in the windows that are about one, which follow its changes; nullptr for
+    // none.
     void ShowSong(const TID3Tag* song);
     // The commands of the database's menu that the overview serves. False when the number is none of them.
     bool Run(int id);
@@ -32,8 +33,13 @@ class ToolWindows {
     void AddTo(QMenu& menu);
 
  private:
+    void FollowSong();
+    void Show(const TID3Tag* song);
+
     TMusicDatabase& database_;
     TOverviewForm* overview_;
     TPropertyForm* properties_;
     TID3TagForm* tag_;
+    SongHandle song_;
+    Subscriptions subscriptions_;
 };

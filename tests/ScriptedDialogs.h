@@ -23,6 +23,7 @@ class ScriptedDialogs : public Dialogs {
     std::vector<MessageKind> MessageKinds;
     QStringList Questions;
     std::vector<Question> Asked;  // the same with their buttons
+    std::vector<Report> Reports;
     QStringList Prompts;
     std::vector<FileDialogOptions> FileDialogs;
     QStringList FolderCaptions;
@@ -37,6 +38,7 @@ class ScriptedDialogs : public Dialogs {
         Asked.push_back(question);
         return Next(Answers).value_or(question.Cancel);
     }
+    void ShowReport(const Report& report) override { Reports.push_back(report); }
     std::optional<QString> Input(const QString&, const QString& prompt, const QStringList&,
                                  const QString&) override {
         Prompts << prompt;

@@ -99,9 +99,9 @@ TEST_F(IntakeTest, PickedFilesAreReadPlacedAndReported) {
     ASSERT_EQ(dialogs_.FileDialogs.size(), 1u);
     EXPECT_EQ(dialogs_.FileDialogs[0].Title, u"Songs zur Datenbank hinzufügen"_s);
     EXPECT_EQ(dialogs_.FileDialogs[0].Filter, u"Musik|*.mp3;*.mp2;*.wma;*.wav;|Alle Dateien|*.*"_s);
-    ASSERT_EQ(dialogs_.Questions.size(), 1);
-    EXPECT_EQ(dialogs_.Questions[0], u"Es wurde(n) 2 neue(r) Song(s) in die Datenbank aufgenommen."_s);
-    EXPECT_EQ(dialogs_.Asked[0].Buttons, (QStringList{u"OK"_s, u"Details"_s}));
+    ASSERT_EQ(dialogs_.Reports.size(), 1u);
+    EXPECT_EQ(dialogs_.Reports[0].Message, u"Es wurde(n) 2 neue(r) Song(s) in die Datenbank aufgenommen."_s);
+    EXPECT_TRUE(dialogs_.Reports[0].HasComplaints());
     EXPECT_TRUE(dialogs_.Messages.empty()) << "a file that cannot be read is passed over without a word";
 }
 
@@ -109,7 +109,7 @@ TEST_F(IntakeTest, GivenFilesNeedNoDialogAndACancelledOneEndsTheCommand) {
     EXPECT_EQ(AddSongsFromDialog(database_, AddSongs(1)).Added, 1);
     EXPECT_TRUE(dialogs_.FileDialogs.empty());
     runs_.clear();
-    dialogs_.Questions.clear();
+    dialogs_.Reports.clear();
     EXPECT_EQ(AddSongsFromDialog(database_).Added, 0);
     EXPECT_EQ(AddFolder(database_, QString(), true).Added, 0);
     EXPECT_EQ(AddFolder(database_, QString(), false).Added, 0);
@@ -117,7 +117,7 @@ TEST_F(IntakeTest, GivenFilesNeedNoDialogAndACancelledOneEndsTheCommand) {
               (QStringList{u"Ordner zum Durchsuchen nach Songs auswählen (inkl. Unterordner):"_s,
                            u"Ordner zum Durchsuchen nach Songs auswählen (ohne Unterordner):"_s}));
     EXPECT_TRUE(runs_.isEmpty());
-    EXPECT_TRUE(dialogs_.Questions.empty());
+    EXPECT_TRUE(dialogs_.Reports.empty());
 }
 
 TEST_F(IntakeTest, AFolderIsSearchedWithOrWithoutItsSubfolders) {
@@ -129,7 +129,7 @@ TEST_F(IntakeTest, AFolderIsSearchedWithOrWithoutItsSubfolders) {
     EXPECT_EQ(result.Known, 1);
     EXPECT_EQ(result.Unreadable, 0);
     EXPECT_EQ(runs_.last(), u"MusicDatabase v6.0 - Dursuche Ordner nach neuen Songs"_s);
-    EXPECT_EQ(dialogs_.Questions.size(), 2);
+    EXPECT_EQ(dialogs_.Reports.size(), 2u);
 
     QStringList descriptions;
     for (const ProgressPoint& point : points_)
@@ -227,7 +227,7 @@ TEST_F(IntakeTest, FilesAndFoldersTogetherAreOneRunWithoutReport) {
                            u"Datei nicht gefunden: "_s + songs_.Path(u"gone.mp3"_s)}));
     EXPECT_EQ(result.Unreadable, 3);
     EXPECT_EQ(runs_.size(), 1);
-    EXPECT_TRUE(dialogs_.Questions.empty());
+    EXPECT_TRUE(dialogs_.Reports.empty());
 }
 
 TEST_F(IntakeTest, NothingBeginsWhileTheDatabaseCannotChange) {
@@ -278,9 +278,9 @@ TEST_F(IntakeTest, BannedSongsAreCountedAndThrownAwayWhenWanted) {
 
 TEST_F(IntakeTest, DetailsNameTheSongsAndWhatWasUnreadable) {
     const RecordingShell shell;
-    dialogs_.Answers.push_back(1);
     const QStringList files = AddSongs(2) + songs_.Paths({u"gone.mp3"_s});
     AddSongsFromDialog(database_, files);
+    dialogs_.Reports.at(0).OpenAsText();
     ASSERT_EQ(shell.Opened,
               QStringList{QDir::temp().filePath(u"Tunestead - Änderungen in der Datenbank.txt"_s)});
     EXPECT_EQ(Contents(shell.Opened[0]), u"Folgende(r) Song(s) (2) wurde(n) neu aufgenommen:\n"_s + files[0] +
@@ -295,8 +295,8 @@ TEST_F(IntakeTest, DetailsNameTheSongsAndWhatWasUnreadable) {
 TEST_F(IntakeTest, DetailsThatCannotBeShownAreToldAndTheSongsStay) {
     RecordingShell shell;
     shell.Works = false;
-    dialogs_.Answers.push_back(1);
     EXPECT_EQ(AddSongsFromDialog(database_, AddSongs(1)).Added, 1);
+    dialogs_.Reports.at(0).OpenAsText();
     ASSERT_EQ(dialogs_.Messages.size(), 1);
     EXPECT_TRUE(dialogs_.Messages[0].startsWith(u"Kann die Datei nicht anzeigen: "_s));
     QFile::remove(shell.Opened[0]);
