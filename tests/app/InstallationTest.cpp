@@ -8,12 +8,12 @@
 #include <QXmlStreamReader>
 
 #include "CommonRUKTools/Errors.h"
-#include "CommonRUKTools/Trash.h"
 #include "app/desktop/DesktopEntry.h"
 #include "app/desktop/InstallationSteps.h"
 #include "app/desktop/MimeTypes.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
+#include "tests/database/RecordingTrash.h"
 
 using namespace Qt::StringLiterals;
 
@@ -173,23 +173,13 @@ TEST(MimeTypesTest, TheDesktopIsToldWhatTheProgramKnows) {
     EXPECT_EQ(said, known);
 }
 
-class RefusingTrash : public Trash {
- public:
-    RefusingTrash() { SetTrash(this); }
-    ~RefusingTrash() override { SetTrash(nullptr); }
-    QStringList Taken;
-    bool Take(const QString& path) override {
-        if (path.endsWith(u".conf"_s)) return false;
-        Taken << path;
-        return QFile::remove(path);
-    }
-};
-
 TEST_F(InstallationTest, TheUserSaysWhatGoesWithTheProgram) {
     const StandardFiles files{In(u"data/tunestead"_s)};
     const QString settings = In(u"config/tunestead.conf"_s);
     ScriptedDialogs dialogs;
-    RefusingTrash trash;
+    RecordingTrash trash;
+    trash.Removes = true;
+    trash.Refused = u".conf"_s;
     InstallationSteps steps(&installation_, files, settings);
     complaint_ = u"xdg-mime: kaputt"_s;
     steps.Install({});
