@@ -136,7 +136,7 @@ void SongListWidget::SetSortingAllowed(bool allowed) {
 }
 
 void SongListWidget::HeaderClicked(int section) {
-    const auto type = SongColumns()[static_cast<std::size_t>(section)].Sort;
+    const auto type = SongColumns()[static_cast<std::size_t>(section)].Field().Sort;
     if (type) {
         SongOrder order = database_.Order();
         order.Backwards = SortedColumn() == section && !order.Backwards;

@@ -110,7 +110,7 @@ TEST_F(SongListModelTest, WhatIsNotKnownIsShownAsNothing) {
     database_.AddEntry(QString(), song);
     model_.SyncViews();
     EXPECT_EQ(Shown(model_, 0), u"Z"_s) << "no mark of a CD";
-    for (const SongColumnId column : {SongColumnId::Year, SongColumnId::Track, SongColumnId::Id3Genre,
+    for (const SongColumnId column : {SongColumnId::Year, SongColumnId::Track, SongColumnId::Genre,
                                       SongColumnId::Channels, SongColumnId::Flags})
         EXPECT_EQ(Shown(model_, 0, column), QString());
 }

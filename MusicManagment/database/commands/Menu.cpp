@@ -79,6 +79,7 @@ constexpr MenuRow kSort[] = {
     // Key code 219: the key right of the 0, which is ß on a German keyboard.
     {kRadio, u"Flags", 421, u"Ctrl+ß"},
     {kRadio, u"Cache-Typ", 422},
+    {kRadio, u"Albumreihenfolge", 423},
 };
 
 constexpr MenuRow kSubSort[] = {

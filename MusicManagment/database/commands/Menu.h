@@ -33,8 +33,8 @@ enum MenuCommand : int {
     mcAddToPlayList = 402,
     mcOpenExternally = 403,
     mcSortSubmenu = 410,
-    mcSortFirst = 411,  // to 422, in the order of TSortType
-    mcSortLast = 422,
+    mcSortFirst = 411,  // to 423, in the order of TSortType
+    mcSortLast = 423,
     mcSubSortSubmenu = 430,
     mcSubSortFirst = 431,  // to 433, in the order of TSubSortType
     mcSubSortLast = 433,

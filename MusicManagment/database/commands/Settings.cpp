@@ -92,7 +92,7 @@ void LoadDatabaseSettings(TMusicDatabase& database, const TRWReg& settings) {
         database.SetCompression(*level);
     for (const BoolSetting& setting : kBools)
         if (const auto value = settings.ReadBool(setting.Name.toString())) (database.*setting.Set)(*value);
-    if (const auto type = ReadEnum<TSortType>(settings, u"SortType"_s, stCacheType + 1))
+    if (const auto type = ReadEnum<TSortType>(settings, u"SortType"_s, stAlbumOrder + 1))
         database.SetSortType(*type);
     if (const auto type = ReadEnum<TSubSortType>(settings, u"SubSortType"_s, sstPath + 1))
         database.SetSubSortType(*type);
