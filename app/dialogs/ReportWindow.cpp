@@ -64,13 +64,16 @@ ReportWindow::ReportWindow(Report report, QWidget* parent) : QDialog(parent), re
     auto* close = buttons->addButton(u"&Schließen"_s, QDialogButtonBox::RejectRole);
     close->setDefault(true);
     connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
-    if (report_.OpenAsText)
-        connect(buttons->addButton(u"Als &Text öffnen"_s, QDialogButtonBox::ActionRole),
-                &QPushButton::clicked, this, [this] { RunCommand(report_.OpenAsText); });
+    if (report_.OpenAsText) {
+        auto* text = buttons->addButton(u"Als &Text öffnen"_s, QDialogButtonBox::ActionRole);
+        text->setAutoDefault(false);
+        connect(text, &QPushButton::clicked, this, [this] { RunCommand(report_.OpenAsText); });
+    }
     auto* layout = new QVBoxLayout(this);
     layout->addWidget(message);
     layout->addWidget(MakePages(), 1);
     layout->addWidget(buttons);
+    close->setFocus();
     resize(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
 }
 

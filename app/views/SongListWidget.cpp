@@ -347,6 +347,7 @@ void SongListWidget::FilterChanged() {
         selectionModel()->setCurrentIndex(songs_.index(row, 0), QItemSelectionModel::NoUpdate);
     }
     executeDelayedItemsLayout();
+    if (songs_.rowCount() == 0) viewport()->update();  // it says why it is empty
     if (currentIndex().isValid())
         scrollTo(currentIndex(), PositionAtCenter);
     else
