@@ -44,7 +44,7 @@ QStringList Captions(const QWidget& window) {
     return captions;
 }
 
-TEST(QtDialogs, AQuestionShowsPlainTextAndItsOwnButtons) {
+TEST(QtDialogs, AQuestionShowsPlainTextAndButtonsWithLetters) {
     QtDialogs dialogs;
     QStringList captions;
     WithNextDialog<QMessageBox>([&](QMessageBox& box) {

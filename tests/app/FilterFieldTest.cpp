@@ -80,6 +80,7 @@ TEST_F(FilterFieldTest, AFieldThatThereIsNotIsTold) {
     Edit()->setText(u"foo:bar"_s);  // an empty list says it itself
     EXPECT_FALSE(warning->isVisible());
     EXPECT_TRUE(NothingShownText(shown_).contains(u"Kein Feld „foo“"_s));
+    EXPECT_EQ(shown_.headerData(0, Qt::Horizontal).toString(), u"Titel"_s);
 }
 
 TEST_F(FilterFieldTest, InALargeCollectionReturnDoesNotWaitForThePause) {

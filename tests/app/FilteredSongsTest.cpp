@@ -59,13 +59,6 @@ TEST_F(FilteredSongsTest, AChangeOfTheFilterIsToldInOneStep) {
     QSignalSpy inserted(&shown_, &QAbstractItemModel::rowsInserted);
     QSignalSpy removed(&shown_, &QAbstractItemModel::rowsRemoved);
     QSignalSpy laidOut(&shown_, &QAbstractItemModel::layoutChanged);
-    shown_.SetText(u"xyz"_s);
-    EXPECT_EQ(shown_.headerData(0, Qt::Horizontal).toString(), u"Titel"_s)
-        << "an empty list keeps its headings";
-    shown_.SetText(QString());
-    inserted.clear();
-    removed.clear();
-    laidOut.clear();
     shown_.SetText(u"7"_s);
     EXPECT_EQ(shown_.rowCount(), 271);
     EXPECT_EQ(removed.count() + laidOut.count(), 2);

@@ -59,17 +59,13 @@ class SongListWidgetTest : public testing::Test {
 };
 
 TEST_F(SongListWidgetTest, ClicksOnAHeaderSortForwardsThenBackwards) {
-    QHeaderView* header = list_.horizontalHeader();
-    ClickHeader(SongColumnId::Length);
-    EXPECT_EQ(FirstTitle(), u"Lied 399"_s);
-    EXPECT_EQ(header->sortIndicatorSection(), static_cast<int>(SongColumnId::Length));
-    EXPECT_EQ(header->sortIndicatorOrder(), Qt::AscendingOrder);
-
-    ClickHeader(SongColumnId::Length);
-    EXPECT_EQ(FirstTitle(), u"Lied 100"_s);
-    EXPECT_TRUE(database_.SortBackwards());
-    EXPECT_EQ(header->sortIndicatorOrder(), Qt::DescendingOrder);
-
+    for (const auto& [first, order] :
+         {std::pair(u"Lied 399"_s, Qt::AscendingOrder), std::pair(u"Lied 100"_s, Qt::DescendingOrder)}) {
+        ClickHeader(SongColumnId::Length);
+        EXPECT_EQ(FirstTitle(), first);
+        EXPECT_EQ(list_.horizontalHeader()->sortIndicatorSection(), static_cast<int>(SongColumnId::Length));
+        EXPECT_EQ(list_.horizontalHeader()->sortIndicatorOrder(), order);
+    }
     ClickHeader(SongColumnId::Title);
     EXPECT_EQ(database_.SortType(), stTitle);
     EXPECT_FALSE(database_.SortBackwards());
@@ -120,19 +116,14 @@ TEST_F(SongListWidgetTest, TheListMovesSidewaysOnlyWhenTheUserMovesIt) {
 }
 
 TEST_F(SongListWidgetTest, TheFocusedSongStaysInSightOnlyWhenWanted) {
-    Focus(2);
-    ClickHeader(SongColumnId::Length);
-    EXPECT_EQ(FocusedTitle(), u"Lied 102"_s);
-    EXPECT_TRUE(FocusVisible());
-
-    database_.SetFollowFocus(false);
-    ClickHeader(SongColumnId::Length);
-    ClickHeader(SongColumnId::Length);
-    list_.scrollToTop();
-    ClickHeader(SongColumnId::Title);
-    ClickHeader(SongColumnId::Title);
-    EXPECT_EQ(FocusedTitle(), u"Lied 102"_s);
-    EXPECT_FALSE(FocusVisible());
+    for (const bool wanted : {true, false}) {
+        database_.SetFollowFocus(wanted);
+        list_.SetOrder({stTitle, sstGATL, false, 0});
+        Focus(2);
+        ClickHeader(SongColumnId::Length);
+        EXPECT_EQ(FocusedTitle(), u"Lied 102"_s);
+        EXPECT_EQ(FocusVisible(), wanted);
+    }
 }
 
 TEST_F(SongListWidgetTest, FocusAndMarksOutliveASortFromElsewhere) {
@@ -296,19 +287,16 @@ TEST_F(SongListWidgetTest, TheMenuOfTheHeaderChoosesColumns) {
             if (action->text().remove(u'&') == caption) return action->trigger();
         ADD_FAILURE() << caption.toStdString();
     };
-    const int channels = static_cast<int>(SongColumnId::Channels);
-    EXPECT_TRUE(header->isSectionHidden(channels));
+    const QByteArray before = list_.SaveColumns();
     choose(u"Kanäle"_s);
-    EXPECT_FALSE(header->isSectionHidden(channels));
+    EXPECT_FALSE(header->isSectionHidden(static_cast<int>(SongColumnId::Channels)));
     choose(u"Titel"_s);
     EXPECT_FALSE(header->isSectionHidden(0));
-
-    const int before = header->sectionSize(0);
+    const int width = header->sectionSize(0);
     choose(u"Spaltenbreite anpassen"_s);
-    EXPECT_LT(header->sectionSize(0), before);
+    EXPECT_LT(header->sectionSize(0), width);
     choose(u"Alle Spalten zurücksetzen"_s);
-    EXPECT_EQ(header->sectionSize(0), before);
-    EXPECT_TRUE(header->isSectionHidden(channels));
+    EXPECT_EQ(list_.SaveColumns(), before);
 }
 
 }  // namespace
