@@ -13,7 +13,8 @@ class TMusicDatabase;
 class TOverviewForm;
 class TPropertyForm;
 
-// The windows that dock at the main window, and what they follow.
+// The windows that dock at the main window, and what they follow. Handles the commands that the overview
+// serves.
 class ToolWindows {
  public:
     // The windows belong to `window`.
@@ -25,14 +26,11 @@ class ToolWindows {
     // Shows a song of the database in the windows that are about one, which follow its changes; nullptr for
     // none.
     void ShowSong(const TID3Tag* song);
-    // The commands of the database's menu that the overview serves. False when the number is none of them.
-    bool Run(int id);
-    // Marks the overview's grouping in the database's menu.
-    void MarkMenu();
     // Adds the items that show and hide the windows.
     void AddTo(QMenu& menu);
 
  private:
+    void HandleCommands(TMusicDatabase& database);
     void FollowSong();
     void Show(const TID3Tag* song);
 
@@ -41,5 +39,6 @@ class ToolWindows {
     TPropertyForm* properties_;
     TID3TagForm* tag_;
     SongHandle song_;
+    Subscriptions handlers_;
     Subscriptions subscriptions_;
 };

@@ -24,6 +24,7 @@ class ScriptedDialogs : public Dialogs {
     QStringList Questions;
     std::vector<Question> Asked;  // the same with their buttons
     std::vector<Report> Reports;
+    std::function<void()> OnReport;
     QStringList Prompts;
     std::vector<FileDialogOptions> FileDialogs;
     QStringList FolderCaptions;
@@ -38,7 +39,10 @@ class ScriptedDialogs : public Dialogs {
         Asked.push_back(question);
         return Next(Answers).value_or(question.Cancel);
     }
-    void ShowReport(const Report& report) override { Reports.push_back(report); }
+    void ShowReport(const Report& report) override {
+        Reports.push_back(report);
+        if (OnReport) OnReport();
+    }
     std::optional<QString> Input(const QString&, const QString& prompt, const QStringList&,
                                  const QString&) override {
         Prompts << prompt;

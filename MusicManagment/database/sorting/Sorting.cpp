@@ -40,7 +40,7 @@ int CompareTies(TSubSortType type, const TID3Tag& a, const TID3Tag& b) {
 int CompareSongs(const SongOrder& order, const TID3Tag& a, const TID3Tag& b) {
     const bool albums = order.SortType == stAlbumOrder;
     int result = albums ? CompareAlbumOrder(a, b) : ComparePrimary(order, a, b);
-    if (result == 0) result = CompareTies(order.SubSortType, a, b);
+    if (result == 0 && !albums) result = CompareTies(order.SubSortType, a, b);
     return order.Backwards ? -result : result;
 }
 
