@@ -6,11 +6,13 @@
 #include <QClipboard>
 #include <QFile>
 #include <QLineEdit>
+#include <QMainWindow>
 #include <QPlainTextEdit>
 #include <QTemporaryDir>
 #include <QTest>
 
 #include "MusicManagment/database/MusicManagment.h"
+#include "app/ToolWindows.h"
 #include "app/views/CoverView.h"
 #include "app/views/PropertyTree.h"
 #include "app/views/TagForm.h"
@@ -164,19 +166,26 @@ TEST_F(PropertyFormTest, FoldedHeadingsStayFolded) {
     EXPECT_FALSE(form_.Properties().topLevelItem(1)->isExpanded());
 }
 
-TEST(TagForm, ShowsTheTagAndNothingWithoutASong) {
+TEST(ToolWindows, TheSheetsFollowTheirSong) {
+    TMusicDatabase database;
     TID3Tag song = CdSong(u"Lied"_s);
     song.Year = u"0000"_s;
     song.Comment = u"Zeile 1\nZeile 2"_s;
-    TID3TagForm form;
-    form.ShowSong(&song);
-    const auto text = [&](const QString& name) { return form.findChild<QLineEdit*>(name)->text(); };
+    database.AddEntry(QString(), song);
+    QMainWindow window;
+    ToolWindows tools(window, database);
+    const auto* tag = window.findChild<TID3TagForm*>();
+    const auto text = [&](const QString& name) { return tag->findChild<QLineEdit*>(name)->text(); };
+    tools.ShowSong(&database.Song(0));
     EXPECT_EQ(text(u"title"_s), u"Lied"_s);
     EXPECT_EQ(text(u"year"_s), QString());
-    EXPECT_EQ(form.findChild<QPlainTextEdit*>()->toPlainText(), song.Comment);
+    EXPECT_EQ(tag->findChild<QPlainTextEdit*>()->toPlainText(), song.Comment);
 
-    form.ShowSong(nullptr);
-    for (const QLineEdit* field : form.findChildren<QLineEdit*>())
+    song.Title = u"Anders"_s;
+    database.UpdateEntry(0, song);
+    EXPECT_EQ(text(u"title"_s), u"Anders"_s);
+    database.Clear();
+    for (const QLineEdit* field : tag->findChildren<QLineEdit*>())
         EXPECT_EQ(field->text(), QString()) << field->objectName().toStdString();
 }
 
