@@ -96,14 +96,6 @@ TEST_F(MusicOverviewTest, AnotherListStartsWithNothingChosen) {
     EXPECT_EQ(told_.last().Genres.count(), 1U);
 }
 
-TEST_F(MusicOverviewTest, TypedLettersFindAGroup) {
-    form_.activateWindow();
-    List().setFocus();
-    QTest::keyClicks(&List(), u"ga"_s);
-    EXPECT_EQ(List().currentIndex().data().toString(), u"Gamma"_s);
-    EXPECT_EQ(LastCaptions(), QSet<QString>({u"Gamma"_s}));
-}
-
 TEST_F(MusicOverviewTest, TheListIsKeptInTheSettings) {
     const QTemporaryDir folder;
     const QString file = folder.filePath(u"settings.ini"_s);
