@@ -197,9 +197,9 @@ TEST_F(SettingsCommandsTest, TheOptionsChangeTheWindowsMenuToo) {
 TEST_F(SettingsCommandsTest, TheItemsRestDuringARun) {
     Start(false);
     Work();
-    window_->Database().StartProgress(u"Test"_s, false);
+    window_->Database().StartProgress(u"Test"_s, true);
     EXPECT_FALSE(ExtrasItem(u"Einstellungen..."_s)->isEnabled());
-    window_->Database().EndProgress(false);
+    window_->Database().EndProgress(true);
     EXPECT_TRUE(ExtrasItem(u"Einrichtungsassistent..."_s)->isEnabled());
 }
 

@@ -16,8 +16,9 @@ inline constexpr PropertySetting kAsynchronous{
 inline constexpr PropertySetting kAutoDelBannedFiles{Setting<bool>{u"AutoDelBannedFiles"},
                                                      &TMusicDatabase::AutoDelBannedFiles,
                                                      &TMusicDatabase::SetAutoDelBannedFiles};
-inline constexpr PropertySetting kSortType{Setting<int>{u"SortType", stGenre, stTitle, stCacheType},
-                                           &TMusicDatabase::SortType, &TMusicDatabase::SetSortType};
+inline constexpr PropertySetting kSortType{
+    Setting<int>{u"SortType", stGenre, stTitle, stAlbumOrder, stAlbumOrder}, &TMusicDatabase::SortType,
+    &TMusicDatabase::SetSortType};
 inline constexpr PropertySetting kSubSortType{Setting<int>{u"SubSortType", sstGATL, sstGATL, sstPath},
                                               &TMusicDatabase::SubSortType, &TMusicDatabase::SetSubSortType};
 inline constexpr PropertySetting kSortBackwards{
@@ -43,8 +44,11 @@ inline constexpr PropertySetting kMP3NamePattern{Setting<QString>{u"MP3NamePatte
 // Pairs of rules, classic when false and modern when true (Rules.h).
 inline constexpr PropertySetting kModernTags{Setting<bool>{u"ModernTags", false, true},
                                              &TMusicDatabase::ModernTags, &TMusicDatabase::SetModernTags};
+inline constexpr PropertySetting kKeepLostSongs{Setting<bool>{u"KeepLostSongs", false, true},
+                                                &TMusicDatabase::KeepLostSongs,
+                                                &TMusicDatabase::SetKeepLostSongs};
 
-inline constexpr std::tuple kRules{kModernTags};
+inline constexpr std::tuple kRules{kModernTags, kKeepLostSongs};
 
 inline constexpr std::tuple kOwn{kAutoSave,
                                  kCompression,
