@@ -217,6 +217,18 @@ bool SongListWidget::FocusSong(SongIndex song, ScrollHint where) {
     return true;
 }
 
+std::vector<QString> SongListWidget::ShownFromFocus(std::size_t most) const {
+    std::vector<QString> paths;
+    if (!currentIndex().isValid()) return paths;
+    for (int row = currentIndex().row(); row < songs_.rowCount() && paths.size() < most; ++row)
+        if (const TID3Tag* song = songs_.SongAt(row)) paths.push_back(song->FileName);
+    return paths;
+}
+
+void SongListWidget::SetPlaying(const QString& path) {
+    songs_.Songs().SetPlaying(path);
+}
+
 SongHandle SongListWidget::NextAfter(const std::vector<SongHandle>& going) const {
     QSet<const TID3Tag*> records;
     for (const SongHandle song : going)

@@ -49,6 +49,10 @@ class SongListWidget : public QTableView {
     // Marks these songs and no others, and shows the first of them, which gets the focus. Returns how many of
     // them are shown.
     std::size_t MarkSongs(const QStringList& paths);
+    // The focused song and those shown below it, by path; at most so many.
+    std::vector<QString> ShownFromFocus(std::size_t most) const;
+    // Marks the song that plays, by its path; empty for none.
+    void SetPlaying(const QString& path);
     // Takes the keys; a list in which no song has the focus gives it to its first.
     void Enter();
 
