@@ -11,6 +11,7 @@
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "MusicManagment/playlist/PlayListMenu.h"
 #include "app/CommandRunner.h"
+#include "app/MenuIcons.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/RaiseWindow.h"
 #include "app/models/CollectionTotals.h"
@@ -54,11 +55,13 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
     SetUpSpectrum(window, std::move(options.Spectrum));
     SetUpContextMenu();
     JoinDesktop(window);
+    handlers_ += database.Commands().Handle(mcPlay, {.Run = [this] { PlayChosen(); }});
+    handlers_ += database.Commands().Handle(mcAddToPlayList, {.Run = [this] { AddChosen(); }});
     database.OnMarkSong = [this](TMusicDatabase&, SongIndex song) {
         if (!songs_.FocusSong(song) && OnDone) OnDone(u"Der Filter zeigt dieses Lied nicht."_s);
     };
     QObject::connect(&songs, &QAbstractItemView::doubleClicked, listForm_,
-                     [this] { RunCommand([this] { database_.ClickMenuItem(mcPlay); }); });
+                     Guarded([this] { database_.ClickMenuItem(mcPlay); }));
 }
 
 // The window would let its tool windows live longer than what they show.
@@ -147,8 +150,8 @@ void Playing::AddMenusTo(QMenuBar& bar) {
 // The keys are those of the view, which acts on them itself.
 void Playing::SetUpContextMenu() {
     TVisPlayList& view = listForm_->View();
-    QAction* play = contextMenu_->addAction(PlayerIcon(plPlay), u"A&bspielen"_s, QKeySequence(u"Return"_s),
-                                            &view, &TVisPlayList::PlaySelected);
+    QAction* play = contextMenu_->addAction(MenuIcon(u"media-playback-start"), u"A&bspielen"_s,
+                                            QKeySequence(u"Return"_s), &view, &TVisPlayList::PlaySelected);
     contextMenu_->addAction(ThemeIcon(u"go-next"_s, QStyle::SP_ArrowRight), u"Als nächs&tes spielen"_s,
                             QKeySequence(u"Ctrl+Return"_s), &view, &TVisPlayList::QueueSelected);
     contextMenu_->addAction(u"Aus der &Warteschlange nehmen"_s, QKeySequence(u"Ctrl+Backspace"_s), &view,
@@ -183,19 +186,6 @@ void Playing::RunPlayerCommand(int id) {
 }
 
 // --- Songs of the collection ---
-
-bool Playing::Run(int id) {
-    switch (id) {
-        case mcPlay:
-            PlayChosen();
-            return true;
-        case mcAddToPlayList:
-            AddChosen();
-            return true;
-        default:
-            return false;
-    }
-}
 
 // At the end; what is listed already stays where it is. Returns how many came in.
 int Playing::Append(const std::vector<SongIndex>& songs) {

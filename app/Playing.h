@@ -8,7 +8,6 @@
 #include "MusicManagment/playback/spectrum/SpectrumFeed.h"
 #include "MusicManagment/playlist/PlayList.h"
 #include "app/CommandMenu.h"
-#include "app/MenuIcons.h"
 #include "app/desktop/Mpris.h"
 #include "app/desktop/StayAwake.h"
 
@@ -41,9 +40,6 @@ class Playing {
     TPlayList& PlayList() { return list_; }
     TPlaySound& Player() { return player_; }
 
-    // The commands of the database's menu that play songs. False when the number is none of them. Throws what
-    // playing throws.
-    bool Run(int id);
     // Adds the menus of the playlist and the player.
     void AddMenusTo(QMenuBar& bar);
     // Adds the items that show and hide the tool windows.
@@ -76,8 +72,8 @@ class Playing {
     bool standardListIsUnread_ = true;
     TPlayList list_;
     TPlaySound player_;
-    CommandMenu listMenu_{[this](int id) { RunPlayListCommand(id); }, &PlayListIcon};
-    CommandMenu playerMenu_{[this](int id) { RunPlayerCommand(id); }, &PlayerIcon};
+    CommandMenu listMenu_{[this](int id) { RunPlayListCommand(id); }};
+    CommandMenu playerMenu_{[this](int id) { RunPlayerCommand(id); }};
     TPlaylistForm* listForm_;
     TPlayerForm* playerForm_;
     TSpectrumForm* spectrumForm_;
@@ -86,4 +82,5 @@ class Playing {
     std::unique_ptr<Mpris> mpris_;
     std::unique_ptr<StayAwake> awake_;
     QString shownSong_;
+    Subscriptions handlers_;
 };

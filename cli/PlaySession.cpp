@@ -4,6 +4,7 @@
 #include <QEventLoop>
 #include <QFileInfo>
 #include <QTimer>
+#include <algorithm>
 
 #include "CommonRUKTools/Clock.h"
 #include "MusicManagment/playback/Engines.h"
@@ -141,6 +142,7 @@ class Session {
 
     int Run() {
         const bool complete = FillList();
+        RefuseToOverwrite();
         const InterruptGuard guard;
         if (list_.Count() > 0) list_.PlayNext();
         options_.Fast ? WriteMix() : Listen();
@@ -166,6 +168,20 @@ class Session {
             if (!QFileInfo(list_.Entry(i).Name).isFile())
                 tell(u"Die Datei ist nicht verfügbar: "_s + list_.Entry(i).Name);
         return complete;
+    }
+
+    // The output begins as an empty file.
+    void RefuseToOverwrite() const {
+        if (!options_.Output || options_.Output->kind != OutputChoice::Kind::WavFile) return;
+        const QFileInfo output(options_.Output->name);
+        QStringList played = options_.Paths;
+        for (int i = 0; i < list_.Count(); ++i)
+            played << list_.Entry(i).Name;
+        if (output.exists() && std::ranges::find(played, output, [](const QString& path) {
+                                   return QFileInfo(path);
+                               }) != played.end())
+            throw EStreamError(u"Die Ausgabe würde überschreiben, was gespielt werden soll: "_s +
+                               options_.Output->name);
     }
 
     // The sound stands still then, and no song would ever end.

@@ -102,7 +102,7 @@ QVariant SongListModel::headerData(int section, Qt::Orientation orientation, int
     if (orientation != Qt::Horizontal || section < 0 || section >= columnCount()) return {};
     const SongColumn& column = ColumnOf(section);
     if (role == Qt::TextAlignmentRole) return CellAlignment(column);
-    return role == Qt::DisplayRole ? QString::fromUtf16(column.Caption) : QVariant();
+    return role == Qt::DisplayRole ? column.Caption() : QVariant();
 }
 
 // --- Order ---

@@ -81,7 +81,7 @@ TVisPlaySound::~TVisPlaySound() {
 QToolButton* TVisPlaySound::AddButton(QBoxLayout& row, int command, const QString& caption) {
     auto* button = new QToolButton(this);
     button->setObjectName(u"player%1"_s.arg(command));
-    button->setIcon(PlayerIcon(command));
+    button->setIcon(MenuIcon(player_.Menu().Find(command)->Icon()));
     button->setAutoRaise(true);
     button->setFocusPolicy(Qt::TabFocus);
     button->setAccessibleName(caption);
@@ -232,7 +232,7 @@ void TVisPlaySound::ShowTexts() {
 void TVisPlaySound::ShowState() {
     const TPSStatus status = player_.GetStatus();
     const bool playing = status == psPlaying;
-    play_->setIcon(PlayerIcon(playing ? plPause : plPlay));
+    play_->setIcon(MenuIcon(playing ? u"media-playback-pause" : u"media-playback-start"));
     play_->setAccessibleName(playing ? u"Pause"_s : u"Play"_s);
     play_->setToolTip(playing ? u"Pause (F6)"_s : u"Play (F5)"_s);
     stop_->setEnabled(playing || status == psPaused);

@@ -49,17 +49,12 @@ class PlayingTest : public testing::Test {
         database_.AddEntry(QString(), song);
     }
     void Start() {
-        menu_ = std::make_unique<MainMenu>(
-            *window_.menuBar(), database_, [this](int id) { database_.ClickMenuItem(id); }, [] {});
+        menu_ = std::make_unique<MainMenu>(*window_.menuBar(), database_);
         menu_->BindTo(*songs_);
         playing_ = std::make_unique<Playing>(window_, database_, *songs_,
                                              PlayingOptions{StandardList(), ScriptedEngines(song_), {}});
         playing_->AddMenusTo(*window_.menuBar());
         playing_->OnDone = [this](const QString& sentence) { told_ = sentence; };
-        database_.OnMenuItemClicked = [this](TMusicDatabase&, const TMenuExItem&, void*, qint64 id,
-                                             bool& proceed) {
-            proceed = !playing_->Run(static_cast<int>(id));
-        };
         window_.resize(1000, 600);
         window_.show();
         window_.activateWindow();

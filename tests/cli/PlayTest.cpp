@@ -149,3 +149,11 @@ TEST_F(PlayTest, OutputThatCannotBeOpenedFails) {
 }
 
 }  // namespace
+
+TEST_F(PlayTest, AMixNeverOverwritesWhatItIsMadeOf) {
+    const QString song = AddLevel(u"mix.wav"_s, 0.25, 1);
+    for (const QString& path : {song, folder_.Path()}) {
+        EXPECT_EQ(WriteMix({path}).Status, 1);
+        EXPECT_EQ(mix_.size(), 16'000) << "as it was";
+    }
+}

@@ -10,7 +10,9 @@
 #include "MusicManagment/database/ListGuards.h"
 #include "MusicManagment/database/intake/FolderWalk.h"
 #include "MusicManagment/database/intake/IntakeReport.h"
+#include "MusicManagment/database/intake/KnownSongs.h"
 #include "MusicManagment/database/intake/ReadAhead.h"
+#include "MusicManagment/database/intake/UpdateFolders.h"
 
 using namespace Qt::StringLiterals;
 
@@ -64,12 +66,15 @@ bool TakeIn(TMusicDatabase& database, const QString& path, const SongReading& re
     if (database.AddEntry(path, reading.Tag) >= 0) {
         ++result.Added;
         result.NewFiles << path;
+        if (reading.Tag.BitRate == 0) result.DamagedFiles << path;
         return true;
     }
-    if (database.IsBanned(reading.Tag))
+    if (database.IsBanned(reading.Tag)) {
         ++result.Banned;
-    else
+        result.BannedFiles << path;
+    } else {
         NoteUnreadable(u"Nicht aufgenommen: "_s + path, result);
+    }
     return false;
 }
 
@@ -157,6 +162,22 @@ IntakeResult AddGiven(TMusicDatabase& database, const std::vector<GivenPath>& gi
     return result;
 }
 
+void Remember(TMusicDatabase& database, const std::vector<GivenPath>& given) {
+    QStringList folders;
+    for (const GivenPath& path : given)
+        if (path.IsFolder) folders << path.Path;
+    RememberFolders(database, folders);
+}
+
+// Saved before anybody is told, for a report may stand there for hours.
+IntakeResult AddAndSave(TMusicDatabase& database, const std::vector<GivenPath>& given, bool withSubfolders,
+                        GivenFolders folders) {
+    IntakeResult result = AddGiven(database, given, withSubfolders);
+    if (folders == GivenFolders::Remembered) Remember(database, given);
+    database.SaveAfterCommand();
+    return result;
+}
+
 IntakeResult AddChosenFiles(TMusicDatabase& database, QStringList files) {
     const ProgressRun run(database, FileRunText());
     IntakeResult result;
@@ -185,26 +206,25 @@ IntakeResult AddSongsFromDialog(TMusicDatabase& database, const QStringList& fil
     const QStringList chosen = files.isEmpty() ? AskForFiles() : files;
     if (chosen.isEmpty()) return {};
     IntakeResult result = AddChosenFiles(database, chosen);
-    ReportIntake(result);
     database.SaveAfterCommand();
+    ReportIntake(result);
     return result;
 }
 
-IntakeResult AddFolder(TMusicDatabase& database, const QString& folder, bool withSubfolders) {
+IntakeResult AddFolder(TMusicDatabase& database, const QString& folder, bool withSubfolders,
+                       GivenFolders folders) {
     RefuseWhenLocked(database);
     const QString chosen = folder.isEmpty() ? AskForFolder(withSubfolders) : folder;
     if (chosen.isEmpty()) return {};
-    IntakeResult result = AddGiven(database, {{AbsolutePath(chosen), true, true}}, withSubfolders);
+    IntakeResult result = AddAndSave(database, {{AbsolutePath(chosen), true, true}}, withSubfolders, folders);
     ReportIntake(result);
-    database.SaveAfterCommand();
     return result;
 }
 
-IntakeResult AddPaths(TMusicDatabase& database, const QStringList& paths, bool withSubfolders) {
+IntakeResult AddPaths(TMusicDatabase& database, const QStringList& paths, bool withSubfolders,
+                      GivenFolders folders) {
     RefuseWhenLocked(database);
-    IntakeResult result = AddGiven(database, LookAt(paths), withSubfolders);
-    database.SaveAfterCommand();
-    return result;
+    return AddAndSave(database, LookAt(paths), withSubfolders, folders);
 }
 
 int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting, QStringList* newNames,
@@ -215,7 +235,8 @@ int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
     QStringList candidates = std::exchange(list, {});
     for (QString& path : candidates)
         path = StoredPath(path);
-    const auto isKnown = [&](const QString& path) { return checkExisting && database.Contains(path); };
+    KnownSongs known(database);
+    const auto isKnown = [&](const QString& path) { return checkExisting && known.Contains(path); };
     // A progress point that nobody hears of, for the time in which nothing goes on.
     const auto goOn = [&database] { return !database.Progress(database.LastProgress(), false, false); };
     ReadOptions options = database.AudioReadOptions();
@@ -232,7 +253,9 @@ int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
         if (isKnown(path)) {
             ++outcome.Known;
         } else if (const auto reading = files.Take(options, goOn)) {
-            if (TakeIn(database, path, *reading, outcome)) list << path;
+            if (!TakeIn(database, path, *reading, outcome)) continue;
+            known.Add(path);
+            list << path;
         } else {
             outcome.Stopped = true;
         }
