@@ -8,6 +8,7 @@
 #include "MusicManagment/playback/spectrum/SpectrumFeed.h"
 #include "MusicManagment/playlist/PlayList.h"
 #include "app/CommandMenu.h"
+#include "app/ShownFollowers.h"
 #include "app/desktop/Mpris.h"
 #include "app/desktop/StayAwake.h"
 
@@ -58,11 +59,14 @@ class Playing {
     void SetUpSpectrum(QMainWindow& window, SpectrumSource source);
     void SetUpContextMenu();
     void JoinDesktop(QMainWindow& window);
+    void FollowPlayer();
     void FollowSong();
+    void PlayFromFocus();
     int Append(const std::vector<SongIndex>& songs);
     void PlayChosen();
     void AddChosen();
-    void PlayEntry(int index, SongIndex hint = -1);
+    void PlayChosenEntry(int index, SongIndex hint = -1);
+    void PlayEntry(int index, SongIndex hint);
     void RunPlayerCommand(int id);
     void RunPlayListCommand(int id);
 
@@ -72,6 +76,7 @@ class Playing {
     bool standardListIsUnread_ = true;
     TPlayList list_;
     TPlaySound player_;
+    ShownFollowers followers_{list_};
     CommandMenu listMenu_{[this](int id) { RunPlayListCommand(id); }};
     CommandMenu playerMenu_{[this](int id) { RunPlayerCommand(id); }};
     TPlaylistForm* listForm_;
@@ -82,5 +87,6 @@ class Playing {
     std::unique_ptr<Mpris> mpris_;
     std::unique_ptr<StayAwake> awake_;
     QString shownSong_;
+    Subscriptions subscriptions_;
     Subscriptions handlers_;
 };

@@ -201,14 +201,14 @@ class TMusicDatabase : public QObject {
     // Whether files are read with the modern profile; off in a new component, switched on by the programs.
     bool ModernTags() const { return modernTags_; }
     void SetModernTags(bool value) { modernTags_ = value; }
-    // Whether a song that comes in without a main genre gets the one that its tag's genre belongs to; off in a
-    // new component, switched on by the programs.
-    bool DerivedGenres() const { return derivedGenres_; }
-    void SetDerivedGenres(bool value) { derivedGenres_ = value; }
     // Whether songs of old database files stay when their audio files cannot be found; off in a new
     // component, switched on by the programs.
     bool KeepLostSongs() const { return keepLostSongs_; }
     void SetKeepLostSongs(bool value) { keepLostSongs_ = value; }
+    // Whether a song that comes in without a main genre gets the one that its tag's genre belongs to; off in a
+    // new component, switched on by the programs.
+    bool DerivedGenres() const { return derivedGenres_; }
+    void SetDerivedGenres(bool value) { derivedGenres_ = value; }
 
     // Linked components; each reference clears itself when the other goes.
     QObject* PlayList() const { return playList_; }
@@ -341,9 +341,9 @@ class TMusicDatabase : public QObject {
     bool readOnly_ = false;
     bool renameAndMoveMP3s_ = true;
     bool modernTags_ = false;
-    bool derivedGenres_ = false;
     bool keepLostSongs_ = false;
     DatabaseLock fileLock_{*this};
+    bool derivedGenres_ = false;
 
     QPointer<QObject> playList_;
     QPointer<QObject> playSound_;

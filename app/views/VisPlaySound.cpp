@@ -220,12 +220,11 @@ void TVisPlaySound::Redraw() {
     ShowTexts();
     ShowState();
     ShowPosition(open ? player_.GetPosition() : 0, open ? player_.GetLength() : 0);
-    if (OnChange) OnChange();
 }
 
 void TVisPlaySound::ShowTexts() {
     title_->setText(song_.FileName.isEmpty() ? u"Kein Lied"_s : song_.Title);
-    artist_->setText(song_.Artist);
+    artist_->setText(player_.AwaitsOutput() ? u"Wartet auf die Tonausgabe"_s : song_.Artist);
     setToolTip(song_.FileName.isEmpty() ? QString() : song_.FileName + u'\n' + EngineText());
 }
 

@@ -112,6 +112,32 @@ TEST_F(PlayingTest, ReturnAppendsTheMarkedSongsAndPlaysTheFocusedOne) {
     EXPECT_EQ(Sounding(), u"4"_s);
 }
 
+TEST_F(PlayingTest, DoubleClickPlaysTheSongAndWhatFollowsInTheShownList) {
+    const auto doubleClick = [this](int row) {
+        const QPoint place = songs_->visualRect(shown_.index(row, 0)).center();
+        QTest::mouseClick(songs_->viewport(), Qt::LeftButton, {}, place);
+        QTest::mouseDClick(songs_->viewport(), Qt::LeftButton, {}, place);
+    };
+    const auto isBold = [this](int row) {
+        return shown_.index(row, 0).data(Qt::FontRole).value<QFont>().bold();
+    };
+    Mark({0}, 0);
+    database_.ClickMenuItem(mcAddToPlayList);
+    doubleClick(2);
+    EXPECT_EQ(Sounding(), u"2"_s);
+    EXPECT_TRUE(isBold(2));
+    for (const QString& next : {u"3"_s, u"4"_s}) {
+        Choose(u"Player"_s, u"Nächstes"_s);
+        EXPECT_EQ(Sounding(), next);
+    }
+    EXPECT_FALSE(isBold(2));
+    EXPECT_EQ(Listed(), u"0234"_s);  // one by one, each when the one before it began
+
+    doubleClick(1);    // what is listed already waits where it stands
+    View().OnPlay(0);  // another choice ends that
+    EXPECT_EQ(playing_->PlayList().Queue(), QStringList());
+}
+
 TEST_F(PlayingTest, AddingLeavesOutWhatIsListed) {
     Mark({0, 3}, 0);
     database_.ClickMenuItem(mcAddToPlayList);

@@ -60,13 +60,11 @@ class RecordingShell : public Shell {
         QFile file(path);
         EXPECT_TRUE(file.open(QIODevice::ReadOnly));
         Opened << path;
-        if (OnOpen) OnOpen();
         Text = QString::fromUtf8(file.readAll());
         return true;
     }
     QStringList Opened;
     QString Text;
-    std::function<void()> OnOpen;
 };
 
 }  // namespace
@@ -88,8 +86,9 @@ TEST_F(IntakeTest, PickedFilesAreReadPlacedAndReported) {
 
     ASSERT_EQ(dialogs_.FileDialogs.size(), 1u);
     EXPECT_EQ(dialogs_.FileDialogs[0].Filter, u"Musik|*.mp3;*.mp2;*.wma;*.wav;|Alle Dateien|*.*"_s);
-    EXPECT_EQ(dialogs_.Questions,
-              QStringList{u"Es wurde(n) 2 neue(r) Song(s) in die Datenbank aufgenommen."_s});
+    ASSERT_EQ(dialogs_.Reports.size(), 1u);
+    EXPECT_EQ(dialogs_.Reports[0].Message, u"Es wurde(n) 2 neue(r) Song(s) in die Datenbank aufgenommen."_s);
+    EXPECT_TRUE(dialogs_.Reports[0].HasComplaints());
     EXPECT_TRUE(dialogs_.Messages.isEmpty()) << "a file that cannot be read is passed over without a word";
 }
 
@@ -99,7 +98,7 @@ TEST_F(IntakeTest, ACancelledDialogEndsTheCommand) {
     EXPECT_EQ(dialogs_.FolderCaptions,
               QStringList{u"Ordner zum Durchsuchen nach Songs auswählen (inkl. Unterordner):"_s});
     EXPECT_TRUE(runs_.isEmpty());
-    EXPECT_TRUE(dialogs_.Questions.isEmpty());
+    EXPECT_TRUE(dialogs_.Reports.empty());
 }
 
 TEST_F(IntakeTest, AFolderIsSearchedWithOrWithoutItsSubfolders) {
@@ -111,7 +110,7 @@ TEST_F(IntakeTest, AFolderIsSearchedWithOrWithoutItsSubfolders) {
     EXPECT_EQ(result.Known, 1);
     EXPECT_EQ(result.Unreadable, 0);
     EXPECT_EQ(runs_.last(), u"MusicDatabase v6.0 - Dursuche Ordner nach neuen Songs"_s);
-    EXPECT_EQ(dialogs_.Questions.size(), 2);
+    EXPECT_EQ(dialogs_.Reports.size(), 2u);
 
     QStringList descriptions;
     for (const ProgressPoint& point : points_)
@@ -247,7 +246,7 @@ TEST_F(IntakeTest, FilesAndFoldersTogetherAreOneRunWithoutReport) {
                            u"Datei nicht gefunden: "_s + songs_.Path(u"gone.mp3"_s)}));
     EXPECT_EQ(result.Unreadable, 3);
     EXPECT_EQ(runs_.size(), 1);
-    EXPECT_TRUE(dialogs_.Questions.empty());
+    EXPECT_TRUE(dialogs_.Reports.empty());
 }
 
 TEST_F(IntakeTest, NothingBeginsWhileTheDatabaseCannotChange) {
@@ -297,9 +296,9 @@ TEST_F(IntakeTest, BannedSongsAreCountedAndThrownAwayWhenWanted) {
 
 TEST_F(IntakeTest, DetailsNameTheSongsAndWhatWasUnreadable) {
     RecordingShell shell;
-    dialogs_.Answers.push_back(1);
     const QStringList files = AddSongs(2) + songs_.Paths({u"gone.mp3"_s});
     AddSongsFromDialog(database_, files);
+    dialogs_.Reports.at(0).OpenAsText();
     ASSERT_EQ(shell.Opened.size(), 1);
     EXPECT_TRUE(shell.Opened[0].endsWith(u"/Tunestead - Änderungen in der Datenbank.txt"_s));
     EXPECT_NE(QFileInfo(shell.Opened[0]).path(), QDir::tempPath()) << "where everybody may put links";
@@ -326,11 +325,10 @@ TEST_F(IntakeTest, EachCommandSavesWithItsFoldersWhenAskedToAndBeforeItReports) 
     EXPECT_EQ(saved(), std::pair(1, songs_.Paths({u"1"_s})));
     AddPaths(database_, songs_.Paths({u"2"_s, u"1/A - 1.wav"_s}), true, GivenFolders::Remembered);
     EXPECT_EQ(saved(), std::pair(2, songs_.Paths({u"1"_s, u"2"_s})));
-    RecordingShell shell;
-    shell.OnOpen = [&] { EXPECT_EQ(saved().first, 3); };
-    dialogs_.Answers.push_back(1);
+    dialogs_.Reports.clear();
+    dialogs_.OnReport = [&] { EXPECT_EQ(saved().first, 3); };
     AddSongsFromDialog(database_, songs_.Paths({u"3/A - 3.wav"_s}));
-    EXPECT_EQ(shell.Opened.size(), 1);
+    EXPECT_EQ(dialogs_.Reports.size(), 1u);
 }
 
 TEST_F(IntakeTest, OneFileIsAddedWithWhatIsKnownBetter) {

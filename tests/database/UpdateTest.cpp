@@ -111,11 +111,6 @@ TEST_F(UpdateTest, ChangedTagsAreTakenOverAndTheCollectionsFieldsStay) {
     EXPECT_TRUE(UpdateDatabase(database_, UpdateTags::Reread).Changed.isEmpty());
 }
 
-TEST_F(UpdateTest, WithoutFoldersThereIsAMessage) {
-    EXPECT_THROW(UpdateDatabase(database_, UpdateTags::Keep), EMusicDatabaseException);
-    EXPECT_THROW(SearchNewSongs(database_), EMusicDatabaseException);
-}
-
 TEST_F(UpdateTest, StoppingKeepsEverything) {
     TakeIn({u"music/A - one.wav"_s});
     QFile::remove(songs_.Path(u"music/A - one.wav"_s));

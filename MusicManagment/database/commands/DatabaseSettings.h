@@ -52,7 +52,7 @@ inline constexpr PropertySetting kDerivedGenres{Setting<bool>{u"DerivedGenres", 
                                                 &TMusicDatabase::DerivedGenres,
                                                 &TMusicDatabase::SetDerivedGenres};
 
-inline constexpr std::tuple kRules{kModernTags, kDerivedGenres, kKeepLostSongs};
+inline constexpr std::tuple kRules{kModernTags, kKeepLostSongs, kDerivedGenres};
 
 inline constexpr std::tuple kOwn{kAutoSave,
                                  kCompression,
