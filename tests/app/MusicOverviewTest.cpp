@@ -94,14 +94,6 @@ TEST_F(MusicOverviewTest, AnotherListStartsWithNothingChosen) {
     EXPECT_EQ(told_.last().Genres.count(), 1U);
 }
 
-TEST_F(MusicOverviewTest, TypedLettersFindAGroup) {
-    form_.activateWindow();
-    List().setFocus();
-    QTest::keyClicks(&List(), u"ga"_s);
-    EXPECT_EQ(List().currentIndex().data().toString(), u"Gamma"_s);
-    EXPECT_EQ(LastCaptions(), QSet<QString>({u"Gamma"_s}));
-}
-
 // As a child of the main window it lives a little longer than the database there.
 TEST(MusicOverview, MayOutliveTheDatabase) {
     auto database = std::make_unique<TMusicDatabase>();
