@@ -47,11 +47,11 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
       playerForm_(new TPlayerForm(player_, list_, &window)),
       spectrumForm_(new TSpectrumForm(&window)),
       contextMenu_(new QMenu(listForm_)) {
-    player_.SetKeepAlbums(true);
+    player_.UseRules(Rules::Modern);
     player_.SetQuietFailures(true);
     // Before the settings, which may ask for it.
     if (options.MakeExternalPlayer) player_.SetExternalPlayer(options.MakeExternalPlayer());
-    list_.SetModernLists(true);
+    list_.UseRules(Rules::Modern);
     list_.SetStandardFileName(standardList_);
     list_.SetMusicDatabase(&database);
     player_.SetMusicDatabase(&database);

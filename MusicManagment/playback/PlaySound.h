@@ -146,6 +146,7 @@ class TPlaySound : public TPlaySoundContainer,
     // --- Settings ---
     void LoadSettings(const TRWReg& settings) override;
     void SaveSettings(TRWReg& settings) const override;
+    void UseRules(Rules rules) override;
 
     // --- Events. The members called On... are told first, all others are listeners. ---
     PlayerEvents& Events() { return events_; }

@@ -21,6 +21,10 @@ void TPlaySound::SaveSettings(TRWReg& settings) const {
     if (panel_ != nullptr) WriteSetting(settings, kCrossover, panel_->Crossover());
 }
 
+void TPlaySound::UseRules(Rules rules) {
+    SetRulesOf(*this, kRules, rules);
+}
+
 // --- What a player program is told ---
 
 namespace {

@@ -14,6 +14,12 @@ inline constexpr PropertySetting kPlayExtern{Setting<bool>{u"PSPlayExtern"}, &TP
 inline constexpr PropertySetting kTimerInterval{Setting<int>{u"PSTimerInterval", 250, 1, 10'000},  // ms
                                                 &TPlaySound::TimerInterval, &TPlaySound::SetTimerInterval};
 
-inline constexpr std::tuple kOwn{kAutoPlay, kPlayExtern, kTimerInterval};
+// Pairs of rules, classic when false and modern when true (Rules.h).
+inline constexpr PropertySetting kKeepAlbums{Setting<bool>{u"KeepAlbums", false, true},
+                                             &TPlaySound::KeepAlbums, &TPlaySound::SetKeepAlbums};
+
+inline constexpr std::tuple kRules{kKeepAlbums};
+
+inline constexpr std::tuple kOwn{kAutoPlay, kPlayExtern, kTimerInterval, kKeepAlbums};
 
 }  // namespace PlayerSettings

@@ -19,4 +19,7 @@ inline constexpr Setting<int> kOVType{u"OVType", ovArtist, ovArtist, kOverviewTy
 inline constexpr Setting<int> kVolume{u"Volume", 100, 0, 100};  // per cent
 inline constexpr Setting<int> kSpectrumStyle{u"SpectrumStyle", ssBars, ssBars, ssCircle};
 
+// A double click plays this song and not what follows it in the shown list.
+inline constexpr Setting<bool> kPlayOnlyThisSong{u"PlayOnlyThisSong"};
+
 }  // namespace WindowSettings

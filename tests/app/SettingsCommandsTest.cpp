@@ -57,6 +57,7 @@ void ForEveryRow(const Action& action) {
     action(WindowSettings::kVolume);
     action(WindowSettings::kSpectrumStyle);
     action(WindowSettings::kLinkPath);
+    action(WindowSettings::kPlayOnlyThisSong);
 }
 
 // A way to a player program that is not there.
