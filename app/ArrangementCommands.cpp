@@ -26,9 +26,9 @@ FileDialogOptions DialogOptions(const QString& title) {
 void ArrangementCommands::AddTo(QMenu& menu) {
     menu.addSeparator();
     QObject::connect(menu.addAction(u"Anordnung &speichern unter..."_s), &QAction::triggered, &menu,
-                     [this] { RunCommand([this] { SaveAs(); }); });
+                     Guarded([this] { SaveAs(); }));
     QObject::connect(menu.addAction(u"Anordnung &laden..."_s), &QAction::triggered, &menu,
-                     [this] { RunCommand([this] { Open(); }); });
+                     Guarded([this] { Open(); }));
 }
 
 void ArrangementCommands::SaveAs() {
@@ -55,6 +55,7 @@ Arrangement ArrangementCommands::Current() const {
 }
 
 bool ArrangementCommands::Apply(const Arrangement& arrangement) {
-    return window_.restoreState(arrangement.Docks) && window_.restoreGeometry(arrangement.Placement) &&
+    // The size first: the docks' are parts of it.
+    return window_.restoreGeometry(arrangement.Placement) && window_.restoreState(arrangement.Docks) &&
            list_.RestoreColumns(arrangement.Columns);
 }

@@ -5,6 +5,7 @@
 
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/commands/Menu.h"
+#include "app/views/DockAction.h"
 #include "app/views/MusicOverview.h"
 #include "app/views/OverviewForm.h"
 #include "app/views/PropertyForm.h"
@@ -25,31 +26,48 @@ ToolWindows::ToolWindows(QMainWindow& window, TMusicDatabase& database)
     overview_->Overview().OnSelectionChanged = [this](const GroupSelection& selection) {
         if (OnSelectionChanged) OnSelectionChanged(selection);
     };
-    overview_->Overview().OnTypeChanged = [this](TOVType) { MarkMenu(); };
-    MarkMenu();
+    overview_->Overview().OnTypeChanged = [&database](TOVType) { database.Commands().Changed.Tell(); };
+    HandleCommands(database);
+    FollowSong();
+}
+
+void ToolWindows::FollowSong() {
+    CollectionEvents& events = database_.Events();
+    subscriptions_ += events.Changed.Subscribe([this](SongIndex index, const TID3Tag&, const TID3Tag& song) {
+        if (index == database_.Songs().PositionOf(song_)) Show(&song);
+    });
+    const auto forget = [this] {
+        if (database_.Songs().Find(song_) == nullptr) Show(nullptr);
+    };
+    subscriptions_ += events.Replaced.Subscribe(forget);
+    subscriptions_ += events.Cleared.Subscribe(forget);
+}
+
+void ToolWindows::HandleCommands(TMusicDatabase& database) {
+    for (int i = 0; i < kOverviewTypeCount; ++i) {
+        const auto type = static_cast<TOVType>(i);
+        const auto show = [this, type] {
+            overview_->show();
+            overview_->raise();
+            overview_->Overview().SetOVType(type);
+        };
+        const auto isShown = [this, type] { return overview_->Overview().OVType() == type; };
+        handlers_ += database.Commands().Handle(mcListArtists + i, {.Run = show, .IsOn = isShown});
+    }
 }
 
 void ToolWindows::ShowSong(const TID3Tag* song) {
-    properties_->ShowSong(song);
-    tag_->ShowSong(song);
+    song_ = song != nullptr ? database_.Songs().HandleOf(*song) : SongHandle();
+    Show(song);
 }
 
-bool ToolWindows::Run(int id) {
-    if (id < mcListArtists || id > mcListGenres) return false;
-    overview_->show();
-    overview_->raise();
-    overview_->Overview().SetOVType(static_cast<TOVType>(id - mcListArtists));
-    return true;
+void ToolWindows::Show(const TID3Tag* song) {
+    properties_->ShowSong(song);
+    tag_->ShowSong(song);
 }
 
 void ToolWindows::AddTo(QMenu& menu) {
     for (QDockWidget* window : {static_cast<QDockWidget*>(overview_), static_cast<QDockWidget*>(properties_),
                                 static_cast<QDockWidget*>(tag_)})
-        menu.addAction(window->toggleViewAction());
-}
-
-void ToolWindows::MarkMenu() {
-    const TOVType type = overview_->Overview().OVType();
-    for (int id = mcListArtists; id <= mcListGenres; ++id)
-        if (TMenuExItem* item = database_.Menu().Find(id)) item->SetChecked(id - mcListArtists == type);
+        AddDockAction(menu, *window);
 }

@@ -2,8 +2,8 @@
 
 #include <functional>
 
-#include "MusicManagment/database/SongTypes.h"
-#include "ReadMPEGHeader/ID3Tag.h"
+#include "CommonRUKTools/Listeners.h"
+#include "MusicManagment/database/SongList.h"
 #include "app/models/GroupSelection.h"
 
 class QMainWindow;
@@ -13,7 +13,8 @@ class TMusicDatabase;
 class TOverviewForm;
 class TPropertyForm;
 
-// The windows that dock at the main window, and what they follow.
+// The windows that dock at the main window, and what they follow. Handles the commands that the overview
+// serves.
 class ToolWindows {
  public:
     // The windows belong to `window`.
@@ -22,18 +23,22 @@ class ToolWindows {
     // Told when other groups are chosen in the overview.
     std::function<void(const GroupSelection&)> OnSelectionChanged;
 
-    // Shows a song in the windows that are about one; nullptr for none.
+    // Shows a song of the database in the windows that are about one, which follow its changes; nullptr for
+    // none.
     void ShowSong(const TID3Tag* song);
-    // The commands of the database's menu that the overview serves. False when the number is none of them.
-    bool Run(int id);
-    // Marks the overview's grouping in the database's menu.
-    void MarkMenu();
     // Adds the items that show and hide the windows.
     void AddTo(QMenu& menu);
 
  private:
+    void HandleCommands(TMusicDatabase& database);
+    void FollowSong();
+    void Show(const TID3Tag* song);
+
     TMusicDatabase& database_;
     TOverviewForm* overview_;
     TPropertyForm* properties_;
     TID3TagForm* tag_;
+    SongHandle song_;
+    Subscriptions handlers_;
+    Subscriptions subscriptions_;
 };

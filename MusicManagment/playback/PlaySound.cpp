@@ -1,97 +1,99 @@
 #include "MusicManagment/playback/PlaySound.h"
 
 #include <QEventLoop>
+#include <QScopeGuard>
 #include <QThread>
 #include <algorithm>
 #include <limits>
 #include <utility>
 
 #include "CommonRUKTools/Clock.h"
-#include "CommonRUKTools/FileSource.h"
-#include "CommonRUKTools/RWReg.h"
-#include "MusicManagment/playback/ExternalLink.h"
+#include "MusicManagment/playback/ExternalTarget.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
-#include "MusicManagment/playback/backend/FadingBackend.h"
-#include "MusicManagment/playback/backend/GainBackend.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr int kWaitRound = 250;          // ms
-constexpr qint64 kStep = 10000;          // ms, of the menu's commands back and forward
-constexpr int kLongestInterval = 10000;  // ms, of a stored timer interval
+constexpr int kWaitRound = 250;  // ms
+constexpr qint64 kStep = 10000;  // ms, of the menu's commands back and forward
 
 }  // namespace
 
 TPlaySound::TPlaySound(EngineTable engines, QObject* parent)
     : TPlaySoundContainer(parent),
-      engineTable_(std::move(engines)),
+      engines_(std::move(engines), settings_,
+               {.FadesWanted = [this] { return FadesWanted(); },
+                .TellRefusal = [this](const QString& text) { TellRefusal(text); }}),
       timers_({.Tick = [this] { RunHandler(&TPlaySound::Tick); },
                .EndOfSong = [this] { RunHandler(&TPlaySound::HandleEndOfSong); },
-               .AutoStop = [this] { RunHandler(&TPlaySound::HandleAutoStop); }}) {}
+               .AutoStop = [this] { RunHandler(&TPlaySound::HandleAutoStop); },
+               .Output = [this] { RunHandler(&TPlaySound::LookForOutput); }}) {
+    ForwardEvents();
+}
 
 TPlaySound::~TPlaySound() {
     SetPlayList(nullptr);
     SetMusicDatabase(nullptr);
 }
 
+void TPlaySound::ForwardEvents() {
+    const auto forward = [this](Listeners<>& event, TNotifyEvent TPlaySound::*member) {
+        forwarding_ += event.Subscribe([this, member] {
+            if (this->*member) (this->*member)(*this);
+        });
+    };
+    forward(events_.Started, &TPlaySound::OnPlayingStarted);
+    forward(events_.Stopped, &TPlaySound::OnPlayingStopped);
+    forward(events_.Paused, &TPlaySound::OnPlayingPaused);
+    forward(events_.Resumed, &TPlaySound::OnPlayingResumed);
+    forward(events_.ReachedEnd, &TPlaySound::OnReachedEndOfSong);
+    forward(events_.Crossover, &TPlaySound::OnCrossover);
+    forwarding_ += events_.Playing.Subscribe([this](quint32 position) {
+        if (OnPlaying) OnPlaying(*this, position);
+    });
+}
+
 // --- Playing ---
 
 void TPlaySound::Play() {
-    if (UseExternal()) {
-        external_->Send(ecPlay);
-        return RestartAutoStop();
-    }
-    if (!current_ || EndFadesOfPlaying() || !FileSource::Exists(fileName_)) return;
-    current_->Play();
-    ResumeFading();
-    StartTimers();
-    AnnounceSong();
-}
-
-// A song that plays already only gets its full volume back.
-bool TPlaySound::EndFadesOfPlaying() {
-    FadingBackend* current = AsFading(current_.get());
-    if (current == nullptr || current_->GetStatus() != psPlaying) return false;
-    current->CancelFades();
-    current->SetVolume(100);
-    if (FadingBackend* fading = AsFading(fading_.get())) fading->CutFadeOut();
-    return true;
-}
-
-// One that has come to its end in the meantime would begin anew.
-void TPlaySound::ResumeFading() {
-    if (fading_ && fading_->GetStatus() != psStopped) fading_->Play();
+    PlayTarget& target = Reached(fileName_);
+    if (waiting_) return GoOn();
+    GuardOutput(false, [&] {
+        switch (target.Play()) {
+            case Carried::Out:
+                StartTimers();
+                return AnnounceSong();
+            case Carried::OnItsWay:
+                return RestartAutoStop();
+            case Carried::Not:
+                return;
+        }
+    });
 }
 
 void TPlaySound::AnnounceSong() {
-    Raise(OnPlayingStarted);
+    events_.Started.Tell();
     Feedback(fbStarted);
-    if (panel_ != nullptr) {
-        panel_->ShowSong(fileName_);
-        panel_->Redraw();
-    }
+    if (panel_ != nullptr) panel_->ShowSong(fileName_);
+    RedrawPanel();
     if (controller_ == nullptr) return;
     controller_->FeedbackFileName(fileName_);
     Feedback(fbStateChanged, 1);
 }
 
 void TPlaySound::Stop(StopMode mode) {
-    if (playExtern_) {
-        timers_.StopAutoStop();
-        if (ExternalRuns()) external_->Send(ecStop, mode == StopMode::Fade);
-        return;
+    if (playExtern_) timers_.StopAutoStop();
+    if (waiting_ && !engines_.IsOpen()) {
+        waiting_->Plays = false;
+        waiting_->Position = 0;
+        return FinishStop();
     }
-    if (!current_) return;
-    FadingBackend* fading = AsFading(current_.get());
-    // A fade-out runs on the timer, which rests unless the song plays.
-    if (mode == StopMode::Fade && fading != nullptr && settings_.FMODCrossoverTime >= kShortestFade &&
-        !fading->IsFadingOut() && current_->GetStatus() == psPlaying) {
-        fading->SetFadeTime(settings_.FMODCrossoverTime);
-        fading->StartFadeOut();
-        return;
-    }
+    auto rest = qScopeGuard([this] { StopTimers(); });  // also when the engine refuses
+    const Carried done = Chosen().Stop(mode);
+    rest.dismiss();
+    if (done != Carried::Out) return;
+    waiting_.reset();
     FinishStop();
     if (timers_.TicksExist() && !timers_.Ticking()) RunTick(TickKind::Last);
 }
@@ -99,33 +101,23 @@ void TPlaySound::Stop(StopMode mode) {
 // The timers rest before anybody is told, who may start another song.
 void TPlaySound::FinishStop() {
     StopTimers();
-    current_->Stop();
-    fading_.reset();
-    Raise(OnPlayingStopped);
+    events_.Stopped.Tell();
     Feedback(fbStopped);
     StateChanged();
 }
 
 void TPlaySound::PauseResume() {
-    if (UseExternal()) {
-        external_->Send(ecPauseResume);
-        return;
-    }
-    if (!current_) return;
-    if (current_->GetStatus() == psPaused) {
-        current_->Play();
-        ResumeFading();
-        StartTimers();
-        Raise(OnPlayingResumed);
-        Feedback(fbResumed);
-    } else {
-        current_->PauseResume();
-        if (fading_) fading_->PauseResume();
-        StopTimers();
-        Raise(OnPlayingPaused);
-        Feedback(fbPaused);
-    }
-    StateChanged();
+    PlayTarget& target = Reached(fileName_);
+    if (waiting_) return GoOn();
+    GuardOutput(true, [&] {
+        const Carried done = target.PauseResume();
+        if (done == Carried::Not || playExtern_) return;
+        const bool plays = done == Carried::Out;
+        plays ? StartTimers() : StopTimers();
+        (plays ? events_.Resumed : events_.Paused).Tell();
+        Feedback(plays ? fbResumed : fbPaused);
+        StateChanged();
+    });
 }
 
 void TPlaySound::StartTimers() {
@@ -147,39 +139,23 @@ void TPlaySound::RestartAutoStop() {
     if (autoStop_ > 0) timers_.StartAutoStop(autoStop_);
 }
 
-template <typename T>
-T TPlaySound::AskCurrent(T (TPlaySoundContainer::*question)(), T none) const {
-    try {
-        return current_ ? (*current_.*question)() : none;
-    } catch (const ERukException&) {
-        return none;
-    }
-}
-
 quint32 TPlaySound::GetPosition() {
-    if (playExtern_) return ExternalRuns() ? static_cast<quint32>(external_->Send(ecGetPosition)) : 0;
-    return AskCurrent<quint32>(&TPlaySoundContainer::GetPosition, 0);
+    return waiting_ ? waiting_->Position : Chosen().Position();
 }
 
 void TPlaySound::SetPosition(quint32 milliseconds) {
-    if (playExtern_) {
-        if (ExternalRuns()) external_->Send(ecSetPosition, milliseconds);
-    } else if (current_) {
-        current_->SetPosition(milliseconds);
-    }
-    if (OnSeeked) OnSeeked(*this, milliseconds);
+    if (waiting_) waiting_->Position = milliseconds;
+    GuardOutput(true, [&] { Chosen().SetPosition(milliseconds); });
+    events_.Seeked.Tell(milliseconds);
 }
 
 quint32 TPlaySound::GetLength() {
-    if (playExtern_) return ExternalRuns() ? static_cast<quint32>(external_->Send(ecGetLength)) : 0;
-    return AskCurrent<quint32>(&TPlaySoundContainer::GetLength, 0);
+    return waiting_ ? waiting_->Length : Chosen().Length();
 }
 
 TPSStatus TPlaySound::GetStatus() {
-    if (!playExtern_) return AskCurrent(&TPlaySoundContainer::GetStatus, psClosed);
-    if (!ExternalRuns()) return psClosed;
-    const qint64 answer = external_->Send(ecGetStatus);
-    return answer >= psClosed && answer <= psSeeking ? static_cast<TPSStatus>(answer) : psClosed;
+    if (waiting_) return waiting_->Plays ? psPaused : psStopped;
+    return Chosen().Status();
 }
 
 void TPlaySound::SetStatus(TPSStatus status) {
@@ -230,13 +206,11 @@ void TPlaySound::SetAutoStop(int milliseconds) {
 
 void TPlaySound::SetEngines(const EngineSettings& settings) {
     const EngineSettings former = std::exchange(settings_, settings);
-    if (playExtern_) external_->SendChanges(former, settings_);
+    if (playExtern_) external_->TellChanges(former);
 }
 
 void TPlaySound::SetGain(float gain) {
-    gain_ = std::clamp(gain, 0.0F, 1.0F);
-    if (engineTable_.SetSharedGain) engineTable_.SetSharedGain(gain_);
-    if (GainBackend* current = AsGain(current_.get())) current->SetGain(gain_);
+    engines_.SetGain(gain);
 }
 
 // --- Wiring ---
@@ -262,6 +236,7 @@ void TPlaySound::SetPlayList(TPlayList* playList) {
 
 void TPlaySound::RedrawPanel() {
     if (panel_ != nullptr) panel_->Redraw();
+    events_.Changed.Tell();
 }
 
 // --- Menu ---
@@ -327,27 +302,4 @@ SongIndex TPlaySound::SongInDatabase() const {
     const SongIndex song = database_->IndexOf(fileName_);
     if (song >= 0 || !playList_ || playList_->CurrentFile() != fileName_) return song;
     return database_->IndexOf(playList_->CurrentSong());
-}
-
-// --- Settings ---
-
-void TPlaySound::LoadSettings(const TRWReg& settings) {
-    EngineSettings engines = settings_;
-    LoadEngineSettings(engines, settings);
-    SetEngines(engines);
-    if (const auto autoPlay = settings.ReadBool(u"PSAutoPlay"_s)) SetAutoPlay(*autoPlay);
-    if (const auto playExtern = settings.ReadBool(u"PSPlayExtern"_s)) SetPlayExtern(*playExtern);
-    const auto interval = settings.ReadInteger(u"PSTimerInterval"_s);
-    if (interval && *interval >= 1 && *interval <= kLongestInterval) SetTimerInterval(*interval);
-    const auto mode = settings.ReadInteger(u"Crossover"_s);
-    if (panel_ != nullptr && mode && *mode >= coNone && *mode <= coAlways)
-        panel_->SetCrossover(static_cast<TCrossover>(*mode));
-}
-
-void TPlaySound::SaveSettings(TRWReg& settings) const {
-    SaveEngineSettings(settings_, settings);
-    settings.WriteBool(u"PSAutoPlay"_s, autoPlay_);
-    settings.WriteBool(u"PSPlayExtern"_s, playExtern_);
-    settings.WriteInteger(u"PSTimerInterval"_s, timerInterval_);
-    if (panel_ != nullptr) settings.WriteInteger(u"Crossover"_s, panel_->Crossover());
 }

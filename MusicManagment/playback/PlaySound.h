@@ -9,25 +9,20 @@
 #include "CommonRUKTools/MenuItem.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/commands/Settings.h"
-#include "MusicManagment/playback/EngineChoice.h"
 #include "MusicManagment/playback/ExternalPlayer.h"
+#include "MusicManagment/playback/OwnEngines.h"
 #include "MusicManagment/playback/PlayController.h"
 #include "MusicManagment/playback/PlayCountClock.h"
 #include "MusicManagment/playback/PlaySoundSettings.h"
 #include "MusicManagment/playback/PlayTimers.h"
+#include "MusicManagment/playback/PlayerEvents.h"
 #include "MusicManagment/playback/PlayerPanel.h"
 #include "MusicManagment/playback/backend/EngineErrors.h"
 #include "MusicManagment/playback/backend/PlaySoundContainer.h"
 #include "MusicManagment/playlist/PlayList.h"
 #include "MusicManagment/playlist/SongPlayer.h"
 
-class ExternalLink;
-class FadingBackend;
-
-enum class StopMode {
-    AtOnce,
-    Fade,  // at once where fading is not possible
-};
+class ExternalTarget;
 
 // Through this one component the whole program plays a song. It chooses an engine for the file, falls back to
 // others, fades from song to song, notices the end of a song, counts songs as played. Single-threaded.
@@ -45,13 +40,16 @@ class TPlaySound : public TPlaySoundContainer,
     // Closes the former song and opens this one, and plays it with AutoPlay. An empty name only closes. A
     // missing file opens nothing. Throws EPlaySoundException when no engine is allowed for the file, and what
     // the last engine throws; nothing is open then. Throws EAbort when another song was opened, or this one
-    // closed, while it was being opened: engines and messages may let the event loop run.
+    // closed, while it was being opened: engines and messages may let the event loop run. Where the way to
+    // the loudspeaker fails, here or later, nothing is thrown: the user is told once, and the song waits.
     void SetFileName(const QString& path) override;
     void Open() override;
     void Close() override;
     // The engine that has the song, be it after others refused; nothing when none has it or it is the
     // external player's.
-    std::optional<TEngine> CurrentEngine() const { return current_ ? std::optional(engine_) : std::nullopt; }
+    std::optional<TEngine> CurrentEngine() const { return engines_.Engine(); }
+    // Whether the song goes on by itself as soon as there is an output again; it counts as paused until then.
+    bool AwaitsOutput() const { return timers_.OutputPending(); }
 
     // --- Playing. Without a song they do nothing. They throw what the engine throws, but for the Get
     // questions, which windows and the desktop ask at any time: a song whose engine fails is as good as
@@ -96,6 +94,14 @@ class TPlaySound : public TPlaySoundContainer,
     const EngineSettings& Engines() const { return settings_; }
     // They hold from the next song on. A reachable external player is told of each change.
     void SetEngines(const EngineSettings& settings);
+    // Modern rules, off by default. Songs that follow one another on an album (track n + 1, same album, and
+    // same artist or folder) are not faded into each other at their end.
+    bool KeepAlbums() const { return keepAlbums_; }
+    void SetKeepAlbums(bool value) { keepAlbums_ = value; }
+    // Songs that are passed over are told in one line each (Events().Notice), not in boxes. Who asks for one
+    // song gets its exception either way.
+    bool QuietFailures() const { return quietFailures_; }
+    void SetQuietFailures(bool value) { quietFailures_ = value; }
     bool PlayExtern() const { return playExtern_; }
     // Closes the song here and opens it there, or the other way round. Without a way to external players
     // nothing changes.
@@ -122,10 +128,11 @@ class TPlaySound : public TPlaySoundContainer,
     void SetExternalPlayer(std::unique_ptr<ExternalPlayer> player);
     void RedrawPanel() override;
 
-    // --- Handlers of the timers (PlaySoundTick.cpp); they throw what playing throws ---
+    // --- Handlers of the timers (PlaySoundTick.cpp, PlaySoundOutput.cpp); they throw what playing throws ---
     void Tick();
     void HandleEndOfSong();
     void HandleAutoStop();
+    void LookForOutput();
     // Runs the handlers whose time has come by the engine's clock, for those who have no event loop.
     void RunDueTimers() { timers_.RunDue(); }
     const PlayTimers& Timers() const { return timers_; }
@@ -140,7 +147,8 @@ class TPlaySound : public TPlaySoundContainer,
     void LoadSettings(const TRWReg& settings) override;
     void SaveSettings(TRWReg& settings) const override;
 
-    // --- Events ---
+    // --- Events. The members called On... are told first, all others are listeners. ---
+    PlayerEvents& Events() { return events_; }
     using TNotifyEvent = std::function<void(TPlaySound&)>;
     TNotifyEvent OnPlayingStarted;
     TNotifyEvent OnPlayingStopped;
@@ -149,31 +157,26 @@ class TPlaySound : public TPlaySoundContainer,
     TNotifyEvent OnReachedEndOfSong;
     TNotifyEvent OnCrossover;
     std::function<void(TPlaySound&, quint32 position)> OnPlaying;  // ms
-    // Somebody has gone to another place of the song, here or in the external player.
-    std::function<void(TPlaySound&, quint32 position)> OnSeeked;  // ms
 
  private:
-    using Backend = std::unique_ptr<TPlaySoundContainer>;
     enum class TickKind { Running, Last };
+    // The song that waits for an output.
+    struct Waiting {
+        quint32 Position;  // ms
+        quint32 Length;    // ms
+        bool Begun;        // it has been heard before
+        bool Plays;        // it goes on by itself
+        int Looks;         // for the output, in vain
+    };
 
     // PlaySoundOpen.cpp
-    Backend MakeBackend(TEngine engine, const QString& path) const;
-    void OpenBackend(TEngine engine);
-    void CreateBackend(TEngine engine, const QString& message);
-    bool CreateBackendsAfter(TEngine failed, const QString& message);
-    bool OpenExternally();
-    bool UseExternal();
-    bool ExternalRuns();
+    PlayTarget& Chosen();
+    PlayTarget& Reached(const QString& song);
     void PlayInternally();
-    void TellWhileOpening(MessageKind kind, const QString& text);
-    void CloseBackends();
     void ClearPanel();
 
     // PlaySound.cpp
-    template <typename T>
-    T AskCurrent(T (TPlaySoundContainer::*question)(), T none) const;
-    bool EndFadesOfPlaying();
-    void ResumeFading();
+    void ForwardEvents();
     void AnnounceSong();
     void FinishStop();
     void StartTimers();
@@ -184,15 +187,19 @@ class TPlaySound : public TPlaySoundContainer,
     void MoveBy(qint64 milliseconds);
 
     // PlaySoundFades.cpp
-    bool CanFade() const;
-    bool CrossFadeTo(Backend next, const QString& path);
-    void FadeOutFormer();
+    bool FadesWanted() const;
+    std::optional<TID3Tag> RecordOf(const QString& path) const;
+    bool ContinuesAlbum(const QString& path) const;
+
+    // PlaySoundOutput.cpp
+    void GuardOutput(bool begun, const std::function<void()>& action);
+    void WaitForOutput(const QString& reason, bool begun);
+    void GoOn();
+    void OpenAtPosition(quint32 position);
 
     // PlaySoundTick.cpp
     void RunTick(TickKind kind);
     void ReportPosition(quint32 position, quint32 length);
-    bool FinishFades();
-    bool IsStopping() const;
     bool HasEnded(quint32 position, quint32 length);
     void CheckEnd(quint32 position, quint32 length);
     void RestWhenOver();
@@ -201,34 +208,39 @@ class TPlaySound : public TPlaySoundContainer,
     void CountSong();
     void AskForNextSong(SongChange change);
     void PlayNextOfDatabase(SongChange change);
-    void RunHandler(void (TPlaySound::*handler)());
-    static void RunGuarded(const std::function<void()>& action, const std::function<void()>& onFailure);
 
     // PlaySoundFeedback.cpp
-    void Raise(const TNotifyEvent& event);
+    void RunHandler(void (TPlaySound::*handler)());
+    void RunGuarded(const std::function<void()>& action, const std::function<void()>& onFailure);
+    void TellFailure(const QString& text);
+    void TellRefusal(const QString& text);
+    void TellWhileOpening(MessageKind kind, const QString& text);
     void Feedback(FeedbackCode code, quint32 parameter = 0);
     void StateChanged();
     void TakeFeedback(int code, quint32 parameter);
     qint64 HandleFeedback(int code, quint32 parameter) override;
     void HandleFeedbackText(int code, const QString& text) override;
 
-    EngineTable engineTable_;
+    PlayerEvents events_;
+    Subscriptions forwarding_;  // from the events to the members called On...
     EngineSettings settings_;
+    OwnEngines engines_;
+    std::unique_ptr<ExternalTarget> external_;
     QString fileName_;
     QString coFileName_;
-    Backend current_;
-    Backend opening_;                 // on its way to be the current one
-    unsigned generation_ = 0;         // changes with every song that is opened or closed
-    TEngine engine_ = TEngine::FMOD;  // of the current song
-    Backend fading_;                  // the song that fades out
     PlayTimers timers_;
     PlayCountClock playCount_;
-    std::unique_ptr<ExternalLink> external_;
+    std::optional<Waiting> waiting_;
+    bool outputTold_ = false;  // of the failure that goes on
+    QStringList untold_;       // failures, while a message about another one stands
+    bool telling_ = false;
     int timerInterval_ = 250;  // ms
     int autoStop_ = 0;         // ms
-    float gain_ = 1;
     bool autoPlay_ = false;
     bool playExtern_ = false;
+    bool keepAlbums_ = false;
+    bool quietFailures_ = false;
+    std::optional<TID3Tag> ending_;  // whose album is kept together, while the song after it is asked for
     bool endReached_ = false;
     bool crossFadeStarted_ = false;
 

@@ -1,58 +1,52 @@
-#include <utility>
+#include <QFileInfo>
 
-#include "CommonRUKTools/FileSource.h"
-#include "MusicManagment/playback/ExternalLink.h"
+#include "MusicManagment/playback/ExternalTarget.h"
 #include "MusicManagment/playback/PlaySound.h"
-#include "MusicManagment/playback/backend/FadingBackend.h"
 
 // Two songs at once.
+
+namespace {
+
+bool IsNextOnAlbum(const TID3Tag& song, const TID3Tag& next) {
+    const auto folder = [](const TID3Tag& tag) { return QFileInfo(tag.FileName).path(); };
+    return !song.Album.isEmpty() && song.Album == next.Album && song.Track > 0 &&
+           next.Track == song.Track + 1 && (song.Artist == next.Artist || folder(song) == folder(next));
+}
+
+}  // namespace
 
 TCrossover TPlaySound::Crossover() const {
     if (controller_ != nullptr) return controller_->AskCrossover();
     return panel_ != nullptr ? panel_->Crossover() : coAutoChange;
 }
 
-bool TPlaySound::CanFade() const {
+bool TPlaySound::FadesWanted() const {
     return settings_.FMODCrossoverTime >= kShortestFade && Crossover() != coNone;
 }
 
-bool TPlaySound::PlayWithCrossFade(const QString& path) {
-    if (UseExternal()) {
-        if (external_->SendText(ecPlayWithCrossFade, path) == 0) return false;
-        fileName_ = path;
-        RestartAutoStop();
-        return true;
-    }
-    // In this order: whoever is asked for the mode may close the song.
-    if (!CanFade() || AsFading(current_.get()) == nullptr) return false;
-    if (!FileSource::Exists(path) || ChooseEngine(path, settings_) != TEngine::FMOD) return false;
-    try {
-        Backend next = MakeBackend(TEngine::FMOD, path);
-        next->Open();
-        return CrossFadeTo(std::move(next), path);
-    } catch (const EFMODException&) {
-        // The song that plays is worth more than the reason; the hard change that follows tells it.
-        return false;
-    }
+// What plays can be a copy of what is listed.
+std::optional<TID3Tag> TPlaySound::RecordOf(const QString& path) const {
+    const bool listed = playList_ && playList_->CurrentFile() == path;
+    const int entry = listed ? playList_->IndexOf() : -1;
+    if (entry >= 0 && playList_->Entry(entry).Record) return *playList_->Entry(entry).Record;
+    const TID3Tag* song = database_ ? database_->Songs().Find(path) : nullptr;
+    return song != nullptr ? std::optional(*song) : std::nullopt;
 }
 
-// The new song is opened beside the current one and takes its place only once it plays, so that whatever goes
-// wrong leaves the current one alone.
-bool TPlaySound::CrossFadeTo(Backend next, const QString& path) {
-    FadingBackend* fadingIn = AsFading(next.get());
-    if (fadingIn == nullptr) return false;
-    fadingIn->SetFadeTime(settings_.FMODCrossoverTime);
-    fadingIn->StartFadeIn();
-    next->Play();
-    fadingIn->FadeStep();  // no moment at full volume before the first tick
+bool TPlaySound::ContinuesAlbum(const QString& path) const {
+    const auto next = ending_ ? RecordOf(path) : std::nullopt;
+    return next && IsNextOnAlbum(*ending_, *next);
+}
 
-    ++generation_;
-    fading_ = std::exchange(current_, std::move(next));
-    FadeOutFormer();
-
+bool TPlaySound::PlayWithCrossFade(const QString& path) {
+    if (ContinuesAlbum(path)) return false;
+    const Carried done = Reached(fileName_).CrossFadeTo(path);
+    if (done == Carried::Not) return false;
     // A song that is faded in counts as well, though its name does not go through SetFileName.
-    if (path != fileName_) playCount_.Arm();
+    if (path != fileName_ && done == Carried::Out) playCount_.Arm();
     fileName_ = path;
+    if (done == Carried::OnItsWay) return RestartAutoStop(), true;
+    waiting_.reset();
     coFileName_.clear();
     if (playList_) playList_->RedrawView();
     StartTimers();
@@ -60,41 +54,13 @@ bool TPlaySound::CrossFadeTo(Backend next, const QString& path) {
     return true;
 }
 
-// One that is paused or stopped would only be heard again when the new song is paused and resumed.
-void TPlaySound::FadeOutFormer() {
-    if (fading_->GetStatus() != psPlaying) return fading_.reset();
-    FadingBackend* former = AsFading(fading_.get());
-    former->SetFadeTime(settings_.FMODCrossoverTime);
-    former->StartFadeOut();
-}
-
 QString TPlaySound::COFileName() {
-    const bool there = playExtern_ ? ExternalRuns() : fading_ != nullptr;
-    return there ? coFileName_ : QString();
+    return Chosen().SoundsBeside() ? coFileName_ : QString();
 }
 
 void TPlaySound::SetCOFileName(const QString& path) {
-    fading_.reset();
+    engines_.CloseBeside();
     coFileName_ = path;
-    if (path.isEmpty() || !CanFade()) {
-        if (ExternalRuns()) external_->Send(ecCloseFading);
-        return;
-    }
-    if (UseExternal()) {
-        external_->Send(ecNewFading);
-        external_->SendText(ecFadingFileName, path);
-        external_->Send(ecOpenFading);
-        external_->Send(ecFadingTime, settings_.FMODCrossoverTime);
-        external_->Send(ecStartFading, 1);
-        external_->Send(ecPlayFading);
-        return;
-    }
-    Backend song = MakeBackend(TEngine::FMOD, path);
-    song->Open();
-    if (FadingBackend* fading = AsFading(song.get())) {
-        fading->SetFadeTime(settings_.FMODCrossoverTime);
-        fading->StartFadeOut();
-    }
-    song->Play();
-    fading_ = std::move(song);
+    if (path.isEmpty() || !FadesWanted()) return Chosen().CloseBeside();
+    Reached(fileName_).PlayBeside(path);
 }

@@ -2,10 +2,10 @@
 #include <utility>
 
 #include "CommonRUKTools/FileSource.h"
-#include "MusicManagment/playback/ExternalLink.h"
+#include "MusicManagment/playback/ExternalTarget.h"
 #include "MusicManagment/playback/PlaySound.h"
 
-// Opening a song: in which engine, in which other engines when that one refuses, or in the external player.
+// Opening a song, here or in the external player.
 
 using namespace Qt::StringLiterals;
 
@@ -14,88 +14,32 @@ void TPlaySound::SetFileName(const QString& path) {
     fileName_ = path;
     Close();
     if (fileName_.isEmpty()) return ClearPanel();
+    // What shows the player must not go on showing the song before.
+    auto show = qScopeGuard([this] { StateChanged(); });
     Open();
     if (autoPlay_) Play();
+    show.dismiss();
 }
 
 void TPlaySound::Open() {
     if (playList_) playList_->RedrawView();
     if (!FileSource::Exists(fileName_)) return ClearPanel();
-    const auto engine = ChooseEngine(fileName_, settings_);
-    if (!engine)
-        throw EPlaySoundException(
-            u"Keine Engine zum Verwenden freigegeben (UseFMOD, UseMCI, UseEldoS, UseWinAmp, ...)"_s);
-    CreateBackend(*engine, QString());
+    RequireEngine(fileName_, settings_);
+    StopTimers();
+    PlayTarget& target = Reached(QString());
+    GuardOutput(false, [&] { target.Open(fileName_); });
 }
 
 void TPlaySound::Close() {
-    ++generation_;
-    if (ExternalRuns()) {
-        external_->Send(ecClose);
-        external_->Send(ecCloseFading);
-    }
-    CloseBackends();
-}
-
-void TPlaySound::CloseBackends() {
+    if (playExtern_) external_->Close();
     StopTimers();
-    current_.reset();
-    opening_.reset();
-    fading_.reset();
+    waiting_.reset();
+    engines_.Close();
 }
 
 void TPlaySound::ClearPanel() {
-    if (panel_ == nullptr) return;
-    panel_->Clear();
-    panel_->Redraw();
-}
-
-// --- Engines ---
-
-TPlaySound::Backend TPlaySound::MakeBackend(TEngine engine, const QString& path) const {
-    Backend backend = engineTable_.Create(engine, settings_);
-    backend->SetBackendFile(path);
-    return backend;
-}
-
-// Where others may close it while it waits for its engine. Full loudness is what engines begin with; another
-// program that plays may have one of its own, which stays.
-void TPlaySound::OpenBackend(TEngine engine) {
-    const auto forget = qScopeGuard([this] { opening_.reset(); });
-    opening_ = MakeBackend(engine, fileName_);
-    opening_->Open();
-    if (!opening_) throw EAbort();
-    current_ = std::move(opening_);
-    engine_ = engine;
-    if (gain_ < 1) SetGain(gain_);
-}
-
-// A message tells why another engine has refused. An engine that refuses here hands over to those behind it.
-void TPlaySound::CreateBackend(TEngine engine, const QString& message) {
-    if (!message.isEmpty())
-        TellWhileOpening(MessageKind::Warning, message + u"\r\nVersuche "_s + EngineName(engine));
-    if (OpenExternally()) return;
-    StopTimers();
-    current_.reset();
-    try {
-        OpenBackend(engine);
-    } catch (const EFMODException& error) {
-        if (!CreateBackendsAfter(TEngine::FMOD, error.Message())) throw;
-    } catch (const EEldoSException& error) {
-        if (!CreateBackendsAfter(TEngine::EldoS, error.Message())) throw;
-    } catch (const EMCIException& error) {
-        if (!CreateBackendsAfter(TEngine::MCI, error.Message())) throw;
-    }
-}
-
-// Deliberately goes on after the first engine that works: each replaces the one before, so that the last one
-// that is allowed plays the song. False when there is none to go on with.
-bool TPlaySound::CreateBackendsAfter(TEngine failed, const QString& message) {
-    CloseBackends();
-    const std::vector<TEngine> engines = EnginesAfter(failed, settings_);
-    for (const TEngine engine : engines)
-        CreateBackend(engine, message);
-    return !engines.empty();
+    if (panel_ != nullptr) panel_->Clear();
+    RedrawPanel();
 }
 
 // --- The external player ---
@@ -103,7 +47,7 @@ bool TPlaySound::CreateBackendsAfter(TEngine failed, const QString& message) {
 void TPlaySound::SetExternalPlayer(std::unique_ptr<ExternalPlayer> player) {
     if (playExtern_) SetPlayExtern(false);
     FeedbackReceiver& receiver = *this;
-    external_ = player ? std::make_unique<ExternalLink>(std::move(player), receiver) : nullptr;
+    external_ = player ? std::make_unique<ExternalTarget>(std::move(player), receiver, settings_) : nullptr;
 }
 
 void TPlaySound::SetPlayExtern(bool value) {
@@ -113,45 +57,26 @@ void TPlaySound::SetPlayExtern(bool value) {
     if (!fileName_.isEmpty()) Open();
 }
 
-bool TPlaySound::ExternalRuns() {
-    return playExtern_ && external_->Runs();
+// Where songs play now.
+PlayTarget& TPlaySound::Chosen() {
+    if (playExtern_) return *external_;
+    return engines_;
 }
 
-// Hands the song over. False when songs are played here, be it from now on.
-bool TPlaySound::OpenExternally() {
-    if (!playExtern_) return false;
-    if (external_->FindOrStart(settings_) == ExternalLink::Reached::No) {
+// The same, ready for a command. An external player that has to be started anew gets the song first; one that
+// cannot be reached gives it back.
+PlayTarget& TPlaySound::Reached(const QString& song) {
+    if (!Chosen().Reach(song)) {
         PlayInternally();
-        return false;
+        if (!song.isEmpty()) Open();
     }
-    external_->SendText(ecOpenFile, fileName_);
-    return true;
-}
-
-// Whether an operation is the external player's. One that has to be started anew gets the song first.
-bool TPlaySound::UseExternal() {
-    if (!playExtern_) return false;
-    const auto reached = external_->FindOrStart(settings_);
-    if (reached == ExternalLink::Reached::No) {
-        PlayInternally();
-        if (!fileName_.isEmpty()) Open();
-        return false;
-    }
-    if (reached == ExternalLink::Reached::New && !fileName_.isEmpty())
-        external_->SendText(ecOpenFile, fileName_);
-    return true;
+    return Chosen();
 }
 
 void TPlaySound::PlayInternally() {
     playExtern_ = false;
-    CloseBackends();
+    StopTimers();
+    engines_.Close();
     TellWhileOpening(MessageKind::Error,
                      u"Kann das Programm TSPlayer nicht starten. Der Sound wird intern abgespielt."_s);
-}
-
-// Whoever opens or closes a song while the message stands has the last word.
-void TPlaySound::TellWhileOpening(MessageKind kind, const QString& text) {
-    const unsigned before = generation_;
-    UserDialogs().ShowMessage(kind, text);
-    if (generation_ != before) throw EAbort();
 }

@@ -1,9 +1,8 @@
+#include <QScopedValueRollback>
 #include <limits>
 
 #include "CommonRUKTools/Clock.h"
-#include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/playback/PlaySound.h"
-#include "MusicManagment/playback/backend/FadingBackend.h"
 
 // What happens while a song plays: the ticks, its end, and what comes after it.
 
@@ -18,103 +17,68 @@ bool IsInLast(quint32 zone, quint32 position, quint32 length) {
 
 }  // namespace
 
-// A timer's handler has nobody above it who could tell the user.
-void TPlaySound::RunHandler(void (TPlaySound::*handler)()) {
-    RunGuarded([this, handler] { (this->*handler)(); },
-               [this, handler] {
-                   // What a tick throws the next one throws again: the song is over. The message box lets
-                   // timers run, so that the next song need not wait for the user.
-                   timers_.StopTicks();
-                   if (handler == &TPlaySound::Tick) timers_.StartEnd();
-               });
-}
-
-// `onFailure` runs before the user is told.
-void TPlaySound::RunGuarded(const std::function<void()>& action, const std::function<void()>& onFailure) {
-    try {
-        action();
-    } catch (const EAbort&) {
-        return;  // the user has been told
-    } catch (const ERukException& error) {
-        if (onFailure) onFailure();
-        UserDialogs().ShowMessage(MessageKind::Error, error.Message());
-    }
-}
-
 void TPlaySound::Tick() {
-    RunTick(TickKind::Running);
+    GuardOutput(true, [this] { RunTick(TickKind::Running); });
 }
 
 // Whoever is told in between may change the song, so that each step looks whether there still is one.
 void TPlaySound::RunTick(TickKind kind) {
-    if (!current_) return;
-    const quint32 position = current_->GetPosition();
-    const quint32 length = current_->GetLength();
+    if (!engines_.IsOpen()) return;
+    const quint32 position = engines_.Song().GetPosition();
+    const quint32 length = engines_.Song().GetLength();
     ReportPosition(position, length);
-    if (kind == TickKind::Running) {
-        if (FinishFades()) return;
+    if (kind == TickKind::Running && engines_.IsOpen()) {
+        if (engines_.Fades().FadeStep()) {
+            StopTimers();
+            engines_.Stop(StopMode::AtOnce);
+            return FinishStop();
+        }
         CheckEnd(position, length);
         CheckCrossFade(position, length);
+        outputTold_ = false;  // it sounds
     }
     CountSongWhenDue();
 }
 
 void TPlaySound::ReportPosition(quint32 position, quint32 length) {
-    if (OnPlaying) OnPlaying(*this, position);
+    events_.Playing.Tell(position);
     Feedback(fbPlaying, position);
     if (panel_ != nullptr) panel_->ShowPosition(position, length);
     Feedback(fbPosition, position);
 }
 
-// True when a fading stop has come to its end.
-bool TPlaySound::FinishFades() {
-    FadingBackend* current = AsFading(current_.get());
-    if (current != nullptr && current->FadeStep()) {
-        FinishStop();
-        return true;
-    }
-    FadingBackend* fading = AsFading(fading_.get());
-    if (fading != nullptr && fading->FadeStep()) fading_.reset();
-    return false;
-}
-
-// The current song fades out only when it was asked to stop; no other song may follow it then.
-bool TPlaySound::IsStopping() const {
-    const FadingBackend* fading = AsFading(current_.get());
-    return fading != nullptr && fading->IsFadingOut();
-}
-
 bool TPlaySound::HasEnded(quint32 position, quint32 length) {
-    const TPSStatus status = current_->GetStatus();
+    const TPSStatus status = engines_.Song().GetStatus();
     if (length == 0 && status == psPlaying) return false;  // not known yet
     // Damaged files end before their time. Only this engine's status is sure enough to go by.
-    const bool endedEarly = status == psStopped && AsFading(current_.get()) != nullptr;
+    const bool endedEarly = status == psStopped && engines_.CanFade();
     return endedEarly || IsInLast(kEndZone, position, length);
 }
 
+// No other song follows one that was asked to stop and still fades.
 void TPlaySound::CheckEnd(quint32 position, quint32 length) {
-    if (!current_) return;
+    if (!engines_.IsOpen()) return;
     if (endReached_ && !timers_.EndPending()) return RestWhenOver();
-    if (endReached_ || IsStopping() || !HasEnded(position, length)) return;
+    if (endReached_ || engines_.Fades().IsStopping() || !HasEnded(position, length)) return;
     endReached_ = true;
     timers_.StartEnd();
 }
 
 void TPlaySound::CheckCrossFade(quint32 position, quint32 length) {
-    if (!current_ || crossFadeStarted_ || IsStopping() || length == 0) return;
-    const unsigned before = generation_;
+    if (!engines_.IsOpen() || crossFadeStarted_ || engines_.Fades().IsStopping() || length == 0) return;
+    const unsigned before = engines_.Generation();
     if (!IsInLast(settings_.FMODCrossoverTime, position, length) || Crossover() == coNone) return;
-    if (generation_ != before) return;  // another song came while the mode was asked for
+    if (engines_.Generation() != before) return;  // another song came while the mode was asked for
     crossFadeStarted_ = true;
-    Raise(OnCrossover);
-    if (AsFading(current_.get()) != nullptr && settings_.FMODCrossoverTime >= kShortestFade)
+    events_.Crossover.Tell();
+    if (engines_.CanFade() && settings_.FMODCrossoverTime >= kShortestFade)
         AskForNextSong(SongChange::CrossFadeOnly);
     Feedback(fbCrossover);
 }
 
 void TPlaySound::HandleEndOfSong() {
     timers_.StopEnd();
-    Raise(OnReachedEndOfSong);
+    events_.ReachedEnd.Tell();
     AskForNextSong(SongChange::Hard);
     Feedback(fbEndOfSong);
     RestWhenOver();
@@ -122,7 +86,7 @@ void TPlaySound::HandleEndOfSong() {
 
 // After a song that nothing has followed. One whose length was told too short plays on for a while.
 void TPlaySound::RestWhenOver() {
-    if (!current_ || GetStatus() != psStopped) return;
+    if (!engines_.IsOpen() || GetStatus() != psStopped) return;
     StopTimers();
     StateChanged();
 }
@@ -157,9 +121,11 @@ void TPlaySound::CountSong() {
 // --- The next song ---
 
 void TPlaySound::AskForNextSong(SongChange change) {
+    const bool atEnd = change == SongChange::CrossFadeOnly;
+    const QScopedValueRollback ending(ending_, keepAlbums_ && atEnd ? RecordOf(fileName_) : std::nullopt);
     if (!playList_) return PlayNextOfDatabase(change);
     // Where nothing follows the user is told at the end of the song, not when it would be faded.
-    if (change == SongChange::CrossFadeOnly && !playList_->HasNext()) return;
+    if (atEnd && !playList_->HasNext()) return;
     playList_->PlayNext(change);
 }
 

@@ -7,7 +7,8 @@
 PlayTimers::PlayTimers(Handlers handlers)
     : ticks_(Timer::Kind::Periodic, std::move(handlers.Tick)),
       end_(Timer::Kind::OneShot, std::move(handlers.EndOfSong)),
-      autoStop_(Timer::Kind::OneShot, std::move(handlers.AutoStop)) {}
+      autoStop_(Timer::Kind::OneShot, std::move(handlers.AutoStop)),
+      output_(Timer::Kind::OneShot, std::move(handlers.Output)) {}
 
 void PlayTimers::StartTicks(int interval) {
     ticks_.Start(interval);
@@ -21,16 +22,22 @@ void PlayTimers::StartAutoStop(int delay) {
     autoStop_.Start(delay);
 }
 
+void PlayTimers::StartOutput() {
+    output_.Start(kOutputLook);
+}
+
 void PlayTimers::StopAll() {
     ticks_.Stop();
     end_.Stop();
     autoStop_.Stop();
+    output_.Stop();
 }
 
 void PlayTimers::RunDue() {
     ticks_.RunWhenDue();
     end_.RunWhenDue();
     autoStop_.RunWhenDue();
+    output_.RunWhenDue();
 }
 
 void PlayTimers::Timer::Start(int delay) {

@@ -5,16 +5,18 @@
 #include <memory>
 #include <optional>
 
-// The three timers of the player. Each keeps its deadline by the engine's clock as well, so that whoever has
+// The timers of the player. Each keeps its deadline by the engine's clock as well, so that whoever has
 // no event loop (or another clock) can run what is due.
 class PlayTimers {
  public:
-    static constexpr int kEndDelay = 1200;  // ms from the noticed to the handled end of a song
+    static constexpr int kEndDelay = 1200;    // ms from the noticed to the handled end of a song
+    static constexpr int kOutputLook = 5000;  // ms between two looks for an output that is lost
 
     struct Handlers {
         std::function<void()> Tick;
         std::function<void()> EndOfSong;
         std::function<void()> AutoStop;
+        std::function<void()> Output;
     };
 
     explicit PlayTimers(Handlers handlers);
@@ -23,6 +25,7 @@ class PlayTimers {
     void StartTicks(int interval);
     void StartEnd();
     void StartAutoStop(int delay);
+    void StartOutput();
     void StopTicks() { ticks_.Stop(); }
     void StopEnd() { end_.Stop(); }
     void StopAutoStop() { autoStop_.Stop(); }
@@ -33,6 +36,7 @@ class PlayTimers {
     bool Ticking() const { return ticks_.Running(); }
     bool EndPending() const { return end_.Running(); }
     bool AutoStopPending() const { return autoStop_.Running(); }
+    bool OutputPending() const { return output_.Running(); }
 
     // Calls the handlers of those whose time has come by the engine's clock.
     void RunDue();
@@ -62,4 +66,5 @@ class PlayTimers {
     Timer ticks_;
     Timer end_;
     Timer autoStop_;
+    Timer output_;
 };

@@ -5,6 +5,8 @@
 #include <functional>
 #include <vector>
 
+#include "CommonRUKTools/Listeners.h"
+#include "MusicManagment/database/SongList.h"
 #include "MusicManagment/database/search/SongFilter.h"
 #include "MusicManagment/database/sorting/Sorting.h"
 #include "app/views/TypeAhead.h"
@@ -13,14 +15,15 @@ class FilteredSongs;
 class TMusicDatabase;
 struct SongRef;
 
-// The list of songs. A click on a column's header sorts by it, a second one backwards. The song that has the
-// focus and the marked (selected) songs are two things; of both only shown songs count.
+// The list of songs. A click on a column's header sorts by it, a second one backwards: the database, or where
+// that has no such order, only this list. The song that has the focus and the marked (selected) songs are two
+// things; of both only shown songs count. The list moves sideways only when the user moves it.
 class SongListWidget : public QTableView {
  public:
     SongListWidget(FilteredSongs& songs, TMusicDatabase& database, QWidget* parent = nullptr);
 
-    // Sorts the database; the focused song stays in sight when the database wants that. Throws
-    // EMusicDatabaseException while a long operation runs.
+    // Sorts the database, and the list like it; the focused song stays in sight when the database wants that.
+    // Throws EMusicDatabaseException while a long operation runs.
     void SetOrder(const SongOrder& order);
     // Whether a click on a header sorts.
     void SetSortingAllowed(bool allowed);
@@ -29,9 +32,10 @@ class SongListWidget : public QTableView {
     std::vector<SongIndex> MarkedSongs() const;
     // What a command is about: the marked songs, else the focused one.
     std::vector<SongIndex> ChosenSongs() const;
+    std::vector<SongHandle> ChosenHandles() const;
     // -1 when no song has the focus.
     SongIndex FocusedSong() const;
-    // The marked songs as a drag takes them along.
+    // The marked songs as a drag takes them along, in the order of the list.
     std::vector<SongRef> DraggedSongs() const;
     void MarkAll();
     void InvertMarks();
@@ -41,7 +45,16 @@ class SongListWidget : public QTableView {
     // is none.
     bool FocusNext(const SongFilter& filter);
     // Gives the focus to a song and shows it. False when it is not shown.
-    bool FocusSong(SongIndex song);
+    bool FocusSong(SongIndex song, ScrollHint where = PositionAtCenter);
+    // The song that gets the focus when these have gone: the next one below the focus, else the next above.
+    SongHandle NextAfter(const std::vector<SongHandle>& going) const;
+    // Marks these songs and no others, and shows the first of them, which gets the focus. Returns how many of
+    // them are shown.
+    std::size_t MarkSongs(const QStringList& paths);
+    // The focused song and those shown below it, by path; at most so many.
+    std::vector<QString> ShownFromFocus(std::size_t most) const;
+    // Marks the song that plays, by its path; empty for none.
+    void SetPlaying(const QString& path);
     // Takes the keys; a list in which no song has the focus gives it to its first.
     void Enter();
 
@@ -55,19 +68,24 @@ class SongListWidget : public QTableView {
     std::function<void(const QPoint&)> OnContextMenu;
 
     void keyboardSearch(const QString& letters) override;
+    void scrollTo(const QModelIndex& index, ScrollHint hint = EnsureVisible) override;
 
  protected:
     QModelIndex moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) override;
     void changeEvent(QEvent* event) override;
+    void paintEvent(QPaintEvent* event) override;
     void contextMenuEvent(QContextMenuEvent* event) override;
     void startDrag(Qt::DropActions actions) override;
 
  private:
     void SetUpHeader();
     void HeaderClicked(int section);
+    void SortShown(int section);
+    void FollowOrder();
+    int SortedColumn() const;
+    void KeepFocusInSight();
     void ShowColumnMenu(const QPoint& position);
     void ShowSortIndicator();
-    QModelIndex InSight(int row) const;
     void FocusRow(int row);
     void FollowModel();
     void KeepTopRow();
@@ -82,4 +100,6 @@ class SongListWidget : public QTableView {
     QString focusedPath_;
     QPersistentModelIndex topRow_;
     bool sorting_ = false;
+    SongOrder order_;  // of the database, as the list knows it
+    Subscriptions subscriptions_;
 };

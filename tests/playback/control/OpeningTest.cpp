@@ -101,15 +101,6 @@ TEST_F(OpeningTest, WhoOpensAnotherSongWhileOneIsBeingOpenedHasTheLastWord) {
     EXPECT_EQ(Open(), QString());
 }
 
-class InterruptingDialogs : public ScriptedDialogs {
- public:
-    std::function<void()> OnMessage;
-    void ShowMessage(MessageKind kind, const QString& text) override {
-        ScriptedDialogs::ShowMessage(kind, text);
-        OnMessage();
-    }
-};
-
 TEST_F(OpeningTest, WhoOpensAnotherSongWhileAMessageStandsHasTheLastWord) {
     InterruptingDialogs dialogs;
     onCreate_[TEngine::FMOD] = Refuse<EFMODException>(u"f"_s);

@@ -165,6 +165,16 @@ class ScriptedController : public PlayController {
     std::function<void()> OnAsked;
 };
 
+// Something happens while a message stands.
+class InterruptingDialogs : public ScriptedDialogs {
+ public:
+    std::function<void()> OnMessage;
+    void ShowMessage(MessageKind kind, const QString& text) override {
+        ScriptedDialogs::ShowMessage(kind, text);
+        OnMessage();
+    }
+};
+
 // A player over scripted engines, and a folder with songs.
 class PlayerTest : public testing::Test {
  protected:
@@ -212,9 +222,10 @@ class PlayerTest : public testing::Test {
     Stage stage_;
     // What an engine does before it makes a back end: throw, when it is to fail.
     std::map<TEngine, std::function<void()>> onCreate_;
-    quint32 length_ = 180'000;         // of the songs opened from now on
-    float sharedGain_ = -1;            // until one is set
-    std::function<void()> onOpening_;  // what happens while the next song is being opened
+    quint32 length_ = 180'000;                        // of the songs opened from now on
+    float sharedGain_ = -1;                           // until one is set
+    std::function<void()> onOpening_;                 // what happens while the next song is being opened
+    std::function<void(ScriptedBackend&)> onOpened_;  // what is special about every song
     TPlaySound player_;
 
  private:
@@ -234,8 +245,21 @@ class PlayerTest : public testing::Test {
             backend = std::make_unique<ScriptedBackend>(stage_, EngineName(engine));
         backend->Length = length_;
         backend->OnOpening = std::exchange(onOpening_, nullptr);
+        if (onOpened_) onOpened_(*backend);
         return backend;
     }
+};
+
+// The same with a playlist.
+class ListedSongsTest : public PlayerTest {
+ protected:
+    ListedSongsTest() { player_.SetPlayList(&list_); }
+    void List(const QStringList& songs) {
+        for (const QString& song : songs)
+            list_.Insert(list_.Count(), {.Name = Add(song)});
+    }
+
+    TPlayList list_;
 };
 
 // Has an engine refuse every song.
