@@ -12,7 +12,7 @@ constexpr FileType kOwnTypes[] = {
     {u"application/x-tunestead-playlist", u"RUK PlayList", {u".rukpl", u".rpl"}, FileKind::PlayList},
     {u"application/x-tunestead-extended-playlist",
      u"Erweiterte PlayList",
-     {u".extpl", u".m3u"},
+     {u".extpl", u".m3u", u".m3u8"},
      FileKind::PlayList},
     {u"application/x-tunestead-ascii-playlist",
      u"PlayList (ASCII-Format)",
