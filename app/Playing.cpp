@@ -46,8 +46,6 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
       playerForm_(new TPlayerForm(player_, list_, &window)),
       spectrumForm_(new TSpectrumForm(&window)),
       contextMenu_(new QMenu(listForm_)) {
-    player_.SetKeepAlbums(true);
-    player_.SetQuietFailures(true);
     // Before the settings, which may ask for it.
     if (options.MakeExternalPlayer) player_.SetExternalPlayer(options.MakeExternalPlayer());
     list_.SetModernLists(true);
@@ -127,11 +125,6 @@ void Playing::JoinDesktop(QMainWindow& window) {
                      .SetVolume = [this](double volume) { playerForm_->Panel().Volume().SetPart(volume); }});
     mpris_->Register(QDBusConnection::sessionBus());
     awake_ = std::make_unique<StayAwake>(QDBusConnection::sessionBus());
-    const auto update = [this] { mpris_->Update(); };
-    const QAbstractItemModel* list = listForm_->View().model();
-    QObject::connect(list, &QAbstractItemModel::modelReset, mpris_.get(), update);
-    QObject::connect(list, &QAbstractItemModel::rowsInserted, mpris_.get(), update);
-    QObject::connect(list, &QAbstractItemModel::rowsRemoved, mpris_.get(), update);
 }
 
 void Playing::FollowPlayer() {

@@ -13,6 +13,7 @@
 #include "app/desktop/Icons.h"
 #include "app/dialogs/options/DurationBox.h"
 #include "app/models/SoundOutputs.h"
+#include "app/views/WindowSettings.h"
 
 using namespace Qt::StringLiterals;
 
@@ -90,6 +91,9 @@ void PlaybackPage::AddPlayList() {
                  u"Kopiert jeden Song vorher in den Ordner für temporäre Dateien, etwa von einer CD."_s);
     fields_.Bind(copy, PlayListSettings::kCopyMp3sBeforePlay.Row);
     AddTime(list, PlayListSettings::kScanTime.Row, u"Spielzeit beim Ans&pielen"_s);
+    auto* onlyThis = AddCheck(list, u"PlayOnlyThisSong"_s, u"Doppelklick spielt &nur diesen Song"_s,
+                              u"Sonst folgt, was in der gezeigten Liste unter ihm steht."_s);
+    fields_.Bind(onlyThis, WindowSettings::kPlayOnlyThisSong);
 }
 
 void PlaybackPage::AddEngines() {

@@ -6,11 +6,12 @@
 #include <algorithm>
 
 #include "MusicManagment/database/commands/DatabaseSettings.h"
+#include "MusicManagment/playback/PlayerSettings.h"
 #include "app/desktop/Icons.h"
 
 using namespace Qt::StringLiterals;
 
-RulesPage::RulesPage(const TMusicDatabase&)
+RulesPage::RulesPage(const TMusicDatabase& database)
     : OptionsPage(u"Regeln"_s, ThemeIcon(u"view-list-details"_s, QStyle::SP_FileDialogInfoView)),
       modern_(new QRadioButton(u"&Modern"_s)),
       classic_(new QRadioButton(u"&Klassisch"_s)),
@@ -30,6 +31,17 @@ RulesPage::RulesPage(const TMusicDatabase&)
     AddText(reading,
             u"Gilt für Dateien, die von nun an gelesen werden. Songs, die schon in der Datenbank sind, "
             "liest „Datenbank updaten (Auch ID3-Tags auf Änderungen prüfen)...“ neu."_s);
+    QFormLayout& playing = AddGroup(u"Wiedergabe"_s);
+    fields_.Bind(AddRule(playing, PlayerSettings::kKeepAlbums.Row.Name, u"Al&ben ohne Überblenden"_s,
+                         u"Songs, die auf einem Album aufeinander folgen, gehen an ihrem Ende ohne "
+                         "Überblenden ineinander über."_s),
+                 PlayerSettings::kKeepAlbums);
+    fields_.Bind(AddRule(playing, PlayerSettings::kQuietFailures.Row.Name,
+                         u"Nicht spielbare Songs in der &Statuszeile melden"_s,
+                         u"Eine Meldung erscheint nur für den Song, den Sie selbst gewählt haben. Klassisch "
+                         "erscheint für jeden Versuch eine."_s),
+                 PlayerSettings::kQuietFailures);
+    SetAvailable(playing, database.PlaySound() != nullptr, u"Wird mit dem Player wirksam."_s);
 }
 
 void RulesPage::AddChoice() {
