@@ -16,6 +16,7 @@
 #include "app/desktop/RaiseWindow.h"
 #include "app/models/CollectionTotals.h"
 #include "app/views/DSPDraw.h"
+#include "app/views/DockAction.h"
 #include "app/views/PlayerForm.h"
 #include "app/views/PlaylistForm.h"
 #include "app/views/SongListWidget.h"
@@ -171,9 +172,9 @@ void Playing::SetUpContextMenu() {
 }
 
 void Playing::AddTo(QMenu& menu) {
-    menu.addAction(listForm_->toggleViewAction());
-    menu.addAction(playerForm_->toggleViewAction());
-    menu.addAction(spectrumForm_->toggleViewAction());
+    AddDockAction(menu, *listForm_);
+    AddDockAction(menu, *playerForm_);
+    AddDockAction(menu, *spectrumForm_);
 }
 
 void Playing::RunPlayListCommand(int id) {

@@ -2,6 +2,7 @@
 // make_midi_seeds.py writes inputs to start from.
 
 #include <cstdlib>
+#include <map>
 
 #include "MusicManagment/playback/fmod/MidiFile.h"
 
@@ -22,7 +23,9 @@ void Check(const MidiFile& song, ByteSpan file) {
     Require(!song.events.empty() && song.events.size() <= file.size());
     Require(song.length <= kDay);
     std::uint64_t time = 0;
+    std::map<std::uint64_t, std::size_t> slices;
     for (const MidiEvent& event : song.events) {
+        Require(++slices[event.time / kMidiSlice] <= kMostMidiEvents);
         Require(event.time >= time && event.time <= song.length);
         time = event.time;
         Require(event.status >= 0x80 && event.status <= 0xF0);

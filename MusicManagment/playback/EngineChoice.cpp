@@ -1,44 +1,32 @@
 #include "MusicManagment/playback/EngineChoice.h"
 
-#include <algorithm>
 #include <array>
-#include <span>
 
 #include "MusicManagment/playback/backend/EngineErrors.h"
+#include "MusicManagment/playback/backend/SoundTypes.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr QStringView kFmodExtensions[] = {u".mp3", u".mp2", u".wma", u".wav", u".mid", u".rmi", u".raw",
-                                           u".asf", u".ogg", u".mod", u".s3m", u".xm",  u".it",  u".sgt"};
-constexpr QStringView kEldosExtensions[] = {u".mp3", u".mp2", u".wma", u".wav"};
-constexpr QStringView kMciExtensions[] = {u".mp3", u".mp2", u".wma", u".wav",
-                                          u".mid", u".rmi", u".cda", u".avi"};
-
 struct EngineRow {
     TEngine Engine;
     QStringView Name;
     bool EngineSettings::*Allowed;
-    std::span<const QStringView> Extensions;  // empty: any
+    bool (*Takes)(const SoundType&);
 };
 
 // In the order of preference, which is also the order of the fall-backs.
 constexpr std::array<EngineRow, 4> kEngines = {{
-    {TEngine::FMOD, u"FMOD", &EngineSettings::UseFMOD, kFmodExtensions},
-    {TEngine::EldoS, u"EldoS", &EngineSettings::UseEldoS, kEldosExtensions},
-    {TEngine::MCI, u"MCI", &EngineSettings::UseMCI, kMciExtensions},
-    {TEngine::WinAmp, u"WinAmp", &EngineSettings::UseWinAmp, {}},
+    {TEngine::FMOD, u"FMOD", &EngineSettings::UseFMOD, [](const SoundType& type) { return type.FMOD; }},
+    {TEngine::EldoS, u"EldoS", &EngineSettings::UseEldoS,
+     [](const SoundType& type) { return !type.EldoSModule.isEmpty(); }},
+    {TEngine::MCI, u"MCI", &EngineSettings::UseMCI, [](const SoundType& type) { return type.MCI; }},
+    {TEngine::WinAmp, u"WinAmp", &EngineSettings::UseWinAmp, [](const SoundType&) { return true; }},
 }};
 
 const EngineRow& RowOf(TEngine engine) {
     return kEngines[static_cast<std::size_t>(engine)];
-}
-
-// With its dot, in lower case; empty for a name without one.
-QString ExtensionOf(const QString& fileName) {
-    const qsizetype dot = fileName.lastIndexOf(u'.');
-    return dot > fileName.lastIndexOf(u'/') ? fileName.mid(dot).toLower() : QString();
 }
 
 }  // namespace
@@ -52,12 +40,9 @@ bool IsAllowed(TEngine engine, const EngineSettings& settings) {
 }
 
 std::optional<TEngine> ChooseEngine(const QString& fileName, const EngineSettings& settings) {
-    const QString extension = ExtensionOf(fileName);
-    for (const EngineRow& row : kEngines) {
-        const bool takes = row.Extensions.empty() ||
-                           std::ranges::find(row.Extensions, QStringView(extension)) != row.Extensions.end();
-        if (takes && settings.*row.Allowed) return row.Engine;
-    }
+    const SoundType type = SoundTypeOf(fileName);
+    for (const EngineRow& row : kEngines)
+        if (row.Takes(type) && settings.*row.Allowed) return row.Engine;
     return std::nullopt;
 }
 

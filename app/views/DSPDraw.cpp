@@ -2,6 +2,7 @@
 
 #include <QEvent>
 #include <QPainter>
+#include <utility>
 
 using namespace Qt::StringLiterals;
 
@@ -55,11 +56,16 @@ void TDSPDraw::Stop() {
 }
 
 void TDSPDraw::Run(const std::stop_token& stop) {
-    while (const auto columns = collector_.Next(stop)) {
-        const QImage picture = Draw(*columns);
-        QMetaObject::invokeMethod(
-            this, [this, picture] { Show(picture); }, Qt::QueuedConnection);
-    }
+    while (const auto columns = collector_.Next(stop))
+        HandOver(Draw(*columns));
+}
+
+// However long the window is blocked, one picture waits for it, the latest.
+void TDSPDraw::HandOver(QImage picture) {
+    const std::lock_guard lock(mutex_);
+    const bool told = next_.has_value();
+    next_ = std::move(picture);
+    if (!told) QMetaObject::invokeMethod(this, &TDSPDraw::ShowNext, Qt::QueuedConnection);
 }
 
 QImage TDSPDraw::Draw(const SpectrumColumns& columns) {
@@ -76,8 +82,12 @@ QImage TDSPDraw::Draw(const SpectrumColumns& columns) {
     return picture;
 }
 
-void TDSPDraw::Show(const QImage& picture) {
-    picture_ = picture;
+void TDSPDraw::ShowNext() {
+    {
+        const std::lock_guard lock(mutex_);
+        if (!next_) return;
+        picture_ = *std::exchange(next_, std::nullopt);
+    }
     ++frames_;
     update();
 }

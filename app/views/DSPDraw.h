@@ -3,6 +3,7 @@
 #include <QImage>
 #include <QWidget>
 #include <mutex>
+#include <optional>
 #include <stop_token>
 #include <thread>
 
@@ -54,13 +55,15 @@ class TDSPDraw : public QWidget {
     void DrawAgain();
     void Run(const std::stop_token& stop);
     QImage Draw(const SpectrumColumns& columns);
-    void Show(const QImage& picture);
+    void HandOver(QImage picture);
+    void ShowNext();
 
     SpectrumCollector collector_;
     TSpectrumStyle style_ = ssBars;
     QImage picture_;
     int frames_ = 0;
     std::mutex mutex_;
-    Canvas canvas_;         // under the mutex
-    std::jthread drawing_;  // ends before the rest goes
+    Canvas canvas_;               // under the mutex, as is the next one
+    std::optional<QImage> next_;  // drawn, and not shown yet
+    std::jthread drawing_;        // ends before the rest goes
 };

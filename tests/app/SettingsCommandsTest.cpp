@@ -144,7 +144,7 @@ TEST_F(SettingsCommandsTest, OkWithoutATouchKeepsEveryAcceptedValue) {
         }
         Start(false);
         Work();
-        WithNext<TOptionsForm>([](TOptionsForm& form) { form.accept(); });
+        WithNext<QDialog>([](QDialog& form) { form.accept(); });
         ExtrasItem(u"Einstellungen..."_s)->trigger();
         EXPECT_EQ(dialogs_.Messages + dialogs_.Questions, QStringList());
         window_->close();

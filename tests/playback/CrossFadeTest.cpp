@@ -3,7 +3,6 @@
 #include "MusicManagment/playback/fmod/FMODPlaySound.h"
 #include "tests/HandClock.h"
 #include "tests/playback/Listening.h"
-#include "tests/playback/ScriptedFmod.h"
 
 namespace {
 
@@ -82,18 +81,47 @@ TEST_F(CrossFadeTest, NoStepIsAClick) {
         ASSERT_LT(std::abs(heard->at(2 * i) - heard->at(2 * i - 2)), steepest) << i - faded;
 }
 
+// What another back end still holds of the library before must not reach the sounds of the new one.
 TEST_F(CrossFadeTest, NewSettingsCloseWhatAnotherBackEndPlays) {
     StartCrossFade();
-    TFMODPlaySound third(library, {.OutputType = FSOUND_OUTPUT_NOSOUND, .MixRate = 48000});
+    TFMODPlaySound third(library, {.OutputType = FSOUND_OUTPUT_NOSOUND, .SoftChannels = 16});
     third.SetBackendFile(Path("old.wav"));
     third.Open();
     EXPECT_EQ(oldSound.GetStatus(), psStopped);
     EXPECT_THROW(oldSound.Play(), EFMODException);
-    oldSound.Close();
     third.Play();
-    Hear(0.1);
+    oldSound.SetVolume(0);
+    newSound.SetVolume(0);
+    oldSound.Close();
+    const std::size_t from = HeardFrames() + Frames(0.1);
+    Hear(0.4);
     EXPECT_EQ(third.GetStatus(), psPlaying);
-    EXPECT_EQ(third.GetLength(), 8000U);
+    EXPECT_NEAR(AmplitudeOf(kOld, *heard, from, Frames(0.2)), 0.45, 0.002);
+}
+
+TEST_F(CrossFadeTest, ASoundThatIsStoppedOrCutOffGlidesIntoSilence) {
+    constexpr double kLow = 100;  // Hz
+    const double steepest = 0.45 * (2 * 3.1416 * kLow / kRate + 1.0 / Mixer::kBlock);
+    WriteWav(Path("low.wav"), Sine({.frequency = kLow, .amplitude = 0.45}, 8));
+    newSound.SetBackendFile(Path("low.wav"));
+    using Ending = void (*)(TFMODPlaySound&);
+    for (const Ending end :
+         {Ending{[](TFMODPlaySound& sound) { sound.Stop(); }},
+          Ending{[](TFMODPlaySound& sound) { sound.Close(); }}, Ending{[](TFMODPlaySound& sound) {
+              sound.StartFadeOut();
+              sound.CutFadeOut();
+              sound.FadeStep();
+          }}}) {
+        newSound.Open();
+        newSound.Play();
+        Hear(0.5025);  // a crest
+        const std::size_t ended = HeardFrames();
+        end(newSound);
+        Hear(0.1);
+        for (std::size_t i = ended - 10; i < HeardFrames(); ++i)
+            ASSERT_LT(std::abs(heard->at(2 * i) - heard->at(2 * i - 2)), steepest) << i - ended;
+        EXPECT_EQ(heard->back(), 0);
+    }
 }
 
 }  // namespace

@@ -111,36 +111,26 @@ TEST_F(SongTest, EndedSongStandsAtItsLength) {
     }
 }
 
-TEST_F(SongTest, VolumePauseAndSeparation) {
+TEST_F(SongTest, VolumeAndSeparation) {
     const FMUSIC_MODULE song = Load("a.mod", Mod({}));
+    const auto play = [&] {
+        library.FMUSIC_StopSong(song);
+        Hear(0.1);  // what is left of it
+        library.FMUSIC_PlaySong(song);
+        const std::size_t from = HeardFrames();
+        Hear(0.1);
+        return from;
+    };
     EXPECT_TRUE(library.FMUSIC_SetMasterVolume(song, 256));
-    library.FMUSIC_PlaySong(song);
-    Hear(0.1);
-    const float full = Loudest(0);
-    EXPECT_TRUE(library.FMUSIC_SetPaused(song, true));
-    EXPECT_TRUE(library.FMUSIC_GetPaused(song));
-    EXPECT_TRUE(library.FMUSIC_IsPlaying(song));
-    Hear(0.1);
-    std::size_t from = HeardFrames();
-    Hear(0.1);
-    EXPECT_EQ(Loudest(from), 0);
-
-    library.FMUSIC_StopSong(song);
+    const float full = Loudest(play());
     library.FMUSIC_SetMasterVolume(song, 64);
-    library.FMUSIC_PlaySong(song);
-    from = HeardFrames();
-    Hear(0.1);
-    EXPECT_NEAR(Loudest(from), full / 4, 0.01);
+    EXPECT_NEAR(Loudest(play()), full / 4, 0.01);
 
     // Amiga voices stand left and right; a separation of 0 brings them together.
     const auto sideDifference = [&](float separation) {
         EXPECT_TRUE(library.FMUSIC_SetPanSeperation(song, separation));
-        library.FMUSIC_StopSong(song);
-        library.FMUSIC_PlaySong(song);
-        from = HeardFrames();
-        Hear(0.1);
         float most = 0;
-        for (std::size_t i = from; i < HeardFrames(); ++i)
+        for (std::size_t i = play(); i < HeardFrames(); ++i)
             most = std::max(most, std::abs(heard->at(2 * i) - heard->at(2 * i + 1)));
         return most;
     };
@@ -211,19 +201,14 @@ TEST(MidiFileTest, DamageEndsOnlyItsTrack) {
     }
 }
 
-TEST(MidiFileTest, CutAtAnyByteItIsReadOrRefused) {
-    const QByteArray file =
-        Rmi(Midi({MidiTrack().Program(0, 5).Note(0, 60, 480).End(0), MidiTrack().Note(9, 62, 7)}));
-    std::size_t events = 0;
-    for (qsizetype size = 0; size <= file.size(); ++size) {
-        // A copy of its own, so that the sanitizer sees a step beyond its end.
-        const std::vector<std::uint8_t> part(file.begin(), file.begin() + size);
-        const auto song = ReadMidiFile(part);
-        const std::size_t count = song ? song->events.size() : 0;
-        EXPECT_GE(count, events);
-        events = count;
-    }
-    EXPECT_EQ(events, 5U);
+TEST(MidiFileTest, WhatComesAtOnceIsBounded) {
+    MidiTrack track;
+    for (int i = 0; i < 5000; ++i)
+        track.Note(0, 60, 0);
+    const auto song = ReadMidiFile(Span(Midi({track.Note(960, 64, 480)})));
+    ASSERT_TRUE(song);
+    EXPECT_EQ(song->events.size(), kMostMidiEvents + 2);
+    EXPECT_EQ(song->length, 1'500'000U);
 }
 
 TEST(MidiFileTest, HugeTimesAreBounded) {

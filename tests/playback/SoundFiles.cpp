@@ -1,8 +1,10 @@
 #include "tests/playback/SoundFiles.h"
 
 #include <QFile>
+#include <QFileInfo>
 #include <algorithm>
 #include <cmath>
+#include <map>
 #include <memory>
 #include <numbers>
 #include <stdexcept>
@@ -15,6 +17,8 @@ extern "C" {
 #include <libavformat/avformat.h>
 #include <libavutil/opt.h>
 }
+
+using namespace Qt::StringLiterals;
 
 namespace {
 
@@ -52,6 +56,7 @@ class Encoder {
         stream_ = avformat_new_stream(format_, nullptr);
         stream_->time_base = codec_->time_base;
         Must(avcodec_parameters_from_context(stream_->codecpar, codec_), "parameters");
+        if (encoding.pictures) AddPictures();
         Must(avio_open(&format_->pb, QFile::encodeName(path).constData(), AVIO_FLAG_WRITE), "file");
         AVDictionary* options = nullptr;
         av_dict_set(&options, "write_xing", encoding.header ? "1" : "0", 0);
@@ -79,6 +84,34 @@ class Encoder {
     }
 
  private:
+    static constexpr int kPictureSide = 16;  // dots
+
+    void AddPictures() {
+        pictures_ = avformat_new_stream(format_, nullptr);
+        pictures_->time_base = {1, 10};
+        pictures_->avg_frame_rate = {10, 1};
+        AVCodecParameters& dots = *pictures_->codecpar;
+        dots.codec_type = AVMEDIA_TYPE_VIDEO;
+        dots.codec_id = AV_CODEC_ID_RAWVIDEO;
+        dots.format = AV_PIX_FMT_BGR24;
+        dots.bits_per_coded_sample = 24;
+        dots.width = dots.height = kPictureSide;
+    }
+
+    // Those that are due before the sound that was encoded last.
+    void WritePictures() {
+        while (pictures_ != nullptr && picture_ * codec_->sample_rate < written_ * 10) {
+            Must(av_new_packet(packet_, kPictureSide * kPictureSide * 3), "picture");
+            std::fill_n(packet_->data, packet_->size, std::uint8_t{0x80});
+            packet_->stream_index = pictures_->index;
+            packet_->pts = packet_->dts = av_rescale_q(picture_++, {1, 10}, pictures_->time_base);
+            packet_->duration = 1;
+            packet_->flags = AV_PKT_FLAG_KEY;
+            Must(av_write_frame(format_, packet_), "write");
+            av_packet_unref(packet_);
+        }
+    }
+
     void Send(const float* stereo, std::size_t count) {
         AVFrame* frame = av_frame_alloc();
         frame->nb_samples = static_cast<int>(count);
@@ -92,6 +125,7 @@ class Encoder {
             Store(*frame, i / 2, i % 2, stereo[i]);
         Must(avcodec_send_frame(codec_, frame), "encode");
         av_frame_free(&frame);
+        WritePictures();
         Receive();
     }
 
@@ -126,8 +160,10 @@ class Encoder {
     AVFormatContext* format_ = nullptr;
     AVCodecContext* codec_ = nullptr;
     AVStream* stream_ = nullptr;
+    AVStream* pictures_ = nullptr;
     AVPacket* packet_ = av_packet_alloc();
     std::int64_t written_ = 0;
+    std::int64_t picture_ = 0;
 };
 
 }  // namespace
@@ -190,6 +226,20 @@ void WriteRaw(const QString& path, const Samples& samples) {
 void Encode(const QString& path, const Samples& samples, const Encoding& encoding, int rate) {
     av_log_set_level(AV_LOG_QUIET);
     Encoder(path, encoding, rate).Write(samples);
+}
+
+void WriteSound(const QString& path, const Samples& samples) {
+    static const std::map<QString, Encoding> encodings = {
+        {u"mp3"_s, {.codec = "libmp3lame", .format = "mp3"}},
+        {u"mp2"_s, {.codec = "mp2", .format = "mp2"}},
+        {u"wma"_s, {.codec = "wmav2", .format = "asf"}},
+        {u"asf"_s, {.codec = "wmav2", .format = "asf"}},
+        {u"ogg"_s, {.codec = "vorbis", .format = "ogg"}},
+        {u"avi"_s, {.codec = "pcm_s16le", .format = "avi", .pictures = true}}};
+    const QString extension = QFileInfo(path).suffix();
+    if (extension == u"wav"_s) return WriteWav(path, samples);
+    if (extension == u"raw"_s) return WriteRaw(path, samples);
+    Encode(path, samples, encodings.at(extension));
 }
 
 double AmplitudeOf(double frequency, const Samples& heard, std::size_t from, std::size_t frames, int side,

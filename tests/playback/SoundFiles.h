@@ -30,8 +30,11 @@ struct Encoding {
     const char* format;     // a muxer's name
     int bitRate = 128'000;  // bit/s; 0 = variable, by quality
     bool header = true;     // of MP3: a frame with length and seek table
+    bool pictures = false;  // ten a second beside the sound
 };
 void Encode(const QString& path, const Samples& samples, const Encoding& encoding, int rate = 44100);
+// As files with this extension usually are: mp3, mp2, wma, asf, ogg, wav, raw, and avi with grey pictures.
+void WriteSound(const QString& path, const Samples& samples);
 
 // Amplitude of a tone within one side of a piece of sound.
 double AmplitudeOf(double frequency, const Samples& heard, std::size_t from, std::size_t frames, int side = 0,

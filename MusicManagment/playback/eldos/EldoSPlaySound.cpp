@@ -3,11 +3,18 @@
 #include <algorithm>
 #include <limits>
 
+#include "CommonRUKTools/Clock.h"
 #include "MusicManagment/playback/eldos/EldoSSound.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
+
+constexpr qint64 kLookEvery = 5000;  // ms; each attempt takes some tenths of a second
+
+QString NoOutput() {
+    return u"Es gibt keine Tonausgabe, die EldoS verwenden kann."_s;
+}
 
 TEldoSSettings Bounded(TEldoSSettings settings) {
     settings.BufferCount = std::clamp(settings.BufferCount, 2, 64);
@@ -29,7 +36,7 @@ void TEldoSPlaySound::Open() {
     auto sound = std::make_unique<EldoSSound>(BackendFile(), settings_.ModuleFolders);
     auto output = settings_.MakeOutput();
     if (output == nullptr || !output->Open(sound->Rate(), sound->Channels()))
-        throw EEldoSException(u"Es gibt keine Tonausgabe, die EldoS verwenden kann."_s);
+        throw EOutputException(NoOutput());
     sound_ = std::move(sound);
     output_ = std::move(output);
 
@@ -51,14 +58,24 @@ void TEldoSPlaySound::Close() {
     pushed_ = 0;
     length_ = 0;
     atEnd_ = false;
+    outputLost_ = false;
 }
 
 void TEldoSPlaySound::Play() {
-    if (status_ == psClosed || status_ == psPlaying) return;
-    // It has played to its end before.
-    if (atEnd_ && output_->Queued() == 0) SeekTo(0);
-    SetPlaying(true);
+    if (status_ == psClosed) return;
+    if (status_ != psPlaying) {
+        // It has played to its end before.
+        if (atEnd_ && output_->Queued() == 0) SeekTo(0);
+        SetPlaying(true);
+    }
+    nextLook_ = 0;
     TopUp();
+    if (IsSilenced()) throw EOutputException(NoOutput());
+}
+
+TPSStatus TEldoSPlaySound::GetStatus() {
+    if (IsSilenced()) throw EOutputException(NoOutput());
+    return status_;
 }
 
 void TEldoSPlaySound::Stop() {
@@ -97,7 +114,10 @@ void TEldoSPlaySound::SetGain(float gain) {
 }
 
 void TEldoSPlaySound::TopUp() {
-    if (status_ != psPlaying || (output_->Failed() && !RecoverOutput())) return;
+    if (status_ != psPlaying) return;
+    if (!outputLost_ && output_->Failed()) NoticeLoss();
+    if (outputLost_) Recover();
+    if (outputLost_) return;
     const std::size_t bytes = buffer_.size() * sizeof(std::int16_t);
     const std::size_t target = bytes * static_cast<std::size_t>(settings_.BufferCount);
     while (!atEnd_ && output_->Queued() + bytes <= target)
@@ -131,16 +151,26 @@ void TEldoSPlaySound::SeekTo(std::int64_t frame) {
     atEnd_ = false;
 }
 
-// A sound server that has come back is used again, without what the lost one had queued; without one the song
-// stops.
-bool TEldoSPlaySound::RecoverOutput() {
-    if (output_->Open(sound_->Rate(), sound_->Channels())) {
-        output_->SetPaused(false);
-        return true;
+// What is still queued was not heard and is read again; where that cannot be it is left out. A timer calls.
+void TEldoSPlaySound::NoticeLoss() {
+    outputLost_ = true;
+    nextLook_ = 0;
+    const std::int64_t heard = PlayedFrames();
+    output_->Clear();
+    try {
+        SeekTo(heard);
+    } catch (const EEldoSException& error) {
+        qWarning("A part of a song is left out: %s", qUtf8Printable(error.Message()));
     }
-    timer_.stop();
-    status_ = psStopped;
-    return false;
+}
+
+void TEldoSPlaySound::Recover() {
+    const qint64 now = CurrentClock().Ticks();
+    if (now < nextLook_) return;
+    nextLook_ = now + kLookEvery;
+    if (!output_->Open(sound_->Rate(), sound_->Channels())) return;
+    output_->SetPaused(false);
+    outputLost_ = false;
 }
 
 std::int64_t TEldoSPlaySound::PlayedFrames() {

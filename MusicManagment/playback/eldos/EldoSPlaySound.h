@@ -27,17 +27,19 @@ class TEldoSPlaySound : public TPlaySoundContainer, public GainBackend {
     explicit TEldoSPlaySound(const TEldoSSettings& settings = {}, QObject* parent = nullptr);
     ~TEldoSPlaySound() override;
 
-    // These throw EEldoSException.
+    // These throw EEldoSException, Open and Play also EOutputException when there is no output. One that is
+    // lost while the song plays is looked for again every few seconds; Play and GetStatus throw
+    // EOutputException until it is back, and the song stays where it was.
     void Open() override;
     void Play() override;
     void SetPosition(quint32 milliseconds) override;
     void Stop() override;
+    TPSStatus GetStatus() override;
 
     void Close() override;
     void PauseResume() override;
     quint32 GetPosition() override;
     quint32 GetLength() override;
-    TPSStatus GetStatus() override { return status_; }
     void SetGain(float gain) override;
 
     // Queues what has been played since; a timer calls it often enough while the song plays.
@@ -47,7 +49,9 @@ class TEldoSPlaySound : public TPlaySoundContainer, public GainBackend {
     void SeekTo(std::int64_t frame);
     void QueueBuffer();
     void SetPlaying(bool playing);
-    bool RecoverOutput();
+    void NoticeLoss();
+    void Recover();
+    bool IsSilenced() const { return outputLost_ && status_ == psPlaying; }
     std::int64_t PlayedFrames();
     quint32 ToMilliseconds(std::int64_t frames) const;
 
@@ -60,4 +64,6 @@ class TEldoSPlaySound : public TPlaySoundContainer, public GainBackend {
     std::int64_t pushed_ = 0;  // frames of the song up to the last one queued
     std::int64_t length_ = 0;  // frames; 0 when not known
     bool atEnd_ = false;       // everything has been queued
+    bool outputLost_ = false;
+    qint64 nextLook_ = 0;  // for a lost output; ticks of the clock
 };

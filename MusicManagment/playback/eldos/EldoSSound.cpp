@@ -4,11 +4,14 @@
 #include <array>
 
 #include "MusicManagment/playback/backend/EngineErrors.h"
+#include "MusicManagment/playback/backend/SoundLimits.h"
 #include "MusicManagment/playback/eldos/ModuleFiles.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
+
+constexpr int kMostDeviceChannels = 8;  // of the outputs
 
 [[noreturn]] void ThrowUnplayable(const QString& fileName, const QString& reason) {
     throw EEldoSException(u"Kann die Datei "_s + fileName + u" nicht abspielen ("_s + reason + u")."_s);
@@ -25,9 +28,7 @@ void* OpenIn(const EldoSModule& module, const QString& fileName, EldoSFormat& fo
 
 EldoSSound::EldoSSound(const QString& fileName, const QStringList& moduleFolders)
     : module_(ModuleFor(fileName, moduleFolders)), sound_(OpenIn(module_, fileName, format_), module_.close) {
-    const bool rateFits = format_.rate >= 1000 && format_.rate <= 384000;
-    const bool channelsFit = format_.channels >= 1 && format_.channels <= 8;
-    if (!rateFits || !channelsFit)
+    if (!IsSoundFormat(format_.rate, format_.channels) || format_.channels > kMostDeviceChannels)
         ThrowUnplayable(fileName, u"%1 Hz, %2 Kanäle"_s.arg(format_.rate).arg(format_.channels));
 }
 

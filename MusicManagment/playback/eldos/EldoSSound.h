@@ -13,7 +13,7 @@ class EldoSSound {
     // Throws EEldoSException.
     EldoSSound(const QString& fileName, const QStringList& moduleFolders);
 
-    int Rate() const { return format_.rate; }                             // Hz, 1000 to 384000
+    int Rate() const { return format_.rate; }                             // Hz, 1000 to 768000
     int Channels() const { return format_.channels; }                     // 1 to 8
     std::int64_t Length() const { return module_.length(sound_.get()); }  // frames; 0 when not known
 

@@ -4,32 +4,13 @@
 #include <QDir>
 #include <QFileInfo>
 #include <QLibrary>
-#include <array>
 
 #include "MusicManagment/playback/backend/EngineErrors.h"
+#include "MusicManagment/playback/backend/SoundTypes.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
-
-struct ModuleOfType {
-    QStringView extension;
-    QStringView module;
-};
-
-constexpr std::array<ModuleOfType, 4> kModules = {{
-    {u"mp3", u"ELAMP.ESP"},
-    {u"mp2", u"ELAMP.ESP"},
-    {u"wma", u"WMAMP.ESP"},
-    {u"wav", u"WAVMP.ESP"},
-}};
-
-QStringView ModuleName(const QString& fileName) {
-    const QString extension = QFileInfo(fileName).suffix().toLower();
-    const auto* found =
-        std::ranges::find(kModules, QStringView(extension), [](const auto& row) { return row.extension; });
-    return found == kModules.end() ? QStringView() : found->module;
-}
 
 // Null when there is no such file, or it is not a module of this version.
 const EldoSModule* Load(const QString& path) {
@@ -57,7 +38,7 @@ QStringList StandardModuleFolders() {
 }
 
 const EldoSModule& ModuleFor(const QString& fileName, const QStringList& folders) {
-    const QStringView name = ModuleName(fileName);
+    const QStringView name = SoundTypeOf(fileName).EldoSModule;
     if (!name.isEmpty()) {
         for (const QString& folder : folders) {
             if (const EldoSModule* module = Load(QDir(folder).absoluteFilePath(name.toString())))

@@ -7,13 +7,15 @@
 
 namespace {
 
-// A peer that lets feedback pile up like this does not take it any more.
+// What is more, of frames that wait here or of bytes that wait for the other end, is not taken any more.
 constexpr std::size_t kMostPosted = 10000;
+constexpr qint64 kMostWaiting = 1 << 20;  // bytes
 
 }  // namespace
 
 ChannelPeer::ChannelPeer(std::unique_ptr<QLocalSocket> socket, qint64 ownNumber)
     : socket_(std::move(socket)) {
+    socket_->setReadBufferSize(kMostWaiting);
     connect(socket_.get(), &QLocalSocket::readyRead, this, &ChannelPeer::ReadSocket);
     connect(socket_.get(), &QLocalSocket::disconnected, this, &ChannelPeer::NoticeEnd);
     Post({.Kind = FrameKind::Greeting, .Number = ownNumber});
@@ -50,6 +52,7 @@ void ChannelPeer::Post(const Frame& frame) {
     if (!IsConnected()) return;
     socket_->write(Encode(frame));
     socket_->flush();
+    if (socket_->bytesToWrite() > kMostWaiting) socket_->abort();
 }
 
 void ChannelPeer::Abandon() {
@@ -104,10 +107,15 @@ void ChannelPeer::Take(const Frame& frame) {
             return AnswerTo(frame);
         case FrameKind::Feedback:
         case FrameKind::FeedbackText:
-            if (posted_.empty()) QTimer::singleShot(0, this, &ChannelPeer::HandOverPosted);
-            if (posted_.size() < kMostPosted) posted_.push_back(frame);
-            return;
+            return KeepPosted(frame);
     }
+}
+
+void ChannelPeer::KeepPosted(const Frame& frame) {
+    if (posted_.size() >= kMostPosted || postedText_ > kMostWaiting) return socket_->abort();
+    if (posted_.empty()) QTimer::singleShot(0, this, &ChannelPeer::HandOverPosted);
+    postedText_ += frame.Text.size();
+    posted_.push_back(frame);
 }
 
 void ChannelPeer::AnswerTo(const Frame& frame) {
@@ -121,6 +129,7 @@ void ChannelPeer::HandOverPosted() {
     if (posted_.empty()) return;
     const Frame frame = std::move(posted_.front());
     posted_.pop_front();
+    postedText_ -= frame.Text.size();
     if (!posted_.empty()) QTimer::singleShot(0, this, &ChannelPeer::HandOverPosted);
     if (OnPosted) OnPosted(frame);
 }

@@ -12,7 +12,7 @@
 
 // One end of a channel. While it waits for an answer it still answers what the other end asks, so that two
 // ends which ask each other do not wait for ever; what needs no answer is handed over later, from the event
-// loop.
+// loop. An end that does not read, or says more than can be heard, loses the connection.
 class ChannelPeer : public QObject {
  public:
     // Of a socket that is connected. `ownNumber` is what the other end is to know this one by.
@@ -45,6 +45,7 @@ class ChannelPeer : public QObject {
     void ReadSocket();
     void Take(const Frame& frame);
     void AnswerTo(const Frame& frame);
+    void KeepPosted(const Frame& frame);
     void HandOverPosted();
     void NoticeEnd();
 
@@ -54,6 +55,7 @@ class ChannelPeer : public QObject {
     quint32 lastId_ = 0;
     std::map<quint32, std::optional<qint64>> open_;  // questions, and the answers that have come
     std::deque<Frame> posted_;
+    qint64 postedText_ = 0;  // characters in these
     bool ending_ = false;
     bool gone_ = false;
 };

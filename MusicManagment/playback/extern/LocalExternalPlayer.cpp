@@ -22,9 +22,14 @@ LocalExternalPlayer::LocalExternalPlayer(QString path, int answerTimeout)
 LocalExternalPlayer::~LocalExternalPlayer() = default;
 
 std::optional<qint64> LocalExternalPlayer::Find() {
-    if (peer_ && peer_->IsConnected()) return peer_->Number();
-    Disconnect();
-    return Connect() ? peer_->Number() : std::nullopt;
+    if (!peer_ || !peer_->IsConnected()) {
+        Disconnect();
+        hangs_ = Connect() && hangs_;
+    }
+    if (!peer_) return std::nullopt;
+    const bool greeted = peer_->WaitForGreeting(hangs_ ? 0 : kGreetingTimeout);
+    hangs_ = !greeted && peer_ && peer_->IsConnected();
+    return greeted && peer_ ? peer_->Number() : std::nullopt;
 }
 
 bool LocalExternalPlayer::Connect() {
@@ -44,9 +49,7 @@ bool LocalExternalPlayer::Connect() {
         else
             receiver_->HandleFeedback(frame.Code, static_cast<quint32>(frame.Number));
     };
-    if (peer_->WaitForGreeting(kGreetingTimeout)) return true;
-    Disconnect();
-    return false;
+    return true;
 }
 
 // Destroyed later: feedback of this peer may be what has led here.
@@ -57,6 +60,7 @@ void LocalExternalPlayer::Disconnect() {
 }
 
 bool LocalExternalPlayer::Start(const QString& program, const QString& argument) {
+    if (hangs_) return false;
     const QFileInfo file(QDir(QCoreApplication::applicationDirPath()).absoluteFilePath(program));
     return file.isFile() && file.isExecutable() &&
            QProcess::startDetached(file.absoluteFilePath(), {argument});
@@ -77,7 +81,10 @@ qint64 LocalExternalPlayer::SendText(ExternalCommand command, const QString& tex
 qint64 LocalExternalPlayer::Ask(const Frame& frame) {
     if (!peer_) return 0;
     const std::optional<qint64> answer = peer_->Ask(frame, answerTimeout_);
-    if (!answer) Disconnect();
+    if (!answer) {
+        hangs_ = peer_ && peer_->IsConnected();
+        Disconnect();
+    }
     return answer.value_or(0);
 }
 

@@ -9,11 +9,13 @@
 // The way to the small player program over a socket of the user's own.
 class LocalExternalPlayer : public ExternalPlayer {
  public:
-    // `answerTimeout` in milliseconds: a player that needs longer is taken for dead.
-    explicit LocalExternalPlayer(QString path = PlayerChannelPath(), int answerTimeout = 20000);
+    // `answerTimeout` in milliseconds: a player that needs longer hangs. It is left, and costs no time any
+    // more before it greets anew.
+    explicit LocalExternalPlayer(QString path = PlayerChannelPath(), int answerTimeout = 2000);
     ~LocalExternalPlayer() override;
 
     std::optional<qint64> Find() override;
+    // False as well while one hangs: a second one would not be let in beside it.
     bool Start(const QString& program, const QString& argument) override;
     // Takes nothing in meanwhile.
     void Wait(int milliseconds) override;
@@ -32,5 +34,6 @@ class LocalExternalPlayer : public ExternalPlayer {
     const int answerTimeout_;
     const qint64 ownNumber_;
     std::unique_ptr<ChannelPeer> peer_;
+    bool hangs_ = false;
     FeedbackReceiver* receiver_ = nullptr;
 };

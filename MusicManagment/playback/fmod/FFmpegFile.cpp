@@ -6,6 +6,7 @@
 #include <utility>
 
 #include "CommonRUKTools/ByteReader.h"
+#include "MusicManagment/playback/backend/SoundLimits.h"
 #include "MusicManagment/playback/fmod/SoundSource.h"
 
 extern "C" {
@@ -20,6 +21,13 @@ namespace {
 
 // What may be inside, whatever a file is called. Formats that lead to other files are not among it.
 constexpr const char* kFormats = "mp3,wav,w64,asf,asf_o,ogg,s16le";
+// Those that the formats are written with. The libraries have some hundred more, which only a hostile file
+// would name.
+constexpr const char* kDecoders =
+    "mp3float,mp3,mp2float,mp2,mp1float,mp1,wmav1,wmav2,wmapro,wmalossless,wmavoice,vorbis,libvorbis,opus,"
+    "libopus,"
+    "flac,aac,ac3,pcm_u8,pcm_s16le,pcm_s24le,pcm_s32le,pcm_f32le,pcm_f64le,pcm_alaw,pcm_mulaw,adpcm_ms,"
+    "adpcm_ima_wav,gsm_ms";
 constexpr std::int64_t kSmallFile = 4 << 20;  // bytes
 constexpr int kMostBadReads = 100;            // in a row
 
@@ -104,6 +112,7 @@ void FFmpegFile::OpenContainer(const QString& path) {
     Options options;
     options.Set("protocol_whitelist", "file");
     options.Set("format_whitelist", kFormats);
+    options.Set("codec_whitelist", kDecoders);
     const AVInputFormat* forced = nullptr;
     if (path.endsWith(u".raw"_s, Qt::CaseInsensitive)) {
         forced = av_find_input_format("s16le");
@@ -129,8 +138,10 @@ void FFmpegFile::OpenDecoder() {
     Checked(avcodec_parameters_to_context(codec_.get(), stream_->codecpar));
     codec_->pkt_timebase = stream_->time_base;
     codec_->thread_count = 1;
-    Checked(avcodec_open2(codec_.get(), decoder, nullptr));
-    if (codec_->sample_rate <= 0 || codec_->ch_layout.nb_channels <= 0)
+    Options options;
+    options.Set("codec_whitelist", kDecoders);
+    Checked(avcodec_open2(codec_.get(), decoder, options.Get()));
+    if (!IsSoundFormat(codec_->sample_rate, codec_->ch_layout.nb_channels))
         throw ESoundFileError(FMOD_ERR_FILE_FORMAT);
 }
 

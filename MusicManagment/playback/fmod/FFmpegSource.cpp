@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <array>
 
+#include "MusicManagment/playback/backend/SoundLimits.h"
+
 extern "C" {
 #include <libavutil/channel_layout.h>
 #include <libavutil/frame.h>
@@ -38,6 +40,7 @@ std::int64_t FFmpegSource::ToMixRate(std::int64_t samples) const {
 void FFmpegSource::PrepareResampler(const AVFrame& frame) {
     const Input input = {frame.format, frame.sample_rate, frame.ch_layout.nb_channels};
     if (resampler_ != nullptr && input == input_) return;
+    if (!IsSoundFormat(input.rate, input.channels)) throw ESoundFileError(FMOD_ERR_FILE_FORMAT);
     if (resampler_ != nullptr) Convert(nullptr);
     AVChannelLayout from = {};
     if (frame.ch_layout.order == AV_CHANNEL_ORDER_UNSPEC)

@@ -30,6 +30,11 @@ static_assert(kTexts.size() == FMOD_ERR_MEDIAPLAYER + 1);
 
 }  // namespace
 
+bool IsOutputError(int code) {
+    return code == FMOD_ERR_INIT || code == FMOD_ERR_ALLOCATED || code == FMOD_ERR_OUTPUT_FORMAT ||
+           code == FMOD_ERR_COOPERATIVELEVEL || code == FMOD_ERR_CREATEBUFFER;
+}
+
 QString FMODErrorText(int code) {
     if (code < 0 || static_cast<std::size_t>(code) >= kTexts.size()) return QStringLiteral("Unknown error");
     return QString::fromLatin1(kTexts[static_cast<std::size_t>(code)]);

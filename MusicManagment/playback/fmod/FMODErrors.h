@@ -25,5 +25,7 @@ enum TFmodError : int {
     FMOD_ERR_MEDIAPLAYER,
 };
 
+// True when a code tells that the way to the loudspeaker fails; it says nothing of the file then.
+bool IsOutputError(int code);
 // The text of an error code; "Unknown error" for a number that is none.
 QString FMODErrorText(int code);

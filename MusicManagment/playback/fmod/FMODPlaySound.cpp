@@ -48,8 +48,11 @@ TFMODPlaySound::~TFMODPlaySound() {
     TFMODPlaySound::Close();
 }
 
-QString TFMODPlaySound::LibraryError() {
-    return FMODErrorText(library_.FSOUND_GetError());
+void TFMODPlaySound::ThrowRefusal(const QString& what) {
+    const int code = library_.FSOUND_GetError();
+    const QString message = what + FMODErrorText(code);
+    if (IsOutputError(code)) throw EOutputException(message);
+    throw EFMODException(message);
 }
 
 bool TFMODPlaySound::MustInitialise() const {
@@ -72,7 +75,7 @@ void TFMODPlaySound::InitialiseLibrary() {
     library_.FSOUND_SetMixer(0);
     library_.FSOUND_SetBufferSize(kLibraryBuffer);
     if (!library_.FSOUND_Init(settings_.MixRate, settings_.SoftChannels, kInitFlags))
-        throw EFMODException(u"Fehler beim Initialisieren von FMOD: "_s + LibraryError());
+        ThrowRefusal(u"Fehler beim Initialisieren von FMOD: "_s);
     known = {true, settings_.OutputType, settings_.MixRate, settings_.SoftChannels};
 }
 
@@ -98,8 +101,7 @@ void TFMODPlaySound::Open() {
     }
     OpenStream();
     if (stream_ == FSOUND_STREAM::kNone)
-        throw EFMODException(u"Fehler beim Öffnen der Datei "_s + BackendFile() + u" in FMOD: "_s +
-                             LibraryError());
+        ThrowRefusal(u"Fehler beim Öffnen der Datei "_s + BackendFile() + u" in FMOD: "_s);
 }
 
 void TFMODPlaySound::Close() {
@@ -137,7 +139,7 @@ bool TFMODPlaySound::SetPaused(bool paused) {
 
 void TFMODPlaySound::Play() {
     bool done = true;
-    switch (GetStatus()) {
+    switch (State()) {
         case psPaused:
             done = SetPaused(false);
             break;
@@ -151,17 +153,15 @@ void TFMODPlaySound::Play() {
         default:
             break;
     }
-    if (!done)
-        throw EFMODException(u"Fehler beim Abspielen von "_s + BackendFile() + u" in FMOD: "_s +
-                             LibraryError());
+    if (!done) ThrowRefusal(u"Fehler beim Abspielen von "_s + BackendFile() + u" in FMOD: "_s);
+    GetStatus();  // tells of a lost output
 }
 
 void TFMODPlaySound::PauseResume() {
-    const TPSStatus status = GetStatus();
+    const TPSStatus status = State();
     if (status != psPaused && status != psPlaying) return;
     if (!SetPaused(status == psPlaying))
-        throw EFMODException(u"Fehler beim Pausieren/Fortsetzen von "_s + BackendFile() + u" in FMOD: "_s +
-                             LibraryError());
+        ThrowRefusal(u"Fehler beim Pausieren/Fortsetzen von "_s + BackendFile() + u" in FMOD: "_s);
 }
 
 void TFMODPlaySound::Stop() {
@@ -172,13 +172,20 @@ void TFMODPlaySound::Stop() {
 }
 
 TPSStatus TFMODPlaySound::GetStatus() {
-    if (song_ != FMUSIC_MODULE::kNone) {
-        if (!library_.FMUSIC_IsPlaying(song_)) return psStopped;
-        return library_.FMUSIC_GetPaused(song_) ? psPaused : psPlaying;
-    }
-    if (stream_ == FSOUND_STREAM::kNone) return psClosed;
-    if (channel_ < 0 || !library_.FSOUND_IsPlaying(channel_)) return psStopped;
-    return library_.FSOUND_GetPaused(channel_) ? psPaused : psPlaying;
+    const TPSStatus state = State();
+    if (state == psPlaying && outputLost_) throw EOutputException(u"Die Tonausgabe ist nicht mehr da."_s);
+    return state;
+}
+
+TPSStatus TFMODPlaySound::State() {
+    const bool isSong = song_ != FMUSIC_MODULE::kNone;
+    if (!isSong && stream_ == FSOUND_STREAM::kNone) return psClosed;
+    if (!isSong && channel_ < 0) return psStopped;
+    if (!(isSong ? library_.FMUSIC_IsPlaying(song_) : library_.FSOUND_IsPlaying(channel_))) return psStopped;
+    // A sound without an output still counts as playing; the error tells.
+    outputLost_ = IsOutputError(library_.FSOUND_GetError());
+    const bool paused = isSong ? library_.FMUSIC_GetPaused(song_) : library_.FSOUND_GetPaused(channel_);
+    return paused ? psPaused : psPlaying;
 }
 
 // Of the open song, in ms; 0 when its first pattern has no rows.

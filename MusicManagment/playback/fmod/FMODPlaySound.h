@@ -22,17 +22,19 @@ class TFMODPlaySound : public TPlaySoundContainer, public FadingBackend {
     TFMODPlaySound(FmodLibrary& library, const TFMODSettings& settings, QObject* parent = nullptr);
     ~TFMODPlaySound() override;
 
-    // These throw EFMODException.
+    // These throw EFMODException, or EOutputException when there is no output. One that is lost while the
+    // song plays is opened anew by the library; Play and GetStatus throw EOutputException until it is back,
+    // and the song stays where it is.
     void Open() override;
     void Play() override;
     void PauseResume() override;
+    TPSStatus GetStatus() override;
 
     void Close() override;
     void Stop() override;
     quint32 GetPosition() override;
     void SetPosition(quint32 milliseconds) override;
     quint32 GetLength() override;
-    TPSStatus GetStatus() override;
 
     void SetVolume(int percent) override;
     quint32 FadeTime() const { return settings_.FadeTime; }
@@ -46,13 +48,14 @@ class TFMODPlaySound : public TPlaySoundContainer, public FadingBackend {
     void CutFadeOut() override;
 
  private:
-    QString LibraryError();
+    [[noreturn]] void ThrowRefusal(const QString& what);
     bool MustInitialise() const;
     void InitialiseLibrary();
     void OpenStream();
     bool StartSong();
     bool StartStream();
     bool SetPaused(bool paused);
+    TPSStatus State();
     quint32 PatternTime() const;
 
     FmodLibrary& library_;
@@ -60,6 +63,7 @@ class TFMODPlaySound : public TPlaySoundContainer, public FadingBackend {
     FMUSIC_MODULE song_ = FMUSIC_MODULE::kNone;
     FSOUND_STREAM stream_ = FSOUND_STREAM::kNone;
     int channel_ = -1;
+    bool outputLost_ = false;  // when the state was asked for last
     // Tick counts in ms; 0 = no fade runs.
     quint32 fadeInEnd_ = 0;
     quint32 fadeOutEnd_ = 0;

@@ -66,7 +66,8 @@ class FmodLibrary {
     virtual bool FMUSIC_StopSong(FMUSIC_MODULE song) = 0;
     virtual bool FMUSIC_SetPaused(FMUSIC_MODULE song, bool paused) = 0;
     virtual bool FMUSIC_GetPaused(FMUSIC_MODULE song) = 0;
-    virtual bool FMUSIC_IsPlaying(FMUSIC_MODULE song) = 0;                    // true as well while paused
+    // True as well while paused, and while the output is lost (FSOUND_GetError then tells FMOD_ERR_INIT).
+    virtual bool FMUSIC_IsPlaying(FMUSIC_MODULE song) = 0;
     virtual bool FMUSIC_SetMasterVolume(FMUSIC_MODULE song, int volume) = 0;  // 0 to 256
     virtual int FMUSIC_GetType(FMUSIC_MODULE song) = 0;                       // an FMUSIC_TYPES
     // 0 = mono, 1 = voices as far apart as the song has them.
@@ -90,7 +91,7 @@ class FmodLibrary {
 
     virtual bool FSOUND_SetPaused(int channel, bool paused) = 0;
     virtual bool FSOUND_GetPaused(int channel) = 0;
-    virtual bool FSOUND_IsPlaying(int channel) = 0;              // true as well while paused
+    virtual bool FSOUND_IsPlaying(int channel) = 0;              // as FMUSIC_IsPlaying
     virtual bool FSOUND_SetVolume(int channel, int volume) = 0;  // 0 to 255
     virtual bool FSOUND_SetPan(int channel, int pan) = 0;        // 0 left to 255 right, or FSOUND_STEREOPAN
 

@@ -168,6 +168,16 @@ class Tempo {
     std::uint64_t time_ = 0;
 };
 
+void ThinOut(std::vector<MidiEvent>& events) {
+    std::uint64_t slice = 0;
+    std::size_t count = 0;
+    std::erase_if(events, [&](const MidiEvent& event) {
+        if (event.time / kMidiSlice != slice) count = 0;
+        slice = event.time / kMidiSlice;
+        return ++count > kMostMidiEvents;
+    });
+}
+
 }  // namespace
 
 bool LooksLikeMidi(ByteSpan head) {
@@ -206,6 +216,7 @@ std::optional<MidiFile> ReadMidiFile(ByteSpan file) {
     Tempo tempo(std::move(tracks.tempos), *tickLength);
     for (MidiEvent& event : song.events)
         event.time = tempo.TimeAt(event.time);
+    ThinOut(song.events);
     song.length = tempo.TimeAt(tracks.end);
     return song;
 }

@@ -21,6 +21,11 @@ struct MidiFile {
     std::uint64_t length = 0;  // microseconds
 };
 
+// The most events in a tenth of a second; what is more is left out. A synthesizer would need minutes for all
+// that a small file can say at once.
+inline constexpr std::size_t kMostMidiEvents = 1024;
+inline constexpr std::uint64_t kMidiSlice = 100'000;  // microseconds
+
 // True for a Standard MIDI File and for one in a RIFF wrapper (RMI).
 bool LooksLikeMidi(ByteSpan head);
 

@@ -5,6 +5,8 @@
 #include <QFile>
 #include <algorithm>
 #include <array>
+#include <bitset>
+#include <ranges>
 
 #include "MusicManagment/playback/fmod/MidiFile.h"
 
@@ -36,6 +38,35 @@ QByteArray FontOf(fluid_settings_t* settings, const QString& font) {
     fluid_free(named);
     return result;
 }
+
+// Which of the events before a place still count there, asked from the last to the first: of controllers,
+// programs, bends and pressures the last of each. What depends on the order (banks, parameters by number,
+// system-exclusive messages) counts as well, up to a bound.
+class Shaping {
+ public:
+    bool Counts(const MidiEvent& event) {
+        const unsigned kind = event.status & 0xF0U;
+        if (kind == 0x80 || kind == 0x90) return false;
+        const bool isController = kind == 0xB0;
+        if (kind == 0xF0 || (isController && NeedsOrder(event.first))) return ++inOrder_ <= kMostInOrder;
+        const unsigned which = isController || kind == 0xA0 ? event.first : 0U;
+        const std::size_t place = (event.status & 0x7FU) * 128U + which;
+        if (told_.test(place)) return false;
+        told_.set(place);
+        return true;
+    }
+
+ private:
+    static constexpr int kMostInOrder = 1024;
+
+    static bool NeedsOrder(std::uint8_t controller) {
+        return controller == 0 || controller == 32 || controller == 6 || controller == 38 ||
+               (controller >= 96 && controller <= 101);
+    }
+
+    std::bitset<std::size_t{128} * 128> told_;  // by status and first data byte
+    int inOrder_ = 0;
+};
 
 class MidiSong : public SongSource {
  public:
@@ -144,10 +175,16 @@ void MidiSong::Silence() {
 std::uint64_t MidiSong::Seek(std::uint64_t frame) {
     frame_ = std::min(frame, length_);
     Silence();
-    for (next_ = 0; next_ < song_.events.size() && FrameAt(song_.events[next_].time) < frame_; ++next_) {
-        const int kind = song_.events[next_].status & 0xF0;
-        if (kind != 0x80 && kind != 0x90) Tell(song_.events[next_]);
-    }
+    next_ = static_cast<std::size_t>(
+        std::ranges::lower_bound(song_.events, frame_, {},
+                                 [this](const MidiEvent& event) { return FrameAt(event.time); }) -
+        song_.events.begin());
+    Shaping shaping;
+    std::vector<const MidiEvent*> counting;
+    for (std::size_t i = next_; i > 0; --i)
+        if (shaping.Counts(song_.events[i - 1])) counting.push_back(&song_.events[i - 1]);
+    for (const MidiEvent* event : std::views::reverse(counting))
+        Tell(*event);
     return frame_;
 }
 

@@ -12,7 +12,8 @@ constexpr int kRounds = std::numeric_limits<int>::max() / kMaxChannels;
 
 }  // namespace
 
-Mixer::Mixer(std::size_t channels) : channels_(std::min<std::size_t>(channels, kMaxChannels)) {}
+Mixer::Mixer(std::size_t channels, int rounds)
+    : channels_(std::min<std::size_t>(channels, kMaxChannels)), rounds_(rounds) {}
 
 std::size_t Mixer::SlotOf(int channel) const {
     return static_cast<std::size_t>(channel % kMaxChannels);
@@ -41,8 +42,8 @@ int Mixer::Start(DecodeAhead& source, float gain, bool paused) {
     unused->right.store(1, std::memory_order_relaxed);
     unused->now = {};
     unused->fresh = true;
-    nextRound_ = (nextRound_ + 1) % kRounds;
-    unused->number = nextRound_ * kMaxChannels + static_cast<int>(unused - channels_.begin());
+    rounds_ = (rounds_ + 1) % kRounds;
+    unused->number = rounds_ * kMaxChannels + static_cast<int>(unused - channels_.begin());
     unused->source.store(&source);
     return unused->number;
 }
@@ -58,7 +59,28 @@ void Mixer::Detach(Channel& channel) {
 }
 
 void Mixer::Release(int channel) {
-    if (Channel* found = Find(channel)) Detach(*found);
+    Channel* found = Find(channel);
+    if (found == nullptr) return;
+    DecodeAhead* source = found->source.load();
+    Detach(*found);
+    // What has ended may be somewhere else in its file by now.
+    if (source != nullptr && !found->over.load(std::memory_order_acquire)) LeaveTail(*found, *source);
+}
+
+// Where all tails sound still, many sounds end at once, and one more jump among them is not heard. Nobody
+// else takes from the source now.
+void Mixer::LeaveTail(const Channel& channel, DecodeAhead& source) {
+    if (channel.now == Sides{}) return;
+    const auto tail = std::ranges::find_if(
+        tails_, [](const Tail& one) { return !one.sounds.load(std::memory_order_acquire); });
+    if (tail == tails_.end()) return;
+    const std::size_t frames = source.SeekPending() ? source.TakeLeft(tailSource_.data(), kBlock)
+                                                    : source.Take(tailSource_.data(), kBlock);
+    tail->samples.fill(0);
+    Add(tail->samples.data(), tailSource_.data(), frames, channel.now, {}, frames);
+    tail->frames = frames;
+    tail->done = 0;
+    tail->sounds.store(frames > 0, std::memory_order_release);
 }
 
 void Mixer::ReleaseAll() {
@@ -127,6 +149,8 @@ void Mixer::RenderBlock(float* stereo, std::size_t frames) {
     std::fill_n(stereo, 2 * frames, 0.0F);
     for (Channel& channel : channels_)
         AddChannel(channel, stereo, frames);
+    for (Tail& tail : tails_)
+        AddTail(tail, stereo, frames);
     ApplyMaster(stereo, frames);
     for (std::size_t i = 0; i < 2 * frames; ++i)
         stereo[i] = std::min(std::max(stereo[i], -1.0F), 1.0F);  // two instructions, std::clamp branches
@@ -171,6 +195,14 @@ void Mixer::AddChannel(Channel& channel, float* stereo, std::size_t frames) {
         channel.over.store(true, std::memory_order_release);
     else if (count < frames)
         starved_.fetch_add(frames - count, std::memory_order_relaxed);
+}
+
+void Mixer::AddTail(Tail& tail, float* stereo, std::size_t frames) {
+    if (!tail.sounds.load(std::memory_order_acquire)) return;
+    const std::size_t count = std::min(frames, tail.frames - tail.done);
+    AddSteady(stereo, tail.samples.data() + 2 * tail.done, count, {1, 1});
+    tail.done += count;
+    if (tail.done == tail.frames) tail.sounds.store(false, std::memory_order_release);
 }
 
 void Mixer::AddSteady(float* target, const float* source, std::size_t frames, Sides gain) {

@@ -18,16 +18,20 @@ class Mixer {
     static constexpr std::size_t kHeard = 4096;  // frames kept for the spectrum
     static constexpr int kNoChannel = -1;
 
-    explicit Mixer(std::size_t channels);
+    // `rounds` are those of the mixer before this one, so that its channel numbers are not used again.
+    explicit Mixer(std::size_t channels, int rounds = 0);
 
     // --- the owner's thread
 
     // Returns a channel that is never the number of an earlier one; kNoChannel when all are taken. The source
     // must stay until Release, the sound begins with its next frame.
     int Start(DecodeAhead& source, float gain, bool paused);
-    // The source is not touched any more when it returns.
+    // The source is not touched any more when it returns. A block of what it has ready is taken, so that the
+    // sound glides into silence.
     void Release(int channel);
     void ReleaseAll();
+    // How often channels have been started, here and in the mixers before; wraps.
+    int Rounds() const { return rounds_; }
     // False for a channel that is over.
     bool Playing(int channel) const;
     // These do nothing and answer false for a number that is no channel now.
@@ -71,10 +75,22 @@ class Mixer {
         bool fresh = true;  // nothing sounded yet, so there is nothing to glide from
     };
 
+    // What is left of a released sound, already gliding into silence. The owner's thread fills one that is
+    // free, the output's empties it.
+    struct Tail {
+        std::atomic<bool> sounds{false};
+        std::size_t frames = 0;
+        std::size_t done = 0;  // of these
+        std::array<float, 2 * kBlock> samples{};
+    };
+    static constexpr std::size_t kTails = 4;
+
     std::size_t SlotOf(int channel) const;
     Channel* Find(int channel);
     const Channel* Find(int channel) const;
     void Detach(Channel& channel);
+    void LeaveTail(const Channel& channel, DecodeAhead& source);
+    void AddTail(Tail& tail, float* stereo, std::size_t frames);
     void RenderBlock(float* stereo, std::size_t frames);
     void AddChannel(Channel& channel, float* stereo, std::size_t frames);
     static void AddSteady(float* target, const float* source, std::size_t frames, Sides gain);
@@ -84,10 +100,12 @@ class Mixer {
     void Keep(const float* stereo, std::size_t frames);
 
     std::vector<Channel> channels_;
-    int nextRound_ = 0;
+    std::array<Tail, kTails> tails_;
+    int rounds_;
     std::atomic<float> master_{1};
     float masterNow_ = 1;  // the output's thread only
     std::array<float, 2 * kBlock> scratch_{};
+    std::array<float, 2 * kBlock> tailSource_{};  // the owner's thread only
     // Odd while a block is being rendered.
     std::atomic<std::uint64_t> epoch_{0};
     std::atomic<std::uint64_t> played_{0};

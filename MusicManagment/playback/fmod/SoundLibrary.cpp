@@ -13,7 +13,9 @@ constexpr int kLowestRate = 4000;
 constexpr int kHighestRate = 192000;
 constexpr int kMostChannels = 1024;
 constexpr std::size_t kSmallestBuffer = 64;  // frames
-constexpr qint64 kReopenEvery = 5000;        // ms; each attempt takes some tenths of a second
+// ms; each attempt takes some tenths of a second. Below the five seconds in which the player asks, so that it meets
+// one each time.
+constexpr qint64 kReopenEvery = 4500;
 
 }  // namespace
 
@@ -117,7 +119,7 @@ bool SoundLibrary::FSOUND_Init(int mixRate, int softChannels, [[maybe_unused]] u
     if (mixRate < kLowestRate || mixRate > kHighestRate || softChannels < 0 || softChannels > kMostChannels)
         return Fail(FMOD_ERR_INVALID_PARAM);
     rate_ = mixRate;
-    mixer_ = std::make_unique<Mixer>(static_cast<std::size_t>(softChannels));
+    mixer_ = std::make_unique<Mixer>(static_cast<std::size_t>(softChannels), channelRounds_);
     mixer_->SetMaster(masterVolume_);
     if (OpenOutput()) return true;
     mixer_.reset();
@@ -127,7 +129,10 @@ bool SoundLibrary::FSOUND_Init(int mixRate, int softChannels, [[maybe_unused]] u
 void SoundLibrary::FSOUND_Close() {
     if (output_ != nullptr) output_->Close();
     output_.reset();
-    if (mixer_ != nullptr) mixer_->ReleaseAll();
+    if (mixer_ != nullptr) {
+        mixer_->ReleaseAll();
+        channelRounds_ = mixer_->Rounds();
+    }
     streams_.clear();
     songs_.clear();
     mixer_.reset();
@@ -147,8 +152,9 @@ bool SoundLibrary::OutputWorks() {
 
 // Sounds wait for a device that can come back. Into a file that takes no more nothing plays on.
 bool SoundLibrary::Sounds(int channel) {
-    const bool isOver = !OutputWorks() && output_ != nullptr;
-    return !isOver && mixer_->Playing(channel);
+    if (OutputWorks()) return mixer_->Playing(channel);
+    Fail(FMOD_ERR_INIT);
+    return output_ == nullptr && mixer_->Playing(channel);
 }
 
 // Runs in the output's thread.
@@ -163,7 +169,7 @@ void SoundLibrary::Render(float* stereo, std::size_t frames) {
 }
 
 bool SoundLibrary::StartVoice(Voice& voice, float gain, bool paused) {
-    if (!OutputWorks()) return Fail(FMOD_ERR_PLAY);
+    if (!OutputWorks()) return Fail(FMOD_ERR_INIT);
     mixer_->Release(voice.channel);
     if (voice.ahead->Exhausted() && !Rewind(voice)) return false;
     voice.channel = mixer_->Start(*voice.ahead, gain, paused);

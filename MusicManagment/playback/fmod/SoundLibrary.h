@@ -115,6 +115,7 @@ class SoundLibrary : public FmodLibrary {
 
     // The mixer is there from FSOUND_Init to FSOUND_Close. Files and the output use it, so they go first.
     std::unique_ptr<Mixer> mixer_;
+    int channelRounds_ = 0;  // of the mixers before
     std::map<FSOUND_STREAM, Voice> streams_;
     std::map<FMUSIC_MODULE, Song> songs_;
     std::uint64_t lastHandle_ = 0;

@@ -5,6 +5,8 @@
 
 #include "MusicManagment/playback/mci/MciInterface.h"
 
+class GstPlayer;
+
 enum class MciSound {
     Audible,
     Silent,  // in real time all the same
@@ -28,14 +30,14 @@ class GstMci : public MciInterface {
     QString ErrorString(quint32 error) override;
 
  private:
-    class Device;
-
     quint32 Open(MciParameters& parameters);
+    static QString Carry(GstPlayer& device, MciCommand command, quint32 flags, MciParameters& parameters);
+    static quint32 ErrorOf(const GstPlayer& device);
     // Keeps the text for ErrorString; an empty one is no error.
-    quint32 Result(const QString& text);
+    quint32 Result(const QString& text, quint32 error = kMciErrorInternal);
 
     MciSound sound_;
-    std::map<quint32, std::unique_ptr<Device>> devices_;
+    std::map<quint32, std::unique_ptr<GstPlayer>> devices_;
     quint32 lastDevice_ = 0;
     quint32 lastError_ = 0;
     QString lastErrorText_;

@@ -103,10 +103,19 @@ void TMCIPlaySound::Stop() {
 }
 
 void TMCIPlaySound::PauseResume() {
-    if (GetStatus() == psPaused)
+    if (IsPaused())
         Play();
     else
         Send(MciCommand::Pause, 0);
+}
+
+// A song that plays without an output is not.
+bool TMCIPlaySound::IsPaused() {
+    try {
+        return GetStatus() == psPaused;
+    } catch (const EOutputException&) {
+        return false;
+    }
 }
 
 quint32 TMCIPlaySound::GetPosition() {
@@ -149,6 +158,8 @@ quint32 TMCIPlaySound::Ask(quint32 item) {
 // Returns the parameters with what the command has answered.
 MciParameters TMCIPlaySound::Require(MciCommand command, quint32 flags, MciParameters parameters) {
     const quint32 error = mci_.SendCommand(device_, command, flags, parameters);
-    if (error != 0) throw EMCIException(PrefixOf(command) + mci_.ErrorString(error).left(kLongestError));
-    return parameters;
+    if (error == 0) return parameters;
+    const QString message = PrefixOf(command) + mci_.ErrorString(error).left(kLongestError);
+    if (error >= kMciErrorFirstOutput && error <= kMciErrorLastOutput) throw EOutputException(message);
+    throw EMCIException(message);
 }

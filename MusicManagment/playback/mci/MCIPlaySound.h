@@ -8,7 +8,9 @@
 // else what is built in.
 QString MciDeviceType(const QString& fileName, const TRWReg& extensions);
 
-// A song that the system's own player plays. Every operation throws EMCIException when it refuses.
+// A song that the system's own player plays. Every operation throws EMCIException when it refuses. Open, Play
+// and GetStatus throw EOutputException when there is no output, or it has been lost while the song plays;
+// Play then goes on where it was as soon as there is one again.
 class TMCIPlaySound : public TPlaySoundContainer, public GainBackend {
  public:
     // Where the settings keep device types by extension.
@@ -35,6 +37,7 @@ class TMCIPlaySound : public TPlaySoundContainer, public GainBackend {
  private:
     void Send(MciCommand command, quint32 flags, MciParameters parameters = {});
     quint32 Ask(quint32 item);
+    bool IsPaused();
     MciParameters Require(MciCommand command, quint32 flags, MciParameters parameters);
 
     MciInterface& mci_;

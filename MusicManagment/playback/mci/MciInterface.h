@@ -41,6 +41,12 @@ inline constexpr quint32 kMciModeSeek = 528;
 inline constexpr quint32 kMciModePause = 529;
 inline constexpr quint32 kMciModeOpen = 530;
 
+// What SendCommand can answer beside 0.
+inline constexpr quint32 kMciErrorInternal = 277;
+inline constexpr quint32 kMciErrorFirstOutput = 320;  // to kMciErrorLastOutput: the way to the loudspeaker
+inline constexpr quint32 kMciErrorNoOutput = 326;     // no device will do
+inline constexpr quint32 kMciErrorLastOutput = 327;
+
 // What a command takes and gives; each uses a part of it.
 struct MciParameters {
     QString DeviceType{};    // Open

@@ -28,6 +28,12 @@ RulesPage::RulesPage(const TMusicDatabase& database)
                 u"Beim Öffnen einer Datenbank der Versionen 1.0 bis 1.2 bleiben auch Songs erhalten, "
                 "deren Datenträger nicht angeschlossen ist. Klassisch gehen sie verloren."_s),
         DatabaseSettings::kKeepLostSongs);
+    fields_.Bind(
+        AddRule(reading, DatabaseSettings::kDerivedGenres.Row.Name,
+                u"&Hauptgenre aus dem Genre des Tags ableiten"_s,
+                u"Neue Songs kommen gleich in die Gruppe, zu der ihr Genre gehört. Klassisch ist das "
+                "Hauptgenre unbekannt, bis Sie es wählen."_s),
+        DatabaseSettings::kDerivedGenres);
     AddText(reading,
             u"Gilt für Dateien, die von nun an gelesen werden. Songs, die schon in der Datenbank sind, "
             "liest „Datenbank updaten (Auch ID3-Tags auf Änderungen prüfen)...“ neu."_s);

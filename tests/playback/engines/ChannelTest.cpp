@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <QFileInfo>
+#include <QSemaphore>
 #include <QTemporaryDir>
 
 #include "MusicManagment/playback/extern/ChannelServer.h"
@@ -82,7 +83,9 @@ struct Listener {
             peer.Post({.Kind = FrameKind::FeedbackText, .Code = fbFileName, .Text = u"lied.mp3"_s});
         if (asksBack)
             return peer.Ask({.Kind = FrameKind::Question, .Code = fbCrossoverQuery}, kPatience).value_or(-1);
-        if (neverAnswers) QThread::msleep(200);
+        for (int i = 0; i < chatter; ++i)
+            peer.Post({.Kind = FrameKind::FeedbackText, .Text = QString(kLongestText, u'x')});
+        if (hangs) goOn.acquire();
         return frame.Number + 1;
     }
 
@@ -92,7 +95,9 @@ struct Listener {
     int gone = 0;
     int feedback = 0;
     bool asksBack = false;
-    bool neverAnswers = false;
+    int chatter = 0;  // long texts that nobody wants
+    bool hangs = false;
+    QSemaphore goOn;
 };
 
 struct Receiver : FeedbackReceiver {
@@ -167,17 +172,48 @@ TEST_F(ChannelTest, APlayerThatGoesIsNoticedAndItsHeirIsAnotherOne) {
     EXPECT_EQ(player.SendCommand(ecGetPosition, 5), 6);
 }
 
-TEST_F(ChannelTest, APlayerThatDoesNotAnswerIsGivenUp) {
+TEST_F(ChannelTest, APlayerThatHangsCostsItsTimeOnce) {
     OtherProgram<Listener> other(path_, qint64{77});
-    other.Do([](Listener& listener) { listener.neverAnswers = true; });
+    QSemaphore* goOn = nullptr;
+    other.Do([&](Listener& listener) {
+        listener.hangs = true;
+        goOn = &listener.goOn;
+    });
     LocalExternalPlayer player(path_, 20);
     ASSERT_TRUE(player.Find());
     EXPECT_EQ(player.SendCommand(ecGetPosition, 5), 0);
-    // Not even a greeting: something else listens there.
-    QLocalServer mute;
-    ASSERT_TRUE(mute.listen(folder_.filePath(u"stumm"_s)));
-    LocalExternalPlayer hopeless(folder_.filePath(u"stumm"_s));
-    EXPECT_EQ(hopeless.Find(), std::nullopt);
+    // It is not asked any more, nor waited for, nor is a second one started beside it.
+    EXPECT_EQ(player.Find(), std::nullopt);
+    EXPECT_EQ(player.SendCommand(ecGetPosition, 5), 0);
+    EXPECT_FALSE(player.Start(u"/bin/true"_s, {}));
+    goOn->release(1000);
+    EXPECT_TRUE(WaitUntil([&] { return player.Find() == 77; }, kPatience));
+    EXPECT_EQ(player.SendCommand(ecGetPosition, 5), 6);
+    other.Do([](Listener& listener) { EXPECT_EQ(listener.asked.size(), 2); });
+}
+
+TEST_F(ChannelTest, WhoSaysTooMuchOrDoesNotListenLosesTheConnection) {
+    OtherProgram<Listener> other(path_, qint64{77});
+    other.Do([](Listener& listener) { listener.chatter = 100; });
+    LocalExternalPlayer player(path_);
+    player.CreateFeedback(receiver_);
+    ASSERT_TRUE(player.Find());
+    EXPECT_EQ(player.SendCommand(ecPlay, 0), 0);
+    other.Do([](Listener& listener) { listener.chatter = 0; });
+    EXPECT_EQ(player.Find(), 77);
+    EXPECT_EQ(player.SendCommand(ecPlay, 0), 1);
+
+    QLocalSocket deaf;
+    deaf.setReadBufferSize(1);
+    deaf.connectToServer(path_);
+    ASSERT_TRUE(deaf.waitForConnected(kPatience));
+    const QByteArray questions = Encode({.Kind = FrameKind::Command, .Code = ecGetPosition}).repeated(1000);
+    EXPECT_TRUE(WaitUntil(
+        [&] {
+            if (deaf.bytesToWrite() < questions.size()) deaf.write(questions);
+            return deaf.state() == QLocalSocket::UnconnectedState;
+        },
+        kPatience));
 }
 
 TEST_F(ChannelTest, GarbageEndsOnlyItsOwnConnection) {

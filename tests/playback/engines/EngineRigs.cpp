@@ -11,7 +11,11 @@
 #include "MusicManagment/playback/fmod/SoundLibrary.h"
 #include "MusicManagment/playback/mci/GstMci.h"
 #include "MusicManagment/playback/mci/MCIPlaySound.h"
+#include "MusicManagment/playback/winamp/Waiting.h"
+#include "MusicManagment/playback/winamp/WinAmpPlaySound.h"
+#include "tests/PrivateBus.h"
 #include "tests/playback/control/PlayerRig.h"
+#include "tests/playback/engines/FakePlayer.h"
 
 using namespace Qt::StringLiterals;
 
@@ -26,6 +30,8 @@ QString OpenErrorOf(TPlaySoundContainer& sound) {
         sound.Open();
     } catch (const Exception& error) {
         return error.Message();
+    } catch (const EOutputException& error) {
+        return u"output: "_s + error.Message();
     }
     return {};
 }
@@ -98,6 +104,45 @@ class MciRig : public EngineRig {
     GstMci mci_;
 };
 
+// The other player goes with the clock of the test, and tells what it does whenever it is asked.
+class WinAmpRig : public EngineRig {
+ public:
+    WinAmpRig() {
+        settings_.Bus = bus_.Connect(u"rig"_s);
+        player_.Length = 2'000'000;
+        player_.Appear();
+    }
+    ~WinAmpRig() override {
+        QDBusConnection::disconnectFromBus(u"rig"_s);
+        QDBusConnection::disconnectFromBus(u"rig's player"_s);
+    }
+
+    std::unique_ptr<TPlaySoundContainer> Make() override {
+        return std::make_unique<TWinAmpPlaySound>(settings_);
+    }
+    QString OpenError(TPlaySoundContainer& sound) override { return OpenErrorOf<EWinAmpException>(sound); }
+    void Pass(TPlaySoundContainer& sound, int milliseconds) override {
+        clock_.Milliseconds += milliseconds;
+        if (player_.Status == u"Playing"_s) player_.Position += 1000 * milliseconds;
+        if (player_.Position >= player_.Length) {
+            player_.Status = u"Stopped"_s;
+            player_.Position = 0;
+        }
+        const int told = player_.StatesTold;
+        sound.GetStatus();
+        WaitUntil([&] { return player_.StatesTold > told; }, 100);
+        // A question of our own comes after that of the back end, and so does its answer.
+        MprisState state;
+        MprisPlayer(settings_.Bus, u"org.mpris.MediaPlayer2.rig"_s, 1000).ReadState(state);
+    }
+
+ private:
+    HandClock clock_;
+    PrivateBus bus_;
+    FakePlayer player_{bus_.Connect(u"rig's player"_s), u"rig"_s};
+    TWinAmpSettings settings_;
+};
+
 }  // namespace
 
 bool EngineRig::Await(TPlaySoundContainer& sound, const std::function<bool()>& condition) {
@@ -132,7 +177,7 @@ std::unique_ptr<EngineRig> MakeRig(TEngine engine, bool hasOutput) {
         case TEngine::MCI:
             return std::make_unique<MciRig>(hasOutput);
         case TEngine::WinAmp:
-            break;
+            return std::make_unique<WinAmpRig>();
     }
     throw std::runtime_error("no rig for this engine");
 }

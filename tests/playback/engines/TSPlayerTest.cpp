@@ -4,8 +4,8 @@
 
 #include "MusicManagment/playback/extern/LocalExternalPlayer.h"
 #include "MusicManagment/playback/winamp/Waiting.h"
+#include "tests/playback/SoundFiles.h"
 #include "tests/playback/control/PlayerRig.h"
-#include "tests/playback/engines/EncodedTone.h"
 
 using namespace Qt::StringLiterals;
 
@@ -19,7 +19,7 @@ TEST(TSPlayerTest, IsStartedPlaysASongToItsEndAndEndsWithItsController) {
     qputenv("TUNESTEAD_AUDIO", "null");
     ScriptedDialogs dialogs;
     const QString song = folder.filePath(u"Töne.wav"_s);
-    WriteTwoTones(song);
+    WriteWav(song, Sine({}, 2));
     const QString path = PlayerChannelPath();
 
     auto player = std::make_unique<TPlaySound>(EngineTable());

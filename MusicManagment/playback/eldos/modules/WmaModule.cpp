@@ -22,6 +22,7 @@ namespace {
 // Decoded and thrown away before the target of a seek, so that the decoder has settled there.
 constexpr std::int64_t kPrerollMs = 200;
 constexpr int kMostChannels = 8;
+constexpr const char* kDecoders = "wmav1,wmav2,wmapro,wmalossless,wmavoice";
 
 template <auto Free>
 struct FreeByAddress {
@@ -49,6 +50,7 @@ Container OpenContainer(const char* fileName) {
     AVDictionary* options = nullptr;
     av_dict_set(&options, "protocol_whitelist", "file", 0);
     av_dict_set(&options, "format_whitelist", "asf", 0);
+    av_dict_set(&options, "codec_whitelist", kDecoders, 0);
     AVFormatContext* context = nullptr;
     const std::string address = std::string("file:") + fileName;
     const int result = avformat_open_input(&context, address.c_str(), nullptr, &options);
@@ -109,6 +111,8 @@ class WmaSound {
         if (!decoder_) throw std::bad_alloc();
         Checked(avcodec_parameters_to_context(decoder_.get(), stream_->codecpar));
         decoder_->pkt_timebase = stream_->time_base;
+        // What the container was opened with holds for its own decoders only.
+        Checked(av_opt_set(decoder_.get(), "codec_whitelist", kDecoders, 0));
         Checked(avcodec_open2(decoder_.get(), codec, nullptr));
         rate_ = decoder_->sample_rate;
         channels_ = decoder_->ch_layout.nb_channels;
