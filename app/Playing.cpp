@@ -48,7 +48,6 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
       spectrumForm_(new TSpectrumForm(&window)),
       contextMenu_(new QMenu(listForm_)) {
     player_.UseRules(Rules::Modern);
-    player_.SetQuietFailures(true);
     // Before the settings, which may ask for it.
     if (options.MakeExternalPlayer) player_.SetExternalPlayer(options.MakeExternalPlayer());
     list_.UseRules(Rules::Modern);
@@ -128,11 +127,6 @@ void Playing::JoinDesktop(QMainWindow& window) {
                      .SetVolume = [this](double volume) { playerForm_->Panel().Volume().SetPart(volume); }});
     mpris_->Register(QDBusConnection::sessionBus());
     awake_ = std::make_unique<StayAwake>(QDBusConnection::sessionBus());
-    const auto update = [this] { mpris_->Update(); };
-    const QAbstractItemModel* list = listForm_->View().model();
-    QObject::connect(list, &QAbstractItemModel::modelReset, mpris_.get(), update);
-    QObject::connect(list, &QAbstractItemModel::rowsInserted, mpris_.get(), update);
-    QObject::connect(list, &QAbstractItemModel::rowsRemoved, mpris_.get(), update);
 }
 
 void Playing::FollowPlayer() {

@@ -51,6 +51,11 @@ RulesPage::RulesPage(const TMusicDatabase& database)
                          u"Songs, die auf einem Album aufeinander folgen, gehen am Ende ohne Überblendung "
                          "ineinander über. Klassisch wird auch zwischen ihnen übergeblendet."_s),
                  PlayerSettings::kKeepAlbums.Row);
+    fields_.Bind(AddRule(playing, PlayerSettings::kQuietFailures.Row.Name,
+                         u"&Nicht spielbare Songs in der Statuszeile melden"_s,
+                         u"Eine Meldung erscheint nur für den Song, den Sie selbst gewählt haben. Klassisch "
+                         "erscheint für jeden Versuch eine."_s),
+                 PlayerSettings::kQuietFailures.Row);
     SetAvailable(playing, database.PlaySound() != nullptr, u"Wird mit dem Player wirksam."_s);
 }
 
