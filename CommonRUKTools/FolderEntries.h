@@ -1,8 +1,10 @@
 #pragma once
 
 #include <QString>
+#include <compare>
 #include <cstdint>
 #include <memory>
+#include <optional>
 
 enum class EntryKind {
     File,
@@ -16,6 +18,7 @@ struct FolderEntry {
     // False when the name is no valid text: no path can be made of it, and Name only shows it, with each bad
     // byte as "\xE4".
     bool Reachable = true;
+    bool IsSystem = false;  // hidden by the system from its users; only some systems know that of a folder
 };
 
 // What tells a folder from every other folder of the machine, by whatever path it was reached.
@@ -23,10 +26,11 @@ struct FolderIdentity {
     std::uint64_t Volume = 0;
     std::uint64_t Number = 0;
 
-    bool operator<(const FolderIdentity& other) const {
-        return Volume != other.Volume ? Volume < other.Volume : Number < other.Number;
-    }
+    auto operator<=>(const FolderIdentity&) const = default;
 };
+
+// Nothing when there is no such folder.
+std::optional<FolderIdentity> IdentifyFolder(const QString& folder);
 
 // The entries of one folder, one by one and in no order, without "." and "..". A symbolic link counts as what
 // it leads to.

@@ -17,6 +17,10 @@ class TMenuExItem {
 
     ItemKind Kind() const { return kind_; }
     const QString& Caption() const { return caption_; }
+    void SetCaption(const QString& caption) { caption_ = caption; }
+    // By which the keyboard chooses the item; null: any letter of the caption.
+    QChar Letter() const { return letter_; }
+    void SetLetter(QChar letter) { letter_ = letter; }
     // Number of the command; 0 for separators and submenus without one.
     int Id() const { return id_; }
     // As "Ctrl+Alt+N"; empty for none.
@@ -25,6 +29,10 @@ class TMenuExItem {
     // Number of the picture beside the caption; -1 none.
     int ImageIndex() const { return imageIndex_; }
     void SetImageIndex(int index) { imageIndex_ = index; }
+
+    // Its name in the freedesktop icon themes; empty for none.
+    const QString& Icon() const { return icon_; }
+    void SetIcon(const QString& icon) { icon_ = icon; }
 
     bool Enabled() const { return enabled_; }
     void SetEnabled(bool enabled) { enabled_ = enabled; }
@@ -42,8 +50,13 @@ class TMenuExItem {
 
     const std::vector<std::unique_ptr<TMenuExItem>>& Items() const { return items_; }
     TMenuExItem& Add(ItemKind kind, const QString& caption, int id = 0, const QString& shortcut = QString()) {
-        items_.push_back(std::make_unique<TMenuExItem>(kind, caption, id, shortcut));
-        return *items_.back();
+        return Insert(items_.size(), kind, caption, id, shortcut);
+    }
+    // In front of the item at this place.
+    TMenuExItem& Insert(std::size_t place, ItemKind kind, const QString& caption, int id = 0,
+                        const QString& shortcut = QString()) {
+        const auto next = items_.begin() + static_cast<std::ptrdiff_t>(place);
+        return **items_.insert(next, std::make_unique<TMenuExItem>(kind, caption, id, shortcut));
     }
     // The item with this number in this tree; nullptr when there is none.
     const TMenuExItem* Find(int id) const;
@@ -55,6 +68,8 @@ class TMenuExItem {
     int id_;
     QString shortcut_;
     QString hint_;
+    QString icon_;
+    QChar letter_;
     int imageIndex_ = -1;
     bool enabled_ = true;
     bool checkable_ = false;

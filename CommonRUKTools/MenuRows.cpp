@@ -5,8 +5,9 @@ std::unique_ptr<TMenuExItem> BuildMenu(QStringView caption, std::span<const Menu
     auto root = std::make_unique<TMenuExItem>(Kind::Submenu, caption.toString());
     for (const MenuRow& row : rows) {
         const Kind kind = row.Caption.isEmpty() ? Kind::Separator : Kind::Command;
-        root->Add(kind, row.Caption.toString(), row.Id, row.Shortcut.toString())
-            .SetImageIndex(row.ImageIndex);
+        TMenuExItem& item = root->Add(kind, row.Caption.toString(), row.Id, row.Shortcut.toString());
+        item.SetImageIndex(row.ImageIndex);
+        item.SetIcon(row.Icon.toString());
     }
     return root;
 }

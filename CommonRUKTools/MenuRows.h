@@ -12,6 +12,7 @@ struct MenuRow {
     int Id = 0;
     QStringView Shortcut{};
     int ImageIndex = -1;
+    QStringView Icon{};  // its name in the freedesktop icon themes
 };
 
 std::unique_ptr<TMenuExItem> BuildMenu(QStringView caption, std::span<const MenuRow> rows);

@@ -38,6 +38,10 @@ QString TRWReg::DefaultFile() {
     return folder.filePath(u"tunestead/tunestead.conf"_s);
 }
 
+bool TRWReg::IsEmpty() const {
+    return settings_->allKeys().isEmpty();
+}
+
 bool TRWReg::Exists(const QString& name) const {
     return settings_->contains(name);
 }
@@ -106,5 +110,6 @@ std::optional<QString> TRWReg::Read(const QString& type, const QString& name) co
 }
 
 void TRWReg::Write(const QString& type, const QString& name, const QString& value) {
-    settings_->setValue(name, type + value);
+    const QString stored = type + value;
+    if (settings_->value(name) != stored) settings_->setValue(name, stored);
 }

@@ -22,6 +22,8 @@ class TRWReg {
 
     static QString DefaultFile();
 
+    // Whether nothing is stored under the key, as before the first start.
+    bool IsEmpty() const;
     bool Exists(const QString& name) const;
     // Nothing when the value is missing, of another type, or damaged.
     std::optional<int> ReadInteger(const QString& name) const;
@@ -29,6 +31,7 @@ class TRWReg {
     std::optional<QString> ReadString(const QString& name) const;
     std::optional<QByteArray> ReadBinary(const QString& name) const;
 
+    // A value that is stored already is not written again.
     void WriteInteger(const QString& name, int value);
     void WriteBool(const QString& name, bool value);
     void WriteString(const QString& name, const QString& value);

@@ -1,13 +1,24 @@
 #include "CommonRUKTools/SafeFile.h"
 
+#include <QFile>
 #include <QFileInfo>
+#include <QRandomGenerator>
+#include <cerrno>
 
 #include "CommonRUKTools/Errors.h"
 #include "CommonRUKTools/FileSync.h"
+#include "CommonRUKTools/SystemError.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
+
+// A folder is let through: it cannot be replaced, and renaming says so.
+void RefuseUnlessFile(const QString& path) {
+    const QFileInfo info(path);
+    if (info.exists() && !info.isFile() && !info.isDir())
+        throw EStreamError(u"Das ist keine gewöhnliche Datei und wird deshalb nicht ersetzt: "_s + path);
+}
 
 QString FollowLink(const QString& path) {
     const QFileInfo info(path);
@@ -16,43 +27,57 @@ QString FollowLink(const QString& path) {
     return real.isEmpty() ? path : real;
 }
 
+// A short name, because the target's may be as long as names can be.
+QString OtherName(const QString& target) {
+    return QFileInfo(target).absolutePath() + u"/.tunestead-"_s +
+           QString::number(QRandomGenerator::system()->generate64(), 36) + u".tmp"_s;
+}
+
+[[noreturn]] void Throw(const QString& what, const QString& path, int error) {
+    throw EStreamError(what + path + u": "_s + SystemErrorText(error));
+}
+
 }  // namespace
 
-SafeFile::SafeFile(const QString& target) : target_(FollowLink(target)), file_(target_ + u".tmp"_s) {
-    if (!file_.open(QIODevice::WriteOnly | QIODevice::Truncate))
-        throw EStreamError(u"Kann die Datei nicht anlegen: "_s + file_.fileName() + u": "_s +
-                           file_.errorString());
+SafeFile::SafeFile(const QString& target) : target_(FollowLink(target)), temporary_(target_ + u".tmp"_s) {
+    RefuseUnlessFile(target);
+    Create();
+    // The new file keeps who may read it; that it can be written is what saving again needs.
+    if (QFileInfo(target_).isFile())
+        QFile::setPermissions(temporary_, QFile::permissions(target_) | QFile::WriteOwner | QFile::WriteUser);
 }
 
 SafeFile::~SafeFile() {
-    if (committed_) return;
-    file_.close();
-    QFile::remove(file_.fileName());
+    Close();
+    if (!committed_) QFile::remove(temporary_);
+}
+
+void SafeFile::Create() {
+    file_ = CreateNewFile(temporary_);
+    if (file_ >= 0) return;
+    temporary_ = OtherName(target_);
+    file_ = CreateNewFile(temporary_);
+    if (file_ < 0) Throw(u"Kann die Datei nicht anlegen: "_s, target_, errno);
+}
+
+void SafeFile::Close() {
+    if (file_ >= 0) CloseFile(file_);
+    file_ = -1;
 }
 
 void SafeFile::Write(ByteSpan bytes) {
-    const auto size = static_cast<qint64>(bytes.size());
-    if (file_.write(reinterpret_cast<const char*>(bytes.data()), size) != size)
-        throw EStreamError(u"Kann die Datei nicht schreiben: "_s + file_.fileName() + u": "_s +
-                           file_.errorString());
+    if (!WriteAll(file_, bytes)) Throw(u"Kann die Datei nicht schreiben: "_s, target_, errno);
 }
 
 void SafeFile::Seek(qint64 position) {
-    if (!file_.seek(position))
-        throw EStreamError(u"Kann die Datei nicht schreiben: "_s + file_.fileName() + u": "_s +
-                           file_.errorString());
+    if (!SeekTo(file_, position)) Throw(u"Kann die Datei nicht schreiben: "_s, target_, errno);
 }
 
 void SafeFile::Commit() {
-    if (!file_.flush() || !FlushToDisk(file_.handle()))
-        throw EStreamError(u"Kann die Datei nicht schreiben: "_s + file_.fileName() + u": "_s +
-                           file_.errorString());
-    // The new file keeps who may read it; that it can be written is what saving again needs.
-    if (QFile::exists(target_))
-        file_.setPermissions(QFile::permissions(target_) | QFile::WriteOwner | QFile::WriteUser);
-    file_.close();
-    if (!ReplaceFile(file_.fileName(), target_))
-        throw EStreamError(u"Fehler beim Speichern: Kann "_s + target_ + u".tmp nicht in "_s + target_ +
+    if (!FlushToDisk(file_)) Throw(u"Kann die Datei nicht schreiben: "_s, target_, errno);
+    Close();
+    if (!ReplaceFile(temporary_, target_))
+        throw EStreamError(u"Fehler beim Speichern: Kann "_s + temporary_ + u" nicht in "_s + target_ +
                            u" umbenennen"_s);
     committed_ = true;
 }

@@ -1,16 +1,16 @@
 #pragma once
 
-#include <QFile>
 #include <QString>
 
 #include "CommonRUKTools/ByteReader.h"
 
-// Writes a new version of a file beside the old one (target name + ".tmp") and puts it in its place in one
-// step. The old file stays untouched until Commit(); without Commit() the destructor removes the temporary
-// file.
+// Writes a new version of a file beside the old one (target name + ".tmp", or another name where somebody has
+// that one) and puts it in its place in one step. The old file stays untouched until Commit(); without
+// Commit() the destructor removes the temporary file.
 class SafeFile {
  public:
-    // Opens the temporary file. A target that is a symbolic link is followed. Throws EStreamError.
+    // Makes the temporary file. A target that is a symbolic link is followed. Throws EStreamError, also for a
+    // target that is a device, a pipe or the like: it would be replaced by a file.
     explicit SafeFile(const QString& target);
     ~SafeFile();
     SafeFile(const SafeFile&) = delete;
@@ -26,7 +26,11 @@ class SafeFile {
     void Commit();
 
  private:
+    void Create();
+    void Close();
+
     QString target_;
-    QFile file_;
+    QString temporary_;
+    int file_ = -1;  // descriptor
     bool committed_ = false;
 };

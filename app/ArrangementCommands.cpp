@@ -26,9 +26,9 @@ FileDialogOptions DialogOptions(const QString& title) {
 void ArrangementCommands::AddTo(QMenu& menu) {
     menu.addSeparator();
     QObject::connect(menu.addAction(u"Anordnung &speichern unter..."_s), &QAction::triggered, &menu,
-                     [this] { RunCommand([this] { SaveAs(); }); });
+                     Guarded([this] { SaveAs(); }));
     QObject::connect(menu.addAction(u"Anordnung &laden..."_s), &QAction::triggered, &menu,
-                     [this] { RunCommand([this] { Open(); }); });
+                     Guarded([this] { Open(); }));
 }
 
 void ArrangementCommands::SaveAs() {

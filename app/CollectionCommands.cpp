@@ -1,14 +1,11 @@
 #include "app/CollectionCommands.h"
 
 #include <QDir>
-#include <QFileInfo>
 
-#include "CommonRUKTools/AbsolutePath.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/database/intake/Intake.h"
-#include "MusicManagment/database/intake/Update.h"
 
 using namespace Qt::StringLiterals;
 
@@ -30,31 +27,14 @@ bool SavedOrGivenUp(const std::function<bool()>& save, const QString& loss) {
 }  // namespace
 
 CollectionCommands::CollectionCommands(TMusicDatabase& database, StandardFiles files)
-    : database_(database), files_(std::move(files)), bannList_(database.BannList(), files_) {}
-
-bool CollectionCommands::Run(int id) {
-    switch (id) {
-        case mcNew:
-            New();
-            return true;
-        case mcOpen:
-            Open();
-            return true;
-        case mcSave:
-            Save();
-            return true;
-        case mcSaveAs:
-            SaveAs();
-            return true;
-        case mcAddSongs:
-            AddSongs();
-            return true;
-        case mcAddFolder:
-            AddFolder();
-            return true;
-        default:
-            return false;
-    }
+    : database_(database), files_(std::move(files)), bannList_(database.BannList(), files_) {
+    database_.Lock().SetWanted(true);
+    const std::pair<int, void (CollectionCommands::*)()> commands[] = {
+        {mcNew, &CollectionCommands::New},           {mcOpen, &CollectionCommands::Open},
+        {mcSave, &CollectionCommands::Save},         {mcSaveAs, &CollectionCommands::SaveAs},
+        {mcAddSongs, &CollectionCommands::AddSongs}, {mcAddFolder, &CollectionCommands::AddFolder}};
+    for (const auto& [id, command] : commands)
+        handlers_ += database_.Commands().Handle(id, {.Run = [this, command] { (this->*command)(); }});
 }
 
 void CollectionCommands::New() {
@@ -86,16 +66,11 @@ void CollectionCommands::AddFolder() {
     const auto folder =
         UserDialogs().ChooseFolder(u"Ordner zum Durchsuchen nach Songs auswählen (inkl. Unterordner):"_s);
     if (!folder) return;
-    ::AddFolder(database_, *folder, true);
-    RememberFolders(database_, {AbsolutePath(*folder)});
+    ::AddFolder(database_, *folder, true, GivenFolders::Remembered);
 }
 
 void CollectionCommands::AddPaths(const QStringList& paths) {
-    QStringList folders;
-    for (const QString& path : paths)
-        if (QFileInfo(path).isDir()) folders << AbsolutePath(path);
-    RememberFolders(database_, folders);
-    const IntakeResult result = ::AddPaths(database_, paths, true);
+    const IntakeResult result = ::AddPaths(database_, paths, true, GivenFolders::Remembered);
     if (OnIntake) OnIntake(result);
 }
 

@@ -3,23 +3,21 @@
 #include <QStringList>
 #include <functional>
 
+#include "CommonRUKTools/Listeners.h"
 #include "app/desktop/BannListFile.h"
-#include "app/desktop/StandardFiles.h"
+#include "CommonRUKTools/StandardFiles.h"
 
 class TMusicDatabase;
 struct IntakeResult;
 
-// What the user can do with the collection as a whole. Every command may throw what the database throws.
+// What the user can do with the collection as a whole: handles the commands that are about its file and its
+// intake. Each may throw what the database throws.
 class CollectionCommands {
  public:
     CollectionCommands(TMusicDatabase& database, StandardFiles files);
 
     // Told what came of files and folders that were taken in without a report of the engine's own.
     std::function<void(const IntakeResult&)> OnIntake;
-
-    // The commands of the database's menu that are about the collection's file and its intake. False when the
-    // number is none of them.
-    bool Run(int id);
 
     void New();
     void Open();
@@ -49,4 +47,5 @@ class CollectionCommands {
     TMusicDatabase& database_;
     StandardFiles files_;
     BannListFile bannList_;
+    Subscriptions handlers_;
 };

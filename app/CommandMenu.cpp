@@ -4,7 +4,9 @@
 #include <QActionGroup>
 #include <QMenu>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/MenuItem.h"
+#include "app/MenuIcons.h"
 
 using namespace Qt::StringLiterals;
 
@@ -43,11 +45,22 @@ QList<QKeySequence> ShortcutsOf(const TMenuExItem& item) {
     return shortcuts;
 }
 
+// With its own letter, or with the first that is not taken.
+QString CaptionOf(const TMenuExItem& item, QString& taken) {
+    if (item.Letter().isNull()) return WithAccessKey(item.Caption(), taken);
+    QString text = item.Caption();
+    text.replace(u'&', u"&&"_s);
+    return text.insert(text.indexOf(item.Letter(), 0, Qt::CaseInsensitive), u'&');
+}
+
 }  // namespace
 
-void CommandMenu::Fill(QMenu& menu, const TMenuExItem& parent, QString taken) {
+void CommandMenu::Fill(QMenu& menu, const TMenuExItem& parent) {
     menu.setToolTipsVisible(true);
     auto* group = new QActionGroup(&menu);
+    QString taken;
+    for (const auto& item : parent.Items())
+        if (!item->Letter().isNull()) taken += item->Letter();
     for (const auto& item : parent.Items()) {
         switch (item->Kind()) {
             case TMenuExItem::ItemKind::Separator:
@@ -57,22 +70,27 @@ void CommandMenu::Fill(QMenu& menu, const TMenuExItem& parent, QString taken) {
                 Fill(*menu.addMenu(WithAccessKey(item->Caption(), taken)), *item);
                 break;
             default:
-                AddCommand(menu, *item);
+                AddCommand(menu, *item, taken);
         }
         if (item->Kind() == TMenuExItem::ItemKind::Radio) group->addAction(actions_[item->Id()]);
-        if (QAction* action = actions_.value(item->Id()))
-            action->setText(WithAccessKey(item->Caption(), taken));
     }
 }
 
-void CommandMenu::AddCommand(QMenu& menu, const TMenuExItem& item) {
-    QAction* action = menu.addAction(icons_(item.Id()), item.Caption());
+void CommandMenu::AddCommand(QMenu& menu, const TMenuExItem& item, QString& taken) {
+    QAction* action = menu.addAction(MenuIcon(item.Icon()), CaptionOf(item, taken));
     action->setShortcuts(ShortcutsOf(item));
     action->setCheckable(item.Checkable());
     if (item.IsDefault()) menu.setDefaultAction(action);
-    QObject::connect(action, &QAction::triggered, &menu, [this, id = item.Id()] { run_(id); });
+    QObject::connect(action, &QAction::triggered, &menu, Guarded([this, id = item.Id()] { run_(id); }));
     actions_.insert(item.Id(), action);
     BindAction(*action, item.Id());
+}
+
+// The keys of the old actions are free at once, also where these live on for a while.
+void CommandMenu::Clear() {
+    for (auto action = actions_.cbegin(); action != actions_.cend(); ++action)
+        if (QWidget* view = views_.value(action.key())) view->removeAction(*action);
+    actions_.clear();
 }
 
 void CommandMenu::Bind(int id, QWidget& view) {
@@ -87,12 +105,13 @@ void CommandMenu::BindAction(QAction& action, int id) {
     view->addAction(&action);
 }
 
-void CommandMenu::Update(const TMenuExItem& root, bool resting) {
+void CommandMenu::Update(const TMenuExItem& root) {
     for (auto action = actions_.cbegin(); action != actions_.cend(); ++action) {
         const TMenuExItem* item = root.Find(action.key());
         if (item == nullptr) continue;
-        (*action)->setEnabled(item->Enabled() && !resting);
+        (*action)->setEnabled(item->Enabled());
         (*action)->setToolTip(item->Hint());
         if (item->Checkable()) (*action)->setChecked(item->Checked());
+        if (QString none; !item->Letter().isNull()) (*action)->setText(CaptionOf(*item, none));
     }
 }

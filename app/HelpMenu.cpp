@@ -5,6 +5,7 @@
 #include <QMenuBar>
 #include <QMessageBox>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "app/dialogs/HandbookWindow.h"
 
 using namespace Qt::StringLiterals;
@@ -26,7 +27,7 @@ void AddHelpMenu(QMenuBar& bar, QWidget& window) {
     QMenu* menu = bar.addMenu(u"&Hilfe"_s);
     QAction* handbook = menu->addAction(u"&Handbuch"_s);
     handbook->setShortcut(QKeySequence::HelpContents);
-    QObject::connect(handbook, &QAction::triggered, &window, [&window] { ShowHandbook(window); });
+    QObject::connect(handbook, &QAction::triggered, &window, Guarded([&window] { ShowHandbook(window); }));
     menu->addSeparator();
     QObject::connect(menu->addAction(u"Über &Tunestead..."_s), &QAction::triggered, &window,
                      [&window] { QMessageBox::about(&window, u"Über Tunestead"_s, AboutText()); });

@@ -11,12 +11,12 @@
 #include <QStackedWidget>
 #include <QStatusBar>
 #include <QTimer>
-#include <QToolButton>
 #include <QUrl>
 #include <QVBoxLayout>
 
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/RWReg.h"
+#include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/database/commands/Settings.h"
 #include "MusicManagment/database/intake/IntakeReport.h"
 #include "app/ArrangementCommands.h"
@@ -26,14 +26,17 @@
 #include "app/MainMenu.h"
 #include "app/Playing.h"
 #include "app/SettingsCommands.h"
+#include "app/ShellCommands.h"
 #include "app/SongCommands.h"
 #include "app/ToolWindows.h"
 #include "app/desktop/Icons.h"
+#include "app/desktop/NewInstallation.h"
 #include "app/desktop/RaiseWindow.h"
 #include "app/desktop/SingleInstance.h"
 #include "app/views/EmptyState.h"
 #include "app/views/FilterField.h"
 #include "app/views/SongListWidget.h"
+#include "app/views/WindowSettings.h"
 
 using namespace Qt::StringLiterals;
 
@@ -70,13 +73,12 @@ TTunesteadMainWnd::TTunesteadMainWnd(MainWindowOptions options)
     SetUpPlacement();
     SetUpStart();
     ListChanged();
-    QTimer::singleShot(0, this, &TTunesteadMainWnd::StartOnce);
+    QTimer::singleShot(0, this, Guarded([this] { StartOnce(); }));
 }
 
 TTunesteadMainWnd::~TTunesteadMainWnd() = default;
 
 void TTunesteadMainWnd::SetUpDatabase() {
-    database_.SetModernTags(true);
     progress_.OnRunning = [this](bool running) { RunningChanged(running); };
     commands_.OnIntake = &ReportIntake;
     const auto follow = [this] { ListChanged(); };
@@ -89,8 +91,8 @@ void TTunesteadMainWnd::SetUpDatabase() {
 void TTunesteadMainWnd::SetUpCentre() {
     centre_ = new QStackedWidget(this);
     empty_ = new EmptyState(centre_);
-    empty_->OnAddFolder = [this] { RunCommand([this] { commands_.AddFolder(); }); };
-    empty_->OnAddSongs = [this] { RunCommand([this] { commands_.AddSongs(); }); };
+    empty_->OnAddFolder = Guarded([this] { database_.ClickMenuItem(mcAddFolder); });
+    empty_->OnAddSongs = Guarded([this] { database_.ClickMenuItem(mcAddSongs); });
     listPage_ = new QWidget(centre_);
     list_ = new SongListWidget(shown_, database_, listPage_);
     filter_ = new FilterField(shown_, listPage_);
@@ -120,35 +122,16 @@ void TTunesteadMainWnd::SetUpStatusBar() {
     connect(&markedTimer_, &QTimer::timeout, this, [this] { ShowMarked(); });
     connect(list_->selectionModel(), &QItemSelectionModel::selectionChanged, &markedTimer_,
             [this] { markedTimer_.start(); });
-    undo_ = new QToolButton(this);
-    undo_->setText(u"Entfernen rückgängig machen"_s);
-    undo_->setToolTip(u"Nimmt die zuletzt entfernten Songs wieder auf (Strg+Z)"_s);
-    undo_->setShortcut(QKeySequence::Undo);
-    undo_->setVisible(false);
-    connect(undo_, &QToolButton::clicked, this,
-            [this] { RunCommand([this] { songCommands_->UndoRemoval(); }); });
-    statusBar()->addPermanentWidget(undo_);
 }
 
 void TTunesteadMainWnd::SetUpMenu() {
     songCommands_ = std::make_unique<SongCommands>(database_, *list_);
     songCommands_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
-    songCommands_->OnUndoChanged = [this](bool possible) { undo_->setVisible(possible); };
-    database_.OnMenuItemClicked = [this](TMusicDatabase&, const TMenuExItem&, void*, qint64 id,
-                                         bool& proceed) { proceed = !RunOwnCommand(static_cast<int>(id)); };
-    menu_ = std::make_unique<MainMenu>(
-        *menuBar(), database_, [this](int id) { RunMenuCommand(id); }, [this] { close(); });
-    database_.OnMenuChanged = [this](TMusicDatabase&) {
-        toolWindows_->MarkMenu();
-        menu_->Update();
-    };
     settingsCommands_ =
         std::make_unique<SettingsCommands>(*this, database_, kSettingsKey.toString(), options_.SettingsFile);
-    settingsCommands_->OnApplied = [this] { menu_->Update(); };
-    menu_->AddSettings([this] { RunCommand([this] { settingsCommands_->ShowOptions(); }); },
-                       [this] { RunCommand([this] { settingsCommands_->ShowWizard(); }); });
-    songCommands_->OnFind = [this] { filter_->Activate(); };
-    songCommands_->OnFindNext = [this] { FindNext(); };
+    settingsCommands_->OnApplied = [this] { database_.Commands().Changed.Tell(); };
+    HandleCommands();
+    menu_ = std::make_unique<MainMenu>(*menuBar(), database_);
     menu_->BindTo(*list_);
     playing_->AddMenusTo(*menuBar());
     QMenu& windows = *menuBar()->addMenu(u"Fe&nster"_s);
@@ -175,41 +158,53 @@ void TTunesteadMainWnd::SetUpToolWindows() {
     playing_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
 }
 
-void TTunesteadMainWnd::RunMenuCommand(int id) {
-    RunCommand([this, id] { database_.ClickMenuItem(id); });
-}
-
-// Commands that need the window or the collection's file; everything else is the database's.
-bool TTunesteadMainWnd::RunOwnCommand(int id) {
-    return commands_.Run(id) || songCommands_->Run(id) || toolWindows_->Run(id) || playing_->Run(id);
+// Those that need the window itself; its parts handle theirs.
+void TTunesteadMainWnd::HandleCommands() {
+    DatabaseMenu& commands = database_.Commands();
+    handlers_ += commands.Handle(mcFind, {.Run = [this] { filter_->Activate(); }});
+    handlers_ += commands.Handle(mcFindNext, {.Run = [this] { FindNext(); }});
+    handlers_ += commands.Add({.Id = scExit,
+                               .Caption = u"Beenden"_s,
+                               .Letter = u'b',
+                               .Keys = u"Ctrl+Q"_s,
+                               .Icon = u"application-exit"_s,
+                               .Then = ShellCommand::DuringRuns::Stays},
+                              {.Run = [this] { close(); }});
+    handlers_ += commands.Changed.Subscribe([this] {
+        const TMenuExItem* add = database_.Menu().Find(mcAddFolder);
+        empty_->SetCommandsEnabled(add != nullptr && add->Enabled());
+    });
 }
 
 void TTunesteadMainWnd::LoadSettings() {
     TRWReg settings(kSettingsKey.toString(), options_.SettingsFile);
+    BeginInstallation(settings);
+    UseRules(database_, Rules::Modern);
     LoadDatabaseSettings(database_, settings);
-    linkPath_ = settings.ReadString(u"LinkPath"_s).value_or(QString());
+    linkPath_ = ReadSetting(settings, WindowSettings::kLinkPath).value_or(QString());
     // Absent counts as the first start; written back at once, so that a crash does not make it the first
     // again.
-    firstTime_ = settings.ReadBool(u"FirstTime"_s).value_or(true);
-    settings.WriteBool(u"FirstTime"_s, false);
-    if (const auto columns = settings.ReadBinary(u"SongListColumns"_s)) list_->RestoreColumns(*columns);
-    menu_->Update();
+    firstTime_ = ReadSetting(settings, WindowSettings::kFirstTime).value_or(true);
+    WriteSetting(settings, WindowSettings::kFirstTime, false);
+    if (const auto columns = ReadSetting(settings, WindowSettings::kSongListColumns))
+        list_->RestoreColumns(*columns);
+    database_.Commands().Changed.Tell();
 }
 
 void TTunesteadMainWnd::StoreSettings() {
     TRWReg settings(kSettingsKey.toString(), options_.SettingsFile);
     SaveDatabaseSettings(database_, settings);
-    settings.WriteString(u"LinkPath"_s, linkPath_);
-    settings.WriteBinary(u"MainForm"_s, saveGeometry());
-    settings.WriteBinary(u"MainFormState"_s, saveState());
-    settings.WriteBinary(u"SongListColumns"_s, list_->SaveColumns());
+    WriteSetting(settings, WindowSettings::kLinkPath, linkPath_);
+    WriteSetting(settings, WindowSettings::kMainForm, saveGeometry());
+    WriteSetting(settings, WindowSettings::kMainFormState, saveState());
+    WriteSetting(settings, WindowSettings::kSongListColumns, list_->SaveColumns());
     settings.Flush();
 }
 
 void TTunesteadMainWnd::SetUpPlacement() {
     const TRWReg settings(kSettingsKey.toString(), options_.SettingsFile);
-    restoreState(settings.ReadBinary(u"MainFormState"_s).value_or(QByteArray()));
-    if (restoreGeometry(settings.ReadBinary(u"MainForm"_s).value_or(QByteArray()))) return;
+    restoreState(ReadSetting(settings, WindowSettings::kMainFormState).value_or(QByteArray()));
+    if (restoreGeometry(ReadSetting(settings, WindowSettings::kMainForm).value_or(QByteArray()))) return;
     constexpr int kWidth = 190;  // average characters
     constexpr int kHeight = 42;  // lines
     const QSize wanted(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
@@ -252,12 +247,10 @@ bool TTunesteadMainWnd::TakeOver(const StartRequest& request) {
 // --- What follows the database ---
 
 void TTunesteadMainWnd::RunningChanged(bool running) {
-    menu_->SetRunning(running);
-    empty_->SetCommandsEnabled(!running);
     list_->SetSortingAllowed(!running);
     if (running) return;
     songs_.SyncViews();
-    if (std::exchange(ending_, false)) QTimer::singleShot(0, this, [this] { End(); });
+    if (std::exchange(ending_, false)) QTimer::singleShot(0, this, Guarded([this] { End(); }));
 }
 
 void TTunesteadMainWnd::ListChanged() {
@@ -305,7 +298,7 @@ void TTunesteadMainWnd::dropEvent(QDropEvent* event) {
     event->setDropAction(Qt::CopyAction);
     event->accept();
     // The other program waits until the drop is over, so the files are taken in after it.
-    QTimer::singleShot(0, this, [this, files] { RunCommand([&] { commands_.AddPaths(files); }); });
+    QTimer::singleShot(0, this, Guarded([this, files] { commands_.AddPaths(files); }));
 }
 
 // --- Closing ---

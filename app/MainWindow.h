@@ -24,7 +24,6 @@ class MainMenu;
 class Playing;
 class QLabel;
 class QStackedWidget;
-class QToolButton;
 class SettingsCommands;
 class SongCommands;
 class SongListWidget;
@@ -75,8 +74,7 @@ class TTunesteadMainWnd : public QMainWindow {
     void ShowMarked();
     void LoadSettings();
     void StoreSettings();
-    void RunMenuCommand(int id);
-    bool RunOwnCommand(int id);
+    void HandleCommands();
     void SetUpStart();
     void StartOnce();
     void RunningChanged(bool running);
@@ -107,9 +105,9 @@ class TTunesteadMainWnd : public QMainWindow {
     QLabel* summary_ = nullptr;
     QLabel* marked_ = nullptr;
     QTimer markedTimer_;
-    QToolButton* undo_ = nullptr;
     bool ending_ = false;     // as soon as the long operation has stopped
     QString linkPath_;        // folder of the program's shortcuts
     bool firstTime_ = false;  // this is the program's first start
     bool started_ = false;    // the standard files are open and the command line is done
+    Subscriptions handlers_;
 };

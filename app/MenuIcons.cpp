@@ -1,74 +1,50 @@
 #include "app/MenuIcons.h"
 
-#include <span>
+#include <algorithm>
+#include <iterator>
 
-#include "MusicManagment/database/commands/Menu.h"
-#include "MusicManagment/playback/PlaySoundMenu.h"
-#include "MusicManagment/playlist/PlayListMenu.h"
 #include "app/desktop/Icons.h"
 
 namespace {
 
-struct CommandIcon {
-    int Id;
-    const char16_t* Name;  // in the freedesktop icon themes
-    QStyle::StandardPixmap Substitute;
+// Where the desktop has no icon theme, or not this icon.
+struct Substitute {
+    QStringView Name;
+    QStyle::StandardPixmap Pixmap;
 };
 
-constexpr CommandIcon kOfDatabase[] = {
-    {mcNew, u"document-new", QStyle::SP_FileIcon},
-    {mcOpen, u"document-open", QStyle::SP_DialogOpenButton},
-    {mcSave, u"document-save", QStyle::SP_DialogSaveButton},
-    {mcSaveAs, u"document-save-as", QStyle::SP_DialogSaveButton},
-    {mcUpdate, u"view-refresh", QStyle::SP_BrowserReload},
-    {mcAddSongs, u"audio-x-generic", QStyle::SP_FileIcon},
-    {mcAddFolder, u"folder-music", QStyle::SP_DirIcon},
-    {mcFind, u"edit-find", QStyle::SP_FileDialogContentsView},
-    {mcMarkAll, u"edit-select-all", QStyle::SP_FileDialogListView},
-    {mcRemoveFromDatabase, u"list-remove", QStyle::SP_TrashIcon},
-    {mcCopyTo, u"edit-copy", QStyle::SP_FileIcon},
-    {mcPlay, u"media-playback-start", QStyle::SP_MediaPlay},
-    {mcAddToPlayList, u"media-playlist-append", QStyle::SP_ArrowRight},
+constexpr Substitute kSubstitutes[] = {
+    {u"application-exit", QStyle::SP_DialogCloseButton},
+    {u"audio-x-generic", QStyle::SP_FileIcon},
+    {u"configure", QStyle::SP_FileDialogDetailedView},
+    {u"document-new", QStyle::SP_FileIcon},
+    {u"document-open", QStyle::SP_DialogOpenButton},
+    {u"document-save", QStyle::SP_DialogSaveButton},
+    {u"document-save-as", QStyle::SP_DialogSaveButton},
+    {u"edit-clear-list", QStyle::SP_DialogResetButton},
+    {u"edit-copy", QStyle::SP_FileIcon},
+    {u"edit-find", QStyle::SP_FileDialogContentsView},
+    {u"edit-select-all", QStyle::SP_FileDialogListView},
+    {u"edit-undo", QStyle::SP_ArrowBack},
+    {u"folder-music", QStyle::SP_DirIcon},
+    {u"go-jump", QStyle::SP_FileDialogContentsView},
+    {u"list-remove", QStyle::SP_TrashIcon},
+    {u"media-playback-pause", QStyle::SP_MediaPause},
+    {u"media-playback-start", QStyle::SP_MediaPlay},
+    {u"media-playback-stop", QStyle::SP_MediaStop},
+    {u"media-playlist-append", QStyle::SP_ArrowRight},
+    {u"media-seek-backward", QStyle::SP_MediaSeekBackward},
+    {u"media-seek-forward", QStyle::SP_MediaSeekForward},
+    {u"media-skip-backward", QStyle::SP_MediaSkipBackward},
+    {u"media-skip-forward", QStyle::SP_MediaSkipForward},
+    {u"tools-wizard", QStyle::SP_FileDialogInfoView},
+    {u"view-refresh", QStyle::SP_BrowserReload},
 };
-
-constexpr CommandIcon kOfPlayList[] = {
-    {pcNew, u"document-new", QStyle::SP_FileIcon},
-    {pcOpen, u"document-open", QStyle::SP_DialogOpenButton},
-    {pcSave, u"document-save", QStyle::SP_DialogSaveButton},
-    {pcSaveAs, u"document-save-as", QStyle::SP_DialogSaveButton},
-    {pcExportAsLinks, u"folder-music", QStyle::SP_DirLinkIcon},
-    {pcRemoveSelected, u"list-remove", QStyle::SP_TrashIcon},
-    {pcMarkCurrent, u"go-jump", QStyle::SP_FileDialogContentsView},
-    {pcRemoveUnavailable, u"edit-clear-list", QStyle::SP_DialogResetButton},
-};
-
-constexpr CommandIcon kOfPlayer[] = {
-    {plPlay, u"media-playback-start", QStyle::SP_MediaPlay},
-    {plPause, u"media-playback-pause", QStyle::SP_MediaPause},
-    {plStop, u"media-playback-stop", QStyle::SP_MediaStop},
-    {plPrevious, u"media-skip-backward", QStyle::SP_MediaSkipBackward},
-    {plNext, u"media-skip-forward", QStyle::SP_MediaSkipForward},
-    {plBack, u"media-seek-backward", QStyle::SP_MediaSeekBackward},
-    {plForward, u"media-seek-forward", QStyle::SP_MediaSeekForward},
-    {plMarkSong, u"go-jump", QStyle::SP_FileDialogContentsView},
-};
-
-QIcon Find(std::span<const CommandIcon> icons, int id) {
-    for (const CommandIcon& icon : icons)
-        if (icon.Id == id) return ThemeIcon(QString::fromUtf16(icon.Name), icon.Substitute);
-    return {};
-}
 
 }  // namespace
 
-QIcon MenuIcon(int id) {
-    return Find(kOfDatabase, id);
-}
-
-QIcon PlayListIcon(int id) {
-    return Find(kOfPlayList, id);
-}
-
-QIcon PlayerIcon(int id) {
-    return Find(kOfPlayer, id);
+QIcon MenuIcon(QStringView name) {
+    if (name.isEmpty()) return {};
+    const auto* found = std::ranges::find(kSubstitutes, name, &Substitute::Name);
+    return ThemeIcon(name.toString(), found == std::end(kSubstitutes) ? QStyle::SP_FileIcon : found->Pixmap);
 }

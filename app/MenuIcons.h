@@ -2,8 +2,5 @@
 
 #include <QIcon>
 
-// The icon of a command of the database menu; none for most.
-QIcon MenuIcon(int id);
-// The same for the menus of the playlist and the player.
-QIcon PlayListIcon(int id);
-QIcon PlayerIcon(int id);
+// The icon of a command by its name in the freedesktop icon themes; none for an empty name.
+QIcon MenuIcon(QStringView name);

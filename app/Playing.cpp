@@ -11,6 +11,7 @@
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "MusicManagment/playlist/PlayListMenu.h"
 #include "app/CommandRunner.h"
+#include "app/MenuIcons.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/RaiseWindow.h"
 #include "app/models/CollectionTotals.h"
@@ -45,8 +46,12 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
       playerForm_(new TPlayerForm(player_, list_, &window)),
       spectrumForm_(new TSpectrumForm(&window)),
       contextMenu_(new QMenu(listForm_)) {
+    player_.SetKeepAlbums(true);
+    player_.SetQuietFailures(true);
     // Before the settings, which may ask for it.
     if (options.MakeExternalPlayer) player_.SetExternalPlayer(options.MakeExternalPlayer());
+    list_.SetModernLists(true);
+    list_.SetStandardFileName(standardList_);
     list_.SetMusicDatabase(&database);
     player_.SetMusicDatabase(&database);
     player_.SetPlayList(&list_);
@@ -54,17 +59,23 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
     SetUpSpectrum(window, std::move(options.Spectrum));
     SetUpContextMenu();
     JoinDesktop(window);
+    FollowPlayer();
+    database.JoinSettings(followers_);
+    handlers_ += database.Commands().Handle(mcPlay, {.Run = [this] { PlayChosen(); }});
+    handlers_ += database.Commands().Handle(mcAddToPlayList, {.Run = [this] { AddChosen(); }});
     database.OnMarkSong = [this](TMusicDatabase&, SongIndex song) {
         if (!songs_.FocusSong(song) && OnDone) OnDone(u"Der Filter zeigt dieses Lied nicht."_s);
     };
     QObject::connect(&songs, &QAbstractItemView::doubleClicked, listForm_,
-                     [this] { RunCommand([this] { database_.ClickMenuItem(mcPlay); }); });
+                     Guarded([this] { PlayFromFocus(); }));
 }
 
 // The window would let its tool windows live longer than what they show.
 Playing::~Playing() {
     database_.OnMarkSong = {};
+    subscriptions_.End();
     mpris_.reset();
+    database_.LeaveSettings(followers_);
     database_.LeaveSettings(*spectrumForm_);
     database_.LeaveSettings(playerForm_->Panel().Volume());
     delete listForm_;
@@ -76,11 +87,10 @@ void Playing::SetUpWindows(QMainWindow& window) {
     window.addDockWidget(Qt::RightDockWidgetArea, listForm_);
     window.addDockWidget(Qt::BottomDockWidgetArea, playerForm_);
     TVisPlayList& view = listForm_->View();
-    view.OnPlay = [this](int index) { RunCommand([&] { PlayEntry(index); }); };
+    view.OnPlay = [this](int index) { RunCommand([&] { PlayChosenEntry(index); }); };
     view.OnContextMenu = [this](const QPoint& place) { contextMenu_->popup(place); };
     TVisPlaySound& panel = playerForm_->Panel();
     panel.OnCommand = [this](int id) { RunPlayerCommand(id); };
-    panel.OnChange = [this] { FollowSong(); };
     panel.Volume().Follow([this](float gain) {
         player_.SetGain(gain);
         if (mpris_) mpris_->Update();
@@ -124,10 +134,20 @@ void Playing::JoinDesktop(QMainWindow& window) {
     QObject::connect(list, &QAbstractItemModel::rowsRemoved, mpris_.get(), update);
 }
 
-// The list goes along with the songs that it plays.
+void Playing::FollowPlayer() {
+    PlayerEvents& events = player_.Events();
+    subscriptions_ += events.Changed.Subscribe([this] { FollowSong(); });
+    subscriptions_ += events.Started.Subscribe([this] { followers_.FollowSong(); });
+    subscriptions_ += events.Notice.Subscribe([this](const QString& text) {
+        if (OnDone) OnDone(text.simplified());
+    });
+}
+
+// The lists go along with the songs that are played.
 void Playing::FollowSong() {
-    if (mpris_) mpris_->Update();
-    if (awake_) awake_->SetPlaying(player_.GetStatus() == psPlaying);
+    const TPSStatus status = player_.GetStatus();
+    if (awake_) awake_->SetPlaying(status == psPlaying);
+    songs_.SetPlaying(status == psClosed ? QString() : SongOf(player_, list_).FileName);
     if (list_.CurrentSong() == shownSong_) return;
     shownSong_ = list_.CurrentSong();
     listForm_->View().ShowEntry(list_.IndexOf());
@@ -147,8 +167,8 @@ void Playing::AddMenusTo(QMenuBar& bar) {
 // The keys are those of the view, which acts on them itself.
 void Playing::SetUpContextMenu() {
     TVisPlayList& view = listForm_->View();
-    QAction* play = contextMenu_->addAction(PlayerIcon(plPlay), u"A&bspielen"_s, QKeySequence(u"Return"_s),
-                                            &view, &TVisPlayList::PlaySelected);
+    QAction* play = contextMenu_->addAction(MenuIcon(u"media-playback-start"), u"A&bspielen"_s,
+                                            QKeySequence(u"Return"_s), &view, &TVisPlayList::PlaySelected);
     contextMenu_->addAction(ThemeIcon(u"go-next"_s, QStyle::SP_ArrowRight), u"Als nächs&tes spielen"_s,
                             QKeySequence(u"Ctrl+Return"_s), &view, &TVisPlayList::QueueSelected);
     contextMenu_->addAction(u"Aus der &Warteschlange nehmen"_s, QKeySequence(u"Ctrl+Backspace"_s), &view,
@@ -176,26 +196,13 @@ void Playing::RunPlayerCommand(int id) {
         }
         const int entry = listForm_->View().CurrentEntry();
         if (entry >= 0)
-            PlayEntry(entry);
+            PlayChosenEntry(entry);
         else
             list_.PlayNext();
     });
 }
 
 // --- Songs of the collection ---
-
-bool Playing::Run(int id) {
-    switch (id) {
-        case mcPlay:
-            PlayChosen();
-            return true;
-        case mcAddToPlayList:
-            AddChosen();
-            return true;
-        default:
-            return false;
-    }
-}
 
 // At the end; what is listed already stays where it is. Returns how many came in.
 int Playing::Append(const std::vector<SongIndex>& songs) {
@@ -216,7 +223,17 @@ void Playing::PlayChosen() {
     const SongIndex focused = songs_.FocusedSong();
     const SongIndex song = std::ranges::binary_search(songs, focused) ? focused : songs.front();
     Append(songs);
-    PlayEntry(list_.IndexOf(database_.Song(song).FileName), song);
+    PlayChosenEntry(list_.IndexOf(database_.Song(song).FileName), song);
+}
+
+// The song that was double-clicked, and then what follows it in the shown list.
+void Playing::PlayFromFocus() {
+    const SongIndex song = songs_.FocusedSong();
+    if (song < 0) return;
+    std::vector<QString> shown = songs_.ShownFromFocus(ShownFollowers::kMost);
+    Append({song});
+    PlayChosenEntry(list_.IndexOf(database_.Song(song).FileName), song);
+    followers_.Begin(std::move(shown));
 }
 
 void Playing::AddChosen() {
@@ -227,6 +244,12 @@ void Playing::AddChosen() {
     if (const std::size_t known = songs.size() - added; known > 0)
         sentence += u", %1 schon darin"_s.arg(known == 1 ? u"1 war"_s : u"%1 waren"_s.arg(known));
     if (OnDone) OnDone(sentence + u'.');
+}
+
+// What the user has chosen ends what he chose before.
+void Playing::PlayChosenEntry(int index, SongIndex hint) {
+    followers_.End();
+    PlayEntry(index, hint);
 }
 
 void Playing::PlayEntry(int index, SongIndex hint) {
@@ -243,7 +266,7 @@ void Playing::OpenStandardList() {
 }
 
 void Playing::OpenPlayList(const QString& path) {
-    list_.SetPlayListFileName(path);
+    if (list_.MayBeReplaced()) list_.SetPlayListFileName(path);
 }
 
 // It plays without being in the list, where "Nächstes" goes on.

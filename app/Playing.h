@@ -8,7 +8,7 @@
 #include "MusicManagment/playback/spectrum/SpectrumFeed.h"
 #include "MusicManagment/playlist/PlayList.h"
 #include "app/CommandMenu.h"
-#include "app/MenuIcons.h"
+#include "app/ShownFollowers.h"
 #include "app/desktop/Mpris.h"
 #include "app/desktop/StayAwake.h"
 
@@ -41,9 +41,6 @@ class Playing {
     TPlayList& PlayList() { return list_; }
     TPlaySound& Player() { return player_; }
 
-    // The commands of the database's menu that play songs. False when the number is none of them. Throws what
-    // playing throws.
-    bool Run(int id);
     // Adds the menus of the playlist and the player.
     void AddMenusTo(QMenuBar& bar);
     // Adds the items that show and hide the tool windows.
@@ -62,11 +59,14 @@ class Playing {
     void SetUpSpectrum(QMainWindow& window, SpectrumSource source);
     void SetUpContextMenu();
     void JoinDesktop(QMainWindow& window);
+    void FollowPlayer();
     void FollowSong();
+    void PlayFromFocus();
     int Append(const std::vector<SongIndex>& songs);
     void PlayChosen();
     void AddChosen();
-    void PlayEntry(int index, SongIndex hint = -1);
+    void PlayChosenEntry(int index, SongIndex hint = -1);
+    void PlayEntry(int index, SongIndex hint);
     void RunPlayerCommand(int id);
     void RunPlayListCommand(int id);
 
@@ -76,8 +76,9 @@ class Playing {
     bool standardListIsUnread_ = true;
     TPlayList list_;
     TPlaySound player_;
-    CommandMenu listMenu_{[this](int id) { RunPlayListCommand(id); }, &PlayListIcon};
-    CommandMenu playerMenu_{[this](int id) { RunPlayerCommand(id); }, &PlayerIcon};
+    ShownFollowers followers_{list_};
+    CommandMenu listMenu_{[this](int id) { RunPlayListCommand(id); }};
+    CommandMenu playerMenu_{[this](int id) { RunPlayerCommand(id); }};
     TPlaylistForm* listForm_;
     TPlayerForm* playerForm_;
     TSpectrumForm* spectrumForm_;
@@ -86,4 +87,6 @@ class Playing {
     std::unique_ptr<Mpris> mpris_;
     std::unique_ptr<StayAwake> awake_;
     QString shownSong_;
+    Subscriptions subscriptions_;
+    Subscriptions handlers_;
 };

@@ -2,14 +2,33 @@
 
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/database/commands/Settings.h"
 #include "MusicManagment/database/intake/Update.h"
+#include "app/ShellCommands.h"
 #include "app/dialogs/options/OptionsForm.h"
 #include "app/dialogs/wizard/WizardForm.h"
 
+using namespace Qt::StringLiterals;
+
 SettingsCommands::SettingsCommands(QWidget& window, TMusicDatabase& database, const QString& key,
                                    const QString& file)
-    : window_(window), database_(database), key_(key), file_(file) {}
+    : window_(window), database_(database), key_(key), file_(file) {
+    handlers_ += database.Commands().Add({.Id = scOptions,
+                                          .Caption = u"Einstellungen..."_s,
+                                          .Letter = u'e',
+                                          .Keys = u"Ctrl+,"_s,
+                                          .Icon = u"configure"_s,
+                                          .Menu = u"Extras"},
+                                         {.Run = [this] { ShowOptions(); }});
+    handlers_ += database.Commands().Add({.Id = scWizard,
+                                          .Caption = u"Einrichtungsassistent..."_s,
+                                          .Letter = u'i',
+                                          .Icon = u"tools-wizard"_s,
+                                          .Menu = u"Extras",
+                                          .BehindLine = false},
+                                         {.Run = [this] { ShowWizard(); }});
+}
 
 void SettingsCommands::ShowOptions() {
     TRWReg settings(key_, file_);

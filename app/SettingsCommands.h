@@ -3,11 +3,13 @@
 #include <QString>
 #include <functional>
 
+#include "CommonRUKTools/Listeners.h"
+
 class QWidget;
 class TMusicDatabase;
 struct WizardChoice;
 
-// The commands that change how the program works: its options and the set-up.
+// The commands that change how the program works, which it adds to the menu: its options and the set-up.
 class SettingsCommands {
  public:
     // `key` and `file` name the settings store, as for TRWReg. The dialogs belong to `window`.
@@ -28,4 +30,5 @@ class SettingsCommands {
     TMusicDatabase& database_;
     QString key_;
     QString file_;
+    Subscriptions handlers_;
 };

@@ -5,56 +5,78 @@
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/database/songfiles/CopySongs.h"
+#include "MusicManagment/database/songfiles/Removal.h"
+#include "app/ShellCommands.h"
 #include "app/models/CollectionTotals.h"
 #include "app/views/SongListWidget.h"
 
 using namespace Qt::StringLiterals;
 
-SongCommands::SongCommands(TMusicDatabase& database, SongListWidget& list)
-    : database_(database), list_(list) {}
+namespace {
 
-bool SongCommands::Run(int id) {
-    if ((id >= mcSortFirst && id <= mcSortLast) || (id >= mcSubSortFirst && id <= mcSubSortLast) ||
-        id == mcReverse)
-        return SetOrder(id), true;
-    switch (id) {
-        case mcFind:
-            if (OnFind) OnFind();
-            return true;
-        case mcFindNext:
-            if (OnFindNext) OnFindNext();
-            return true;
-        case mcMarkAll:
-            list_.MarkAll();
-            return true;
-        case mcInvertMarks:
-            list_.InvertMarks();
-            return true;
-        case mcMarkByFilter:
-            list_.MarkByFilter();
-            return true;
-        case mcRemoveFromDatabase:
-            RemoveChosen();
-            return true;
-        case mcCopyTo:
-            CopyChosen();
-            return true;
-        case mcOpenExternally:
-            OpenExternally();
-            return true;
-        default:
-            return false;
-    }
+// Of those that are still there.
+QStringList PathsOf(const TMusicDatabase& database, const std::vector<SongHandle>& songs) {
+    QStringList paths;
+    for (const SongHandle song : songs)
+        if (const TID3Tag* record = database.Songs().Find(song)) paths << record->FileName;
+    return paths;
 }
 
-void SongCommands::UndoRemoval() {
-    if (removals_.empty()) return;
-    const int restored = RestoreSongs(database_, removals_.back());
-    removals_.pop_back();
-    Tell(SongCountText(static_cast<std::size_t>(restored)) + u" wieder in die Datenbank aufgenommen."_s);
-    if (OnUndoChanged) OnUndoChanged(!removals_.empty());
+}  // namespace
+
+SongCommands::SongCommands(TMusicDatabase& database, SongListWidget& list)
+    : database_(database), list_(list), undo_(database) {
+    HandleCommands();
+    AddUndo();
+}
+
+void SongCommands::HandleCommands() {
+    const auto handle = [this](int id, std::function<void()> run) {
+        handlers_ += database_.Commands().Handle(id, {.Run = std::move(run)});
+    };
+    for (int id = mcSortFirst; id <= mcSortLast; ++id)
+        handle(id, [this, id] { SetOrder(id); });
+    for (int id = mcSubSortFirst; id <= mcSubSortLast; ++id)
+        handle(id, [this, id] { SetOrder(id); });
+    handle(mcReverse, [this] { SetOrder(mcReverse); });
+    handle(mcMarkAll, [this] { list_.MarkAll(); });
+    handle(mcInvertMarks, [this] { list_.InvertMarks(); });
+    handle(mcMarkByFilter, [this] { list_.MarkByFilter(); });
+    handle(mcRemoveFromDatabase, [this] { RemoveChosen(); });
+    handle(mcCopyTo, [this] { CopyChosen(); });
+    handle(mcOpenExternally, [this] { OpenExternally(); });
+}
+
+// --- Undo ---
+
+void SongCommands::AddUndo() {
+    const auto caption = [this] {
+        return undo_.IsEmpty() ? u"Rückgängig"_s : u"Rückgängig: "_s + undo_.Caption();
+    };
+    handlers_ +=
+        database_.Commands().Add({.Id = scUndo,
+                                  .Caption = caption(),
+                                  .Letter = u'r',
+                                  .Keys = u"Ctrl+Z"_s,
+                                  .Icon = u"edit-undo"_s,
+                                  .Menu = u"Bearbeiten",
+                                  .Where = ShellCommand::Place::First},
+                                 {.Run = [this] { Undo(); },
+                                  .IsEnabled = [this] { return !undo_.IsEmpty() && !database_.ReadOnly(); },
+                                  .Caption = caption});
+    undoChanges_ = undo_.Changed.Subscribe([this] { database_.Commands().Changed.Tell(); });
+}
+
+void SongCommands::Undo() {
+    const QStringList songs = undo_.TakeBack();
+    const std::size_t shown = list_.MarkSongs(songs);
+    const auto count = static_cast<std::size_t>(songs.size());
+    Tell(SongCountText(count) + u" wieder in die Datenbank aufgenommen."_s +
+         (shown < count ? u" Der Filter zeigt nicht alle davon."_s : QString()));
     database_.SaveAfterCommand();
 }
+
+// --- The songs of the list ---
 
 // Through the list, which keeps the focused song in sight.
 void SongCommands::SetOrder(int id) {
@@ -68,32 +90,44 @@ void SongCommands::SetOrder(int id) {
     list_.SetOrder(order);
 }
 
+QString SongCommands::RemovalQuestion(const std::vector<SongHandle>& songs) const {
+    if (songs.size() > 1)
+        return u"Sollen "_s + SongCountText(songs.size()) +
+               u" aus der Datenbank entfernt werden? Die Dateien bleiben erhalten."_s;
+    const TID3Tag& song = *database_.Songs().Find(songs.front());
+    return u"Soll \""_s + song.Artist + u" - "_s + song.Title +
+           u"\" aus der Datenbank entfernt werden? Die Datei bleibt erhalten."_s;
+}
+
 void SongCommands::RemoveChosen() {
-    const auto songs = list_.ChosenSongs();
+    const std::vector<SongHandle> songs = list_.ChosenHandles();
     if (songs.empty()) return;
-    const QString question = songs.size() == 1
-                                 ? u"Soll \""_s + database_.Song(songs[0]).Artist + u" - "_s +
-                                       database_.Song(songs[0]).Title +
-                                       u"\" aus der Datenbank entfernt werden? Die Datei bleibt erhalten."_s
-                                 : u"Sollen "_s + SongCountText(songs.size()) +
-                                       u" aus der Datenbank entfernt werden? Die Dateien bleiben erhalten."_s;
-    if (UserDialogs().Ask({.Text = question, .Buttons = {u"Entfernen"_s, u"Abbrechen"_s}, .Cancel = 1}) != 0)
+    if (UserDialogs().Ask(
+            {.Text = RemovalQuestion(songs), .Buttons = {u"Entfernen"_s, u"Abbrechen"_s}, .Cancel = 1}) != 0)
         return;
+    const SongHandle next = list_.NextAfter(songs);
     RemovedSongs removed = RemoveSongs(database_, songs);
     if (removed.empty()) return;
-    Tell(SongCountText(removed.size()) + u" aus der Datenbank entfernt."_s);
-    removals_.push_back(std::move(removed));
-    if (OnUndoChanged) OnUndoChanged(true);
+    list_.FocusSong(database_.Songs().PositionOf(next), QAbstractItemView::EnsureVisible);
+    const QString count = SongCountText(removed.size());
+    Tell(count + u" aus der Datenbank entfernt. Strg+Z macht das rückgängig."_s);
+    undo_.Add({count + u" entfernen"_s, [&database = database_, removed = std::move(removed)] {
+                   RestoreSongs(database, removed);
+                   QStringList restored;
+                   for (const TID3Tag& song : removed)
+                       restored << song.FileName;
+                   return restored;
+               }});
     database_.SaveAfterCommand();
 }
 
 void SongCommands::CopyChosen() {
-    const auto songs = list_.ChosenSongs();
+    const std::vector<SongHandle> songs = list_.ChosenHandles();
     if (songs.empty()) return;
     const auto folder =
         UserDialogs().ChooseFolder(u"Ordner auswählen, in den die Songs kopiert werden sollen:"_s);
     if (!folder) return;
-    const CopyResult result = CopySongs(database_, songs, *folder);
+    const CopyResult result = CopySongs(database_, PathsOf(database_, songs), *folder);
     Tell(SongCountText(static_cast<std::size_t>(result.Copied)) + u" kopiert."_s);
     if (!result.Failed.isEmpty())
         UserDialogs().ShowMessage(MessageKind::Warning, u"Diese Dateien konnten nicht kopiert werden:\n"_s +

@@ -68,6 +68,7 @@ bool Startup::OpenStandardDatabase() {
         }
     }
     database_.SetFileName(path);
+    if (!database_.Lock().IsElsewhere()) database_.Lock().Claim(path);  // there may be no file yet
     return true;
 }
 

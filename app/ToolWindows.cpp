@@ -11,8 +11,7 @@
 #include "app/views/TagForm.h"
 
 ToolWindows::ToolWindows(QMainWindow& window, TMusicDatabase& database)
-    : database_(database),
-      overview_(new TOverviewForm(database, &window)),
+    : overview_(new TOverviewForm(database, &window)),
       properties_(new TPropertyForm(database, &window)),
       tag_(new TID3TagForm(&window)) {
     window.addDockWidget(Qt::LeftDockWidgetArea, overview_);
@@ -25,8 +24,21 @@ ToolWindows::ToolWindows(QMainWindow& window, TMusicDatabase& database)
     overview_->Overview().OnSelectionChanged = [this](const GroupSelection& selection) {
         if (OnSelectionChanged) OnSelectionChanged(selection);
     };
-    overview_->Overview().OnTypeChanged = [this](TOVType) { MarkMenu(); };
-    MarkMenu();
+    overview_->Overview().OnTypeChanged = [&database](TOVType) { database.Commands().Changed.Tell(); };
+    HandleCommands(database);
+}
+
+void ToolWindows::HandleCommands(TMusicDatabase& database) {
+    for (int i = 0; i < kOverviewTypeCount; ++i) {
+        const auto type = static_cast<TOVType>(i);
+        const auto show = [this, type] {
+            overview_->show();
+            overview_->raise();
+            overview_->Overview().SetOVType(type);
+        };
+        const auto isShown = [this, type] { return overview_->Overview().OVType() == type; };
+        handlers_ += database.Commands().Handle(mcListArtists + i, {.Run = show, .IsOn = isShown});
+    }
 }
 
 void ToolWindows::ShowSong(const TID3Tag* song) {
@@ -34,22 +46,8 @@ void ToolWindows::ShowSong(const TID3Tag* song) {
     tag_->ShowSong(song);
 }
 
-bool ToolWindows::Run(int id) {
-    if (id < mcListArtists || id > mcListGenres) return false;
-    overview_->show();
-    overview_->raise();
-    overview_->Overview().SetOVType(static_cast<TOVType>(id - mcListArtists));
-    return true;
-}
-
 void ToolWindows::AddTo(QMenu& menu) {
     for (QDockWidget* window : {static_cast<QDockWidget*>(overview_), static_cast<QDockWidget*>(properties_),
                                 static_cast<QDockWidget*>(tag_)})
         menu.addAction(window->toggleViewAction());
-}
-
-void ToolWindows::MarkMenu() {
-    const TOVType type = overview_->Overview().OVType();
-    for (int id = mcListArtists; id <= mcListGenres; ++id)
-        if (TMenuExItem* item = database_.Menu().Find(id)) item->SetChecked(id - mcListArtists == type);
 }

@@ -2,6 +2,7 @@
 
 #include <functional>
 
+#include "CommonRUKTools/Listeners.h"
 #include "MusicManagment/database/SongTypes.h"
 #include "ReadMPEGHeader/ID3Tag.h"
 #include "app/models/GroupSelection.h"
@@ -13,7 +14,8 @@ class TMusicDatabase;
 class TOverviewForm;
 class TPropertyForm;
 
-// The windows that dock at the main window, and what they follow.
+// The windows that dock at the main window, and what they follow. Handles the commands that the overview
+// serves.
 class ToolWindows {
  public:
     // The windows belong to `window`.
@@ -24,16 +26,14 @@ class ToolWindows {
 
     // Shows a song in the windows that are about one; nullptr for none.
     void ShowSong(const TID3Tag* song);
-    // The commands of the database's menu that the overview serves. False when the number is none of them.
-    bool Run(int id);
-    // Marks the overview's grouping in the database's menu.
-    void MarkMenu();
     // Adds the items that show and hide the windows.
     void AddTo(QMenu& menu);
 
  private:
-    TMusicDatabase& database_;
+    void HandleCommands(TMusicDatabase& database);
+
     TOverviewForm* overview_;
     TPropertyForm* properties_;
     TID3TagForm* tag_;
+    Subscriptions handlers_;
 };

@@ -4,6 +4,7 @@
 #include <string_view>
 
 #include "CommonRUKTools/AbsolutePath.h"
+#include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/playback/Engines.h"
@@ -14,7 +15,7 @@
 #include "app/desktop/Icons.h"
 #include "app/desktop/Installation.h"
 #include "app/desktop/SingleInstance.h"
-#include "app/desktop/StandardFiles.h"
+#include "CommonRUKTools/StandardFiles.h"
 #include "app/desktop/Termination.h"
 #include "app/desktop/Translations.h"
 #include "app/dialogs/QtDialogs.h"
@@ -142,7 +143,7 @@ int main(int argc, char** argv) {
         return 0;
     }
     const QString token = ActivationToken();
-    QApplication application(argc, argv);
+    GuardedApplication<QApplication> application(argc, argv);
     SetUp(application);
     QGuiApplication::setDesktopFileName(u"tunestead"_s);
     const QStringList arguments = ArgumentsOf(application);

@@ -2,7 +2,8 @@
 
 #include <algorithm>
 #include <cerrno>
-#include <system_error>
+
+#include "CommonRUKTools/SystemError.h"
 
 using namespace Qt::StringLiterals;
 
@@ -10,8 +11,7 @@ namespace {
 
 [[noreturn]] void ThrowWriteError(int error) {
     if (error == EPIPE) throw EOutputClosed();
-    const QString reason = QString::fromStdString(std::generic_category().message(error));
-    throw EStreamError(u"Die Ausgabe konnte nicht geschrieben werden: "_s + reason);
+    throw EStreamError(u"Die Ausgabe konnte nicht geschrieben werden: "_s + SystemErrorText(error));
 }
 
 }  // namespace

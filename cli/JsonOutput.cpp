@@ -3,6 +3,9 @@
 #include <algorithm>
 #include <charconv>
 #include <cmath>
+#include <type_traits>
+
+#include "MusicManagment/database/SongFields.h"
 
 namespace {
 
@@ -179,30 +182,18 @@ void JsonLine::Close(char bracket) {
 }
 
 void WriteSongFields(JsonLine& line, const TID3Tag& song) {
-    line.Text("fileName", song.FileName);
-    line.Text("title", song.Title);
-    line.Text("artist", song.Artist);
-    line.Text("album", song.Album);
-    line.Text("year", song.Year);
-    line.Text("comment", song.Comment);
-    line.Text("format", song.MPEGLayer);
-    line.Number("length", song.Length);
-    line.Number("genre", song.Genre);
-    line.Number("bitRate", song.BitRate);
-    line.Number("sampleRate", song.SampleRate);
-    line.Number("channelMode", song.ChannelMode);
-    line.Number("emphasis", song.Emphasis);
-    line.Flag("private", song.Private);
-    line.Flag("protected", song.Protected);
-    line.Flag("copyrighted", song.Copyrighted);
-    line.Flag("original", song.Original);
-    line.Flag("padding", song.Padding);
-    line.Number("frameSize", song.FrameSize);
-    line.Number("track", song.Track);
-    line.Number("playCount", song.PlayCount);
-    line.Number("reserved", song.Reserved);
-    line.Number("flags", song.Flags);
-    line.Number("mainGenre", song.MainGenre);
-    line.Flag("remix", song.Remix);
-    line.Real("fileTime", song.AddTime);
+    for (const RecordMember& row : RecordMembers()) {
+        const auto write = [&](auto member) {
+            using Value = std::remove_cvref_t<decltype(song.*member)>;
+            if constexpr (std::is_same_v<Value, QString>)
+                line.Text(row.Name, song.*member);
+            else if constexpr (std::is_same_v<Value, bool>)
+                line.Flag(row.Name, song.*member);
+            else if constexpr (std::is_same_v<Value, double>)
+                line.Real(row.Name, song.*member);
+            else
+                line.Number(row.Name, song.*member);
+        };
+        std::visit(write, row.Member);
+    }
 }

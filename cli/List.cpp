@@ -9,10 +9,11 @@ using namespace Qt::StringLiterals;
 namespace {
 
 constexpr ChoiceRow<TSortType> kSortTypes[] = {
-    {u"stTitle", stTitle},     {u"stArtist", stArtist}, {u"stAlbum", stAlbum},
-    {u"stComment", stComment}, {u"stYear", stYear},     {u"stLength", stLength},
-    {u"stGenre", stGenre},     {u"stPath", stPath},     {u"stPlayCnt", stPlayCnt},
-    {u"stAddTime", stAddTime}, {u"stFlags", stFlags},   {u"stCacheType", stCacheType},
+    {u"stTitle", stTitle},           {u"stArtist", stArtist}, {u"stAlbum", stAlbum},
+    {u"stComment", stComment},       {u"stYear", stYear},     {u"stLength", stLength},
+    {u"stGenre", stGenre},           {u"stPath", stPath},     {u"stPlayCnt", stPlayCnt},
+    {u"stAddTime", stAddTime},       {u"stFlags", stFlags},   {u"stCacheType", stCacheType},
+    {u"stAlbumOrder", stAlbumOrder},
 };
 
 constexpr ChoiceRow<TSubSortType> kSubSortTypes[] = {
@@ -57,7 +58,7 @@ constexpr OptionRow kOptions[] = {
     {u"--db", u"DATENBANK", u"Datei der Sammlung (.tsdb)", true},
     {u"--sort", u"SCHLÜSSEL",
      u"stTitle, stArtist, stAlbum, stComment, stYear, stLength, stGenre (Vorgabe), stPath, stPlayCnt,\n"
-     u"stAddTime, stFlags oder stCacheType"},
+     u"stAddTime, stFlags, stCacheType oder stAlbumOrder (Album, Ordner, Track)"},
     {u"--subsort", u"SCHLÜSSEL",
      u"ordnet, was sonst gleich ist: sstGATL (Genre, Interpret, Titel, Länge; Vorgabe), sstATL\n"
      u"(Interpret, Titel, Länge) oder sstPath (Pfad)"},

@@ -1,12 +1,26 @@
 #pragma once
 
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/commands/Rules.h"
+#include "cli/Arguments.h"
 #include "cli/Console.h"
 #include "cli/RunWatcher.h"
 
-// Makes the database one of a program without windows: modern reading profile, no events to wait for.
-void PrepareDatabase(TMusicDatabase& database);
+// Makes the database one of a program without windows: no events to wait for, and the modern rules unless the
+// user wants the classic ones.
+void PrepareDatabase(TMusicDatabase& database, Rules rules = Rules::Modern);
+
+// Keeps other programs from writing the file that the command is going to write. Throws EAbort, after telling
+// the user, when one has it open.
+void ClaimFile(TMusicDatabase& database, const QString& fileName);
 
 // Reads the file into the database. Throws EMusicDatabaseException with the reason; also when the user
 // stopped.
 void ReadInto(TMusicDatabase& database, const QString& fileName, Console& console, StopBy stopBy);
+
+inline constexpr OptionRow kBannListOption = {
+    u"--bannlist", u"DATEI",
+    u"Bann-Liste (.str), deren Songs nicht aufgenommen werden; ohne die Option\n"
+    u"gilt für die Standard-Datenbank die Standard-Bann-Liste"};
+// Loads the ban list of that option. Throws EStreamError when it cannot be read.
+void LoadBannListFor(TMusicDatabase& database, const QString& fileName, const Arguments& arguments);

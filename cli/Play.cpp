@@ -80,6 +80,7 @@ int RunPlay(const Arguments& arguments, Console& console) {
     PlaySessionOptions options;
     options.Paths = arguments.Operands();
     options.Order = ChoiceOf(arguments, u"--order", kOrders, options.Order);
+    options.Classic = arguments.Has(u"--classic");
     options.Repeat = arguments.Has(u"--repeat");
     options.ScanTime = TimeOf(arguments, u"--scan");
     options.Mode = ChoiceOf(arguments, u"--mode", kModes, options.Mode);
@@ -99,6 +100,7 @@ constexpr OptionRow kOptions[] = {
     {u"--mode", u"ART",
      u"wann überblendet wird: none, auto (am Ende eines Songs; Vorgabe),\n"
      u"all (auch bei n und p) oder always"},
+    {u"--classic", u"", u"blendet auch zwischen aufeinander folgenden Songs eines Albums über"},
     {u"--engine", u"ENGINE", u"nur diese: fmod, eldos, mci oder winamp (Vorgabe: fmod, ersatzweise mci)"},
     {u"--output", u"AUSGABE",
      u"null, file:DATEI.wav oder ein Treiber wie pulseaudio, pipewire\n"

@@ -4,6 +4,7 @@
 #include <QEventLoop>
 #include <QFileInfo>
 #include <QTimer>
+#include <algorithm>
 
 #include "CommonRUKTools/Clock.h"
 #include "MusicManagment/playback/Engines.h"
@@ -130,9 +131,14 @@ class Session {
         player_.SetPanel(&panel_);
         player_.SetPlayList(&list_);
         player_.SetEngines(options.Engines);
+        player_.SetKeepAlbums(!options.Classic);
         // The end of the list needs no message here.
         list_.OnAllFilesPlayed = [](TPlayList&, bool&) {};
-        player_.OnPlayingStarted = [this](TPlaySound&) { begun_ << list_.CurrentSong(); };
+        player_.OnPlayingStarted = [this](TPlaySound&) {
+            begun_ << list_.CurrentSong();
+            heard_ = true;
+        };
+        list_.SetModernLists(!options.Classic);
         list_.SetPlayOrder(options.Order);
         list_.SetRepeatAll(options.Repeat);
         if (options.ScanTime) list_.SetScanTime(*options.ScanTime);
@@ -141,6 +147,7 @@ class Session {
 
     int Run() {
         const bool complete = FillList();
+        RefuseToOverwrite();
         const InterruptGuard guard;
         if (list_.Count() > 0) list_.PlayNext();
         options_.Fast ? WriteMix() : Listen();
@@ -168,6 +175,20 @@ class Session {
         return complete;
     }
 
+    // The output begins as an empty file.
+    void RefuseToOverwrite() const {
+        if (!options_.Output || options_.Output->kind != OutputChoice::Kind::WavFile) return;
+        const QFileInfo output(options_.Output->name);
+        QStringList played = options_.Paths;
+        for (int i = 0; i < list_.Count(); ++i)
+            played << list_.Entry(i).Name;
+        if (output.exists() && std::ranges::find(played, output, [](const QString& path) {
+                                   return QFileInfo(path);
+                               }) != played.end())
+            throw EStreamError(u"Die Ausgabe würde überschreiben, was gespielt werden soll: "_s +
+                               options_.Output->name);
+    }
+
     // The sound stands still then, and no song would ever end.
     void TellOutputLost() {
         dialogs_.ShowMessage(
@@ -178,7 +199,17 @@ class Session {
 
     bool GoesOn() { return !Over() && !InterruptRequested() && !library_->OutputLost(); }
 
+    // A device that is plugged in again is worth waiting for when it has been there, or when somebody sits
+    // before the terminal; a file does not come back, and a script would hang.
+    bool WaitsForOutput() const {
+        const bool device = !options_.Output || (options_.Output->kind != OutputChoice::Kind::WavFile &&
+                                                 options_.Output->kind != OutputChoice::Kind::Null);
+        return player_.AwaitsOutput() && device && (heard_ || line_.IsWatched());
+    }
+
     bool Over() {
+        if (WaitsForOutput()) return false;
+        if (player_.AwaitsOutput()) return true;
         const PlayTimers& timers = player_.Timers();
         return !timers.Ticking() && !timers.EndPending() && player_.GetStatus() != psPaused;
     }
@@ -243,7 +274,8 @@ class Session {
     TPlayList list_;
     StatusLine panel_;
     TPlaySound player_;
-    QStringList begun_;  // songs whose line is still to be written
+    QStringList begun_;   // songs whose line is still to be written
+    bool heard_ = false;  // a song has begun
 };
 
 }  // namespace

@@ -35,6 +35,7 @@ int RunPlaylist(const Arguments& arguments, Console& console) {
     if (arguments.Has(u"--out") && arguments.Has(u"--json"))
         throw EUsageError(u"--out und --json schließen sich aus."_s);
     TPlayList list;
+    list.SetModernLists(!arguments.Has(u"--classic"));
     list.SetPlayListFileName(arguments.Operands().first());
     if (arguments.Has(u"--out"))
         list.Save(arguments.Value(u"--out"));
@@ -44,6 +45,7 @@ int RunPlaylist(const Arguments& arguments, Console& console) {
 }
 
 constexpr OptionRow kOptions[] = {
+    {u"--classic", u"", u"liest die PlayList nach den ursprünglichen Regeln des Programms"},
     {u"--json", u"", u"ein JSON-Objekt je Eintrag und Zeile"},
     {u"--out", u"DATEI2", u"schreibt die PlayList in diese Datei, statt sie zu zeigen"},
 };
@@ -53,9 +55,12 @@ constexpr OptionRow kOptions[] = {
 const CommandRow kPlaylistCommand = {
     u"playlist",
     u"Zeigt eine PlayList oder wandelt sie um",
-    u"Das Format einer PlayList wird an ihren ersten Bytes erkannt, das Format von DATEI2 richtet sich\n"
-    u"nach der Endung: .rukpl und .rpl eigenes Format, .m3u und .extpl M3U, .pls und .inipl PLS, alles\n"
-    u"andere ein Pfad je Zeile. Eine Zeile je Eintrag: Nummer (ab 0), Interpret, Titel, Länge und Name,\n"
+    u"Das Format einer PlayList wird an ihrem Inhalt erkannt, das Format von DATEI2 richtet sich nach der\n"
+    u"Endung: .rukpl und .rpl eigenes Format, .m3u, .m3u8 und .extpl M3U, .pls und .inipl PLS, alles\n"
+    u"andere ein Pfad je Zeile. Relative Namen gelten vom Ordner der PlayList aus. Mit --classic gelten die\n"
+    u"ursprünglichen Regeln: nur die ersten neun Bytes entscheiden, eine einfache Liste verliert sie,\n"
+    u"relative Namen gelten vom aktuellen Ordner aus, und Titel werden nur im eigenen Format gelesen.\n"
+    u"Eine Zeile je Eintrag: Nummer (ab 0), Interpret, Titel, Länge und Name,\n"
     u"durch Tabulatoren getrennt. Felder im JSON-Format: index, name und, wenn die PlayList sie enthält,\n"
     u"die Felder des Datensatzes, wie der Befehl info sie zeigt.\n",
     {.Name = u"DATEI", .Help = u"PlayList", .Several = false},

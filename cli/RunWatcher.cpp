@@ -9,28 +9,18 @@ namespace {
 
 constexpr qint64 kShowEveryMs = 100;
 
-// What the run is called, without the name of the component.
-QString RunName(const TMusicDatabase& database) {
-    const QString& caption = database.Caption();
-    return caption.mid(caption.indexOf(u" - "_s) + 3);
-}
-
 }  // namespace
 
 RunWatcher::RunWatcher(TMusicDatabase& database, Console& console, StopBy stopBy)
     : database_(database),
       line_(IsTerminal(console.ErrorStream()) ? console.ErrorStream() : nullptr),
       nextShow_(CurrentClock().Ticks() + kShowEveryMs) {
-    database_.OnProgress = [this, stopBy](TMusicDatabase&, const ProgressPoint& point) {
-        if (stopBy == StopBy::Interrupt && InterruptRequested()) database_.RequestAbort();
+    Operation& operation = database_.CurrentOperation();
+    watched_ += operation.Advanced.Subscribe([this, stopBy, &operation](const ProgressPoint& point) {
+        if (stopBy == StopBy::Interrupt && InterruptRequested()) operation.RequestStop();
         if (line_.IsWatched()) Show(point);
-    };
-    database_.OnEndProgress = [this](TMusicDatabase&) { line_.Erase(); };
-}
-
-RunWatcher::~RunWatcher() {
-    database_.OnProgress = nullptr;
-    database_.OnEndProgress = nullptr;
+    });
+    watched_ += operation.Ended.Subscribe([this] { line_.Erase(); });
 }
 
 void RunWatcher::Show(const ProgressPoint& point) {
@@ -38,7 +28,7 @@ void RunWatcher::Show(const ProgressPoint& point) {
     if (now < nextShow_) return;
     nextShow_ = now + kShowEveryMs;
     const int percent = database_.MainPercent();
-    QString text = RunName(database_);
+    QString text = database_.CurrentOperation().Title().value_or(QString());
     if (percent >= 0) text += u": "_s + QString::number(percent) + u" %"_s;
     if (!point.Description.isEmpty()) text += u"  "_s + point.Description;
     line_.Show(text);

@@ -14,9 +14,6 @@ enum class StopBy {
 class RunWatcher {
  public:
     RunWatcher(TMusicDatabase& database, Console& console, StopBy stopBy);
-    ~RunWatcher();
-    RunWatcher(const RunWatcher&) = delete;
-    RunWatcher& operator=(const RunWatcher&) = delete;
 
  private:
     void Show(const ProgressPoint& point);
@@ -24,4 +21,5 @@ class RunWatcher {
     TMusicDatabase& database_;
     TransientLine line_;
     qint64 nextShow_;  // ticks of the clock
+    Subscriptions watched_;
 };

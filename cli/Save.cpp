@@ -20,6 +20,7 @@ int RunSave(const Arguments& arguments, Console& console) {
     TMusicDatabase database;
     PrepareDatabase(database);
     database.SetCompression(ChoiceOf(arguments, u"--compression", kCompressions, database.Compression()));
+    ClaimFile(database, target);
     ReadInto(database, arguments.Value(u"--db"), console, StopBy::Interrupt);
     const RunWatcher watcher(database, console, StopBy::Interrupt);
     if (database.SaveDatabase(target)) return esDone;

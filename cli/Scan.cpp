@@ -51,20 +51,27 @@ void WriteResult(const IntakeResult& result, bool asJson, Console& console) {
 int RunScan(const Arguments& arguments, Console& console) {
     const QString fileName = arguments.Value(u"--db");
     const QStringList& paths = arguments.Operands();
-    const bool allThere = std::ranges::all_of(paths, FileSource::Exists);
+    const auto there = std::ranges::count_if(paths, FileSource::Exists);
+    const bool allThere = there == paths.size();
     RequireWritableFolder(fileName);
     const InterruptGuard guard;
     TMusicDatabase database;
-    PrepareDatabase(database);
-    database.SetModernTags(!arguments.Has(u"--classic"));
+    PrepareDatabase(database, arguments.Has(u"--classic") ? Rules::Classic : Rules::Modern);
+    LoadBannListFor(database, fileName, arguments);
+    ClaimFile(database, fileName);
     const bool isNew = !FileSource::Exists(fileName);
     if (!isNew) ReadInto(database, fileName, console, StopBy::Interrupt);
 
     const IntakeResult result = TakeIn(database, paths, !arguments.Has(u"--no-subfolders"), console);
-    if (isNew || database.Modified()) Save(database, fileName, console);
+    // A path that was mistyped is no reason to make a database.
+    if (isNew ? there > 0 : database.Modified()) Save(database, fileName, console);
     for (const QString& name : result.UnreadableNames)
         console.Message(Printable(name));
+    for (const QString& file : result.BannedFiles)
+        console.Message(u"In der Bann-Liste: "_s + Printable(file));
     WriteResult(result, arguments.Has(u"--json"), console);
+    if (isNew && there == 0)
+        console.Message(u"Es gibt keinen der Pfade; die Datenbank ist nicht angelegt worden."_s);
     if (result.Stopped)
         console.Message(u"Abgebrochen; die bis dahin aufgenommenen Songs sind gespeichert."_s);
     return result.Stopped || !allThere ? esFailed : esDone;
@@ -73,6 +80,7 @@ int RunScan(const Arguments& arguments, Console& console) {
 constexpr OptionRow kOptions[] = {
     {u"--db", u"DATENBANK", u"Datei der Sammlung (.tsdb); wird angelegt, wenn sie fehlt", true},
     {u"--no-subfolders", u"", u"durchsucht Ordner ohne ihre Unterordner"},
+    kBannListOption,
     {u"--classic", u"", u"liest die Tags nach den ursprünglichen Regeln des Programms"},
     {u"--json", u"", u"gibt das Ergebnis als ein JSON-Objekt aus"},
 };

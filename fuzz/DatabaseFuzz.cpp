@@ -12,6 +12,7 @@
 #include "CommonRUKTools/ByteWriter.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/tsdb/DatabaseFile.h"
+#include "tests/ScriptedDialogs.h"
 
 namespace {
 
@@ -41,6 +42,7 @@ void Check(const TMusicDatabase& database, bool failed) {
 }
 
 void Load(ByteSpan file) {
+    const ScriptedDialogs silent;
     MemorySource source(file);
     TMusicDatabase database;
     bool failed = false;

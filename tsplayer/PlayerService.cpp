@@ -13,40 +13,6 @@ T Bounded(qint64 value) {
                                      static_cast<qint64>(std::numeric_limits<T>::max())));
 }
 
-struct NumberSetting {
-    ExternalCommand command;
-    void (*set)(EngineSettings&, qint64 value);
-};
-
-constexpr NumberSetting kNumberSettings[] = {
-    {ecUseFMOD, [](EngineSettings& s, qint64 value) { s.UseFMOD = value != 0; }},
-    {ecUseMCI, [](EngineSettings& s, qint64 value) { s.UseMCI = value != 0; }},
-    {ecUseEldoS, [](EngineSettings& s, qint64 value) { s.UseEldoS = value != 0; }},
-    {ecUseWinAmp, [](EngineSettings& s, qint64 value) { s.UseWinAmp = value != 0; }},
-    {ecCrossoverTime, [](EngineSettings& s, qint64 value) { s.FMODCrossoverTime = Bounded<quint32>(value); }},
-    {ecFadingTime, [](EngineSettings& s, qint64 value) { s.FMODCrossoverTime = Bounded<quint32>(value); }},
-    {ecSoundOutputTypes,
-     [](EngineSettings& s, qint64 value) {
-         if (value >= FSOUND_OUTPUT_NOSOUND && value <= FSOUND_OUTPUT_XBOX)
-             s.FMODSoundOutputTypes = static_cast<TFSoundOutputTypes>(value);
-     }},
-    {ecMixRate, [](EngineSettings& s, qint64 value) { s.FMODMixRate = Bounded<int>(value); }},
-    {ecSoftChannels, [](EngineSettings& s, qint64 value) { s.FMODSoftChannels = Bounded<int>(value); }},
-    {ecBufferSize, [](EngineSettings& s, qint64 value) { s.FMODBufferSize = Bounded<int>(value); }},
-    {ecEldoSBufferCount, [](EngineSettings& s, qint64 value) { s.EldoSBufferCount = Bounded<int>(value); }},
-    {ecEldoSBufferSize, [](EngineSettings& s, qint64 value) { s.EldoSBufferSize = Bounded<int>(value); }},
-};
-
-struct TextSetting {
-    ExternalCommand command;
-    QString EngineSettings::*value;
-};
-
-constexpr TextSetting kTextSettings[] = {
-    {ecWinAmpClassName, &EngineSettings::WinAmpClassName},
-    {ecWinAmpFile, &EngineSettings::WinAmpFile},
-};
-
 constexpr bool IsText(int code) {
     return code == ecFadingFileName || code == ecOpenFile || code == ecPlayWithCrossFade ||
            code == ecWinAmpClassName || code == ecWinAmpFile;
@@ -80,14 +46,9 @@ qint64 PlayerService::Serve(const Frame& frame) {
 
 bool PlayerService::CarryOutSetting(const Frame& frame) {
     EngineSettings settings = player_.Engines();
-    const auto* number = std::ranges::find(kNumberSettings, frame.Code, &NumberSetting::command);
-    const auto* text = std::ranges::find(kTextSettings, frame.Code, &TextSetting::command);
-    if (number != std::end(kNumberSettings))
-        number->set(settings, frame.Number);
-    else if (text != std::end(kTextSettings))
-        settings.*text->value = frame.Text;
-    else
-        return false;
+    // The time of a fade is a setting under another number.
+    const int command = frame.Code == ecFadingTime ? ecCrossoverTime : static_cast<int>(frame.Code);
+    if (!TakeEngineSetting(settings, command, frame.Number, frame.Text)) return false;
     player_.SetEngines(settings);
     return true;
 }

@@ -5,6 +5,8 @@
 #include <QLabel>
 #include <QPushButton>
 
+#include "CommonRUKTools/CommandRunner.h"
+
 using namespace Qt::StringLiterals;
 
 namespace {
@@ -55,16 +57,10 @@ void PlayerWindow::AddButton(QWidget& row, const QString& caption, const char* i
                              void (TPlaySound::*operation)()) {
     auto* button = new QPushButton(QIcon::fromTheme(QLatin1StringView(icon)), caption, &row);
     row.layout()->addWidget(button);
-    connect(button, &QPushButton::clicked, this, [this, operation] {
-        message_->hide();
-        try {
-            (player_.*operation)();
-        } catch (const EAbort&) {
-            // The user has been told.
-        } catch (const ERukException& error) {
-            ShowMessage(MessageKind::Error, error.Message());
-        }
-    });
+    connect(button, &QPushButton::clicked, this, Guarded([this, operation] {
+                message_->hide();
+                (player_.*operation)();
+            }));
 }
 
 void PlayerWindow::ShowSong(const QString& fileName) {

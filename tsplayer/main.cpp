@@ -1,6 +1,7 @@
 #include <QApplication>
 #include <QTimer>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "MusicManagment/playback/Engines.h"
 #include "MusicManagment/playback/extern/PlayerChannel.h"
 #include "MusicManagment/playback/fmod/SoundLibrary.h"
@@ -18,7 +19,7 @@ constexpr int kWaitForController = 30000;  // ms
 }  // namespace
 
 int main(int argc, char** argv) {
-    QApplication application(argc, argv);
+    GuardedApplication<QApplication> application(argc, argv);
     QCoreApplication::setApplicationName(u"TSPlayer"_s);
     QCoreApplication::setApplicationVersion(QStringLiteral(TUNESTEAD_VERSION));
     const bool hidden = QCoreApplication::arguments().contains(u"/NoVisible"_s, Qt::CaseInsensitive);

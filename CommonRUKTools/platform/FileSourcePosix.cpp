@@ -7,13 +7,14 @@
 
 #include "CommonRUKTools/Errors.h"
 #include "CommonRUKTools/FileSource.h"
+#include "CommonRUKTools/SystemError.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
 
 QString SystemMessage(const QString& text, const QString& path, int error) {
-    return text + path + u": "_s + qt_error_string(error);
+    return text + path + u": "_s + SystemErrorText(error);
 }
 
 // The system would cut such a name at the zero character and find another file.

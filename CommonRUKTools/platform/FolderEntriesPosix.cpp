@@ -9,13 +9,14 @@
 #include "CommonRUKTools/CodePage.h"
 #include "CommonRUKTools/Errors.h"
 #include "CommonRUKTools/FolderEntries.h"
+#include "CommonRUKTools/SystemError.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
 
 [[noreturn]] void Fail(const QString& what, const QString& folder, int error) {
-    throw EStreamError(what + folder + u": "_s + qt_error_string(error));
+    throw EStreamError(what + folder + u": "_s + SystemErrorText(error));
 }
 
 EntryKind KindOfMode(mode_t mode) {
@@ -79,6 +80,13 @@ void SetName(std::string_view name, FolderEntry& entry) {
 }
 
 }  // namespace
+
+std::optional<FolderIdentity> IdentifyFolder(const QString& folder) {
+    struct stat status {};
+    if (::stat(QFile::encodeName(folder).constData(), &status) != 0 || !S_ISDIR(status.st_mode))
+        return std::nullopt;
+    return FolderIdentity{status.st_dev, status.st_ino};
+}
 
 struct FolderEntries::Handle {
     struct Close {

@@ -1,6 +1,7 @@
 #include <windows.h>
 
 #include <QDir>
+#include <QFileInfo>
 
 #include "CommonRUKTools/Errors.h"
 #include "CommonRUKTools/FolderEntries.h"
@@ -37,6 +38,15 @@ FolderIdentity IdentityOf(const QString& folder) {
 
 }  // namespace
 
+std::optional<FolderIdentity> IdentifyFolder(const QString& folder) {
+    if (!QFileInfo(folder).isDir()) return std::nullopt;
+    try {
+        return IdentityOf(folder);
+    } catch (const EStreamError&) {
+        return std::nullopt;  // it went meanwhile
+    }
+}
+
 struct FolderEntries::Handle {
     ~Handle() {
         if (Search != INVALID_HANDLE_VALUE) FindClose(Search);
@@ -71,6 +81,8 @@ bool FolderEntries::Next(FolderEntry& entry) {
         entry.Name = QString::fromWCharArray(handle_->Data.cFileName);
         entry.Kind = KindOf(handle_->Data.dwFileAttributes);
         entry.Reachable = true;
+        constexpr DWORD kHiddenBySystem = FILE_ATTRIBUTE_HIDDEN | FILE_ATTRIBUTE_SYSTEM;
+        entry.IsSystem = (handle_->Data.dwFileAttributes & kHiddenBySystem) == kHiddenBySystem;
         if (FindNextFileW(handle_->Search, &handle_->Data) == 0) {
             if (GetLastError() != ERROR_NO_MORE_FILES)
                 Fail(u"Kann den Ordner nicht weiter lesen: "_s, folder_, GetLastError());

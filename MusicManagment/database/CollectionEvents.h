@@ -32,4 +32,5 @@ struct CollectionEvents {
     // A medium has come or gone: songs look different, none has changed.
     Listeners<> MediaChanged;
     Listeners<> ModifiedChanged;
+    Listeners<> ReadOnlyChanged;
 };

@@ -1,15 +1,13 @@
 #include "MusicManagment/database/MusicManagment.h"
 
-#include <QCoreApplication>
-#include <QStandardPaths>
 #include <algorithm>
 #include <cmath>
 
 #include "CommonRUKTools/Clock.h"
 #include "CommonRUKTools/Collation.h"
-#include "CommonRUKTools/Dialogs.h"
+#include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/FileSource.h"
-#include "MusicManagment/database/commands/Menu.h"
+#include "CommonRUKTools/MusicFolder.h"
 #include "MusicManagment/database/intake/BannList.h"
 #include "MusicManagment/database/songfiles/RecycleBin.h"
 
@@ -63,8 +61,8 @@ void KeepLastOfEachSerial(std::vector<CdName>& names) {
 
 TMusicDatabase::TMusicDatabase(QObject* parent) : QObject(parent), mp3NamePattern_(u"%ARTIST% - %TITLE%"_s) {
     SubscribeSlots();
-    caption_ = u"MusicDatabase v6.0"_s;
-    SetMP3MoveRootDir(QStandardPaths::writableLocation(QStandardPaths::MusicLocation));
+    SubscribeProgressSlots();
+    SetMP3MoveRootDir(MusicFolder());
     // The list of an earlier version, which a component has until settings are loaded; the setter adds the
     // rest.
     SetMP3MoveSubDirs({u"Unsorted"_s, u"Alternative, Psychedelic, Punk, Funk"_s, u"Comedy"_s,
@@ -329,24 +327,7 @@ ReadOptions TMusicDatabase::AudioReadOptions() const {
 void TMusicDatabase::SetReadOnly(bool value) {
     if (value == readOnly_) return;
     readOnly_ = value;
-    menu_.reset();
-    if (OnMenuChanged) OnMenuChanged(*this);
-}
-
-// --- Command menu ---
-
-TMenuExItem& TMusicDatabase::Menu() {
-    if (!menu_) menu_ = BuildDatabaseMenu(readOnly_);
-    UpdateDatabaseMenu(*menu_, *this);
-    return *menu_;
-}
-
-bool TMusicDatabase::ClickMenuItem(int id, void* platformItem) {
-    const TMenuExItem* item = Menu().Find(id);
-    if (item == nullptr || !item->Enabled()) return false;
-    bool proceed = true;
-    if (OnMenuItemClicked) OnMenuItemClicked(*this, *item, platformItem, id, proceed);
-    return !proceed || RunDatabaseCommand(*this, id);
+    events_.ReadOnlyChanged.Tell();
 }
 
 // --- Automatic save ---
@@ -370,15 +351,8 @@ void TMusicDatabase::SetAutoSave(int interval) {
 void TMusicDatabase::AutoSaveTick() {
     if (autoSaveTimer_) autoSaveTimer_->stop();
     // A run in progress is not disturbed; the next tick comes.
-    if (!fileName_.isEmpty() && !progressRunning_) {
-        try {
-            SaveDatabase(fileName_, true);
-        } catch (const EAbort&) {
-            // The user has been told.
-        } catch (const ERukException& error) {
-            UserDialogs().ShowMessage(MessageKind::Error, error.Message());
-        }
-    }
+    if (!fileName_.isEmpty() && !ProgressRunning() && !fileLock_.IsElsewhere())
+        RunCommand([this] { SaveDatabase(fileName_, true); });
     if (autoSaveTimer_ && autoSave_ > 0) autoSaveTimer_->start(autoSave_);
 }
 
@@ -388,64 +362,38 @@ void TMusicDatabase::SaveAfterCommand() {
 
 // --- Long operations ---
 
+void TMusicDatabase::SubscribeProgressSlots() {
+    const auto raise = [this](TNotifyEvent TMusicDatabase::*slot) {
+        return [this, slot] {
+            if (this->*slot) (this->*slot)(*this);
+        };
+    };
+    progressSlots_ += operation_.Starting.Subscribe(raise(&TMusicDatabase::OnStartProgress));
+    progressSlots_ += operation_.TitleChanged.Subscribe(raise(&TMusicDatabase::OnCaptionChanged));
+    progressSlots_ += operation_.Reset.Subscribe(raise(&TMusicDatabase::OnResetProgress));
+    progressSlots_ += operation_.Ending.Subscribe(raise(&TMusicDatabase::OnEndProgress));
+    progressSlots_ += operation_.Advanced.Subscribe([this](const ProgressPoint& point) {
+        if (OnProgress) OnProgress(*this, point);
+    });
+}
+
+QString TMusicDatabase::Caption() const {
+    const auto& run = operation_.Title();
+    return run ? u"MusicDatabase v6.0 - "_s + *run : u"MusicDatabase v6.0"_s;
+}
+
 void TMusicDatabase::StartProgress(const QString& description, bool lockMenu) {
-    if (progressRunning_) {
-        UserDialogs().ShowMessage(
-            MessageKind::Warning,
-            u"Warten Sie, bis der gerade laufende Vorgang beendet wurde oder brechen Sie ihn ab."_s);
-        throw EAbort();
-    }
-    ResetProgress();
-    caption_ = u"MusicDatabase v6.0 - "_s + description;
-    if (OnStartProgress) OnStartProgress(*this);
-    if (OnCaptionChanged) OnCaptionChanged(*this);
-    progressRunning_ = true;
-    abortRequested_ = false;
-    if (lockMenu) menuLocked_ = true;
+    operation_.Start(description, lockMenu ? Operation::Commands::Rest : Operation::Commands::Stay);
 }
 
 bool TMusicDatabase::Progress(const ProgressPoint& point, bool resetAbort, bool report) {
-    lastProgress_ = point;
-    if (report) ReportProgress();
-    if (asynchronous_ && QCoreApplication::instance() != nullptr) QCoreApplication::processEvents();
-    if (!abortRequested_) return false;
-    if (resetAbort) abortRequested_ = false;
-    return true;
-}
-
-void TMusicDatabase::ReportProgress() {
-    const auto normalise = [](qint64& current, qint64& maximum) {
-        if (maximum != -1) return;
-        maximum = current == -1 ? 0 : 100;
-        if (current == -1) current = 0;
-    };
-    const auto percent = [](qint64 current, qint64 maximum) {
-        return maximum > 0
-                   ? static_cast<int>(100.0 / static_cast<double>(maximum) * static_cast<double>(current))
-                   : -1;
-    };
-    normalise(lastProgress_.Cur, lastProgress_.Max);
-    normalise(lastProgress_.CurSub, lastProgress_.MaxSub);
-    mainPercent_ = percent(lastProgress_.Cur, lastProgress_.Max);
-    subPercent_ = percent(lastProgress_.CurSub, lastProgress_.MaxSub);
-    if (OnProgress) OnProgress(*this, lastProgress_);
+    const bool stop = operation_.Reach(point, report ? Operation::Point::Told : Operation::Point::Kept);
+    if (resetAbort) operation_.ForgetStop();
+    return stop;
 }
 
 void TMusicDatabase::EndProgress(bool unlockMenu) {
-    if (unlockMenu) menuLocked_ = false;
-    progressRunning_ = false;
-    abortRequested_ = false;
-    caption_ = u"MusicDatabase v6.0"_s;
-    if (OnCaptionChanged) OnCaptionChanged(*this);
-    if (OnEndProgress) OnEndProgress(*this);
-    ResetProgress();
-}
-
-void TMusicDatabase::ResetProgress() {
-    lastProgress_ = ProgressPoint();
-    mainPercent_ = -1;
-    subPercent_ = -1;
-    if (OnResetProgress) OnResetProgress(*this);
+    operation_.End(unlockMenu ? Operation::Commands::Stay : Operation::Commands::Rest);
 }
 
 // --- Events ---

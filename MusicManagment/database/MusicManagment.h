@@ -10,9 +10,10 @@
 #include <optional>
 
 #include "CommonRUKTools/Errors.h"
-#include "CommonRUKTools/MenuItem.h"
 #include "MusicManagment/database/CollectionEvents.h"
+#include "MusicManagment/database/DatabaseLock.h"
 #include "MusicManagment/database/GroupLists.h"
+#include "MusicManagment/database/Operation.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/SongList.h"
 #include "MusicManagment/database/SongTypes.h"
@@ -21,7 +22,9 @@
 #include "ReadMPEGHeader/AudioFile.h"
 
 class CollectionEdit;
+class DatabaseMenu;
 class SettingsClient;
+class TMenuExItem;
 class TMusicDatabase;
 
 class EMusicDatabaseException : public ERukException {
@@ -126,6 +129,8 @@ class TMusicDatabase : public QObject {
     bool OpenDatabase(const QString& fileName, bool keepName = false);
     // Asks for the file first; false also when the user cancelled.
     bool OpenDatabaseFromDialog();
+    // Keeps other programs from writing the file meanwhile; the programs switch it on.
+    DatabaseLock& Lock() { return fileLock_; }
 
     // --- Summary lists: caption and number of songs of each row ---
     const GroupLists& Groups() const { return groups_; }
@@ -151,12 +156,12 @@ class TMusicDatabase : public QObject {
     void SetUpdateFolders(const QStringList& folders) { updateFolders_ = folders; }
     SortedTextList& BannList() { return bannList_; }
     const SortedTextList& BannList() const { return bannList_; }
-    const QString& Caption() const { return caption_; }
+    QString Caption() const;
     int Compression() const { return compression_; }
     // A TCompressionLevel. Throws EMusicDatabaseException for any other number.
     void SetCompression(int level);
-    bool Asynchronous() const { return asynchronous_; }
-    void SetAsynchronous(bool value) { asynchronous_ = value; }
+    bool Asynchronous() const { return operation_.LetsInterfaceWork(); }
+    void SetAsynchronous(bool value) { operation_.SetLetsInterfaceWork(value); }
     bool AutoDelBannedFiles() const { return autoDelBannedFiles_; }
     void SetAutoDelBannedFiles(bool value) { autoDelBannedFiles_ = value; }
     TSortType SortType() const { return order_.SortType; }
@@ -196,6 +201,10 @@ class TMusicDatabase : public QObject {
     // Whether files are read with the modern profile; off in a new component, switched on by the programs.
     bool ModernTags() const { return modernTags_; }
     void SetModernTags(bool value) { modernTags_ = value; }
+    // Whether songs of old database files stay when their audio files cannot be found; off in a new
+    // component, switched on by the programs.
+    bool KeepLostSongs() const { return keepLostSongs_; }
+    void SetKeepLostSongs(bool value) { keepLostSongs_ = value; }
 
     // Linked components; each reference clears itself when the other goes.
     QObject* PlayList() const { return playList_; }
@@ -206,18 +215,20 @@ class TMusicDatabase : public QObject {
     void SetRemoteControl(QObject* component) { remoteControl_ = component; }
 
     // --- Long operations ---
-    // Shows a message and throws EAbort when a run is going. Prefer the ProgressRun object of Progress.h.
+    // Whoever shows it subscribes to it; who works begins it with the ProgressRun object of Progress.h.
+    Operation& CurrentOperation() { return operation_; }
+    const Operation& CurrentOperation() const { return operation_; }
+    // The same in other words. The first shows a message and throws EAbort when a run is going; the second is
+    // true when the user asked to stop.
     void StartProgress(const QString& description, bool lockMenu);
-    // Raises OnProgress, lets the interface work when Asynchronous; true when the user asked to stop.
     bool Progress(const ProgressPoint& point, bool resetAbort = false, bool report = true);
     void EndProgress(bool unlockMenu);
-    void ResetProgress();
-    void RequestAbort() { abortRequested_ = true; }
-    bool ProgressRunning() const { return progressRunning_; }
-    bool MenuLocked() const { return menuLocked_; }
-    const ProgressPoint& LastProgress() const { return lastProgress_; }
-    int MainPercent() const { return mainPercent_; }  // -1 unknown
-    int SubPercent() const { return subPercent_; }
+    void RequestAbort() { operation_.RequestStop(); }
+    bool ProgressRunning() const { return operation_.Running(); }
+    bool MenuLocked() const { return operation_.CommandsRest(); }
+    const ProgressPoint& LastProgress() const { return operation_.LastPoint(); }
+    int MainPercent() const { return operation_.MainPercent(); }  // -1 unknown
+    int SubPercent() const { return operation_.SubPercent(); }
 
     // While above 0 the song list must not change.
     bool Busy() const { return busy_ > 0; }
@@ -240,11 +251,12 @@ class TMusicDatabase : public QObject {
     // Saves at once when AutoSave is -1; called at the end of every command that changes songs.
     void SaveAfterCommand();
 
-    // --- Command menu (Menu.h) ---
+    // --- Command menu (commands/Menu.h, which knows the commands of all capabilities) ---
+    DatabaseMenu& Commands();
     // Built at the first call and kept until ReadOnly changes.
     TMenuExItem& Menu();
-    // Raises OnMenuItemClicked and then, unless the handler stops it, runs the operation behind the item.
-    // False when nobody knew the command. Throws what the operation throws.
+    // Raises OnMenuItemClicked and then, unless the handler stops it, runs the command behind the item. False
+    // when it can do nothing now. Throws what the command throws.
     bool ClickMenuItem(int id, void* platformItem = nullptr);
 
     // --- Settings (Settings.h) ---
@@ -265,7 +277,6 @@ class TMusicDatabase : public QObject {
 
     // One slot each, told before all who have subscribed since.
     TNotifyEvent OnModifiedChange;
-    TNotifyEvent OnMenuChanged;  // the menu has gone, the next call builds another
     TChangeEvent OnChange;
     TNotifyEvent OnClear;
     std::function<void(TMusicDatabase&, int count)> OnPrepareMultiAdd;
@@ -289,7 +300,7 @@ class TMusicDatabase : public QObject {
  private:
     friend class CollectionEdit;
 
-    void ReportProgress();
+    void SubscribeProgressSlots();
     bool Accepts(const TID3Tag& record);
     TID3Tag PutRecord(SongIndex index, TID3Tag record);
     SongIndex ChangeSong(SongIndex index, TID3Tag record);
@@ -306,11 +317,11 @@ class TMusicDatabase : public QObject {
     bool maybeUnsorted_ = false;  // after reading a file, until the order has been looked at
 
     QString fileName_;
-    QString caption_;
     QStringList updateFolders_;
     SortedTextList bannList_;
     std::vector<CdName> cdNames_;
-    std::unique_ptr<TMenuExItem> menu_;
+    // Shared for the sake of its deleter: what it is need not be known here.
+    std::shared_ptr<DatabaseMenu> commands_;
     ConversionSettings conversion_;
     std::vector<SettingsClient*> settingsClients_;
     QString mp3MoveRootDir_;
@@ -319,7 +330,6 @@ class TMusicDatabase : public QObject {
     int autoSave_ = 0;
     TCompressionLevel compression_ = clFastest;
     bool modified_ = false;
-    bool asynchronous_ = true;
     bool autoDelBannedFiles_ = false;
     bool followFocus_ = true;
     bool moveMP3sAfterGenreChange_ = false;
@@ -327,18 +337,16 @@ class TMusicDatabase : public QObject {
     bool readOnly_ = false;
     bool renameAndMoveMP3s_ = true;
     bool modernTags_ = false;
+    bool keepLostSongs_ = false;
+    DatabaseLock fileLock_{*this};
 
     QPointer<QObject> playList_;
     QPointer<QObject> playSound_;
     QPointer<QObject> remoteControl_;
     std::unique_ptr<QTimer> autoSaveTimer_;
 
-    ProgressPoint lastProgress_;
-    int mainPercent_ = -1;
-    int subPercent_ = -1;
-    bool progressRunning_ = false;
-    bool abortRequested_ = false;
-    bool menuLocked_ = false;
+    Operation operation_;
+    Subscriptions progressSlots_;
     int busy_ = 0;
     int loading_ = 0;
 };

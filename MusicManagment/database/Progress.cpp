@@ -2,13 +2,9 @@
 
 #include "MusicManagment/database/MusicManagment.h"
 
-ProgressRun::ProgressRun(TMusicDatabase& database, const QString& description, bool lockMenu)
-    : database_(database), lockMenu_(lockMenu) {
-    database_.StartProgress(description, lockMenu);
-}
-
-ProgressRun::~ProgressRun() {
-    database_.EndProgress(lockMenu_);
+ProgressRun::ProgressRun(TMusicDatabase& database, const QString& description, Operation::Commands commands)
+    : operation_(database.CurrentOperation()) {
+    operation_.Start(description, commands);
 }
 
 void RefuseDuringRun(TMusicDatabase& database) {

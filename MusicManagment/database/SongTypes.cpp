@@ -1,5 +1,7 @@
 #include "MusicManagment/database/SongTypes.h"
 
+#include <algorithm>
+
 using namespace Qt::StringLiterals;
 
 QString FormatSongFlags(quint32 flags) {
@@ -36,4 +38,14 @@ QStringList DefaultGenreFolderNames() {
             u"Dance"_s,
             u"Hip-Hop"_s,
             u"Classic"_s};
+}
+
+qsizetype LastSeparator(const QString& path) {
+    const qsizetype slash = path.lastIndexOf(u'/');
+    return IsCdPath(path) ? std::max(slash, path.lastIndexOf(u'\\')) : slash;
+}
+
+QString FolderOf(const QString& path) {
+    const qsizetype separator = LastSeparator(path);
+    return path.left(std::max<qsizetype>(separator, separator == 0 ? 1 : 0));
 }

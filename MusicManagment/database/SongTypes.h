@@ -20,6 +20,7 @@ enum TSortType {
     stAddTime,
     stFlags,
     stCacheType,
+    stAlbumOrder,  // album, folder, track: as the songs of an album follow each other
 };
 
 // What decides between songs that are equal under the sort type.
@@ -62,3 +63,8 @@ QStringList DefaultGenreFolderNames();
 inline bool IsCdPath(const QString& path) {
     return path.startsWith(u':');
 }
+// Before the name of the file in a stored path; -1 when it is only a name. A path on a CD keeps its own
+// separators on every system.
+qsizetype LastSeparator(const QString& path);
+// Without a separator at its end, unless it is the root.
+QString FolderOf(const QString& path);

@@ -15,36 +15,6 @@ constexpr QStringView kProgram = u"TSPlayer.exe";
 constexpr QStringView kProgram = u"TSPlayer";
 #endif
 
-struct NumberRow {
-    ExternalCommand Command;
-    qint64 (*Value)(const EngineSettings&);
-};
-
-// In the order in which a new player program is told.
-constexpr NumberRow kNumbers[] = {
-    {ecUseFMOD, [](const EngineSettings& s) -> qint64 { return s.UseFMOD; }},
-    {ecUseMCI, [](const EngineSettings& s) -> qint64 { return s.UseMCI; }},
-    {ecUseEldoS, [](const EngineSettings& s) -> qint64 { return s.UseEldoS; }},
-    {ecUseWinAmp, [](const EngineSettings& s) -> qint64 { return s.UseWinAmp; }},
-    {ecCrossoverTime, [](const EngineSettings& s) -> qint64 { return s.FMODCrossoverTime; }},
-    {ecSoundOutputTypes, [](const EngineSettings& s) -> qint64 { return s.FMODSoundOutputTypes; }},
-    {ecMixRate, [](const EngineSettings& s) -> qint64 { return s.FMODMixRate; }},
-    {ecSoftChannels, [](const EngineSettings& s) -> qint64 { return s.FMODSoftChannels; }},
-    {ecBufferSize, [](const EngineSettings& s) -> qint64 { return s.FMODBufferSize; }},
-    {ecEldoSBufferCount, [](const EngineSettings& s) -> qint64 { return s.EldoSBufferCount; }},
-    {ecEldoSBufferSize, [](const EngineSettings& s) -> qint64 { return s.EldoSBufferSize; }},
-};
-
-struct TextRow {
-    ExternalCommand Command;
-    QString EngineSettings::*Value;
-};
-
-constexpr TextRow kTexts[] = {
-    {ecWinAmpClassName, &EngineSettings::WinAmpClassName},
-    {ecWinAmpFile, &EngineSettings::WinAmpFile},
-};
-
 }  // namespace
 
 ExternalLink::Reached ExternalLink::Find(const EngineSettings& settings) {
@@ -76,10 +46,8 @@ bool ExternalLink::Start() {
 void ExternalLink::Greet(const EngineSettings& settings) {
     MakeFeedback();
     Send(ecFeedbackHandle, *feedback_);
-    for (const NumberRow& row : kNumbers)
-        Send(row.Command, row.Value(settings));
-    for (const TextRow& row : kTexts)
-        SendText(row.Command, settings.*row.Value);
+    ForEachSetting(PlayerSettings::kEngines,
+                   [&](const auto& setting) { SendSetting(setting.Command, setting.Of(settings)); });
 }
 
 void ExternalLink::MakeFeedback() {
@@ -95,8 +63,7 @@ void ExternalLink::MakeFeedback() {
 
 void ExternalLink::SendChanges(const EngineSettings& before, const EngineSettings& after) {
     if (!Runs()) return;  // a new one is told everything when it is met
-    for (const NumberRow& row : kNumbers)
-        if (row.Value(before) != row.Value(after)) Send(row.Command, row.Value(after));
-    for (const TextRow& row : kTexts)
-        if (before.*row.Value != after.*row.Value) SendText(row.Command, after.*row.Value);
+    ForEachSetting(PlayerSettings::kEngines, [&](const auto& setting) {
+        if (setting.Of(before) != setting.Of(after)) SendSetting(setting.Command, setting.Of(after));
+    });
 }

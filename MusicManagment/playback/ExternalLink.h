@@ -39,6 +39,8 @@ class ExternalLink {
     bool Start();
     void Greet(const EngineSettings& settings);
     void MakeFeedback();
+    void SendSetting(ExternalCommand command, qint64 number) { Send(command, number); }
+    void SendSetting(ExternalCommand command, const QString& text) { SendText(command, text); }
 
     std::unique_ptr<ExternalPlayer> player_;
     FeedbackReceiver& receiver_;

@@ -8,7 +8,6 @@
 #include <utility>
 
 #include "CommonRUKTools/Clock.h"
-#include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/playback/ExternalTarget.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 
@@ -16,9 +15,8 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr int kWaitRound = 250;          // ms
-constexpr qint64 kStep = 10000;          // ms, of the menu's commands back and forward
-constexpr int kLongestInterval = 10000;  // ms, of a stored timer interval
+constexpr int kWaitRound = 250;  // ms
+constexpr qint64 kStep = 10000;  // ms, of the menu's commands back and forward
 
 }  // namespace
 
@@ -316,27 +314,4 @@ SongIndex TPlaySound::SongInDatabase() const {
     const SongIndex song = database_->IndexOf(fileName_);
     if (song >= 0 || !playList_ || playList_->CurrentFile() != fileName_) return song;
     return database_->IndexOf(playList_->CurrentSong());
-}
-
-// --- Settings ---
-
-void TPlaySound::LoadSettings(const TRWReg& settings) {
-    EngineSettings engines = settings_;
-    LoadEngineSettings(engines, settings);
-    SetEngines(engines);
-    if (const auto autoPlay = settings.ReadBool(u"PSAutoPlay"_s)) SetAutoPlay(*autoPlay);
-    if (const auto playExtern = settings.ReadBool(u"PSPlayExtern"_s)) SetPlayExtern(*playExtern);
-    const auto interval = settings.ReadInteger(u"PSTimerInterval"_s);
-    if (interval && *interval >= 1 && *interval <= kLongestInterval) SetTimerInterval(*interval);
-    const auto mode = settings.ReadInteger(u"Crossover"_s);
-    if (panel_ != nullptr && mode && *mode >= coNone && *mode <= coAlways)
-        panel_->SetCrossover(static_cast<TCrossover>(*mode));
-}
-
-void TPlaySound::SaveSettings(TRWReg& settings) const {
-    SaveEngineSettings(settings_, settings);
-    settings.WriteBool(u"PSAutoPlay"_s, autoPlay_);
-    settings.WriteBool(u"PSPlayExtern"_s, playExtern_);
-    settings.WriteInteger(u"PSTimerInterval"_s, timerInterval_);
-    if (panel_ != nullptr) settings.WriteInteger(u"Crossover"_s, panel_->Crossover());
 }

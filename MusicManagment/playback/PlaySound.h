@@ -94,6 +94,14 @@ class TPlaySound : public TPlaySoundContainer,
     const EngineSettings& Engines() const { return settings_; }
     // They hold from the next song on. A reachable external player is told of each change.
     void SetEngines(const EngineSettings& settings);
+    // Modern rules, off by default. Songs that follow one another on an album (track n + 1, same album, and
+    // same artist or folder) are not faded into each other at their end.
+    bool KeepAlbums() const { return keepAlbums_; }
+    void SetKeepAlbums(bool value) { keepAlbums_ = value; }
+    // Songs that are passed over are told in one line each (Events().Notice), not in boxes. Who asks for one
+    // song gets its exception either way.
+    bool QuietFailures() const { return quietFailures_; }
+    void SetQuietFailures(bool value) { quietFailures_ = value; }
     bool PlayExtern() const { return playExtern_; }
     // Closes the song here and opens it there, or the other way round. Without a way to external players
     // nothing changes.
@@ -181,6 +189,8 @@ class TPlaySound : public TPlaySoundContainer,
 
     // PlaySoundFades.cpp
     bool FadesWanted() const;
+    std::optional<TID3Tag> RecordOf(const QString& path) const;
+    bool ContinuesAlbum(const QString& path) const;
 
     // PlaySoundOutput.cpp
     void GuardOutput(bool begun, const std::function<void()>& action);
@@ -229,6 +239,9 @@ class TPlaySound : public TPlaySoundContainer,
     int autoStop_ = 0;         // ms
     bool autoPlay_ = false;
     bool playExtern_ = false;
+    bool keepAlbums_ = false;
+    bool quietFailures_ = false;
+    std::optional<TID3Tag> ending_;  // whose album is kept together, while the song after it is asked for
     bool endReached_ = false;
     bool crossFadeStarted_ = false;
 

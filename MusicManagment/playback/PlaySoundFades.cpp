@@ -1,7 +1,19 @@
+#include <QFileInfo>
+
 #include "MusicManagment/playback/ExternalTarget.h"
 #include "MusicManagment/playback/PlaySound.h"
 
 // Two songs at once.
+
+namespace {
+
+bool IsNextOnAlbum(const TID3Tag& song, const TID3Tag& next) {
+    const auto folder = [](const TID3Tag& tag) { return QFileInfo(tag.FileName).path(); };
+    return !song.Album.isEmpty() && song.Album == next.Album && song.Track > 0 &&
+           next.Track == song.Track + 1 && (song.Artist == next.Artist || folder(song) == folder(next));
+}
+
+}  // namespace
 
 TCrossover TPlaySound::Crossover() const {
     if (controller_ != nullptr) return controller_->AskCrossover();
@@ -12,7 +24,22 @@ bool TPlaySound::FadesWanted() const {
     return settings_.FMODCrossoverTime >= kShortestFade && Crossover() != coNone;
 }
 
+// What plays can be a copy of what is listed.
+std::optional<TID3Tag> TPlaySound::RecordOf(const QString& path) const {
+    const bool listed = playList_ && playList_->CurrentFile() == path;
+    const int entry = listed ? playList_->IndexOf() : -1;
+    if (entry >= 0 && playList_->Entry(entry).Record) return *playList_->Entry(entry).Record;
+    const TID3Tag* song = database_ ? database_->Songs().Find(path) : nullptr;
+    return song != nullptr ? std::optional(*song) : std::nullopt;
+}
+
+bool TPlaySound::ContinuesAlbum(const QString& path) const {
+    const auto next = ending_ ? RecordOf(path) : std::nullopt;
+    return next && IsNextOnAlbum(*ending_, *next);
+}
+
 bool TPlaySound::PlayWithCrossFade(const QString& path) {
+    if (ContinuesAlbum(path)) return false;
     const Carried done = Reached(fileName_).CrossFadeTo(path);
     if (done == Carried::Not) return false;
     // A song that is faded in counts as well, though its name does not go through SetFileName.

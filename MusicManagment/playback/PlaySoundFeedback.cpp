@@ -45,6 +45,7 @@ void TPlaySound::RunGuarded(const std::function<void()>& action, const std::func
 // box.
 void TPlaySound::TellFailure(const QString& text) {
     events_.Notice.Tell(text);
+    if (quietFailures_) return;
     if (!untold_.contains(text)) untold_ << text;  // a list that is repeated fails for ever
     if (telling_) return;
     const QScopedValueRollback<bool> telling(telling_, true);
@@ -59,7 +60,8 @@ void TPlaySound::TellFailure(const QString& text) {
 
 // An engine has refused a song, and another one is tried.
 void TPlaySound::TellRefusal(const QString& text) {
-    TellWhileOpening(MessageKind::Warning, text);
+    events_.Notice.Tell(text);
+    if (!quietFailures_) TellWhileOpening(MessageKind::Warning, text);
 }
 
 // Whoever opens or closes a song while the message stands has the last word.

@@ -1,3 +1,4 @@
+#include <QScopedValueRollback>
 #include <limits>
 
 #include "CommonRUKTools/Clock.h"
@@ -120,9 +121,11 @@ void TPlaySound::CountSong() {
 // --- The next song ---
 
 void TPlaySound::AskForNextSong(SongChange change) {
+    const bool atEnd = change == SongChange::CrossFadeOnly;
+    const QScopedValueRollback ending(ending_, keepAlbums_ && atEnd ? RecordOf(fileName_) : std::nullopt);
     if (!playList_) return PlayNextOfDatabase(change);
     // Where nothing follows the user is told at the end of the song, not when it would be faded.
-    if (change == SongChange::CrossFadeOnly && !playList_->HasNext()) return;
+    if (atEnd && !playList_->HasNext()) return;
     playList_->PlayNext(change);
 }
 

@@ -1,5 +1,6 @@
 #include <QFileInfo>
 #include <algorithm>
+#include <functional>
 #include <optional>
 
 #include "CommonRUKTools/AbsolutePath.h"
@@ -7,9 +8,7 @@
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/intake/FolderWalk.h"
 #include "MusicManagment/database/intake/Intake.h"
-#include "MusicManagment/playlist/ListRecognition.h"
 #include "MusicManagment/playlist/PlayList.h"
-#include "MusicManagment/playlist/PlayListFiles.h"
 
 // Files from outside become entries.
 
@@ -42,9 +41,13 @@ class DropProgress {
     std::optional<ProgressRun> run_;
 };
 
+// The entries of a file that is a playlist.
+using ListReading = std::function<std::optional<std::vector<PlayListEntry>>(const QString& path)>;
+
 // Appends what a path stands for: a playlist for its entries, a folder for the songs in it, what is not there
 // for nothing. False when the user wants to stop.
-bool Expand(const QString& path, DropProgress& progress, std::vector<PlayListEntry>& entries) {
+bool Expand(const QString& path, const ListReading& readIfList, DropProgress& progress,
+            std::vector<PlayListEntry>& entries) {
     const auto report = [&progress](const QString& folder) {
         return progress.Report({.Description = folder});
     };
@@ -56,10 +59,11 @@ bool Expand(const QString& path, DropProgress& progress, std::vector<PlayListEnt
         if (!walk.Walk(path, files)) return false;
         for (const QString& file : files)
             entries.push_back({.Name = file});
-    } else if (info.isFile() && IsPlayListName(path)) {
-        std::ranges::move(ReadPlayList(path), std::back_inserter(entries));
     } else if (info.isFile()) {
-        entries.push_back({.Name = path});
+        if (auto listed = readIfList(path))
+            std::ranges::move(*listed, std::back_inserter(entries));
+        else
+            entries.push_back({.Name = path});
     }
     return true;
 }
@@ -69,9 +73,12 @@ bool Expand(const QString& path, DropProgress& progress, std::vector<PlayListEnt
 // What was read before the user stopped is kept.
 std::vector<PlayListEntry> TPlayList::EntriesFor(const QStringList& paths) const {
     DropProgress progress(database_);
+    const ListReading readIfList = [this](const QString& path) {
+        return rules_->IsListName(path) ? std::optional(ReadList(path)) : std::nullopt;
+    };
     std::vector<PlayListEntry> entries;
     for (const QString& path : paths)
-        if (!Expand(AbsolutePath(path), progress, entries)) return {};
+        if (!Expand(AbsolutePath(path), readIfList, progress, entries)) return {};
     for (std::size_t i = 0; i < entries.size(); ++i) {
         PlayListEntry& entry = entries[i];
         if (i % kEntriesPerProgressPoint == 0 && progress.Report({.Cur = static_cast<qint64>(i),

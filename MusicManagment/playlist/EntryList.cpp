@@ -8,25 +8,44 @@ qint64 SecondsOf(const PlayListEntry& entry) {
     return entry.Record ? entry.Record->Length : 0;
 }
 
-}  // namespace
-
-int EntryList::Find(const QString& name) const {
-    if (name.isEmpty()) return -1;
+template <typename List, typename Predicate>
+int FirstThat(const List& items, Predicate fits) {
     int index = 0;
-    for (const auto& entry : entries_) {
-        if (entry->Name == name) return index;
+    for (const auto& item : items) {
+        if (fits(item)) return index;
         ++index;
     }
     return -1;
 }
 
-void EntryList::Insert(int position, PlayListEntry entry) {
+}  // namespace
+
+int EntryList::Find(const QString& name) const {
+    if (name.isEmpty()) return -1;
+    return FirstThat(items_, [&name](const Item& item) { return item.Entry->Name == name; });
+}
+
+int EntryList::Find(EntryId id) const {
+    if (id == 0) return -1;
+    return FirstThat(items_, [id](const Item& item) { return item.Id == id; });
+}
+
+int EntryList::Find(const RememberedEntry& entry) const {
+    const int index = Find(entry.Id);
+    return index >= 0 ? index : Find(entry.Name);
+}
+
+EntryList::Item EntryList::MakeItem(PlayListEntry entry) {
     seconds_ += SecondsOf(entry);
-    entries_.insert(static_cast<std::size_t>(position), std::make_unique<PlayListEntry>(std::move(entry)));
+    return {std::make_unique<PlayListEntry>(std::move(entry)), ++lastId_};
+}
+
+void EntryList::Insert(int position, PlayListEntry entry) {
+    items_.insert(static_cast<std::size_t>(position), MakeItem(std::move(entry)));
 }
 
 void EntryList::SetRecord(int index, TID3Tag record) {
-    PlayListEntry& entry = *entries_[static_cast<std::size_t>(index)];
+    PlayListEntry& entry = *ItemAt(index).Entry;
     seconds_ -= SecondsOf(entry);
     entry.Record = std::move(record);
     seconds_ += SecondsOf(entry);
@@ -34,39 +53,40 @@ void EntryList::SetRecord(int index, TID3Tag record) {
 
 void EntryList::Remove(int index) {
     seconds_ -= SecondsOf(At(index));
-    entries_.removeAt(static_cast<std::size_t>(index));
+    items_.removeAt(static_cast<std::size_t>(index));
 }
 
 void EntryList::Clear() {
-    entries_.clear();
+    items_.clear();
     seconds_ = 0;
 }
 
 void EntryList::Assign(std::vector<PlayListEntry> entries) {
     Clear();
-    std::vector<std::unique_ptr<PlayListEntry>> owned;
-    owned.reserve(entries.size());
-    for (PlayListEntry& entry : entries) {
-        seconds_ += SecondsOf(entry);
-        owned.push_back(std::make_unique<PlayListEntry>(std::move(entry)));
-    }
-    entries_.assign(std::move(owned));
+    std::vector<Item> items;
+    items.reserve(entries.size());
+    for (PlayListEntry& entry : entries)
+        items.push_back(MakeItem(std::move(entry)));
+    items_.assign(std::move(items));
 }
 
-int EntryList::Move(const std::vector<int>& indices, int before) {
-    auto entries = entries_.takeAll();
-    std::vector<bool> moves(entries.size(), false);
-    for (const int index : indices)
-        moves[static_cast<std::size_t>(index)] = true;
+std::vector<int> EntryList::Move(const std::vector<int>& indices, int before) {
+    std::vector<int> former;
+    former.reserve(items_.size());
+    const auto addOthers = [&](int first, int last) {
+        for (int index = first; index < last; ++index)
+            if (!std::ranges::binary_search(indices, index)) former.push_back(index);
+    };
+    before = std::clamp(before, 0, Count());
+    addOthers(0, before);
+    former.insert(former.end(), indices.begin(), indices.end());
+    addOthers(before, Count());
 
-    std::vector<std::unique_ptr<PlayListEntry>> above, moved, below;
-    for (std::size_t i = 0; i < entries.size(); ++i) {
-        auto& target = moves[i] ? moved : static_cast<int>(i) < before ? above : below;
-        target.push_back(std::move(entries[i]));
-    }
-    const auto first = static_cast<int>(above.size());
-    std::ranges::move(moved, std::back_inserter(above));
-    std::ranges::move(below, std::back_inserter(above));
-    entries_.assign(std::move(above));
-    return first;
+    auto items = items_.takeAll();
+    std::vector<Item> moved;
+    moved.reserve(items.size());
+    for (const int index : former)
+        moved.push_back(std::move(items[static_cast<std::size_t>(index)]));
+    items_.assign(std::move(moved));
+    return former;
 }

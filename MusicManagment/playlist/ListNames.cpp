@@ -57,9 +57,14 @@ QString LocalPath(const QString& text) {
     return QDir::isAbsolutePath(path.sliced(1)) && !path.startsWith("//"_L1) ? path.sliced(1) : path;
 }
 
-bool ReadsBack(const QString& path) {
-    return std::ranges::none_of(path, IsLineEnd) && !path.isEmpty() && !path.front().isSpace() &&
-           !path.back().isSpace();
+bool ReadsBack(const QString& name) {
+    if (std::ranges::any_of(name, IsLineEnd)) return false;
+    return !name.startsWith(u'/') || !name.back().isSpace();
+}
+
+QString OnOneLine(QString text) {
+    std::ranges::replace_if(text, IsLineEnd, QChar(u' '));
+    return text;
 }
 
 }  // namespace
@@ -85,26 +90,32 @@ std::optional<ByteSpan> LineReader::Next() {
     return line;
 }
 
-QString NameFromList(const QString& text) {
+QString NameFromList(const QString& text, const QString& folder) {
     const QString local = LocalPath(text);
     if (!local.isEmpty()) return AbsolutePath(local);
     const bool isAsItIs = text.size() < 2 || text[1] == u':' || IsStoredCdPath(text) || IsAddress(text);
     if (isAsItIs) return text;
     // Qt takes a name that begins with a colon for one inside the program, and so for absolute.
-    return AbsolutePath(text.startsWith(u':') ? QDir::currentPath() + u'/' + text : text);
+    const bool isAbsolute = !text.startsWith(u':') && QDir::isAbsolutePath(text);
+    return AbsolutePath(isAbsolute ? text : folder + u'/' + text);
 }
 
-QString NameFromList(ByteSpan text) {
-    return NameFromList(CodePage::FromSystem(text));
+QString NameFromList(ByteSpan text, const QString& folder) {
+    return NameFromList(CodePage::FromSystem(text), folder);
 }
 
-QByteArray PathForList(const QString& path) {
-    if (ReadsBack(path)) return CodePage::ToSystem(path);
-    return "file://" + path.toUtf8().toPercentEncoding("/");
+QByteArray ToUtf8(QStringView text) {
+    return text.toUtf8();
 }
 
-QByteArray TitleForList(const QString& artist, const QString& title) {
-    QString text = artist + u" - "_s + title;
-    std::ranges::replace_if(text, IsLineEnd, QChar(u' '));
-    return CodePage::ToSystem(text);
+QByteArray PathForList(const QString& name, ListEncoder encode) {
+    if (ReadsBack(name)) return encode(name);
+    if (IsAddress(name)) return name.toUtf8().replace('\r', "%0D").replace('\n', "%0A");
+    const QString path = NameFromList(name, QDir::currentPath());
+    if (path.startsWith(u'/')) return "file://" + path.toUtf8().toPercentEncoding("/");
+    return encode(OnOneLine(name));
+}
+
+QByteArray TitleForList(const QString& artist, const QString& title, ListEncoder encode) {
+    return encode(OnOneLine(artist + u" - "_s + title));
 }

@@ -23,14 +23,18 @@ class LineReader {
 // "http://..." and its like.
 bool IsAddress(const QString& text);
 
-// The name of the entry that a text stands for. A relative name is made absolute against the current folder,
-// a file: address becomes a path. Left as they are: other addresses (http), paths with a drive letter, paths
+// The name of the entry that a text stands for. A relative name is made absolute against `folder`, a file:
+// address becomes a path. Left as they are: other addresses (http), paths with a drive letter, paths
 // on catalogued CDs, and names of one character.
-QString NameFromList(const QString& text);
-QString NameFromList(ByteSpan text);
+QString NameFromList(const QString& text, const QString& folder);
+QString NameFromList(ByteSpan text, const QString& folder);
 
-// The text for a song's path in the system's code page: a file: address where the path itself would not read
-// back, because it has line ends in it or blanks at an end.
-QByteArray PathForList(const QString& path);
+// How a list's texts become bytes: CodePage::ToSystem, or ToUtf8.
+using ListEncoder = QByteArray (*)(QStringView text);
+QByteArray ToUtf8(QStringView text);
+
+// The line for a name: a file: address where a path from "/" would not read back, because it has line ends in
+// it or blanks at an end. Of other names blanks are kept, which PLS lists put into quotes.
+QByteArray PathForList(const QString& name, ListEncoder encode);
 // "artist - title" on one line.
-QByteArray TitleForList(const QString& artist, const QString& title);
+QByteArray TitleForList(const QString& artist, const QString& title, ListEncoder encode);

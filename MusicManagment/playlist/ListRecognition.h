@@ -4,7 +4,13 @@
 
 #include "CommonRUKTools/ByteReader.h"
 
-enum class PlayListFormat { Native, M3u, Pls, Plain };
+enum class PlayListFormat {
+    Native,
+    M3u,   // in the system's code page
+    M3u8,  // in UTF-8 on every system
+    Pls,
+    Plain,
+};
 
 // What a file is by its first bytes, and where the reader of that format begins.
 struct RecognizedList {

@@ -2,6 +2,7 @@
 
 #include "CommonRUKTools/CodePage.h"
 #include "MusicManagment/database/tsdb/PackedRecord.h"
+#include "MusicManagment/playlist/ListBuilder.h"
 #include "MusicManagment/playlist/PlayListFiles.h"
 
 // The program's own lists (.rukpl): names as they are listed, each with the record of its song.
@@ -19,9 +20,13 @@ using TextField = QString TID3Tag::*;
 constexpr std::array<TextField, 6> kTexts = {&TID3Tag::FileName, &TID3Tag::Title,   &TID3Tag::Artist,
                                              &TID3Tag::Album,    &TID3Tag::Comment, &TID3Tag::MPEGLayer};
 
+// The converter takes a byte-order mark at the head away; within a record it is a character like any other.
 QString ReadText(ByteReader& reader) {
     const std::size_t length = reader.U16Le();
-    return CodePage::FromSystem(reader.Take(length));
+    const ByteSpan bytes = reader.Take(length);
+    QString text = CodePage::FromSystem(bytes);
+    if (StartsWith(bytes, "\xEF\xBB\xBF") && CodePage::IsValidUtf8(bytes)) text.prepend(QChar::ByteOrderMark);
+    return text;
 }
 
 TID3Tag ReadRecord(ByteReader& reader) {
@@ -59,10 +64,10 @@ std::vector<PlayListEntry> ParseNativeList(ByteSpan contents) {
     ByteReader reader(contents);
     if (reader.U16Le() != kVersion || reader.Failed())
         throw EUnknownPlayListVersion(u"Diese PlayList liegt in einer unbekannten Version vor."_s);
-    std::vector<PlayListEntry> entries;
+    ListBuilder list;
     while (!reader.AtEnd())
-        AppendEntry(entries, ReadEntry(reader, entries.size()));
-    return entries;
+        list.Add(ReadEntry(reader, list.Count()));
+    return list.Take();
 }
 
 void WriteNativeList(ByteWriter& file, std::span<const EntryToSave> entries) {

@@ -29,31 +29,41 @@ bool TPlayList::PlayEntry(int index, const PlayOptions& options) {
 
 TPlayList::Outcome TPlayList::Play(int index, const PlayOptions& options) {
     RequirePlayer();
-    const QString song = NameAt(index);
+    const RememberedEntry entry = Remember(index);
     if (database_) RefreshRecord(index, options.DatabaseHint);
-    const QString path = PlayablePath(song);
-    if (path.isEmpty()) return Outcome::Failed;
+    QString file = PlayablePath(entry.Name);
+    if (file.isEmpty()) return Outcome::Failed;
+    // The song that plays is heard until a fade is over, or goes on when there is none.
+    const bool formerIsHeard = options.Change != SongChange::Hard;
+    if (copyMp3sBeforePlay_) file = CopyForPlaying(file, formerIsHeard ? currentFile_ : QString());
 
-    const QString formerSong = std::exchange(currentSong_, song);
-    const QString formerFile = std::exchange(currentFile_, copyMp3sBeforePlay_ ? CopyForPlaying(path) : path);
-    const bool started = StartPlayer(options.Change);
-    if (!started) {
-        currentSong_ = formerSong;
-        currentFile_ = formerFile;
-        return Outcome::CurrentGoesOn;
+    if (options.Change == SongChange::Hard || !FadeInto(entry, file)) {
+        if (options.Change == SongChange::CrossFadeOnly) return Outcome::CurrentGoesOn;
+        ChangeTo(entry, file);
     }
-    if (options.Record) history_.prepend(song);
+    if (options.Record) history_.push_front(entry);
     player_->RedrawPanel();
-    RedrawView();
+    events_.CurrentChanged.Tell();
     return Outcome::Playing;
 }
 
-bool TPlayList::StartPlayer(SongChange change) {
-    if (change != SongChange::Hard && player_->PlayWithCrossFade(currentFile_)) return true;
-    if (change == SongChange::CrossFadeOnly) return false;
-    player_->SetFileName(currentFile_);
-    if (!player_->AutoPlay()) player_->Play();
+// Whoever shows the song asks for it while the player begins it; where it does not begin the former goes on.
+bool TPlayList::FadeInto(const RememberedEntry& entry, const QString& file) {
+    QScopedValueRollback<RememberedEntry> song(current_, entry);
+    QScopedValueRollback<QString> path(currentFile_, file);
+    if (!player_->PlayWithCrossFade(file)) return false;
+    song.commit();
+    path.commit();
     return true;
+}
+
+// It is the current song from now on, also when no engine can play it: the order goes on from there.
+void TPlayList::ChangeTo(const RememberedEntry& entry, const QString& file) {
+    current_ = entry;
+    currentFile_ = file;
+    events_.CurrentChanged.Tell();
+    player_->SetFileName(file);
+    if (!player_->AutoPlay()) player_->Play();
 }
 
 // --- The next entry ---
@@ -66,10 +76,11 @@ class TPlayList::Search {
 
     bool ServeQueue() {
         while (!list_.queue_.isEmpty()) {
-            const QString head = list_.queue_.takeFirst();
-            if (!Try(list_.entries_.Find(head), true)) continue;
+            const EntryId head = list_.queue_.takeFirst();
+            const bool found = Try(list_.entries_.Find(head), true);
             if (CurrentGoesOn()) list_.queue_.prepend(head);
-            return true;
+            list_.events_.QueueChanged.Tell();
+            if (found) return true;
         }
         return false;
     }
@@ -83,7 +94,7 @@ class TPlayList::Search {
     bool Try(int index, bool record) {
         if (index < 0 || index >= list_.Count()) return false;
         const QString song = list_.NameAt(index);
-        if (tried_.contains(song)) return false;
+        if (tried_.contains(song)) return false;  // listed twice it would fail twice
         tried_.insert(song);
         outcome_ = Play(index, song, record);
         if (outcome_ == Outcome::Playing) list_.roundIsOver_ = false;
@@ -91,16 +102,6 @@ class TPlayList::Search {
     }
 
     bool CurrentGoesOn() const { return outcome_ == Outcome::CurrentGoesOn; }
-
-    // What the user must be told when the search is over; empty for nothing.
-    QString Report(bool found) const {
-        QStringList parts = reasons_.first(std::min(reasons_.size(), kMostReasons));
-        if (reasons_.size() > kMostReasons) parts << u"und %1 weitere"_s.arg(reasons_.size() - kMostReasons);
-        // Without a round that ends there is no other word on it.
-        if (!found && list_.repeatAll_)
-            parts.prepend(u"Keines der Lieder in der PlayList konnte abgespielt werden."_s);
-        return parts.join(u"\r\n\r\n"_s);
-    }
 
  private:
     Outcome Play(int index, const QString& song, bool record) {
@@ -110,7 +111,7 @@ class TPlayList::Search {
         } catch (const EAbort&) {
             throw;
         } catch (const ERukException& error) {
-            if (!list_.told_.contains(song)) reasons_ << error.Message() + u"\r\n"_s + song;
+            if (!list_.told_.contains(song)) list_.reasons_ << error.Message() + u"\r\n"_s + song;
             list_.told_.insert(song);
             return Outcome::Failed;
         }
@@ -119,7 +120,6 @@ class TPlayList::Search {
     TPlayList& list_;
     SongChange change_;
     QSet<QString> tried_;
-    QStringList reasons_;
     Outcome outcome_ = Outcome::Failed;
 };
 
@@ -137,25 +137,34 @@ bool TPlayList::PlayNext(SongChange change) {
     if (!found) {
         const int current = IndexOf();
         found = search.TryEach(RestOfRound(current));
+        // At the cross-fade point the last song still plays: its end will be the end of the round.
+        if (!found && change == SongChange::CrossFadeOnly && !repeatAll_) return false;
         if (!found) HandleAllPlayed();
         if (!found && repeatAll_ && current >= 0)
             found =
                 search.TryEach(SequenceAfter(playOrder_, Count(), std::min(current, Count() - 1), random_));
     }
-    Tell(search.Report(found));
+    TellReasons(found);
     return found;
 }
 
 bool TPlayList::HasNext() const {
     if (Count() == 0 || playOrder_ == poStopAfterPlay) return false;
-    if (std::ranges::any_of(queue_, [this](const QString& name) { return entries_.Find(name) >= 0; }))
-        return true;
+    if (!queue_.isEmpty()) return true;
     const int current = IndexOf();
     if (current < 0 || repeatAll_) return true;
-    const QSet<QString> played(history_.begin(), history_.end());
+    const QSet<QString> played = PlayedNames();
     for (int index = 0; index < Count(); ++index)
         if (IsOpen(index, current, played)) return true;
     return false;
+}
+
+// A round plays no song twice, so that one that is listed twice counts as played with either entry.
+QSet<QString> TPlayList::PlayedNames() const {
+    QSet<QString> names;
+    for (const RememberedEntry& entry : history_)
+        names.insert(entry.Name);
+    return names;
 }
 
 // Whether an entry is still to be played in this round. Downwards and upwards the round is over when it comes
@@ -167,7 +176,7 @@ bool TPlayList::IsOpen(int index, int current, const QSet<QString>& played) cons
 std::vector<int> TPlayList::RestOfRound(int current) {
     std::vector<int> sequence = SequenceAfter(playOrder_, Count(), current, random_);
     if (current < 0) return sequence;
-    const QSet<QString> played(history_.begin(), history_.end());
+    const QSet<QString> played = PlayedNames();
     std::erase_if(sequence, [&](int index) { return !IsOpen(index, current, played); });
     return sequence;
 }
@@ -191,27 +200,28 @@ void TPlayList::HandleAllPlayed() {
 bool TPlayList::PlayPrevious(SongChange change) {
     if (searching_ || !HasPrevious()) return false;
     RequirePlayer();
-    const QStringList history = history_;
+    const auto history = history_;
     Search search(*this, change);
     bool found = false;
     while (!found && HasPrevious()) {
-        history_.removeFirst();
-        found = search.Try(entries_.Find(history_.first()), false);
+        history_.pop_front();
+        found = search.Try(entries_.Find(history_.front()), false);
     }
     if (!found || search.CurrentGoesOn())
         history_ = history;
     else
-        ReturnTo(history.first());
-    Tell(search.Report(true));
+        ReturnTo(history.front());
+    TellReasons(true);
     return found;
 }
 
 // Makes the song that was left the next one.
-void TPlayList::ReturnTo(const QString& song) {
-    if (entries_.Find(song) < 0) return;
-    queue_.removeAll(song);
-    queue_.prepend(song);
-    RedrawView();
+void TPlayList::ReturnTo(const RememberedEntry& entry) {
+    const int index = entries_.Find(entry);
+    if (index < 0) return;
+    queue_.removeOne(entries_.IdAt(index));
+    queue_.prepend(entries_.IdAt(index));
+    events_.QueueChanged.Tell();
 }
 
 void TPlayList::RequirePlayer() const {
@@ -219,6 +229,12 @@ void TPlayList::RequirePlayer() const {
         throw EPlayListException(u"Keine PlaySound-Komponente zum Abspielen vorhanden."_s);
 }
 
-void TPlayList::Tell(const QString& report) {
-    if (!report.isEmpty()) UserDialogs().ShowMessage(MessageKind::Error, report);
+// Tells the user, in one message, why entries failed in the search that is over.
+void TPlayList::TellReasons(bool found) {
+    const QStringList reasons = std::exchange(reasons_, {});
+    QStringList parts = reasons.first(std::min(reasons.size(), kMostReasons));
+    if (reasons.size() > kMostReasons) parts << u"und %1 weitere"_s.arg(reasons.size() - kMostReasons);
+    // Without a round that ends there is no other word on it.
+    if (!found && repeatAll_) parts.prepend(u"Keines der Lieder in der PlayList konnte abgespielt werden."_s);
+    if (!parts.isEmpty()) UserDialogs().ShowMessage(MessageKind::Error, parts.join(u"\r\n\r\n"_s));
 }

@@ -26,7 +26,9 @@ std::vector<int> ValidPositions(std::vector<int> indices, int count) {
 
 }  // namespace
 
-TPlayList::TPlayList(QObject* parent) : QObject(parent), random_(std::random_device{}()) {}
+TPlayList::TPlayList(QObject* parent) : QObject(parent), random_(std::random_device{}()) {
+    ForwardChanges();
+}
 
 TPlayList::~TPlayList() {
     SetMusicDatabase(nullptr);
@@ -35,7 +37,7 @@ TPlayList::~TPlayList() {
 // --- Entries ---
 
 int TPlayList::IndexOf(const QString& name) const {
-    return entries_.Find(name.isEmpty() ? currentSong_ : name);
+    return name.isEmpty() ? entries_.Find(current_) : entries_.Find(name);
 }
 
 void TPlayList::InsertSong(int position, SongIndex song) {
@@ -50,14 +52,17 @@ void TPlayList::InsertSong(int position, SongIndex song) {
 void TPlayList::Insert(int position, PlayListEntry entry) {
     position = std::clamp(position, 0, Count());
     entries_.Insert(position, std::move(entry));
-    RaiseChange(position, ctInserted);
+    SetModified(true);
+    events_.Inserted.Tell(position);
 }
 
 void TPlayList::Remove(int index) {
     if (index < 0 || index >= Count()) return;
-    queue_.removeAll(NameAt(index));
+    const bool waited = queue_.removeOne(entries_.IdAt(index));
     entries_.Remove(index);
-    RaiseChange(index, ctRemoved);
+    SetModified(true);
+    events_.Removed.Tell(index);
+    if (waited) events_.QueueChanged.Tell();
 }
 
 void TPlayList::Remove(std::vector<int> indices) {
@@ -67,19 +72,22 @@ void TPlayList::Remove(std::vector<int> indices) {
 }
 
 void TPlayList::Clear() {
+    if (Count() > 0) SetModified(true);
     entries_.Clear();
     queue_.clear();
+    reasons_.clear();
     // What was played of the old list would otherwise be passed over in the next one.
     StartNewRound();
-    RaiseChange(-1, ctRemoved);
+    events_.Cleared.Tell();
 }
 
 int TPlayList::Move(std::vector<int> indices, int before) {
     const std::vector<int> positions = ValidPositions(std::move(indices), Count());
     if (positions.empty()) return std::clamp(before, 0, Count());
-    const int first = entries_.Move(positions, before);
-    RaiseChange(-1, ctChanged);
-    return first;
+    const std::vector<int> former = entries_.Move(positions, before);
+    SetModified(true);
+    events_.Moved.Tell(former);
+    return static_cast<int>(std::ranges::find(former, positions.front()) - former.begin());
 }
 
 void TPlayList::RefreshRecord(int index, SongIndex databaseHint) {
@@ -88,7 +96,7 @@ void TPlayList::RefreshRecord(int index, SongIndex databaseHint) {
     std::optional<TID3Tag> record = FindRecord(name, databaseHint);
     if (!record) return;
     entries_.SetRecord(index, std::move(*record));
-    RaiseChange(index, ctChanged);
+    events_.Changed.Tell(index);
 }
 
 int TPlayList::RemoveUnavailable() {
@@ -135,22 +143,36 @@ QString TPlayList::PlayablePath(const QString& name) const {
 
 // --- Queue ---
 
+QStringList TPlayList::Queue() const {
+    QStringList names;
+    for (const EntryId entry : queue_)
+        names << NameAt(entries_.Find(entry));
+    return names;
+}
+
 void TPlayList::Enqueue(int index) {
-    if (index < 0 || index >= Count() || queue_.contains(NameAt(index))) return;
-    queue_.append(NameAt(index));
-    RedrawView();
+    if (index < 0 || index >= Count() || QueuePosition(index) >= 0) return;
+    queue_.append(entries_.IdAt(index));
+    events_.QueueChanged.Tell();
 }
 
 void TPlayList::Dequeue(int index) {
-    if (index < 0 || index >= Count() || queue_.removeAll(NameAt(index)) == 0) return;
-    RedrawView();
+    if (index < 0 || index >= Count() || !queue_.removeOne(entries_.IdAt(index))) return;
+    events_.QueueChanged.Tell();
 }
 
 int TPlayList::QueuePosition(int index) const {
-    return static_cast<int>(queue_.indexOf(NameAt(index)));
+    return static_cast<int>(queue_.indexOf(entries_.IdAt(index)));
 }
 
 // --- Others ---
+
+QStringList TPlayList::History() const {
+    QStringList names;
+    for (const RememberedEntry& entry : history_)
+        names << entry.Name;
+    return names;
+}
 
 void TPlayList::StartNewRound() {
     history_.clear();
@@ -169,14 +191,14 @@ bool TPlayList::MarkSong(int index) {
 
 void TPlayList::SetScan(bool scan) {
     if (scan == scan_) return;
-    scan_ = scan;
+    SetOption(scan_, scan);
     if (player_ != nullptr) player_->SetAutoStop(scan_ ? scanTime_ : 0);
 }
 
 void TPlayList::SetScanTime(int milliseconds) {
     milliseconds = std::max(milliseconds, 0);
     if (milliseconds == scanTime_) return;
-    scanTime_ = milliseconds;
+    SetOption(scanTime_, milliseconds);
     if (scan_ && player_ != nullptr) player_->SetAutoStop(scanTime_);
 }
 
@@ -198,14 +220,33 @@ void TPlayList::SetPlaySound(SongPlayer* player) {
     if (player_ != nullptr && scan_) player_->SetAutoStop(scanTime_);
 }
 
-void TPlayList::RefreshView() {
-    if (view_ != nullptr) view_->Refresh();
-}
+// --- Events ---
 
 void TPlayList::RedrawView() {
-    if (view_ != nullptr) view_->Redraw();
+    events_.CurrentChanged.Tell();
 }
 
-void TPlayList::RaiseChange(int index, TChangeType change) {
-    if (OnChange) OnChange(*this, index, change);
+void TPlayList::SetModified(bool modified) {
+    if (modified == modified_) return;
+    modified_ = modified;
+    events_.NameChanged.Tell();
+}
+
+// OnChange knows positions and three kinds of changes only.
+void TPlayList::ForwardChanges() {
+    const auto raise = [this](TChangeType change) {
+        return [this, change](int index) {
+            if (OnChange) OnChange(*this, index, change);
+        };
+    };
+    const auto raiseForAll = [raise](TChangeType change) {
+        return [forward = raise(change)] { forward(-1); };
+    };
+    forwarding_ += events_.Inserted.Subscribe(raise(ctInserted));
+    forwarding_ += events_.Changed.Subscribe(raise(ctChanged));
+    forwarding_ += events_.Removed.Subscribe(raise(ctRemoved));
+    forwarding_ += events_.Cleared.Subscribe(raiseForAll(ctRemoved));
+    forwarding_ += events_.Loaded.Subscribe(raiseForAll(ctChanged));
+    forwarding_ +=
+        events_.Moved.Subscribe([forward = raise(ctChanged)](const std::vector<int>&) { forward(-1); });
 }

@@ -1,10 +1,12 @@
 #pragma once
 
+#include <QList>
 #include <QObject>
 #include <QPointer>
 #include <QSet>
 #include <QString>
 #include <QStringList>
+#include <deque>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -15,6 +17,8 @@
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/commands/Settings.h"
 #include "MusicManagment/playlist/EntryList.h"
+#include "MusicManagment/playlist/ListRules.h"
+#include "MusicManagment/playlist/PlayListEvents.h"
 #include "MusicManagment/playlist/PlayListTypes.h"
 
 class PlayListView;
@@ -38,7 +42,7 @@ class TPlayList : public QObject, public SettingsClient {
     // --- Entries, in display order ---
     int Count() const { return entries_.Count(); }
     const PlayListEntry& Entry(int index) const { return entries_.At(index); }
-    // The first entry with this name; an empty name means the current song. -1 when it is not listed.
+    // The first entry with this name; an empty name means the entry that plays. -1 when it is not listed.
     int IndexOf(const QString& name = QString()) const;
     // Playing time of all entries with a record, in seconds.
     qint64 TotalSeconds() const { return entries_.TotalSeconds(); }
@@ -68,8 +72,9 @@ class TPlayList : public QObject, public SettingsClient {
     // Removes each entry whose file is not there now; returns how many.
     int RemoveUnavailable();
 
-    // --- Queue: names that are played before the order goes on, the next one first ---
-    const QStringList& Queue() const { return queue_; }
+    // --- Queue: entries that are played before the order goes on ---
+    // Their names, the next one first.
+    QStringList Queue() const;
     // Puts entries at the end; one that waits already keeps its place.
     void Enqueue(int index);
     void Dequeue(int index);
@@ -91,12 +96,12 @@ class TPlayList : public QObject, public SettingsClient {
     bool PlayPrevious(SongChange change = SongChange::Hard);
     bool HasPrevious() const { return history_.size() >= 2; }
 
-    // The entry that plays, by its name in the list; empty before the first.
-    const QString& CurrentSong() const { return currentSong_; }
+    // The entry that plays, by its name in the list; empty before the first. Where it stands: IndexOf().
+    const QString& CurrentSong() const { return current_.Name; }
     // The file that the player was given: the song or its copy.
     const QString& CurrentFile() const { return currentFile_; }
     // What was played in this round, the latest first.
-    const QStringList& History() const { return history_; }
+    QStringList History() const;
     // Forgets what was played.
     void StartNewRound();
     // Has the database mark the song of an entry; -1 is the entry with the focus in the view. False when the
@@ -105,6 +110,8 @@ class TPlayList : public QObject, public SettingsClient {
 
     // --- Files (PlayListFiles.h, PlayListCommands.cpp) ---
     const QString& PlayListFileName() const { return playListFileName_; }
+    // Whether entries have come, gone or moved since the list was loaded or saved.
+    bool Modified() const { return modified_; }
     // Loads the list; an empty name begins an empty one. Throws EPlayListException or EStreamError; the list
     // is then as it was, but empty and without a name when the file is of an unknown version.
     void SetPlayListFileName(const QString& fileName);
@@ -112,12 +119,18 @@ class TPlayList : public QObject, public SettingsClient {
     void Save(const QString& fileName);
     // Saves under the known name, or asks for one. False when the user cancelled.
     bool SaveOrAsk(bool askForName = false);
+    // For whoever is about to begin or load another list: lets the user save what was changed in this one.
+    // False when the user wants to keep it.
+    bool MayBeReplaced();
+    // The file that whichever list is open is kept in from one run of the program to the next. The next list
+    // takes its place there, so a list that has no other file asks for a name when it is saved before that.
+    void SetStandardFileName(const QString& fileName) { standardFileName_ = fileName; }
     // Makes the folder, and in it a link to each song. Throws EStreamError.
     void ExportAsLinks(const QString& folder);
 
     // --- Properties ---
     TPlayOrder PlayOrder() const { return playOrder_; }
-    void SetPlayOrder(TPlayOrder order) { playOrder_ = order; }
+    void SetPlayOrder(TPlayOrder order) { SetOption(playOrder_, order); }
     // Intro scan: each song is played for ScanTime milliseconds. Both go on to the player.
     bool Scan() const { return scan_; }
     void SetScan(bool scan);
@@ -125,10 +138,13 @@ class TPlayList : public QObject, public SettingsClient {
     void SetScanTime(int milliseconds);
     // Whether a new round begins when all songs have been played.
     bool RepeatAll() const { return repeatAll_; }
-    void SetRepeatAll(bool value) { repeatAll_ = value; }
+    void SetRepeatAll(bool value) { SetOption(repeatAll_, value); }
     // Whether songs are played from a copy in the temporary folder, so that the medium can be taken out.
     bool CopyMp3sBeforePlay() const { return copyMp3sBeforePlay_; }
-    void SetCopyMp3sBeforePlay(bool value) { copyMp3sBeforePlay_ = value; }
+    void SetCopyMp3sBeforePlay(bool value) { SetOption(copyMp3sBeforePlay_, value); }
+    // Whether lists are read as other programs write them (ListRules.h).
+    bool ModernLists() const { return rules_ == &kModernLists; }
+    void SetModernLists(bool value) { SetOption(rules_, value ? &kModernLists : &kClassicLists); }
 
     // --- Wiring ---
     TMusicDatabase* MusicDatabase() const { return database_; }
@@ -142,7 +158,7 @@ class TPlayList : public QObject, public SettingsClient {
     PlayListView* View() const { return view_; }
     // A view tells when it goes: SetView(nullptr).
     void SetView(PlayListView* view) { view_ = view; }
-    void RefreshView();
+    // The player opens or shows a song anew: who shows the list does so too.
     void RedrawView();
     // The source of random choices; seeded differently in every run.
     void SetRandom(const std::mt19937& random) { random_ = random; }
@@ -158,16 +174,26 @@ class TPlayList : public QObject, public SettingsClient {
     void SaveSettings(TRWReg& settings) const override;
 
     // --- Events ---
+    // Everything that happens to the list, for any number of listeners.
+    PlayListEvents& Events() { return events_; }
     // A round has ended. `showException` is whether the user is told; false unless the handler sets it.
     std::function<void(TPlayList&, bool& showException)> OnAllFilesPlayed;
-    // Index -1: the whole list (ctRemoved: it was emptied).
+    // One more listener. Index -1: the whole list (ctRemoved: it was emptied).
     std::function<void(TPlayList&, int index, TChangeType change)> OnChange;
 
  private:
     class Search;
     enum class Outcome { Failed, Playing, CurrentGoesOn };
 
-    void RaiseChange(int index, TChangeType change);
+    void ForwardChanges();
+    void SetModified(bool modified);
+    void SetFile(const QString& fileName);
+    template <typename T>
+    void SetOption(T& option, T value) {
+        if (option == value) return;
+        option = value;
+        events_.OptionsChanged.Tell();
+    }
     const QString& NameAt(int index) const { return entries_.At(index).Name; }
     QString ResolvedPath(const QString& name, const ResolveOptions& options) const;
     QString PlayablePath(const QString& name) const;
@@ -175,32 +201,42 @@ class TPlayList : public QObject, public SettingsClient {
 
     // Next.cpp
     Outcome Play(int index, const PlayOptions& options);
-    bool StartPlayer(SongChange change);
+    bool FadeInto(const RememberedEntry& entry, const QString& file);
+    void ChangeTo(const RememberedEntry& entry, const QString& file);
+    RememberedEntry Remember(int index) const { return {entries_.IdAt(index), NameAt(index)}; }
+    QSet<QString> PlayedNames() const;
     bool IsOpen(int index, int current, const QSet<QString>& played) const;
     std::vector<int> RestOfRound(int current);
     void HandleAllPlayed();
-    void ReturnTo(const QString& song);
+    void ReturnTo(const RememberedEntry& entry);
     void RequirePlayer() const;
-    static void Tell(const QString& report);
+    void TellReasons(bool found);
 
     // Drop.cpp
     std::vector<PlayListEntry> EntriesFor(const QStringList& paths) const;
 
     // PlayListCommands.cpp
+    std::vector<PlayListEntry> ReadList(const QString& fileName) const;
     void Replace(std::vector<PlayListEntry> entries, const QString& fileName);
     std::vector<EntryToSave> EntriesForSaving() const;
     void OpenFromDialog();
     void ExportFromDialog();
 
+    PlayListEvents events_;
+    Subscriptions forwarding_;  // to OnChange
     EntryList entries_;
-    QStringList history_;
-    QStringList queue_;
-    QString currentSong_;
+    std::deque<RememberedEntry> history_;
+    QList<EntryId> queue_;
+    RememberedEntry current_;
     QString currentFile_;
     QString playListFileName_;
-    QSet<QString> told_;  // entries whose failure the user has been told of in this round
+    QString standardFileName_;
+    bool modified_ = false;
+    QStringList reasons_;  // why entries failed, still to be told
+    QSet<QString> told_;   // songs whose failure the user has been told of in this round
     std::mt19937 random_;
 
+    const ListRules* rules_ = &kClassicLists;
     TPlayOrder playOrder_ = poDownwards;
     int scanTime_ = 10000;
     bool scan_ = false;

@@ -14,20 +14,17 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-FileDialogOptions DialogOptions(const QString& title, const QString& preset) {
+FileDialogOptions DialogOptions(const QString& title, const QString& filter, const QString& preset) {
     FileDialogOptions options;
     options.Title = title;
     options.DefaultExtension = u"rukpl"_s;
-    options.Filter =
-        u"Alle PlayLists|*.rukpl;*.rpl;*.m3u;*.extpl;*.pl;*.txtpl;*.pls;*.inipl|RUK Playlist|*.rukpl;*.rpl|"
-        "M3U PlayLists|*.m3u;*.extpl|PL PlayLists|*.pl;*.txtpl|PLS PlayLists|*.pls;*.inipl|"
-        "Alle Dateien|*.*"_s;
+    options.Filter = filter;
     options.Preset = preset;
     return options;
 }
 
-std::optional<QString> AskForTarget(const QString& preset) {
-    FileDialogOptions options = DialogOptions(u"PlayList speichern unter"_s, preset);
+std::optional<QString> AskForTarget(const QString& filter, const QString& preset) {
+    FileDialogOptions options = DialogOptions(u"PlayList speichern unter"_s, filter, preset);
     options.ConfirmOverwrite = true;
     return UserDialogs().SaveFile(options);
 }
@@ -37,18 +34,32 @@ std::optional<QString> AskForTarget(const QString& preset) {
 void TPlayList::SetPlayListFileName(const QString& fileName) {
     if (fileName.isEmpty()) return Replace({}, {});
     try {
-        Replace(ReadPlayList(fileName), fileName);
+        Replace(ReadList(fileName), fileName);
     } catch (const EUnknownPlayListVersion&) {
         Replace({}, {});  // without a name, so that nothing empty is saved over a list
         throw;
     }
 }
 
+std::vector<PlayListEntry> TPlayList::ReadList(const QString& fileName) const {
+    ListOrigin origin{.FileName = fileName};
+    if (database_) origin.Known = [this](const QString& name) { return database_->Songs().Find(name); };
+    return ReadPlayList(*rules_, origin);
+}
+
 void TPlayList::Replace(std::vector<PlayListEntry> entries, const QString& fileName) {
     Clear();
     entries_.Assign(std::move(entries));
+    SetFile(fileName);
+    events_.Loaded.Tell();
+}
+
+// The file holds what the list is now.
+void TPlayList::SetFile(const QString& fileName) {
+    const bool differs = fileName != playListFileName_ || modified_;
     playListFileName_ = fileName;
-    RaiseChange(-1, ctChanged);
+    modified_ = false;
+    if (differs) events_.NameChanged.Tell();
 }
 
 std::vector<EntryToSave> TPlayList::EntriesForSaving() const {
@@ -60,16 +71,29 @@ std::vector<EntryToSave> TPlayList::EntriesForSaving() const {
 }
 
 void TPlayList::Save(const QString& fileName) {
-    WritePlayList(fileName, EntriesForSaving());
-    playListFileName_ = fileName;
+    WritePlayList(fileName, rules_->FormatOfName(fileName), EntriesForSaving());
+    SetFile(fileName);
 }
 
 bool TPlayList::SaveOrAsk(bool askForName) {
     std::optional<QString> target = playListFileName_;
-    if (askForName || target->isEmpty()) target = AskForTarget(playListFileName_);
+    if (askForName || target->isEmpty()) target = AskForTarget(rules_->DialogFilter(), playListFileName_);
     if (!target || target->isEmpty()) return false;
     Save(*target);
     return true;
+}
+
+bool TPlayList::MayBeReplaced() {
+    const bool isNothing = Count() == 0 && playListFileName_.isEmpty();
+    if (!modified_ || isNothing) return true;
+    enum { buSave, buDiscard, buCancel };
+    const int answer = UserDialogs().Ask(
+        {.Text = u"Die PlayList wurde geändert. Sollen die Änderungen gespeichert werden?"_s,
+         .Buttons = {u"Speichern"_s, u"Nicht speichern"_s, u"Abbrechen"_s},
+         .Cancel = buCancel,
+         .Default = buSave});
+    if (answer == buSave) return SaveOrAsk(playListFileName_ == standardFileName_);
+    return answer == buDiscard;
 }
 
 void TPlayList::ExportAsLinks(const QString& folder) {
@@ -87,7 +111,9 @@ TMenuExItem& TPlayList::Menu() {
 }
 
 void TPlayList::OpenFromDialog() {
-    const auto chosen = UserDialogs().OpenFile(DialogOptions(u"PlayList öffnen"_s, playListFileName_));
+    if (!MayBeReplaced()) return;
+    const auto chosen = UserDialogs().OpenFile(
+        DialogOptions(u"PlayList öffnen"_s, rules_->DialogFilter(), playListFileName_));
     if (chosen && !chosen->isEmpty()) SetPlayListFileName(*chosen);
 }
 
@@ -100,7 +126,7 @@ void TPlayList::ExportFromDialog() {
 bool TPlayList::ClickMenuItem(int id) {
     switch (id) {
         case pcNew:
-            SetPlayListFileName(QString());
+            if (MayBeReplaced()) SetPlayListFileName(QString());
             return true;
         case pcOpen:
             OpenFromDialog();

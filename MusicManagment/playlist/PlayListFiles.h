@@ -8,6 +8,7 @@
 
 #include "CommonRUKTools/ByteReader.h"
 #include "CommonRUKTools/ByteWriter.h"
+#include "MusicManagment/playlist/ListRules.h"
 #include "MusicManagment/playlist/PlayListTypes.h"
 
 // Lists in files. Each format has a source of its own.
@@ -18,10 +19,9 @@ class EUnknownPlayListVersion : public EPlayListException {
     using EPlayListException::EPlayListException;
 };
 
-// Reads a list of any format; which it is is known by the first bytes. Throws EStreamError when the file
-// cannot be read, EPlayListException when it is damaged or too large.
-std::vector<PlayListEntry> ReadPlayList(const QString& fileName);
-std::vector<PlayListEntry> ParsePlayList(ByteSpan file);
+// Reads a list of any format. Throws EStreamError when the file cannot be read, EPlayListException when it is
+// damaged or too large.
+std::vector<PlayListEntry> ReadPlayList(const ListRules& rules, const ListOrigin& origin);
 
 // An entry on its way into a file.
 struct EntryToSave {
@@ -29,9 +29,8 @@ struct EntryToSave {
     QString Path;  // where the song is now; empty leaves it out, but not in the native format
 };
 
-// Writes a list in the format that the name's extension stands for. Throws EStreamError; the old file is then
-// as it was.
-void WritePlayList(const QString& fileName, std::span<const EntryToSave> entries);
+// Throws EStreamError; the old file is then as it was.
+void WritePlayList(const QString& fileName, PlayListFormat format, std::span<const EntryToSave> entries);
 
 // All bytes of a text; the implicit conversion would end at the first zero byte.
 inline std::string_view AllOf(const QByteArray& text) {
@@ -40,19 +39,17 @@ inline std::string_view AllOf(const QByteArray& text) {
 
 // --- The formats ---
 
-// Throws EPlayListException.
+// What stands before the remark of a song in M3U lists.
+inline constexpr std::string_view kM3uRemark = "#EXTINF:";
+
+// Each throws EPlayListException. Relative names are made absolute against `folder`.
 std::vector<PlayListEntry> ParseNativeList(ByteSpan contents);
-std::vector<PlayListEntry> ParseM3uList(ByteSpan contents);
-std::vector<PlayListEntry> ParsePlsList(ByteSpan contents);
-std::vector<PlayListEntry> ParsePlainList(ByteSpan contents);
+std::vector<PlayListEntry> ParseM3uList(ByteSpan contents, const QString& folder);
+std::vector<PlayListEntry> ParsePlsList(ByteSpan contents, const QString& folder);
+std::vector<PlayListEntry> ParsePlainList(ByteSpan contents, const QString& folder);
 
 void WriteNativeList(ByteWriter& file, std::span<const EntryToSave> entries);
 void WriteM3uList(ByteWriter& file, std::span<const EntryToSave> entries);
+void WriteM3u8List(ByteWriter& file, std::span<const EntryToSave> entries);
 void WritePlsList(ByteWriter& file, std::span<const EntryToSave> entries);
 void WritePlainList(ByteWriter& file, std::span<const EntryToSave> entries);
-
-// The most entries that a file may have: enough for every collection, and little enough for memory when a
-// hostile file holds nothing but tiny ones.
-inline constexpr std::size_t kMostListEntries = 2'000'000;
-// Appends an entry. Throws EPlayListException when the list has too many.
-void AppendEntry(std::vector<PlayListEntry>& entries, PlayListEntry entry);

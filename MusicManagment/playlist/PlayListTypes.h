@@ -1,10 +1,9 @@
 #pragma once
 
 #include <QString>
-#include <optional>
 
 #include "CommonRUKTools/Errors.h"
-#include "ReadMPEGHeader/ID3Tag.h"
+#include "MusicManagment/playlist/ListedRecord.h"
 
 class EPlayListException : public ERukException {
  public:
@@ -24,7 +23,16 @@ enum class SongChange {
 // One line of a playlist.
 struct PlayListEntry {
     QString Name;  // path, stored CD path or address (http), as it is listed
-    std::optional<TID3Tag> Record{};
+    ListedRecord Record{};
 
     bool operator==(const PlayListEntry&) const = default;
+};
+
+// An entry itself, wherever it stands and however often its song is listed. Never used again; 0 is none.
+using EntryId = quint64;
+
+// An entry that is remembered. When it has left the list the first with its name stands in for it.
+struct RememberedEntry {
+    EntryId Id = 0;
+    QString Name{};
 };

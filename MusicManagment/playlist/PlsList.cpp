@@ -1,40 +1,64 @@
-#include <map>
-
 #include "CommonRUKTools/CodePage.h"
+#include "MusicManagment/playlist/ListBuilder.h"
 #include "MusicManagment/playlist/ListNames.h"
 #include "MusicManagment/playlist/PlayListFiles.h"
+#include "MusicManagment/playlist/PlsSection.h"
 
-// PLS, a list in the form of an INI file: the keys File1, File2, ... of the section "playlist". Names are
-// taken by their bytes, commas and backslashes too, which a general reader of INI files would interpret.
+// PLS: the keys File1, Title1, Length1, File2, ... of the section "playlist".
 
 using namespace Qt::StringLiterals;
 
 namespace {
 
-// The keys of the section that this format needs.
-struct PlsSection {
-    std::map<int, QString> Files;  // by number; of a number that comes twice the first counts
-    std::optional<int> Count{};
-};
+// --- Reading ---
 
-QString Unquoted(const QString& value) {
-    const bool isQuoted = value.size() >= 2 && value.front() == value.back() &&
-                          (value.front() == u'"' || value.front() == u'\'');
-    return isQuoted ? value.sliced(1, value.size() - 2) : value;
+bool IsQuoted(const QString& value) {
+    return value.size() >= 2 && value.front() == value.back() &&
+           (value.front() == u'"' || value.front() == u'\'');
 }
 
-void TakeKey(PlsSection& section, const QString& key, const QString& value) {
+QString Unquoted(const QString& value) {
+    return IsQuoted(value) ? value.sliced(1, value.size() - 2) : value;
+}
+
+struct ItemKey {
+    QLatin1StringView Name;
+    QString PlsItem::*Value;
+};
+
+constexpr ItemKey kItemKeys[] = {
+    {"File"_L1, &PlsItem::File}, {"Title"_L1, &PlsItem::Title}, {"Length"_L1, &PlsItem::Length}};
+
+// "7"; "07" and "+7" are other keys.
+std::optional<int> NumberFrom(QStringView digits) {
     bool isNumber = false;
-    if (key.compare("NumberOfEntries"_L1, Qt::CaseInsensitive) == 0) {
-        const int count = value.toInt(&isNumber);
-        if (!section.Count) section.Count = isNumber ? count : 0;
-    } else if (key.startsWith("File"_L1, Qt::CaseInsensitive)) {
-        const int number = QStringView(key).sliced(4).toInt(&isNumber);
-        if (isNumber && section.Files.size() <= kMostListEntries) section.Files.emplace(number, value);
+    const int number = digits.toInt(&isNumber);
+    if (!isNumber || QString::number(number) != digits) return std::nullopt;
+    return number;
+}
+
+void TakeItemKey(PlsSection& section, const QString& key, const QString& value) {
+    for (const auto& [name, field] : kItemKeys) {
+        if (!key.startsWith(name, Qt::CaseInsensitive)) continue;
+        const auto number = NumberFrom(QStringView(key).sliced(name.size()));
+        if (!number) return;
+        QString& text = section.Items[*number].*field;
+        if (text.isNull()) text = value.isNull() ? u""_s : value;
+        if (section.Items.size() > kMostListEntries) ThrowListTooLarge();
     }
 }
 
-PlsSection ReadSection(ByteSpan contents) {
+void TakeKey(PlsSection& section, const QString& key, const QString& value) {
+    if (key.compare("NumberOfEntries"_L1, Qt::CaseInsensitive) != 0) return TakeItemKey(section, key, value);
+    if (!section.Count) section.Count = value.toInt();
+}
+
+}  // namespace
+
+PlsSection ReadPlsSection(ByteSpan contents) {
+    // In memory it takes several times of that; two million items of usual length take half of it.
+    constexpr std::size_t kLargest = std::size_t{1} << 28;
+    if (contents.size() > kLargest) ThrowListTooLarge();
     PlsSection section;
     bool isOurs = false;
     LineReader lines(contents);
@@ -52,6 +76,26 @@ PlsSection ReadSection(ByteSpan contents) {
     return section;
 }
 
+std::vector<PlayListEntry> ParsePlsList(ByteSpan contents, const QString& folder) {
+    const PlsSection section = ReadPlsSection(contents);
+    ListBuilder list;
+    for (const auto& [number, item] : section.Items)
+        if (number >= 1 && number <= section.Count.value_or(0) && !item.File.isEmpty())
+            list.Add({.Name = NameFromList(item.File, folder)});
+    return list.Take();
+}
+
+// --- Writing ---
+
+namespace {
+
+// Blanks at its ends would be lost, and quotes taken for ours.
+QByteArray Quoted(const QString& name) {
+    const QByteArray path = PathForList(name, CodePage::ToSystem);
+    const bool isBare = path != name.toUtf8() || (name.trimmed() == name && !IsQuoted(name));
+    return isBare ? path : '"' + path + '"';
+}
+
 void WriteKey(ByteWriter& file, std::string_view key, int number, const QByteArray& value) {
     file.Raw(key);
     file.Raw(AllOf(QByteArray::number(number) + '=' + value + "\r\n"));
@@ -59,25 +103,16 @@ void WriteKey(ByteWriter& file, std::string_view key, int number, const QByteArr
 
 }  // namespace
 
-std::vector<PlayListEntry> ParsePlsList(ByteSpan contents) {
-    const PlsSection section = ReadSection(contents);
-    std::vector<PlayListEntry> entries;
-    for (const auto& [number, value] : section.Files) {
-        if (number < 1 || number > section.Count.value_or(0) || value.isEmpty()) continue;
-        AppendEntry(entries, {.Name = NameFromList(value)});
-    }
-    return entries;
-}
-
 void WritePlsList(ByteWriter& file, std::span<const EntryToSave> entries) {
     file.Raw("[playlist]\r\n");
     int number = 0;
     for (const auto& [entry, path] : entries) {
         if (path.isEmpty()) continue;
         ++number;
-        WriteKey(file, "File", number, PathForList(path));
+        WriteKey(file, "File", number, Quoted(path));
         if (!entry->Record) continue;
-        WriteKey(file, "Title", number, TitleForList(entry->Record->Artist, entry->Record->Title));
+        WriteKey(file, "Title", number,
+                 TitleForList(entry->Record->Artist, entry->Record->Title, CodePage::ToSystem));
         WriteKey(file, "Length", number, QByteArray::number(entry->Record->Length));
     }
     file.Raw(AllOf("NumberOfEntries=" + QByteArray::number(number) + "\r\nVersion=2\r\n"));

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "CommonRUKTools/SortedTextList.h"
-#include "app/desktop/StandardFiles.h"
+#include "CommonRUKTools/StandardFiles.h"
 
 // The standard ban list between the start of the program and its end. Entries on the disk are only replaced
 // once they have been read.

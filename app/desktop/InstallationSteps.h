@@ -2,7 +2,7 @@
 
 #include <QString>
 
-#include "app/desktop/StandardFiles.h"
+#include "CommonRUKTools/StandardFiles.h"
 
 class Installation;
 

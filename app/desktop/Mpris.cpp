@@ -44,12 +44,13 @@ Mpris::Mpris(TPlaySound& player, TPlayList& list, Hooks hooks)
     : player_(player), list_(list), hooks_(std::move(hooks)), bus_(QString()) {
     updateTimer_.setSingleShot(true);
     updateTimer_.setInterval(0);
-    connect(&updateTimer_, &QTimer::timeout, this, [this] { TellChanges(); });
-    player_.OnSeeked = [this](TPlaySound&, quint32 position) { TellSeeked(position); };
+    connect(&updateTimer_, &QTimer::timeout, this, [this] { RunCommand([this] { TellChanges(); }); });
+    PlayerEvents& events = player_.Events();
+    subscriptions_ += events.Changed.Subscribe([this] { Update(); });
+    subscriptions_ += events.Seeked.Subscribe([this](quint32 position) { TellSeeked(position); });
 }
 
 Mpris::~Mpris() {
-    player_.OnSeeked = {};
     if (serviceName_.isEmpty()) return;
     bus_.unregisterService(serviceName_);
     bus_.unregisterObject(kPath);
@@ -78,7 +79,12 @@ QString Mpris::introspect(const QString&) const {
 bool Mpris::handleMessage(const QDBusMessage& message, const QDBusConnection& connection) {
     if (message.type() != QDBusMessage::MethodCallMessage) return false;
     if (message.interface() == kProperties) return HandleProperties(message, connection);
-    bool known = false;
+    return HandleCall(message, connection);
+}
+
+// A command that fails is known as well: the user is told, not the bus.
+bool Mpris::HandleCall(const QDBusMessage& message, const QDBusConnection& connection) {
+    bool known = true;
     RunCommand([&] {
         known = (message.interface() == kRoot && CallRoot(message.member())) ||
                 (message.interface() == kPlayer && CallPlayer(message.member(), message.arguments()));
@@ -97,7 +103,7 @@ bool Mpris::HandleProperties(const QDBusMessage& message, const QDBusConnection&
         return connection.send(
             message.createReply(QVariant::fromValue(QDBusVariant(properties.value(name)))));
     if (message.member() != u"Set"_s) return false;
-    SetProperty(name, arguments.value(2).value<QDBusVariant>().variant());
+    RunCommand([&] { SetProperty(name, arguments.value(2).value<QDBusVariant>().variant()); });
     return connection.send(message.createReply());
 }
 
@@ -116,7 +122,8 @@ void Mpris::SetProperty(const QString& name, const QVariant& value) {
 bool Mpris::CallRoot(const QString& method) {
     if (method == u"Raise"_s) return hooks_.Raise(), true;
     if (method != u"Quit"_s) return false;
-    QTimer::singleShot(0, this, [this] { hooks_.Quit(); });  // the answer goes first
+    // The answer goes first.
+    QTimer::singleShot(0, this, [this] { RunCommand(hooks_.Quit); });
     return true;
 }
 

@@ -6,6 +6,7 @@
 #include <QVariantMap>
 #include <functional>
 
+#include "CommonRUKTools/Listeners.h"
 #include "app/models/PlayingSong.h"
 
 class TPlayList;
@@ -34,8 +35,8 @@ class Mpris : public QDBusVirtualObject {
     // The name that was taken; empty for none.
     const QString& ServiceName() const { return serviceName_; }
 
-    // The song, what the player does with it, the list or the volume has changed. Told to the bus as soon as
-    // the program comes to it.
+    // Something that the bus shows has changed that neither player nor list tell, as the volume. Told to the
+    // bus as soon as the program comes to it.
     void Update() { updateTimer_.start(); }
     bool handleMessage(const QDBusMessage& message, const QDBusConnection& connection) override;
     QString introspect(const QString& path) const override;
@@ -43,6 +44,7 @@ class Mpris : public QDBusVirtualObject {
  private:
     struct Interface;
 
+    bool HandleCall(const QDBusMessage& message, const QDBusConnection& connection);
     bool HandleProperties(const QDBusMessage& message, const QDBusConnection& connection);
     void SetProperty(const QString& name, const QVariant& value);
     QVariantMap PropertiesOf(const QString& interface) const;
@@ -66,4 +68,5 @@ class Mpris : public QDBusVirtualObject {
     QVariantMap told_;  // what the bus knows of the player
     PlayingSong song_;
     int track_ = 0;  // counts the songs
+    Subscriptions subscriptions_;
 };

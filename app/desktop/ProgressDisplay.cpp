@@ -8,30 +8,22 @@ using namespace Qt::StringLiterals;
 
 ProgressDisplay::ProgressDisplay(TMusicDatabase& database, QWidget& mainWindow)
     : database_(database), mainWindow_(mainWindow) {
-    database_.OnStartProgress = [this](TMusicDatabase&) { RunStarted(); };
-    database_.OnProgress = [this](TMusicDatabase&, const ProgressPoint& point) {
-        if (window_) window_->ShowPoint(point, database_.MainPercent());
-    };
-    database_.OnResetProgress = [this](TMusicDatabase&) {
-        if (window_) window_->Reset();
-    };
-    database_.OnEndProgress = [this](TMusicDatabase&) { RunEnded(); };
-    database_.OnCaptionChanged = [this](TMusicDatabase&) { ShowCaption(); };
+    Operation& operation = database_.CurrentOperation();
+    watched_ += operation.Started.Subscribe([this] { RunStarted(); });
+    watched_ += operation.Advanced.Subscribe([this, &operation](const ProgressPoint& point) {
+        if (window_) window_->ShowPoint(point, operation.MainPercent());
+    });
+    watched_ += operation.Ended.Subscribe([this] { RunEnded(); });
+    watched_ += operation.TitleChanged.Subscribe([this] { ShowCaption(); });
     ShowCaption();
 }
 
-ProgressDisplay::~ProgressDisplay() {
-    database_.OnStartProgress = nullptr;
-    database_.OnProgress = nullptr;
-    database_.OnResetProgress = nullptr;
-    database_.OnEndProgress = nullptr;
-    database_.OnCaptionChanged = nullptr;
-}
+ProgressDisplay::~ProgressDisplay() = default;
 
 void ProgressDisplay::RunStarted() {
     if (!window_) {
         window_ = std::make_unique<TPrgForm>(&mainWindow_);
-        window_->OnStop = [this] { database_.RequestAbort(); };
+        window_->OnStop = [this] { database_.CurrentOperation().RequestStop(); };
     }
     window_->Start();
     if (OnRunning) OnRunning(true);

@@ -14,8 +14,6 @@ class ProgressDisplay {
  public:
     ProgressDisplay(TMusicDatabase& database, QWidget& mainWindow);
     ~ProgressDisplay();
-    ProgressDisplay(const ProgressDisplay&) = delete;
-    ProgressDisplay& operator=(const ProgressDisplay&) = delete;
 
     // Told when a run begins and when it has ended.
     std::function<void(bool running)> OnRunning;
@@ -28,4 +26,5 @@ class ProgressDisplay {
     TMusicDatabase& database_;
     QWidget& mainWindow_;
     std::unique_ptr<TPrgForm> window_;  // made for the first run
+    Subscriptions watched_;
 };

@@ -9,7 +9,7 @@
 
 #include "CommonRUKTools/AbsolutePath.h"
 #include "CommonRUKTools/Dialogs.h"
-#include "MusicManagment/database/intake/Update.h"
+#include "MusicManagment/database/intake/UpdateFolders.h"
 #include "app/desktop/Icons.h"
 
 using namespace Qt::StringLiterals;

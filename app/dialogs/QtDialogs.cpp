@@ -6,8 +6,8 @@
 #include <QInputDialog>
 #include <QMessageBox>
 #include <QPushButton>
-#include <QStandardPaths>
 
+#include "CommonRUKTools/MusicFolder.h"
 #include "app/dialogs/FileFilters.h"
 
 using namespace Qt::StringLiterals;
@@ -67,8 +67,8 @@ void SetUpFileDialog(QFileDialog& dialog, const QString& accept) {
 }
 
 // Songs mostly lie there.
-QString MusicFolder() {
-    const QString music = QStandardPaths::writableLocation(QStandardPaths::MusicLocation);
+QString UsualFolder() {
+    const QString music = MusicFolder();
     return QFileInfo(music).isDir() ? music : QDir::homePath();
 }
 
@@ -88,7 +88,7 @@ void QtDialogs::ApplyOptions(QFileDialog& dialog, const FileDialogOptions& optio
 
     const QFileInfo preset(options.Preset);
     if (options.Preset.isEmpty())
-        dialog.setDirectory(folder_.isEmpty() ? MusicFolder() : folder_);
+        dialog.setDirectory(folder_.isEmpty() ? UsualFolder() : folder_);
     else
         dialog.setDirectory(preset.isDir() ? preset.absoluteFilePath() : preset.absolutePath());
     if (!options.Preset.isEmpty() && !preset.isDir()) dialog.selectFile(preset.fileName());

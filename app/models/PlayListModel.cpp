@@ -5,6 +5,7 @@
 #include <QFont>
 #include <QPalette>
 #include <algorithm>
+#include <utility>
 
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/playlist/ListNames.h"
@@ -31,68 +32,81 @@ Qt::Alignment AlignmentOf(PlayListColumn column) {
 }  // namespace
 
 PlayListModel::PlayListModel(TPlayList& list, QObject* parent) : QAbstractTableModel(parent), list_(list) {
-    list_.OnChange = [this](TPlayList&, int index, TChangeType change) { ListChanged(index, change); };
     files_.OnChange = [this] { ShowAgain(0, rows_ - 1); };
-    Refresh();
-}
-
-PlayListModel::~PlayListModel() {
-    list_.OnChange = {};
+    FollowList();
+    Reset();
 }
 
 // --- Following the list ---
 
-void PlayListModel::Refresh() {
-    current_ = list_.IndexOf();
-    queueIsKnown_ = false;
-    // The same number of rows may be the same list: what is selected stays so, and the view where it is.
-    if (rows_ == list_.Count()) return ShowAgain(0, rows_ - 1);
+void PlayListModel::FollowList() {
+    PlayListEvents& events = list_.Events();
+    const auto reset = [this] { Reset(); };
+    const auto showAll = [this] { ShowAgain(0, rows_ - 1); };
+    subscriptions_ += events.Inserted.Subscribe([this](int row) { EntryInserted(row); });
+    subscriptions_ += events.Changed.Subscribe([this](int row) { ShowAgain(row, row); });
+    subscriptions_ += events.Removed.Subscribe([this](int row) { EntryRemoved(row); });
+    subscriptions_ += events.Moved.Subscribe([this](const auto& former) { EntriesMoved(former); });
+    subscriptions_ += events.Cleared.Subscribe(reset);
+    subscriptions_ += events.Loaded.Subscribe(reset);
+    subscriptions_ += events.CurrentChanged.Subscribe([this] { CurrentChanged(); });
+    subscriptions_ += events.QueueChanged.Subscribe(showAll);
+}
+
+// Another list: nothing of what was marked in the old one is in it.
+void PlayListModel::Reset() {
     beginResetModel();
     rows_ = list_.Count();
+    current_ = list_.IndexOf();
     endResetModel();
 }
 
-void PlayListModel::Redraw() {
-    Refresh();
+// Thousands of entries may come and go one by one, so nothing here looks through the whole list.
+void PlayListModel::EntryInserted(int row) {
+    beginInsertRows({}, row, row);
+    ++rows_;
+    if (current_ >= row)
+        ++current_;
+    else if (current_ < 0 && list_.Entry(row).Name == list_.CurrentSong())
+        current_ = row;
+    endInsertRows();
 }
 
-// Thousands of entries may come in one by one, so nothing here looks through the whole list.
-void PlayListModel::ListChanged(int index, TChangeType change) {
-    if (index < 0 || (change == ctInserted && index > rows_)) return Refresh();
-    if (change == ctChanged) return ShowAgain(index, index);
-    if (change == ctInserted) {
-        if (current_ >= index) ++current_;
-        if (list_.Entry(index).Name == list_.CurrentSong() && (current_ < 0 || index < current_))
-            current_ = index;
-        beginInsertRows({}, index, index);
-        ++rows_;
-        endInsertRows();
-    } else {
-        queueIsKnown_ = false;
-        if (current_ == index)
-            current_ = list_.IndexOf();
-        else if (current_ > index)
-            --current_;
-        beginRemoveRows({}, index, index);
-        --rows_;
-        endRemoveRows();
-    }
+void PlayListModel::EntryRemoved(int row) {
+    beginRemoveRows({}, row, row);
+    --rows_;
+    if (current_ == row)
+        current_ = list_.IndexOf();
+    else if (current_ > row)
+        --current_;
+    endRemoveRows();
+}
+
+// Marks and focus go along with their entries.
+void PlayListModel::EntriesMoved(const std::vector<int>& former) {
+    Q_EMIT layoutAboutToBeChanged({}, VerticalSortHint);
+    std::vector<int> rowOf(former.size());
+    for (std::size_t row = 0; row < former.size(); ++row)
+        rowOf[static_cast<std::size_t>(former[row])] = static_cast<int>(row);
+    const QModelIndexList from = persistentIndexList();
+    QModelIndexList to;
+    to.reserve(from.size());
+    for (const QModelIndex& entry : from)
+        to << index(rowOf[static_cast<std::size_t>(entry.row())], entry.column());
+    changePersistentIndexList(from, to);
+    if (current_ >= 0) current_ = rowOf[static_cast<std::size_t>(current_)];
+    Q_EMIT layoutChanged({}, VerticalSortHint);
+}
+
+void PlayListModel::CurrentChanged() {
+    const int former = std::exchange(current_, list_.IndexOf());
+    ShowAgain(former, former);
+    ShowAgain(current_, current_);
 }
 
 void PlayListModel::ShowAgain(int first, int last) {
-    if (last >= first) Q_EMIT dataChanged(index(first, 0), index(last, kColumns - 1));
-}
-
-// Read when somebody looks at it: emptying a long list changes the queue many times.
-int PlayListModel::QueuePlace(const QString& name) const {
-    if (!queueIsKnown_) {
-        queue_.clear();
-        int place = 0;
-        for (const QString& queued : list_.Queue())
-            queue_.insert(queued, ++place);
-        queueIsKnown_ = true;
-    }
-    return queue_.value(name);
+    if (first >= 0 && last >= first && last < rows_)
+        Q_EMIT dataChanged(index(first, 0), index(last, kColumns - 1));
 }
 
 // --- Files that are not there ---
@@ -170,7 +184,7 @@ QVariant PlayListModel::data(const QModelIndex& index, int role) const {
         case Qt::ToolTipRole:
             return ToolTip(row);
         case QueueRole: {
-            const int place = QueuePlace(list_.Entry(row).Name);
+            const int place = QueuePlace(row);
             return place > 0 ? QVariant(place) : QVariant();
         }
         case CurrentRole:
@@ -199,8 +213,7 @@ QString PlayListModel::Spoken(int row, PlayListColumn column) const {
     if (column != PlayListColumn::Number) return Text(row, column);
     QString text = QString::number(row + 1);
     if (row == current_) text += u", läuft"_s;
-    if (const int place = QueuePlace(list_.Entry(row).Name); place > 0)
-        text += u", Warteschlange %1"_s.arg(place);
+    if (const int place = QueuePlace(row); place > 0) text += u", Warteschlange %1"_s.arg(place);
     if (IsMissing(list_.Entry(row).Name)) text += u", nicht verfügbar"_s;
     return text;
 }
@@ -217,7 +230,7 @@ QVariant PlayListModel::Font(int row) const {
 QString PlayListModel::ToolTip(int row) const {
     const QString& name = list_.Entry(row).Name;
     QStringList lines(name);
-    if (const int place = QueuePlace(name); place > 0)
+    if (const int place = QueuePlace(row); place > 0)
         lines << (place == 1 ? u"Wird als Nächstes gespielt"_s
                              : u"Wird als %1. der Warteschlange gespielt"_s.arg(place));
     if (IsMissing(name)) lines << u"Die Datei ist nicht verfügbar"_s;

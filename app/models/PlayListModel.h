@@ -15,21 +15,16 @@ class PlayListModel : public QAbstractTableModel {
     enum Role {
         // Place in the queue, counted from 1; nothing for entries that do not wait.
         QueueRole = Qt::UserRole + 1,
-        // Whether it is the song that plays.
+        // Whether it is the entry that plays.
         CurrentRole,
     };
 
-    // Follows the changes of the list, whose OnChange is taken by this model.
+    // Follows the changes of the list.
     explicit PlayListModel(TPlayList& list, QObject* parent = nullptr);
-    ~PlayListModel() override;
 
     TPlayList& List() { return list_; }
-    // -1 when the song that plays is not listed.
+    // The entry that plays; -1 when it is not listed.
     int CurrentRow() const { return current_; }
-    // Reads the whole list anew.
-    void Refresh();
-    // The current song or the queue has changed.
-    void Redraw();
     // Has the files of these rows looked for; those that are missing are shown so as soon as that is known.
     void LookForFiles(int first, int last);
     // As drag and drop takes them along.
@@ -44,9 +39,14 @@ class PlayListModel : public QAbstractTableModel {
     Qt::DropActions supportedDropActions() const override { return Qt::CopyAction | Qt::MoveAction; }
 
  private:
-    void ListChanged(int index, TChangeType change);
+    void FollowList();
+    void Reset();
+    void EntryInserted(int row);
+    void EntryRemoved(int row);
+    void EntriesMoved(const std::vector<int>& former);
+    void CurrentChanged();
     void ShowAgain(int first, int last);
-    int QueuePlace(const QString& name) const;
+    int QueuePlace(int row) const { return list_.QueuePosition(row) + 1; }
     bool IsMissing(const QString& name) const;
     QString Text(int row, PlayListColumn column) const;
     QString Spoken(int row, PlayListColumn column) const;
@@ -55,9 +55,8 @@ class PlayListModel : public QAbstractTableModel {
 
     TPlayList& list_;
     FilePresence files_;
-    QHash<QString, QString> paths_;      // of entries that are no files themselves, as far as looked for
-    mutable QHash<QString, int> queue_;  // places, counted from 1
-    mutable bool queueIsKnown_ = false;
-    int rows_ = 0;  // as the views know it
+    QHash<QString, QString> paths_;  // of entries that are no files themselves, as far as looked for
+    int rows_ = 0;                   // as the views know it
     int current_ = -1;
+    Subscriptions subscriptions_;
 };

@@ -2,45 +2,25 @@
 
 #include <QString>
 #include <Qt>
-#include <optional>
 #include <span>
 
-#include "MusicManagment/database/SongTypes.h"
-#include "ReadMPEGHeader/ID3Tag.h"
+#include "MusicManagment/database/SongFields.h"
 
-// The numbers stand in the settings: columns to come get the next ones.
-enum class SongColumnId {
-    Title,
-    Artist,
-    Album,
-    Year,
-    Length,
-    Genre,
-    Id3Genre,
-    Track,
-    BitRate,
-    SampleRate,
-    Channels,
-    Format,
-    PlayCount,
-    Comment,
-    AddTime,
-    Flags,
-    Path,
-};
+using SongColumnId = SongFieldId;
 
-// A column of the song list.
+// A column of the song list: how a field of the songs is shown there.
 struct SongColumn {
-    SongColumnId Id;
-    const char16_t* Caption;
+    SongFieldId Id;
     int Width;  // at first, in average characters
     Qt::AlignmentFlag Alignment;
-    bool Shown;                     // at first
-    std::optional<TSortType> Sort;  // what a click on the header sorts by; some columns have no order
-    QString (*Text)(const TID3Tag& song);
+    bool Shown = true;  // at first
+
+    const SongField& Field() const { return FieldOf(Id); }
+    QString Caption() const { return QString::fromUtf16(Field().ShortCaption); }
+    QString Text(const TID3Tag& song) const;
 };
 
-// All columns, from left to right.
+// All columns, from left to right, in the order of their ids.
 std::span<const SongColumn> SongColumns();
 // The column that shows what songs are sorted by; -1 when none does.
 int ColumnOfSortType(TSortType type);

@@ -1,5 +1,6 @@
 #include "app/models/SongListModel.h"
 
+#include <QFont>
 #include <algorithm>
 
 #include "CommonRUKTools/Clock.h"
@@ -23,6 +24,14 @@ const SongColumn& ColumnOf(int section) {
 
 QVariant CellAlignment(const SongColumn& column) {
     return QVariant::fromValue(column.Alignment | Qt::AlignVCenter);
+}
+
+// The views' own font, but bold.
+QVariant BoldFont() {
+    QFont font;
+    font.setBold(true);
+    font.setResolveMask(QFont::WeightResolved);
+    return font;
 }
 
 }  // namespace
@@ -93,16 +102,30 @@ QVariant SongListModel::data(const QModelIndex& index, int role) const {
     if (!index.isValid()) return {};
     const SongColumn& column = ColumnOf(index.column());
     if (role == Qt::TextAlignmentRole) return CellAlignment(column);
-    if (role != Qt::DisplayRole) return {};
+    if (role != Qt::DisplayRole && (role != Qt::FontRole || playing_.isEmpty())) return {};
     const TID3Tag* song = SongAt(index.row());
+    if (role == Qt::FontRole) return song != nullptr && song->FileName == playing_ ? BoldFont() : QVariant();
     return song != nullptr ? column.Text(*song) : QString();
+}
+
+void SongListModel::SetPlaying(const QString& path) {
+    if (path == playing_) return;
+    SyncViews();
+    const QString former = std::exchange(playing_, path);
+    ShowFontOf(former);
+    ShowFontOf(playing_);
+}
+
+void SongListModel::ShowFontOf(const QString& path) {
+    const SongIndex song = path.isEmpty() ? -1 : database_.IndexOf(path);
+    if (song >= 0) Q_EMIT dataChanged(index(song, 0), index(song, columnCount() - 1), {Qt::FontRole});
 }
 
 QVariant SongListModel::headerData(int section, Qt::Orientation orientation, int role) const {
     if (orientation != Qt::Horizontal || section < 0 || section >= columnCount()) return {};
     const SongColumn& column = ColumnOf(section);
     if (role == Qt::TextAlignmentRole) return CellAlignment(column);
-    return role == Qt::DisplayRole ? QString::fromUtf16(column.Caption) : QVariant();
+    return role == Qt::DisplayRole ? column.Caption() : QVariant();
 }
 
 // --- Order ---

@@ -23,6 +23,8 @@ class SongListModel : public QAbstractTableModel {
     void SetOrder(const SongOrder& order);
     // Tells the views at once what has changed.
     void SyncViews();
+    // Marks the song that plays, by its path; empty for none.
+    void SetPlaying(const QString& path);
 
     int rowCount(const QModelIndex& parent = {}) const override;
     int columnCount(const QModelIndex& parent = {}) const override;
@@ -38,6 +40,7 @@ class SongListModel : public QAbstractTableModel {
     void ScheduleSync();
     void SyncRows();
     void PlaceRows();
+    void ShowFontOf(const QString& path);
 
     TMusicDatabase& database_;
     RowJournal journal_;
@@ -46,5 +49,6 @@ class SongListModel : public QAbstractTableModel {
     std::unique_ptr<Reordering> reordering_;  // while all songs change their places
     QTimer syncTimer_;
     qint64 nextSync_ = 0;  // ticks of the clock
+    QString playing_;
     Subscriptions subscriptions_;
 };

@@ -25,12 +25,6 @@ std::vector<PropertyRow> CollectionProperties(const TID3Tag& song);
 // Name and folder.
 std::vector<PropertyRow> PathProperties(const TID3Tag& song);
 
-// The year; empty where none was read.
-QString ShownYear(const TID3Tag& song);
-// The genre of the tag, with the mark of a remix.
-QString ShownGenre(const TID3Tag& song);
-QString ShownTrack(const TID3Tag& song);
-
 // Groups as plain text, a row a line: "Titel: ...".
 QString PropertyLine(const PropertyRow& row);
 QString PropertyText(const std::vector<PropertyGroup>& groups);

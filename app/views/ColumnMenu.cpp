@@ -23,7 +23,7 @@ ColumnMenu::ColumnMenu(QHeaderView& header, int section, QWidget* parent) : QMen
 void ColumnMenu::AddColumns(QHeaderView& header) {
     for (int section = 0; section < header.count(); ++section) {
         const SongColumn& column = SongColumns()[static_cast<std::size_t>(section)];
-        QAction* action = addAction(QString::fromUtf16(column.Caption));
+        QAction* action = addAction(column.Caption());
         action->setCheckable(true);
         action->setChecked(!header.isSectionHidden(section));
         action->setEnabled(column.Id != SongColumnId::Title);  // a list of songs without names helps nobody

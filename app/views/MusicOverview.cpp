@@ -9,13 +9,11 @@
 #include <QVBoxLayout>
 #include <limits>
 
-#include "CommonRUKTools/RWReg.h"
+#include "app/views/WindowSettings.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
-
-constexpr auto kTypeValue = u"OVType";
 
 // In the order of TOVType.
 constexpr const char16_t* kTypeCaptions[kOverviewTypeCount] = {u"Artisten", u"Alben", u"Jahre", u"Längen",
@@ -146,10 +144,10 @@ void TMusicOverview::FollowSelection() {
 // --- Settings ---
 
 void TMusicOverview::LoadSettings(const TRWReg& settings) {
-    const auto type = settings.ReadInteger(QString::fromUtf16(kTypeValue));
-    if (type && *type >= 0 && *type < kOverviewTypeCount) SetOVType(static_cast<TOVType>(*type));
+    if (const auto type = ReadSetting(settings, WindowSettings::kOVType))
+        SetOVType(static_cast<TOVType>(*type));
 }
 
 void TMusicOverview::SaveSettings(TRWReg& settings) const {
-    settings.WriteInteger(QString::fromUtf16(kTypeValue), OVType());
+    WriteSetting(settings, WindowSettings::kOVType, OVType());
 }

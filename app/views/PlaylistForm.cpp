@@ -1,17 +1,22 @@
 #include "app/views/PlaylistForm.h"
 
 #include <QComboBox>
-#include <QEvent>
+#include <QDropEvent>
 #include <QHBoxLayout>
 #include <QLabel>
+#include <QLineEdit>
+#include <QMimeData>
 #include <QSignalBlocker>
 #include <QSpinBox>
 #include <QToolButton>
 #include <QVBoxLayout>
+#include <algorithm>
 
 #include "MusicManagment/playlist/PlayList.h"
+#include "app/CommandRunner.h"
 #include "app/desktop/Icons.h"
 #include "app/models/CollectionTotals.h"
+#include "app/models/SongMime.h"
 #include "app/views/VisPlayList.h"
 
 using namespace Qt::StringLiterals;
@@ -64,15 +69,23 @@ TPlaylistForm::TPlaylistForm(TPlayList& list, QWidget* parent)
     contents->setFocusProxy(view_);
     setWidget(contents);
 
-    const auto follow = [this] { ShowTotals(); };
-    connect(view_->model(), &QAbstractItemModel::modelReset, this, follow);
-    connect(view_->model(), &QAbstractItemModel::rowsInserted, this, follow);
-    connect(view_->model(), &QAbstractItemModel::rowsRemoved, this, follow);
-    connect(view_->model(), &QAbstractItemModel::dataChanged, this, follow);
-    // Who plays the list from elsewhere may have set another order.
-    connect(view_->model(), &QAbstractItemModel::dataChanged, this, [this] { ShowOptions(); });
+    setAcceptDrops(true);
+    FollowList();
     ShowTotals();
     ShowOptions();
+}
+
+void TPlaylistForm::FollowList() {
+    PlayListEvents& events = list_.Events();
+    const auto showTotals = [this] { ShowTotals(); };
+    const auto showTotalsOf = [this](int) { ShowTotals(); };
+    subscriptions_ += events.Inserted.Subscribe(showTotalsOf);
+    subscriptions_ += events.Changed.Subscribe(showTotalsOf);
+    subscriptions_ += events.Removed.Subscribe(showTotalsOf);
+    subscriptions_ += events.Cleared.Subscribe(showTotals);
+    subscriptions_ += events.Loaded.Subscribe(showTotals);
+    // Who plays the list from elsewhere may set another order.
+    subscriptions_ += events.OptionsChanged.Subscribe([this] { ShowOptions(); });
 }
 
 QWidget* TPlaylistForm::MakeOptions() {
@@ -99,25 +112,24 @@ void TPlaylistForm::SetUpOrder() {
     // A narrow window shows as much of it as there is room for.
     order_->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
     order_->setMinimumContentsLength(8);
-    connect(order_, &QComboBox::activated, this,
-            [this] { list_.SetPlayOrder(static_cast<TPlayOrder>(order_->currentData().toInt())); });
+    connect(order_, &QComboBox::activated, this, [this] {
+        RunCommand([this] { list_.SetPlayOrder(static_cast<TPlayOrder>(order_->currentData().toInt())); });
+    });
 }
 
 void TPlaylistForm::SetUpRepeat() {
     repeat_->setObjectName(u"repeatAll"_s);
     repeat_->setIcon(ThemeIcon(u"media-playlist-repeat"_s, QStyle::SP_BrowserReload));
     SetUpSwitch(*repeat_, u"Wiederholen"_s, u"Beginnt von vorn, wenn alle Lieder gespielt worden sind"_s);
-    connect(repeat_, &QToolButton::toggled, this, [this](bool on) { list_.SetRepeatAll(on); });
+    connect(repeat_, &QToolButton::toggled, this,
+            [this](bool on) { RunCommand([&] { list_.SetRepeatAll(on); }); });
 }
 
 void TPlaylistForm::SetUpScan() {
     scan_->setObjectName(u"scan"_s);
     scan_->setIcon(ThemeIcon(u"media-seek-forward"_s, QStyle::SP_MediaSeekForward));
     SetUpSwitch(*scan_, u"Anspielen"_s, u"Spielt von jedem Lied nur den Anfang"_s);
-    connect(scan_, &QToolButton::toggled, this, [this](bool on) {
-        list_.SetScan(on);
-        scanTime_->setVisible(on);
-    });
+    connect(scan_, &QToolButton::toggled, this, [this](bool on) { RunCommand([&] { list_.SetScan(on); }); });
 
     constexpr int kShortest = 2;  // seconds
     constexpr int kLongest = 600;
@@ -127,8 +139,12 @@ void TPlaylistForm::SetUpScan() {
     scanTime_->setRange(kShortest, kLongest);
     scanTime_->setSuffix(u" s"_s);
     scanTime_->setKeyboardTracking(false);  // half a number is no time
-    connect(scanTime_, &QSpinBox::valueChanged, this,
-            [this](int seconds) { list_.SetScanTime(seconds * kMillisecondsPerSecond); });
+    // It would take the names of files for text.
+    for (auto* field : scanTime_->findChildren<QLineEdit*>())
+        field->setAcceptDrops(false);
+    connect(scanTime_, &QSpinBox::valueChanged, this, [this](int seconds) {
+        RunCommand([&] { list_.SetScanTime(seconds * kMillisecondsPerSecond); });
+    });
 }
 
 void TPlaylistForm::ShowOptions() {
@@ -145,13 +161,30 @@ void TPlaylistForm::ShowTotals() {
     totals_->setText(TotalsText(list_.Count(), list_.TotalSeconds()));
 }
 
-// The options dialog, which sets the same, has been another active window.
-void TPlaylistForm::changeEvent(QEvent* event) {
-    QDockWidget::changeEvent(event);
-    if (event->type() == QEvent::ActivationChange && isActiveWindow()) ShowOptions();
+// --- Drag and drop ---
+
+// Between the entries the view takes it, and everywhere else it comes to the end of the list. What is dragged
+// out of the list is in it already.
+void TPlaylistForm::Consider(QDropEvent& drag) const {
+    const QStringList formats = DropFormats();
+    const bool isWelcome =
+        drag.source() != view_ && std::ranges::any_of(formats, [&drag](const QString& format) {
+            return drag.mimeData()->hasFormat(format);
+        });
+    if (!isWelcome) return drag.ignore();
+    drag.setDropAction(Qt::CopyAction);
+    drag.accept();
 }
 
-void TPlaylistForm::showEvent(QShowEvent* event) {
-    QDockWidget::showEvent(event);
-    ShowOptions();
+void TPlaylistForm::dragEnterEvent(QDragEnterEvent* event) {
+    Consider(*event);
+}
+
+void TPlaylistForm::dragMoveEvent(QDragMoveEvent* event) {
+    Consider(*event);
+}
+
+void TPlaylistForm::dropEvent(QDropEvent* event) {
+    Consider(*event);
+    if (event->isAccepted()) view_->TakeDrop(*event, list_.Count());
 }

@@ -2,6 +2,8 @@
 
 #include <QDockWidget>
 
+#include "CommonRUKTools/Listeners.h"
+
 class QComboBox;
 class QLabel;
 class QSpinBox;
@@ -9,25 +11,28 @@ class QToolButton;
 class TPlayList;
 class TVisPlayList;
 
-// The tool window of the playlist: the list, how it is played, and how long it takes.
+// The tool window of the playlist: the list, how it is played, and how long it takes. Songs and files can be
+// dropped anywhere on it.
 class TPlaylistForm : public QDockWidget {
  public:
     explicit TPlaylistForm(TPlayList& list, QWidget* parent = nullptr);
 
     TVisPlayList& View() { return *view_; }
-    // Shows how the list is played, which can have been set elsewhere.
-    void ShowOptions();
 
  protected:
-    void changeEvent(QEvent* event) override;
-    void showEvent(QShowEvent* event) override;
+    void dragEnterEvent(QDragEnterEvent* event) override;
+    void dragMoveEvent(QDragMoveEvent* event) override;
+    void dropEvent(QDropEvent* event) override;
 
  private:
+    void FollowList();
     QWidget* MakeOptions();
     void SetUpOrder();
     void SetUpRepeat();
     void SetUpScan();
+    void ShowOptions();
     void ShowTotals();
+    void Consider(QDropEvent& drag) const;
 
     TPlayList& list_;
     TVisPlayList* view_;
@@ -36,4 +41,5 @@ class TPlaylistForm : public QDockWidget {
     QToolButton* scan_;
     QSpinBox* scanTime_;
     QLabel* totals_;
+    Subscriptions subscriptions_;
 };

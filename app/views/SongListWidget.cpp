@@ -4,6 +4,7 @@
 #include <QHeaderView>
 #include <QScopedValueRollback>
 #include <QScrollBar>
+#include <QSet>
 #include <algorithm>
 
 #include "CommonRUKTools/Dialogs.h"
@@ -82,7 +83,7 @@ void SongListWidget::SetSortingAllowed(bool allowed) {
 }
 
 void SongListWidget::HeaderClicked(int section) {
-    const auto type = SongColumns()[static_cast<std::size_t>(section)].Sort;
+    const auto type = SongColumns()[static_cast<std::size_t>(section)].Field().Sort;
     if (type) {
         SongOrder order = database_.Order();
         order.Backwards = order.SortType == *type && !order.Backwards;
@@ -148,6 +149,13 @@ std::vector<SongIndex> SongListWidget::ChosenSongs() const {
     return songs;
 }
 
+std::vector<SongHandle> SongListWidget::ChosenHandles() const {
+    std::vector<SongHandle> handles;
+    for (const SongIndex song : ChosenSongs())
+        handles.push_back(database_.Songs().HandleOf(song));
+    return handles;
+}
+
 SongIndex SongListWidget::FocusedSong() const {
     return currentIndex().isValid() ? songs_.IndexAt(currentIndex().row()) : -1;
 }
@@ -200,13 +208,59 @@ bool SongListWidget::FocusNext(const SongFilter& filter) {
     return false;
 }
 
-bool SongListWidget::FocusSong(SongIndex song) {
+bool SongListWidget::FocusSong(SongIndex song, ScrollHint where) {
     songs_.Songs().SyncViews();
     const int row = songs_.RowOfSource(song);
     if (row < 0) return false;
     FocusRow(row);
-    scrollTo(currentIndex(), PositionAtCenter);
+    scrollTo(currentIndex(), where);
     return true;
+}
+
+std::vector<QString> SongListWidget::ShownFromFocus(std::size_t most) const {
+    std::vector<QString> paths;
+    if (!currentIndex().isValid()) return paths;
+    for (int row = currentIndex().row(); row < songs_.rowCount() && paths.size() < most; ++row)
+        if (const TID3Tag* song = songs_.SongAt(row)) paths.push_back(song->FileName);
+    return paths;
+}
+
+void SongListWidget::SetPlaying(const QString& path) {
+    songs_.Songs().SetPlaying(path);
+}
+
+SongHandle SongListWidget::NextAfter(const std::vector<SongHandle>& going) const {
+    QSet<const TID3Tag*> records;
+    for (const SongHandle song : going)
+        records.insert(database_.Songs().Find(song));
+    const auto stays = [&](int row) {
+        const TID3Tag* song = songs_.SongAt(row);
+        return song != nullptr && !records.contains(song);
+    };
+    const int focus = std::max(0, currentIndex().row());
+    int row = focus;
+    while (row < songs_.rowCount() && !stays(row))
+        ++row;
+    if (row == songs_.rowCount())
+        for (row = focus - 1; row >= 0 && !stays(row);)
+            --row;
+    return row >= 0 && row < songs_.rowCount() ? database_.Songs().HandleOf(*songs_.SongAt(row))
+                                               : SongHandle();
+}
+
+std::size_t SongListWidget::MarkSongs(const QStringList& paths) {
+    songs_.Songs().SyncViews();
+    const QSet<QString> wanted(paths.begin(), paths.end());
+    std::vector<int> rows;
+    for (int row = 0; row < songs_.rowCount(); ++row) {
+        const TID3Tag* song = songs_.SongAt(row);
+        if (song != nullptr && wanted.contains(song->FileName)) rows.push_back(row);
+    }
+    if (rows.empty()) return 0;
+    FocusRow(rows.front());
+    MarkRows(*selectionModel(), RangesOf(rows));
+    scrollTo(currentIndex(), PositionAtCenter);
+    return rows.size();
 }
 
 void SongListWidget::Enter() {

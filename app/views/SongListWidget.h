@@ -5,6 +5,7 @@
 #include <functional>
 #include <vector>
 
+#include "MusicManagment/database/SongList.h"
 #include "MusicManagment/database/search/SongFilter.h"
 #include "MusicManagment/database/sorting/Sorting.h"
 #include "app/views/TypeAhead.h"
@@ -29,6 +30,7 @@ class SongListWidget : public QTableView {
     std::vector<SongIndex> MarkedSongs() const;
     // What a command is about: the marked songs, else the focused one.
     std::vector<SongIndex> ChosenSongs() const;
+    std::vector<SongHandle> ChosenHandles() const;
     // -1 when no song has the focus.
     SongIndex FocusedSong() const;
     // The marked songs as a drag takes them along.
@@ -41,7 +43,16 @@ class SongListWidget : public QTableView {
     // is none.
     bool FocusNext(const SongFilter& filter);
     // Gives the focus to a song and shows it. False when it is not shown.
-    bool FocusSong(SongIndex song);
+    bool FocusSong(SongIndex song, ScrollHint where = PositionAtCenter);
+    // The song that gets the focus when these have gone: the next one below the focus, else the next above.
+    SongHandle NextAfter(const std::vector<SongHandle>& going) const;
+    // Marks these songs and no others, and shows the first of them, which gets the focus. Returns how many of
+    // them are shown.
+    std::size_t MarkSongs(const QStringList& paths);
+    // The focused song and those shown below it, by path; at most so many.
+    std::vector<QString> ShownFromFocus(std::size_t most) const;
+    // Marks the song that plays, by its path; empty for none.
+    void SetPlaying(const QString& path);
     // Takes the keys; a list in which no song has the focus gives it to its first.
     void Enter();
 

@@ -3,8 +3,8 @@
 #include <QAction>
 #include <QActionGroup>
 
-#include "CommonRUKTools/RWReg.h"
 #include "app/views/DSPDraw.h"
+#include "app/views/WindowSettings.h"
 
 using namespace Qt::StringLiterals;
 
@@ -16,8 +16,6 @@ struct StyleCaption {
 };
 
 constexpr StyleCaption kStyles[] = {{ssBars, u"&Balken"}, {ssLine, u"&Linie"}, {ssCircle, u"&Kreis"}};
-
-const QString kValue = u"SpectrumStyle"_s;
 
 }  // namespace
 
@@ -48,11 +46,11 @@ void TSpectrumForm::ShowStyle() {
 }
 
 void TSpectrumForm::LoadSettings(const TRWReg& settings) {
-    const auto style = settings.ReadInteger(kValue);
-    if (style && *style >= ssBars && *style <= ssCircle) draw_->SetStyle(static_cast<TSpectrumStyle>(*style));
+    if (const auto style = ReadSetting(settings, WindowSettings::kSpectrumStyle))
+        draw_->SetStyle(static_cast<TSpectrumStyle>(*style));
     ShowStyle();
 }
 
 void TSpectrumForm::SaveSettings(TRWReg& settings) const {
-    settings.WriteInteger(kValue, draw_->Style());
+    WriteSetting(settings, WindowSettings::kSpectrumStyle, draw_->Style());
 }

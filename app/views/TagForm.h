@@ -1,8 +1,9 @@
 #pragma once
 
 #include <QDockWidget>
+#include <vector>
 
-#include "ReadMPEGHeader/ID3Tag.h"
+#include "MusicManagment/database/SongFields.h"
 
 class QFormLayout;
 class QLineEdit;
@@ -17,15 +18,14 @@ class TID3TagForm : public QDockWidget {
     void ShowSong(const TID3Tag* song);
 
  private:
-    QLineEdit* AddField(QFormLayout& form, const QString& caption, const QString& name);
-    QPlainTextEdit* AddComment(QFormLayout& form, const QString& caption);
+    struct ShownField {
+        SongFieldId Id;
+        QLineEdit* Field;
+    };
 
-    QLineEdit* title_;
-    QLineEdit* artist_;
-    QLineEdit* album_;
-    QLineEdit* year_;
-    QLineEdit* track_;
-    QLineEdit* genre_;
-    QLineEdit* mainGenre_;
-    QPlainTextEdit* comment_;
+    QLineEdit* AddField(QFormLayout& form, const SongField& shown);
+    QPlainTextEdit* AddComment(QFormLayout& form, const SongField& shown);
+
+    std::vector<ShownField> fields_;
+    QPlainTextEdit* comment_ = nullptr;
 };

@@ -42,10 +42,7 @@ TVisPlayList::TVisPlayList(TPlayList& list, QWidget* parent) : QTableView(parent
     constexpr int kDelay = 120;  // milliseconds after the last scrolling
     lookTimer_.setSingleShot(true);
     lookTimer_.setInterval(kDelay);
-    connect(&lookTimer_, &QTimer::timeout, this, &TVisPlayList::LookForFiles);
-    redrawTimer_.setSingleShot(true);
-    redrawTimer_.setInterval(0);
-    connect(&redrawTimer_, &QTimer::timeout, this, [this] { model_.Redraw(); });
+    connect(&lookTimer_, &QTimer::timeout, this, [this] { RunCommand([this] { LookForFiles(); }); });
     connect(verticalScrollBar(), &QScrollBar::valueChanged, this, &TVisPlayList::LookForFilesSoon);
     connect(&model_, &QAbstractItemModel::modelReset, this, &TVisPlayList::CountChanged);
     connect(&model_, &QAbstractItemModel::rowsInserted, this, &TVisPlayList::CountChanged);
@@ -158,24 +155,34 @@ void TVisPlayList::PlaySelected() {
     int entry = CurrentEntry();
     const auto selected = SelectedEntries();
     if (entry < 0 && !selected.empty()) entry = selected.front();
-    if (entry >= 0 && OnPlay) OnPlay(entry);
+    if (entry >= 0) PlayEntry(entry);
+}
+
+void TVisPlayList::PlayEntry(int index) {
+    RunCommand([this, index] {
+        if (OnPlay) OnPlay(index);
+    });
 }
 
 void TVisPlayList::QueueSelected() {
-    for (const int entry : SelectedEntries())
-        list_.Enqueue(entry);
+    RunCommand([this] {
+        for (const int entry : SelectedEntries())
+            list_.Enqueue(entry);
+    });
 }
 
 void TVisPlayList::UnqueueSelected() {
-    for (const int entry : SelectedEntries())
-        list_.Dequeue(entry);
+    RunCommand([this] {
+        for (const int entry : SelectedEntries())
+            list_.Dequeue(entry);
+    });
 }
 
 void TVisPlayList::MoveTo(int before) {
-    const auto entries = SelectedEntries();
-    if (entries.empty()) return;
-    const int first = list_.Move(entries, before);
-    Select(first, static_cast<int>(entries.size()));
+    RunCommand([this, before] {
+        const auto entries = SelectedEntries();
+        if (!entries.empty()) ShowEntry(list_.Move(entries, before));
+    });
 }
 
 void TVisPlayList::MoveSelected(int step) {
@@ -231,11 +238,17 @@ void TVisPlayList::keyboardSearch(const QString& letters) {
     QTableView::keyboardSearch(letters);
 }
 
+void TVisPlayList::scrollTo(const QModelIndex& index, ScrollHint hint) {
+    const int place = horizontalScrollBar()->value();
+    QTableView::scrollTo(index, hint);
+    horizontalScrollBar()->setValue(place);
+}
+
 void TVisPlayList::mouseDoubleClickEvent(QMouseEvent* event) {
     const QModelIndex entry = indexAt(event->position().toPoint());
     if (event->button() != Qt::LeftButton || !entry.isValid())
         return QTableView::mouseDoubleClickEvent(event);
-    if (OnPlay) OnPlay(entry.row());
+    PlayEntry(entry.row());
 }
 
 void TVisPlayList::contextMenuEvent(QContextMenuEvent* event) {
@@ -290,8 +303,13 @@ void TVisPlayList::dropEvent(QDropEvent* event) {
         event->setDropAction(Qt::MoveAction);
         return MoveTo(row);
     }
-    event->setDropAction(Qt::CopyAction);
-    const DroppedSongs drop = ReadDrop(*event->mimeData());
-    // The other program waits until the drop is over, so the files are read after it.
-    if (!drop.IsEmpty()) QTimer::singleShot(0, this, [this, row, drop] { Insert(row, drop); });
+    TakeDrop(*event, row);
+}
+
+// The other program waits until the drop is over, so the files are read after it.
+void TVisPlayList::TakeDrop(QDropEvent& event, int position) {
+    event.setDropAction(Qt::CopyAction);
+    event.accept();
+    const DroppedSongs drop = ReadDrop(*event.mimeData());
+    if (!drop.IsEmpty()) QTimer::singleShot(0, this, [this, position, drop] { Insert(position, drop); });
 }

@@ -29,11 +29,13 @@ class TVisPlayList : public QTableView, public PlayListView {
 
     std::vector<int> SelectedEntries() const override;
     int CurrentEntry() const override { return currentIndex().row(); }
-    void Refresh() override { model_.Refresh(); }
-    // As soon as the program comes to it: many entries may be queued one by one.
-    void Redraw() override { redrawTimer_.start(); }
 
     void keyboardSearch(const QString& letters) override;
+    // Never sideways.
+    void scrollTo(const QModelIndex& index, ScrollHint hint = EnsureVisible) override;
+
+    // Takes what comes from elsewhere, once the drop is over, before the entry at `position`.
+    void TakeDrop(QDropEvent& event, int position);
 
  protected:
     void changeEvent(QEvent* event) override;
@@ -56,6 +58,7 @@ class TVisPlayList : public QTableView, public PlayListView {
     int DropRow(const QPoint& position) const;
     void ChooseAction(QDropEvent& event) const;
     void Select(int first, int count);
+    void PlayEntry(int index);
     void MoveTo(int before);
     void Insert(int position, const DroppedSongs& drop);
 
@@ -63,5 +66,4 @@ class TVisPlayList : public QTableView, public PlayListView {
     PlayListModel model_{list_};
     qsizetype digits_ = 0;  // that the numbers have room for
     QTimer lookTimer_;
-    QTimer redrawTimer_;
 };

@@ -81,7 +81,7 @@ TVisPlaySound::~TVisPlaySound() {
 QToolButton* TVisPlaySound::AddButton(QBoxLayout& row, int command, const QString& caption) {
     auto* button = new QToolButton(this);
     button->setObjectName(u"player%1"_s.arg(command));
-    button->setIcon(PlayerIcon(command));
+    button->setIcon(MenuIcon(player_.Menu().Find(command)->Icon()));
     button->setAutoRaise(true);
     button->setFocusPolicy(Qt::TabFocus);
     button->setAccessibleName(caption);
@@ -220,19 +220,18 @@ void TVisPlaySound::Redraw() {
     ShowTexts();
     ShowState();
     ShowPosition(open ? player_.GetPosition() : 0, open ? player_.GetLength() : 0);
-    if (OnChange) OnChange();
 }
 
 void TVisPlaySound::ShowTexts() {
     title_->setText(song_.FileName.isEmpty() ? u"Kein Lied"_s : song_.Title);
-    artist_->setText(song_.Artist);
+    artist_->setText(player_.AwaitsOutput() ? u"Wartet auf die Tonausgabe"_s : song_.Artist);
     setToolTip(song_.FileName.isEmpty() ? QString() : song_.FileName + u'\n' + EngineText());
 }
 
 void TVisPlaySound::ShowState() {
     const TPSStatus status = player_.GetStatus();
     const bool playing = status == psPlaying;
-    play_->setIcon(PlayerIcon(playing ? plPause : plPlay));
+    play_->setIcon(MenuIcon(playing ? u"media-playback-pause" : u"media-playback-start"));
     play_->setAccessibleName(playing ? u"Pause"_s : u"Play"_s);
     play_->setToolTip(playing ? u"Pause (F6)"_s : u"Play (F5)"_s);
     stop_->setEnabled(playing || status == psPaused);

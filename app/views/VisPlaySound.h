@@ -23,8 +23,6 @@ class TVisPlaySound : public QWidget, public PlayerPanel {
 
     // A button was pressed; `command` is of the player's menu (PlaySoundMenu.h).
     std::function<void(int command)> OnCommand;
-    // The song or what the player does with it has changed.
-    std::function<void()> OnChange;
 
     const PlayingSong& Song() const { return song_; }
     VolumeSlider& Volume() { return *volume_; }

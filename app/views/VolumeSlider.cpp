@@ -1,23 +1,22 @@
 #include "app/views/VolumeSlider.h"
 
-#include "CommonRUKTools/RWReg.h"
+#include "app/views/WindowSettings.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr int kFull = 100;  // per cent
-constexpr int kStep = 5;
+constexpr int kStep = 5;  // per cent
 
 }  // namespace
 
 VolumeSlider::VolumeSlider(QWidget* parent) : QSlider(Qt::Horizontal, parent) {
     setObjectName(u"volume"_s);
     setAccessibleName(u"Lautstärke"_s);
-    setRange(0, kFull);
+    setRange(WindowSettings::kVolume.Least, WindowSettings::kVolume.Most);
     setSingleStep(kStep);
     setPageStep(4 * kStep);
-    setValue(kFull);
+    setValue(WindowSettings::kVolume.Default);
     setFixedWidth(12 * fontMetrics().averageCharWidth());
     connect(this, &QSlider::valueChanged, this, [this] { Tell(); });
 }
@@ -34,9 +33,9 @@ void VolumeSlider::Tell() {
 }
 
 void VolumeSlider::LoadSettings(const TRWReg& settings) {
-    if (const auto volume = settings.ReadInteger(u"Volume"_s)) setValue(*volume);
+    if (const auto volume = ReadSetting(settings, WindowSettings::kVolume)) setValue(*volume);
 }
 
 void VolumeSlider::SaveSettings(TRWReg& settings) const {
-    settings.WriteInteger(u"Volume"_s, value());
+    WriteSetting(settings, WindowSettings::kVolume, value());
 }

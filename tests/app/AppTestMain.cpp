@@ -2,10 +2,11 @@
 
 #include <QApplication>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "app/desktop/Translations.h"
 
 int main(int argc, char** argv) {
-    QApplication application(argc, argv);
+    GuardedApplication<QApplication> application(argc, argv);
     InstallGerman(application);
     testing::InitGoogleTest(&argc, argv);
     return RUN_ALL_TESTS();

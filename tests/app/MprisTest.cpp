@@ -159,16 +159,4 @@ TEST_F(MprisTest, ASecondProgramTakesANameOfItsOwn) {
     QDBusConnection::disconnectFromBus(u"second"_s);
 }
 
-TEST(MprisWithoutBusTest, NobodyIsListening) {
-    TPlayList list;
-    ScriptedSong song;
-    TPlaySound player(ScriptedEngines(song));
-    Mpris mpris(player, list, {});
-    EXPECT_FALSE(mpris.Register(QDBusConnection(u"none"_s)));
-    mpris.Update();
-    player.SetPosition(1000);
-    QApplication::processEvents();
-    EXPECT_TRUE(mpris.ServiceName().isEmpty());
-}
-
 }  // namespace

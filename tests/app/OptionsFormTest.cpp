@@ -17,8 +17,9 @@
 
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/commands/Settings.h"
 #include "MusicManagment/database/songfiles/NamePattern.h"
+#include "MusicManagment/playback/fmod/FmodLibrary.h"
+#include "MusicManagment/playlist/PlayList.h"
 #include "app/dialogs/NamePatternTexts.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
@@ -68,86 +69,66 @@ class OptionsFormTest : public testing::Test {
     std::unique_ptr<TOptionsForm> form_;
 };
 
-TEST_F(OptionsFormTest, ShowsTheValuesInForce) {
-    database_.SetAutoSave(90'000);
-    database_.SetCompression(clMax);
-    database_.SetFollowFocus(false);
-    database_.SetSortType(stYear);
-    database_.SetUpdateFolders({u"/musik"_s});
-    database_.SetCDNames({{u"Urlaub"_s, 0x00AB12CD}});
-    settings_.WriteBool(u"UseMCI"_s, false);
-    settings_.WriteInteger(u"CrossoverTime"_s, 2500);
-    settings_.WriteInteger(u"FMODSoundOutput"_s, 99);     // none of the outputs
-    settings_.WriteString(u"FMODMixRate"_s, u"48000"_s);  // not the type of this value
-    Open();
-    EXPECT_EQ(Field<QComboBox>(u"AutoSave"_s).currentIndex(), 2);
-    EXPECT_EQ(Field<QSpinBox>(u"AutoSaveInterval"_s).text(), u"1,5 min"_s);
-    EXPECT_EQ(Field<QComboBox>(u"Compression"_s).currentIndex(), clMax);
-    EXPECT_FALSE(Field<QCheckBox>(u"FollowFocus"_s).isChecked());
-    EXPECT_EQ(Field<QComboBox>(u"SortType"_s).currentText(), u"Jahr"_s);
-    EXPECT_EQ(Field<QListWidget>(u"UpdateFolders"_s, u"folders"_s).item(0)->text(), u"/musik"_s);
-    EXPECT_EQ(Field<QTableWidget>(u"CDNames"_s).item(0, 1)->text(), u"00AB12CD"_s);
-    EXPECT_EQ(Field<QTableWidget>(u"MP3MoveSubDirs"_s).item(19, 1)->text(), u"Genre #19"_s);
-    EXPECT_FALSE(Field<QCheckBox>(u"UseMCI"_s).isChecked());
-    EXPECT_EQ(Field<QSpinBox>(u"CrossoverTime"_s).text(), u"2,5 s"_s);
-    EXPECT_EQ(Field<QComboBox>(u"FMODSoundOutput"_s).currentIndex(), 2);
-    EXPECT_EQ(Field<QSpinBox>(u"FMODMixRate"_s).value(), 44'100);
-    EXPECT_FALSE(Field<QPushButton>(u"apply"_s).isEnabled());
-}
-
 TEST_F(OptionsFormTest, OkStoresEveryKindOfValueWithItsType) {
     LinkPlayer();
     int applied = 0;
+    settings_.WriteInteger(u"FMODSoundOutput"_s, 99);  // none of the outputs; nobody touches it
     Open();
     form_->OnApplied = [&applied] { ++applied; };
+    EXPECT_EQ(Field<QComboBox>(u"FMODSoundOutput"_s).currentIndex(), FSOUND_OUTPUT_DSOUND);
+    EXPECT_FALSE(Field<QPushButton>(u"apply"_s).isEnabled());
     Field<QComboBox>(u"AutoSave"_s).setCurrentIndex(2);
-    Field<QSpinBox>(u"AutoSaveInterval"_s).setValue(5 * 60'000);
+    Field<QSpinBox>(u"AutoSaveInterval"_s).setValue(90'000);
+    EXPECT_EQ(Field<QSpinBox>(u"AutoSaveInterval"_s).text(), u"1,5 min"_s);
     Field<QComboBox>(u"SortType"_s).setCurrentIndex(stAlbum);
     Field<QCheckBox>(u"SortBackwards"_s).setChecked(true);
-    Field<QRadioButton>(u"ModernTags"_s).setChecked(true);
-    Field<QCheckBox>(u"MoveMP3sAfterGenreChange"_s).setChecked(true);
-    Pattern().setText(u"%TRACKNR% %TITLE%"_s);
     Field<QTableWidget>(u"MP3MoveSubDirs"_s).item(3, 1)->setText(u"Deutschrock"_s);
     Field<QCheckBox>(u"UseFMOD"_s).setChecked(false);
     Field<QSpinBox>(u"ScanTime"_s).setValue(7500);
     Field<QLineEdit>(u"WinAmpFileName"_s).setText(u"winamp5.exe"_s);
-    Field<QCheckBox>(u"UseWinAmpForLenCheck"_s).setChecked(true);
-    Field<QCheckBox>(u"RCEnabled"_s).setChecked(false);
     Click(u"ok"_s);
 
     EXPECT_EQ(form_->result(), QDialog::Accepted);
     EXPECT_EQ(applied, 1);
-    EXPECT_EQ(database_.AutoSave(), 300'000);
+    EXPECT_EQ(database_.AutoSave(), 90'000);
     EXPECT_EQ(database_.Order(), (SongOrder{stAlbum, sstGATL, true}));
-    EXPECT_TRUE(database_.ModernTags() && database_.UseWinAmpForLenCheck());
-    EXPECT_TRUE(database_.MoveMP3sAfterGenreChange());
-    EXPECT_EQ(database_.MP3NamePattern(), u"%TRACKNR% %TITLE%"_s);
     EXPECT_EQ(database_.MP3MoveSubDirs().at(3), u"Deutschrock"_s);
-
     const TRWReg stored(u"\\Test"_s, folder_.filePath(u"test.conf"_s));
-    EXPECT_EQ(stored.ReadInteger(u"AutoSave"_s), 300'000);
+    EXPECT_EQ(stored.ReadInteger(u"AutoSave"_s), 90'000);
     EXPECT_EQ(stored.ReadBool(u"UseFMOD"_s), false);
-    EXPECT_EQ(stored.ReadBool(u"UseWinamp"_s), true);
     EXPECT_EQ(stored.ReadInteger(u"ScanTime"_s), 7500);
-    EXPECT_EQ(stored.ReadInteger(u"FMODSoundOutput"_s), 2);
     EXPECT_EQ(stored.ReadString(u"WinAmpFileName"_s), u"winamp5.exe"_s);
-    EXPECT_EQ(stored.ReadBool(u"RCEnabled"_s), false);
-    EXPECT_EQ(stored.ReadString(u"MP3MoveSubDirs3"_s), u"Deutschrock"_s);
+    EXPECT_EQ(stored.ReadInteger(u"FMODSoundOutput"_s), 99);
+    EXPECT_FALSE(stored.Exists(u"UseMCI"_s));
     EXPECT_FALSE(database_.Modified());  // none of this is in the database's file
+}
+
+TEST_F(OptionsFormTest, RulesAreChosenTogetherOrOneByOne) {
+    Open();
+    form_->ShowTab(OptionsTab::Rules);
+    EXPECT_TRUE(Field<QRadioButton>(u"ClassicRules"_s).isChecked());
+    auto& tags = Field<QCheckBox>(u"ModernTags"_s);
+    EXPECT_FALSE(tags.isEnabled());
+    Field<QRadioButton>(u"ModernRules"_s).click();
+    EXPECT_TRUE(tags.isChecked());
+    EXPECT_TRUE(form_->Apply());
+    EXPECT_TRUE(database_.ModernTags());
+    Field<QRadioButton>(u"SingleRules"_s).click();
+    EXPECT_TRUE(tags.isEnabled());
+    tags.click();
+    EXPECT_TRUE(form_->Apply());
+    EXPECT_FALSE(database_.ModernTags());
+    Click(u"defaults"_s);
+    EXPECT_TRUE(Field<QRadioButton>(u"ModernRules"_s).isChecked());
 }
 
 TEST_F(OptionsFormTest, CancelChangesNothing) {
     Open();
     Field<QComboBox>(u"AutoSave"_s).setCurrentIndex(1);
-    Field<QCheckBox>(u"Asynchronous"_s).setChecked(false);
-    Field<QCheckBox>(u"RCEnabled"_s).setChecked(false);
-    Field<QTableWidget>(u"MP3MoveSubDirs"_s).item(0, 1)->setText(QString());
     QTest::keyClick(form_.get(), Qt::Key_Escape);
     EXPECT_FALSE(form_->isVisible());
     EXPECT_EQ(form_->result(), QDialog::Rejected);
     EXPECT_EQ(database_.AutoSave(), 0);
-    EXPECT_TRUE(database_.Asynchronous());
-    EXPECT_FALSE(settings_.Exists(u"RCEnabled"_s));
     EXPECT_TRUE(dialogs_.Messages.isEmpty());
 }
 
@@ -166,42 +147,26 @@ TEST_F(OptionsFormTest, ApplyStoresAndStaysAndRests) {
     EXPECT_EQ(form_->result(), QDialog::Accepted);
 }
 
-// A component that keeps a value of its own, as the playlist does.
-class Repeater : public SettingsClient {
- public:
-    bool RepeatAll = true;
-    void LoadSettings(const TRWReg& settings) override {
-        RepeatAll = settings.ReadBool(u"RepeatAll"_s).value_or(RepeatAll);
-    }
-    void SaveSettings(TRWReg& settings) const override { settings.WriteBool(u"RepeatAll"_s, RepeatAll); }
-};
-
 TEST_F(OptionsFormTest, ComponentsTellWhatIsInForceAndReadWhatWasChosen) {
-    LinkPlayer();
-    Repeater repeater;
-    database_.JoinSettings(repeater);
+    TPlayList list;
+    list.SetMusicDatabase(&database_);
+    list.SetRepeatAll(true);
     settings_.WriteBool(u"RepeatAll"_s, false);
     Open();
     EXPECT_TRUE(Field<QCheckBox>(u"RepeatAll"_s).isChecked());
     Field<QCheckBox>(u"RepeatAll"_s).setChecked(false);
     EXPECT_TRUE(form_->Apply());
-    EXPECT_FALSE(repeater.RepeatAll);
+    EXPECT_FALSE(list.RepeatAll());
     EXPECT_EQ(settings_.ReadBool(u"RepeatAll"_s), false);
-    database_.LeaveSettings(repeater);
 }
 
-TEST_F(OptionsFormTest, GroupsOfMissingComponentsAreGreyAndKeepTheirValues) {
-    settings_.WriteInteger(u"EldoSBufferCount"_s, 8);
-    settings_.WriteString(u"WinAmpClassName"_s, QString());  // would be refused if it could be mended
+TEST_F(OptionsFormTest, GroupsOfMissingComponentsAreGrey) {
     Open();
     EXPECT_FALSE(Field<QCheckBox>(u"UseFMOD"_s).isEnabled());
     EXPECT_EQ(Field<QCheckBox>(u"UseFMOD"_s).toolTip(), u"Wird mit dem Player wirksam."_s);
-    EXPECT_TRUE(form_->Apply());
-    EXPECT_EQ(settings_.ReadInteger(u"EldoSBufferCount"_s), 8);
     LinkPlayer();
     Open();
     EXPECT_TRUE(Field<QCheckBox>(u"UseFMOD"_s).isEnabled());
-    EXPECT_FALSE(form_->Apply());
 }
 
 // --- Faults ---
@@ -227,6 +192,9 @@ TEST_F(OptionsFormTest, ThePatternMustGiveNames) {
         EXPECT_EQ(form_->focusWidget(), &Pattern());
     }
     EXPECT_EQ(database_.MP3NamePattern(), u"%ARTIST% - %TITLE%"_s);
+    Pattern().setText(u"%TRACKNR%: %TITLE% (%LENGTHF%)"_s);
+    EXPECT_EQ(Example(), u"Beispiel: 4- Ein schöner Tag (3-45).mp3"_s);
+    Pattern().setText(u"Lied"_s);
     // Without renaming the pattern does not matter, and what cannot be used is not stored.
     Field<QCheckBox>(u"RenameAndMoveMP3s"_s).setChecked(false);
     Click(u"ok"_s);
@@ -257,14 +225,6 @@ TEST_F(OptionsFormTest, AMissingRootFolderIsOfferedToBeMade) {
     Root().setText(folder_.filePath(u"test.conf"_s));
     EXPECT_FALSE(form_->Apply());
     EXPECT_EQ(dialogs_.Messages.last(), folder_.filePath(u"test.conf"_s) + u" ist kein Ordner."_s);
-}
-
-TEST_F(OptionsFormTest, ARootFolderThatNobodyTouchedIsNotAskedAbout) {
-    database_.SetMP3MoveRootDir(folder_.filePath(u"abgesteckt"_s));
-    Open();
-    Field<QCheckBox>(u"FollowFocus"_s).setChecked(false);
-    EXPECT_TRUE(form_->Apply());
-    EXPECT_TRUE(dialogs_.Questions.isEmpty());
 }
 
 TEST_F(OptionsFormTest, GenreFoldersStayInTheRootFolder) {
@@ -316,7 +276,7 @@ TEST_F(OptionsFormTest, CdsAreAddedRenamedAndRemoved) {
     EXPECT_EQ(database_.CDNames()[1].Name, u"Urlaub 2003"_s);
 }
 
-TEST_F(OptionsFormTest, APlayerNeedsAnEngine) {
+TEST_F(OptionsFormTest, APlayerNeedsAnEngineAndWinampItsNames) {
     LinkPlayer();
     Open();
     for (const QString& name : {u"UseFMOD"_s, u"UseMCI"_s, u"UseEldoS"_s, u"UseWinamp"_s})
@@ -325,6 +285,10 @@ TEST_F(OptionsFormTest, APlayerNeedsAnEngine) {
     EXPECT_EQ(Tab(), OptionsTab::Playback);
     EXPECT_EQ(dialogs_.Messages,
               QStringList{u"Mindestens ein System zum Abspielen muss eingeschaltet sein."_s});
+    Field<QCheckBox>(u"UseFMOD"_s).setChecked(true);
+    Field<QLineEdit>(u"WinAmpClassName"_s).clear();
+    EXPECT_FALSE(form_->Apply());
+    EXPECT_EQ(dialogs_.Messages.last(), u"Die Fensterklasse von Winamp fehlt."_s);
 }
 
 TEST_F(OptionsFormTest, NothingIsChangedDuringARun) {
@@ -343,7 +307,7 @@ TEST_F(OptionsFormTest, NothingIsChangedDuringARun) {
 TEST_F(OptionsFormTest, DefaultsAreThoseOfTheShownPageAndNotYetStored) {
     database_.SetUpdateFolders({u"/musik"_s});
     database_.SetMP3NamePattern(u"%TITLE%"_s);
-    database_.SetAutoSave(-1);
+    database_.SetAutoSave(60'000);
     settings_.WriteInteger(u"CrossoverTime"_s, 0);
     Open();
     form_->ShowTab(OptionsTab::Files);
@@ -351,25 +315,14 @@ TEST_F(OptionsFormTest, DefaultsAreThoseOfTheShownPageAndNotYetStored) {
     EXPECT_EQ(Pattern().text(), u"%ARTIST% - %TITLE%"_s);
     EXPECT_EQ(Field<QTableWidget>(u"MP3MoveSubDirs"_s).item(19, 1)->text(), u"Classic"_s);
     EXPECT_EQ(Field<QListWidget>(u"UpdateFolders"_s, u"folders"_s).count(), 1);
-    EXPECT_EQ(Field<QComboBox>(u"AutoSave"_s).currentIndex(), 1);
+    EXPECT_EQ(Field<QComboBox>(u"AutoSave"_s).currentIndex(), 2);
     EXPECT_EQ(Field<QSpinBox>(u"CrossoverTime"_s).value(), 0);
     form_->ShowTab(OptionsTab::Playback);
     Click(u"defaults"_s);
     EXPECT_EQ(Field<QSpinBox>(u"CrossoverTime"_s).value(), 10'000);
-    form_->ShowTab(OptionsTab::Tags);
-    Click(u"defaults"_s);
-    EXPECT_TRUE(Field<QRadioButton>(u"ModernTags"_s).isChecked());
+    EXPECT_FALSE(Field<QCheckBox>(u"UseWinamp"_s).isChecked());
     EXPECT_EQ(database_.MP3NamePattern(), u"%TITLE%"_s);
     EXPECT_TRUE(Field<QPushButton>(u"apply"_s).isEnabled());
-}
-
-TEST_F(OptionsFormTest, TheExampleFollowsThePattern) {
-    Open();
-    form_->ShowTab(OptionsTab::Files);
-    EXPECT_EQ(Example(), u"Beispiel: Die Beispiele - Ein schöner Tag.mp3"_s);
-    Pattern().clear();
-    QTest::keyClicks(&Pattern(), u"%TRACKNR%: %TITLE% (%LENGTHF%)"_s);
-    EXPECT_EQ(Example(), u"Beispiel: 4- Ein schöner Tag (3-45).mp3"_s);
 }
 
 TEST_F(OptionsFormTest, EveryPlaceholderIsExplained) {

@@ -49,17 +49,12 @@ class PlayingTest : public testing::Test {
         database_.AddEntry(QString(), song);
     }
     void Start() {
-        menu_ = std::make_unique<MainMenu>(
-            *window_.menuBar(), database_, [this](int id) { database_.ClickMenuItem(id); }, [] {});
+        menu_ = std::make_unique<MainMenu>(*window_.menuBar(), database_);
         menu_->BindTo(*songs_);
         playing_ = std::make_unique<Playing>(window_, database_, *songs_,
                                              PlayingOptions{StandardList(), ScriptedEngines(song_), {}});
         playing_->AddMenusTo(*window_.menuBar());
         playing_->OnDone = [this](const QString& sentence) { told_ = sentence; };
-        database_.OnMenuItemClicked = [this](TMusicDatabase&, const TMenuExItem&, void*, qint64 id,
-                                             bool& proceed) {
-            proceed = !playing_->Run(static_cast<int>(id));
-        };
         window_.resize(1000, 600);
         window_.show();
         window_.activateWindow();
@@ -115,6 +110,32 @@ TEST_F(PlayingTest, ReturnAppendsTheMarkedSongsAndPlaysTheFocusedOne) {
     QTest::mouseDClick(songs_->viewport(), Qt::LeftButton, {}, last);
     EXPECT_EQ(Listed(), u"124"_s);
     EXPECT_EQ(Sounding(), u"4"_s);
+}
+
+TEST_F(PlayingTest, DoubleClickPlaysTheSongAndWhatFollowsInTheShownList) {
+    const auto doubleClick = [this](int row) {
+        const QPoint place = songs_->visualRect(shown_.index(row, 0)).center();
+        QTest::mouseClick(songs_->viewport(), Qt::LeftButton, {}, place);
+        QTest::mouseDClick(songs_->viewport(), Qt::LeftButton, {}, place);
+    };
+    const auto isBold = [this](int row) {
+        return shown_.index(row, 0).data(Qt::FontRole).value<QFont>().bold();
+    };
+    Mark({0}, 0);
+    database_.ClickMenuItem(mcAddToPlayList);
+    doubleClick(2);
+    EXPECT_EQ(Sounding(), u"2"_s);
+    EXPECT_TRUE(isBold(2));
+    for (const QString& next : {u"3"_s, u"4"_s}) {
+        Choose(u"Player"_s, u"Nächstes"_s);
+        EXPECT_EQ(Sounding(), next);
+    }
+    EXPECT_FALSE(isBold(2));
+    EXPECT_EQ(Listed(), u"0234"_s);  // one by one, each when the one before it began
+
+    doubleClick(1);    // what is listed already waits where it stands
+    View().OnPlay(0);  // another choice ends that
+    EXPECT_EQ(playing_->PlayList().Queue(), QStringList());
 }
 
 TEST_F(PlayingTest, AddingLeavesOutWhatIsListed) {

@@ -46,22 +46,6 @@ TEST_F(ProgressWindowTest, ShowsBothBarsTheirTextsAndTheTitle) {
     EXPECT_EQ(window_.windowTitle(), u"Tunestead"_s);
 }
 
-TEST_F(ProgressWindowTest, EachKindOfRunHasItsHeading) {
-    const std::pair<TProgressType, QString> headings[] = {
-        {ptLoadDatabase, u"Lade die Datenbank"_s},
-        {ptSaveDatabase, u"Speichere die Datenbank"_s},
-        {ptSearchFolders, u"Dursuche Ordner nach neuen Songs"_s},
-        {ptReadBackupCd, u"Lese die Songs einer Backup-CD ein"_s},
-        {ptCopySongs, u"Kopiere die Songs an die Zielorte"_s},
-        {ptOther, u"Fortschritt"_s},
-        {static_cast<TProgressType>(1), u"Fortschritt"_s},
-    };
-    for (const auto& [type, heading] : headings) {
-        window_.ShowPoint({1, 2, 0, 0, type, QString()}, 50);
-        EXPECT_EQ(Text(u"heading"_s), heading);
-    }
-}
-
 TEST_F(ProgressWindowTest, PointsInQuickSuccessionAreNotAllPaintedButTheLastIs) {
     window_.ShowPoint({1, 12, 0, 0, ptAddSongs, QString()}, 8);
     window_.ShowPoint({2, 12, 0, 0, ptAddSongs, QString()}, 16);

@@ -12,9 +12,13 @@
 #include <QTimer>
 
 #include "CommonRUKTools/RWReg.h"
+#include "MusicManagment/database/commands/DatabaseSettings.h"
+#include "MusicManagment/playback/PlayerSettings.h"
+#include "MusicManagment/playlist/PlayListSettings.h"
 #include "app/MainWindow.h"
 #include "app/dialogs/options/OptionsForm.h"
 #include "app/dialogs/wizard/WizardForm.h"
+#include "app/views/WindowSettings.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
 
@@ -22,13 +26,61 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
+const QString kKey = u"\\Software\\RUK\\Tunestead3"_s;
+
+enum class Pick { Least, Default, Most };
+
+bool ValueAt(const Setting<bool>& setting, Pick pick) {
+    return pick == Pick::Default ? setting.Default : pick == Pick::Most;
+}
+int ValueAt(const Setting<int>& setting, Pick pick) {
+    if (pick == Pick::Default) return setting.Default;
+    return pick == Pick::Least ? setting.Least : setting.Most;
+}
+QString ValueAt(const Setting<QString>& setting, Pick pick) {
+    if (pick == Pick::Default && !setting.Default.isEmpty()) return setting.Default.toString();
+    return QString(u"/ö"_s).repeated(pick == Pick::Most ? 500 : 1) + u'/';
+}
+
+// Every setting that has a value of its own.
+template <typename Action>
+void ForEveryRow(const Action& action) {
+    const auto ofRow = [&action](const auto& setting) { action(setting.Row); };
+    ForEachSetting(DatabaseSettings::kAll, ofRow);
+    ForEachSetting(PlayListSettings::kAll, ofRow);
+    ForEachSetting(PlayerSettings::kEngines, ofRow);
+    ForEachSetting(PlayerSettings::kOwn, ofRow);
+    action(DatabaseSettings::kLastMusicFormat.Row);
+    action(DatabaseSettings::kRCEnabled);
+    action(PlayerSettings::kCrossover);
+    action(WindowSettings::kOVType);
+    action(WindowSettings::kVolume);
+    action(WindowSettings::kSpectrumStyle);
+    action(WindowSettings::kLinkPath);
+}
+
+// A way to a player program that is not there.
+class AbsentPlayer : public ExternalPlayer {
+ public:
+    std::optional<qint64> Find() override { return std::nullopt; }
+    bool Start(const QString&, const QString&) override { return false; }
+    void Wait(int) override {}
+    qint64 SendCommand(ExternalCommand, qint64) override { return 0; }
+    qint64 SendText(ExternalCommand, const QString&) override { return 0; }
+    bool RegisterFeedback() override { return false; }
+    std::optional<qint64> CreateFeedback(FeedbackReceiver&) override { return std::nullopt; }
+};
+
 // The main window with the commands as a user reaches them.
 class SettingsCommandsTest : public testing::Test {
  protected:
     void Start(bool offerWizard) {
         window_.reset();
-        window_ = std::make_unique<TTunesteadMainWnd>(MainWindowOptions{
-            .Files = {folder_.path()}, .SettingsFile = SettingsFile(), .OfferWizard = offerWizard});
+        window_ = std::make_unique<TTunesteadMainWnd>(
+            MainWindowOptions{.Files = {folder_.path()},
+                              .SettingsFile = SettingsFile(),
+                              .OfferWizard = offerWizard,
+                              .MakeExternalPlayer = [] { return std::make_unique<AbsentPlayer>(); }});
         window_->show();
     }
     static void Work() {
@@ -80,8 +132,48 @@ TEST_F(SettingsCommandsTest, WhatTheWizardSetsIsStoredAtOnce) {
     Work();
     EXPECT_EQ(dialogCount_, 1);
     EXPECT_FALSE(window_->Database().RenameAndMoveMP3s());
-    const TRWReg stored(u"\\Software\\RUK\\Tunestead3"_s, SettingsFile());
+    const TRWReg stored(kKey, SettingsFile());
     EXPECT_EQ(stored.ReadBool(u"RenameAndMoveMP3s"_s), false);
+}
+
+TEST_F(SettingsCommandsTest, OkWithoutATouchKeepsEveryAcceptedValue) {
+    for (const Pick pick : {Pick::Least, Pick::Default, Pick::Most}) {
+        {
+            TRWReg settings(kKey, SettingsFile());
+            ForEveryRow([&](const auto& row) { WriteSetting(settings, row, ValueAt(row, pick)); });
+        }
+        Start(false);
+        Work();
+        WithNext<TOptionsForm>([](TOptionsForm& form) { form.accept(); });
+        ExtrasItem(u"Einstellungen..."_s)->trigger();
+        EXPECT_EQ(dialogs_.Messages + dialogs_.Questions, QStringList());
+        window_->close();
+        const TRWReg settings(kKey, SettingsFile());
+        ForEveryRow([&](const auto& row) {
+            EXPECT_EQ(ReadSetting(settings, row), ValueAt(row, pick)) << row.Name.toString().toStdString();
+        });
+    }
+    EXPECT_EQ(dialogCount_, 3);
+}
+
+TEST_F(SettingsCommandsTest, ANewInstallationBeginsWithWhatAUserOfTodayWants) {
+    Start(false);
+    window_->close();
+    {
+        TRWReg settings(kKey, SettingsFile());
+        EXPECT_EQ(settings.ReadInteger(u"AutoSave"_s), -1);
+        for (const QString& name : {u"UseEldoS"_s, u"UseWinamp"_s})
+            EXPECT_EQ(settings.ReadBool(name), false) << name.toStdString();
+        EXPECT_EQ(settings.ReadBool(u"ModernTags"_s), true);
+        settings.WriteBool(u"UseEldoS"_s, true);
+        settings.Delete(u"UseWinamp"_s);
+    }
+    // An existing one keeps what it has, and what it does not have is what it was.
+    Start(false);
+    window_->close();
+    const TRWReg settings(kKey, SettingsFile());
+    for (const QString& name : {u"UseEldoS"_s, u"UseWinamp"_s})
+        EXPECT_EQ(settings.ReadBool(name), true) << name.toStdString();
 }
 
 TEST_F(SettingsCommandsTest, TheOptionsChangeTheWindowsMenuToo) {
@@ -105,9 +197,9 @@ TEST_F(SettingsCommandsTest, TheOptionsChangeTheWindowsMenuToo) {
 TEST_F(SettingsCommandsTest, TheItemsRestDuringARun) {
     Start(false);
     Work();
-    window_->Database().StartProgress(u"Test"_s, false);
+    window_->Database().StartProgress(u"Test"_s, true);
     EXPECT_FALSE(ExtrasItem(u"Einstellungen..."_s)->isEnabled());
-    window_->Database().EndProgress(false);
+    window_->Database().EndProgress(true);
     EXPECT_TRUE(ExtrasItem(u"Einrichtungsassistent..."_s)->isEnabled());
 }
 

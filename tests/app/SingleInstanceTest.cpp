@@ -11,7 +11,6 @@
 #include <QTimer>
 #include <memory>
 
-#include "app/desktop/StartMessage.h"
 #include "app/desktop/StartRequests.h"
 #include "tests/PrintQt.h"
 
@@ -60,17 +59,11 @@ TEST_F(SingleInstanceTest, ALaterStartHandsOverWhatItWasGiven) {
     const StartRequest request{{u"/Musik/Zu spät.mp3"_s, QString(200'000, u'x')}, u"token"_s};
     EXPECT_EQ(Program()->Start(request), Role::HandedOver);
     EXPECT_EQ(Program()->Start({}), Role::HandedOver);
+    EXPECT_EQ(Program(u"other"_s)->Start(request), Role::First) << "with a folder of its own";
     ASSERT_EQ(received_.size(), 2U);
     EXPECT_EQ(received_[0].Arguments, request.Arguments);
     EXPECT_EQ(received_[0].ActivationToken, request.ActivationToken);
     EXPECT_TRUE(received_[1].Arguments.isEmpty());
-}
-
-TEST_F(SingleInstanceTest, ProgramsWithFoldersOfTheirOwnDoNotMeet) {
-    const auto first = RunningProgram();
-    const auto other = Program(u"other"_s);
-    EXPECT_EQ(other->Start({{u"/a.mp3"_s}, {}}), Role::First);
-    EXPECT_TRUE(received_.empty());
 }
 
 TEST_F(SingleInstanceTest, TheSocketOfADeadProgramIsTakenOver) {
@@ -107,23 +100,11 @@ TEST_F(SingleInstanceTest, AProgramThatIsEndingMakesPlace) {
 TEST_F(SingleInstanceTest, HangsUpOnWhatIsNoMessage) {
     const auto first = RunningProgram();
     EXPECT_TRUE(HangsUpOn("GET / HTTP/1.1\r\n"));
-    EXPECT_TRUE(HangsUpOn(QByteArray("TSI1\xff\xff\xff\xff", 8)));
-    EXPECT_TRUE(HangsUpOn(QByteArray("TSI1\3\0\0\0abc", 11)));  // a text without its end
+    EXPECT_TRUE(HangsUpOn(QByteArray("TSI1\xff\xff\xff\xff", 8)));  // longer than a message may be
+    EXPECT_TRUE(HangsUpOn(QByteArray("TSI1\3\0\0\0abc", 11)));      // a text without its end
     EXPECT_TRUE(HangsUpOn(QByteArray("TSI1\0\0\0\0", 8)));
     EXPECT_TRUE(received_.empty());
     EXPECT_EQ(Program()->Start({}), Role::HandedOver);
-}
-
-TEST(StartMessageTest, SaysNoMoreThanALaterStartMay) {
-    const auto head = [](quint32 size) {
-        QByteArray bytes = "TSI1";
-        for (int shift = 0; shift < 32; shift += 8)
-            bytes += static_cast<char>(size >> shift);
-        return bytes;
-    };
-    EXPECT_EQ(StartMessage::BodySize(head(StartMessage::kLargestBody)), StartMessage::kLargestBody);
-    EXPECT_EQ(StartMessage::BodySize(head(StartMessage::kLargestBody + 1)), std::nullopt);
-    EXPECT_EQ(StartMessage::BodySize("TSI"), std::nullopt);
 }
 
 TEST(StartRequestsTest, WaitUntilTheProgramCanAct) {

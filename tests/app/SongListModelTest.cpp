@@ -201,7 +201,7 @@ TEST_F(SongListModelTest, ShowsASongInGermanTexts) {
     EXPECT_EQ(Shown(model_, 1), u"Z"_s);
     EXPECT_EQ(Shown(model_, 1, SongColumnId::Year), QString());
     for (const SongColumnId column :
-         {SongColumnId::Track, SongColumnId::Id3Genre, SongColumnId::Channels, SongColumnId::Flags})
+         {SongColumnId::Track, SongColumnId::Genre, SongColumnId::Channels, SongColumnId::Flags})
         EXPECT_EQ(Shown(model_, 1, column), QString());
 }
 

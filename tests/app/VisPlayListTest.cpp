@@ -5,6 +5,7 @@
 #include <QComboBox>
 #include <QDropEvent>
 #include <QFile>
+#include <QHeaderView>
 #include <QLabel>
 #include <QMimeData>
 #include <QSpinBox>
@@ -16,12 +17,22 @@
 #include "app/views/PlaylistForm.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
-#include "tests/app/ScriptedPlayer.h"
 #include "tests/app/Songs.h"
+#include "tests/playlist/ScriptedPlayer.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
+
+void DropOn(QWidget& widget, const QMimeData& data, const QPoint& place) {
+    QDragEnterEvent enter(place, Qt::CopyAction | Qt::MoveAction, &data, Qt::LeftButton, Qt::NoModifier);
+    QApplication::sendEvent(&widget, &enter);
+    EXPECT_TRUE(enter.isAccepted());
+    EXPECT_EQ(enter.dropAction(), Qt::CopyAction);
+    QDropEvent drop(place, Qt::CopyAction | Qt::MoveAction, &data, Qt::LeftButton, Qt::NoModifier);
+    QApplication::sendEvent(&widget, &drop);
+    QApplication::processEvents();
+}
 
 class VisPlayListTest : public testing::Test {
  protected:
@@ -60,15 +71,7 @@ class VisPlayListTest : public testing::Test {
     QPoint Above(int row) const {
         return view_.visualRect(view_.model()->index(row, 1)).topLeft() + QPoint(5, 2);
     }
-    void Drop(const QMimeData& data, const QPoint& place) {
-        QDragEnterEvent enter(place, Qt::CopyAction | Qt::MoveAction, &data, Qt::LeftButton, Qt::NoModifier);
-        QApplication::sendEvent(view_.viewport(), &enter);
-        EXPECT_TRUE(enter.isAccepted());
-        EXPECT_EQ(enter.dropAction(), Qt::CopyAction);
-        QDropEvent drop(place, Qt::CopyAction | Qt::MoveAction, &data, Qt::LeftButton, Qt::NoModifier);
-        QApplication::sendEvent(view_.viewport(), &drop);
-        QApplication::processEvents();
-    }
+    void Drop(const QMimeData& data, const QPoint& place) { DropOn(*view_.viewport(), data, place); }
 
     TPlayList list_;
     ScriptedPlayer player_;
@@ -81,12 +84,6 @@ TEST_F(VisPlayListTest, ReturnAndADoubleClickPlayTheFocusedEntry) {
     Press(Qt::Key_Return);
     QTest::mouseDClick(view_.viewport(), Qt::LeftButton, {}, Above(2));
     EXPECT_EQ(played_, QList<int>({4, 2}));
-}
-
-TEST_F(VisPlayListTest, DelRemovesWhatIsSelected) {
-    Select({1, 2, 5});
-    Press(Qt::Key_Delete);
-    EXPECT_EQ(Order(), u"034"_s);
 }
 
 TEST_F(VisPlayListTest, SelectedEntriesMoveByKeysAndStaySelected) {
@@ -122,17 +119,6 @@ TEST_F(VisPlayListTest, ADropGoesBetweenTheEntriesOrToTheEnd) {
     EXPECT_EQ(Order(), u"01xy2345z"_s);
 }
 
-TEST_F(VisPlayListTest, FoldersFromAFileManagerBringTheirSongs) {
-    const QTemporaryDir folder;
-    for (const QString& name : {u"7.mp3"_s, u"8.mp3"_s, u"brief.txt"_s})
-        ASSERT_TRUE(QFile(folder.filePath(name)).open(QIODevice::WriteOnly));
-    QMimeData data;
-    data.setUrls({QUrl::fromLocalFile(folder.path())});
-    Drop(data, Above(0));
-    EXPECT_EQ(list_.Count(), 8);
-    EXPECT_TRUE(Order().endsWith(u"012345"_s));
-}
-
 TEST_F(VisPlayListTest, AListThatShrinksWhileADropIsReadGetsItAtItsEnd) {
     const QTemporaryDir folder;
     ASSERT_TRUE(QFile(folder.filePath(u"7.mp3"_s)).open(QIODevice::WriteOnly));
@@ -158,12 +144,17 @@ TEST_F(VisPlayListTest, ADamagedPlayListIsToldAndChangesNothing) {
     EXPECT_EQ(Order(), u"012345"_s);
 }
 
-TEST_F(VisPlayListTest, TheSelectionOutlivesAChangeOfSong) {
+TEST_F(VisPlayListTest, MarksAndFocusGoAlongWithTheirEntries) {
     Select({1, 3});
     list_.Insert(0, {.Name = u"/Musik/9.mp3"_s});
-    view_.Refresh();  // as the player asks for when it opens a song
+    list_.Events().CurrentChanged.Tell();
+    list_.Enqueue(0);
+    list_.Remove(6);
     EXPECT_EQ(view_.SelectedEntries(), std::vector<int>({2, 4}));
-    EXPECT_EQ(view_.CurrentEntry(), 2);
+    list_.Move({0}, 3);  // by someone else
+    list_.RefreshRecord(0);
+    EXPECT_EQ(view_.SelectedEntries(), std::vector<int>({1, 4}));
+    EXPECT_EQ(view_.CurrentEntry(), 1);
 }
 
 // --- The tool window ---
@@ -178,6 +169,25 @@ TEST(PlaylistFormTest, TellsHowLongTheListPlays) {
     EXPECT_EQ(totals->text(), u"3 Songs, Spielzeit 5:00"_s);
     list.Remove(0);
     EXPECT_EQ(totals->text(), u"2 Songs, Spielzeit 3:20"_s);
+}
+
+TEST(PlaylistFormTest, WhatIsDroppedAnywhereOnTheWindowComesIn) {
+    TPlayList list;
+    TPlaylistForm form(list);
+    form.show();
+    QString expected;
+    for (QWidget* target : {form.View().viewport(), static_cast<QWidget*>(form.View().horizontalHeader()),
+                            static_cast<QWidget*>(form.findChild<QLabel*>(u"playListTotals"_s)),
+                            static_cast<QWidget*>(form.findChild<QToolButton*>(u"repeatAll"_s)),
+                            form.findChild<QSpinBox*>(u"scanTime"_s)->findChild<QWidget*>()}) {
+        const QString name = QString::number(list.Count());
+        DropOn(*target, SongMimeData({{.Name = name}}), QPoint(2, 2));
+        expected += name;
+    }
+    QString listed;
+    for (int i = 0; i < list.Count(); ++i)
+        listed += list.Entry(i).Name;
+    EXPECT_EQ(listed, expected);
 }
 
 TEST(PlaylistFormTest, SetsHowTheListIsPlayedAndShowsWhatOthersHaveSet) {
@@ -196,13 +206,10 @@ TEST(PlaylistFormTest, SetsHowTheListIsPlayedAndShowsWhatOthersHaveSet) {
     form.findChild<QToolButton*>(u"scan"_s)->click();
     EXPECT_TRUE(time->isVisible());
     time->setValue(15);
-    EXPECT_EQ(player.Limit, 15'000);
+    EXPECT_EQ(player.AutoStop, 15'000);
 
     list.SetPlayOrder(poRandom);
     list.SetRepeatAll(false);
-    list.Insert(0, {.Name = u"/x"_s});
-    list.RedrawView();
-    QApplication::processEvents();
     EXPECT_EQ(order->currentText(), u"Zufällig"_s);
     EXPECT_FALSE(form.findChild<QToolButton*>(u"repeatAll"_s)->isChecked());
     list.SetPlaySound(nullptr);

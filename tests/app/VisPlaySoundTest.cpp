@@ -99,22 +99,7 @@ TEST_F(VisPlaySoundTest, OneButtonPlaysAndPauses) {
     EXPECT_FALSE(Button(plStop)->isEnabled());
 }
 
-TEST_F(VisPlaySoundTest, PreviousRestsUntilThereIsOne) {
-    ASSERT_TRUE(list_.PlayEntry(0));
-    EXPECT_FALSE(Button(plPrevious)->isEnabled());
-    ASSERT_TRUE(list_.PlayEntry(1));
-    EXPECT_TRUE(Button(plPrevious)->isEnabled());
-}
-
 // --- The position ---
-
-TEST_F(VisPlaySoundTest, AClickGoesThere) {
-    ASSERT_TRUE(list_.PlayEntry(0));
-    QTest::mouseClick(Slider(), Qt::LeftButton, {}, Slider()->rect().center());
-    EXPECT_NEAR(song_.Position, 120'000, 3'000);
-    QTest::mouseClick(Slider(), Qt::LeftButton, {}, QPoint(0, 5));
-    EXPECT_EQ(song_.Position, 0u);
-}
 
 TEST_F(VisPlaySoundTest, DraggingShowsTheTimeAndGoesThereAtItsEnd) {
     ASSERT_TRUE(list_.PlayEntry(0));
@@ -130,21 +115,6 @@ TEST_F(VisPlaySoundTest, DraggingShowsTheTimeAndGoesThereAtItsEnd) {
     EXPECT_NEAR(song_.Position, 120'000, 3'000);
 }
 
-TEST_F(VisPlaySoundTest, KeysMoveTheSongWithinItsBounds) {
-    ASSERT_TRUE(list_.PlayEntry(0));
-    TickAt(20'000);
-    quint32 told = 0;
-    player_.OnSeeked = [&](TPlaySound&, quint32 position) { told = position; };
-    QTest::keyClick(Slider(), Qt::Key_Right);
-    EXPECT_EQ(song_.Position, 25'000u);
-    EXPECT_EQ(told, 25'000u);
-    QTest::keyClick(Slider(), Qt::Key_PageDown);
-    EXPECT_EQ(song_.Position, 0u);
-    for (int i = 0; i < 9; ++i)
-        QTest::keyClick(Slider(), Qt::Key_PageUp);
-    EXPECT_EQ(song_.Position, 240'000u);
-}
-
 // --- Cross-fading ---
 
 TEST_F(VisPlaySoundTest, ThePlayerAsksHereWhenToFade) {
@@ -154,25 +124,6 @@ TEST_F(VisPlaySoundTest, ThePlayerAsksHereWhenToFade) {
     EXPECT_EQ(player_.Crossover(), coAlways);
     panel_.SetCrossover(coNone);
     EXPECT_EQ(modes->currentText(), u"Kein Überblenden"_s);
-}
-
-// --- The look ---
-
-TEST_F(VisPlaySoundTest, AWideStripIsLowAndANarrowStackIsNotCut) {
-    for (const int points : {9, 12, 16}) {
-        QFont font = panel_.font();
-        font.setPointSize(points);
-        panel_.setFont(font);
-        panel_.resize(1200, 60);
-        QApplication::processEvents();
-        const int strip = panel_.sizeHint().height();
-        panel_.resize(panel_.minimumSizeHint().width(), 200);
-        QApplication::processEvents();
-        EXPECT_GT(panel_.sizeHint().height(), strip);
-        const auto* modes = panel_.findChild<QComboBox*>(u"crossover"_s);
-        EXPECT_GE(modes->width(), modes->minimumSizeHint().width());
-        EXPECT_TRUE(panel_.rect().contains(modes->geometry()));
-    }
 }
 
 }  // namespace

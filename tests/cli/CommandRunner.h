@@ -2,16 +2,13 @@
 
 #include <gtest/gtest.h>
 
-#include <QDir>
-#include <QFile>
 #include <QJsonDocument>
 #include <QJsonObject>
-#include <QTemporaryDir>
 #include <cstdio>
 #include <memory>
 
-#include "CommonRUKTools/ByteWriter.h"
 #include "cli/CommandLine.h"
+#include "tests/database/SongFolder.h"
 
 struct CloseFile {
     void operator()(std::FILE* file) const { std::fclose(file); }
@@ -54,35 +51,14 @@ inline CommandResult RunWords(const QStringList& words) {
 // A test with a folder of its own and sound files in it.
 class CommandTest : public testing::Test {
  protected:
-    QString Path(const QString& name) const { return folder_.filePath(name); }
-
-    static void Put(const QString& path, ByteSpan bytes) {
-        QDir().mkpath(QFileInfo(path).path());
-        QFile file(path);
-        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
-        file.write(reinterpret_cast<const char*>(bytes.data()), static_cast<qsizetype>(bytes.size()));
+    QString Path(const QString& name) const { return folder_.Path(name); }
+    void Put(const QString& path, ByteSpan bytes) const {
+        folder_.Put(QDir(folder_.Path()).relativeFilePath(path), bytes);
     }
-
-    // Mono, 8 bits, 8000 Hz. Returns the path.
+    // Returns the path.
     QString PutWave(const QString& name, std::uint32_t seconds = 1) const {
-        const std::uint32_t size = 8000 * seconds;
-        ByteWriter wave;
-        wave.Raw("RIFF");
-        wave.U32Le(36 + size);
-        wave.Raw("WAVEfmt ");
-        wave.U32Le(16);
-        wave.U16Le(1);
-        wave.U16Le(1);
-        wave.U32Le(8000);
-        wave.U32Le(8000);
-        wave.U16Le(1);
-        wave.U16Le(8);
-        wave.Raw("data");
-        wave.U32Le(size);
-        wave.Zeros(size);
-        Put(Path(name), wave.Bytes());
-        return Path(name);
+        return folder_.Add(name, seconds);
     }
 
-    QTemporaryDir folder_;
+    SongFolder folder_;
 };

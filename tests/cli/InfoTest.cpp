@@ -54,7 +54,7 @@ TEST_F(InfoTest, TheObjectHasItsKeysInTheirOrder) {
     EXPECT_EQ(info[u"title"_s], u"Was"_s);
     EXPECT_EQ(info[u"format"_s], u"Wave"_s);
     EXPECT_EQ(info[u"length"_s], 3);
-    EXPECT_EQ(info[u"sampleRate"_s], 8000);
+    EXPECT_EQ(info[u"sampleRate"_s], 1000);
     EXPECT_EQ(info[u"remix"_s], QJsonValue(false));
     EXPECT_TRUE(info[u"error"_s].isNull());
     EXPECT_EQ(info[u"vbr"_s], QString());

@@ -74,43 +74,18 @@ TEST_F(PlayTest, SongsFollowOneAnotherInTheOrderThatIsAskedFor) {
     EXPECT_NEAR(Seconds(), 6.75, 0.75);
 }
 
-TEST_F(PlayTest, IntroScanGoesOnAfterItsTime) {
-    const QString a = AddLevel(u"a.wav"_s, 0.25, 30);
-    const QString b = AddLevel(u"b.wav"_s, -0.5, 30);
-    WriteMix({u"--scan"_s, u"2000"_s, u"--crossfade=0"_s, a, b});
-    EXPECT_NEAR(LevelAt(1.5), 0.25, 0.01);
-    EXPECT_NEAR(LevelAt(3), -0.5, 0.01);
-    EXPECT_NEAR(Seconds(), 4, 0.3);
-}
-
-TEST_F(PlayTest, ListsAndFoldersStandForTheirSongs) {
-    const QString a = AddLevel(u"a.wav"_s, 0.25, 2);
-    const QString b = AddLevel(u"music/b.wav"_s, 0.25, 2);
-    const std::string list = "#EXTM3U\r\n" + a.toStdString() + "\r\n";
-    Put(Path(u"list.m3u"_s), AsBytes(list));
-    const CommandResult result = WriteMix({u"--mode=none"_s, Path(u"list.m3u"_s), Path(u"music"_s)});
-    EXPECT_EQ(result.Out, a + u'\n' + b + u'\n');
-}
-
 TEST_F(PlayTest, WhatCannotBePlayedIsToldAndTheRestIsPlayed) {
     const QString a = AddLevel(u"a.wav"_s, 0.25, 2);
     Put(Path(u"bad.mp3"_s), AsBytes("no sound at all"));
-    const CommandResult result = WriteMix({Path(u"missing.mp3"_s), Path(u"bad.mp3"_s), a});
+    const QByteArray list = "#EXTM3U\r\n" + Path(u"gone.mp3"_s).toUtf8() + "\r\n";
+    Put(Path(u"list.m3u"_s), AsBytes(list.constData()));
+    const CommandResult result =
+        WriteMix({Path(u"missing.mp3"_s), Path(u"bad.mp3"_s), Path(u"list.m3u"_s), a});
     EXPECT_EQ(result.Status, 1);
     EXPECT_EQ(result.Out, a + u'\n');
+    EXPECT_TRUE(result.Err.contains(u"Die Datei ist nicht verfügbar: "_s + Path(u"gone.mp3"_s)));
     EXPECT_TRUE(result.Err.contains(u"Nichts zum Abspielen gefunden: "_s + Path(u"missing.mp3"_s)));
     EXPECT_TRUE(result.Err.contains(u"Fehler beim Öffnen der Datei "_s + Path(u"bad.mp3"_s)));
-}
-
-TEST_F(PlayTest, EntriesWithoutAFileAreToldAndPassedOver) {
-    const QString a = AddLevel(u"a.wav"_s, 0.25, 2);
-    const QString gone = Path(u"gone.mp3"_s);
-    const QByteArray list = "#EXTM3U\r\n" + gone.toUtf8() + "\r\n" + a.toUtf8() + "\r\n";
-    Put(Path(u"list.m3u"_s), AsBytes(list.constData()));
-    const CommandResult result = WriteMix({Path(u"list.m3u"_s)});
-    EXPECT_EQ(result.Status, 1);
-    EXPECT_EQ(result.Out, a + u'\n');
-    EXPECT_EQ(result.Err, u"Die Datei ist nicht verfügbar: "_s + gone + u'\n');
 }
 
 TEST_F(PlayTest, AFullDiskEndsThePlaying) {
@@ -149,3 +124,11 @@ TEST_F(PlayTest, OutputThatCannotBeOpenedFails) {
 }
 
 }  // namespace
+
+TEST_F(PlayTest, AMixNeverOverwritesWhatItIsMadeOf) {
+    const QString song = AddLevel(u"mix.wav"_s, 0.25, 1);
+    for (const QString& path : {song, folder_.Path()}) {
+        EXPECT_EQ(WriteMix({path}).Status, 1);
+        EXPECT_EQ(mix_.size(), 16'000) << "as it was";
+    }
+}

@@ -14,56 +14,38 @@ class PlaylistCommandTest : public CommandTest {
         QFile file(Path(name));
         return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
     }
-    // A native list of one song with a record and one without.
-    void PutNative() const {
-        ByteWriter file;
-        file.Raw("RUKPLYLST");
-        file.U16Le(0x0100);
-        const auto text = [&file](std::string_view value) {
-            file.U16Le(static_cast<std::uint16_t>(value.size()));
-            file.Raw(value);
-        };
-        text("/m/a.mp3");
-        file.U8(255);
-        file.U16Le(1993);
-        file.U16Le(227);
-        file.Zeros(35);
-        for (const std::string_view value : {"/m/a.mp3", "Venus\tas a Boy", "Björk", "Debut", "", "MP3"})
-            text(value);
-        text("/m/b.mp3");
-        file.U8(0);
-        Put(Path(u"l.rukpl"_s), file.Bytes());
+    QString List() const {
+        Put(Path(u"l.m3u"_s), AsBytes("#EXTM3U\n#EXTINF:227,Björk - Venus\tas a Boy\n/m/a.mp3\nb.mp3\n"));
+        return Path(u"l.m3u"_s);
     }
 };
 
 }  // namespace
 
 TEST_F(PlaylistCommandTest, AListIsShownAsTextAndAsJson) {
-    PutNative();
-    const auto text = Run({Path(u"l.rukpl"_s)});
+    const auto text = Run({List()});
     EXPECT_EQ(text.Status, esDone);
-    EXPECT_EQ(text.Out, u"0\tBjörk\tVenus as a Boy\t3:47\t/m/a.mp3\n1\t\t\t\t/m/b.mp3\n"_s);
-    const auto objects = Run({u"--json"_s, Path(u"l.rukpl"_s)}).Objects();
+    EXPECT_EQ(text.Out, u"0\tBjörk\tVenus as a Boy\t3:47\t/m/a.mp3\n1\t\t\t\t"_s + Path(u"b.mp3"_s) + u'\n');
+    const auto objects = Run({u"--json"_s, List()}).Objects();
     ASSERT_EQ(objects.size(), 2u);
     EXPECT_EQ(objects[0][u"name"_s].toString(), u"/m/a.mp3"_s);
-    EXPECT_EQ(objects[0][u"year"_s].toString(), u"1993"_s);
+    EXPECT_EQ(objects[0][u"artist"_s].toString(), u"Björk"_s);
     EXPECT_EQ(objects[1][u"index"_s].toInt(), 1);
     EXPECT_EQ(objects[1].size(), 2);
+    EXPECT_TRUE(Run({u"--classic"_s, List()}).Out.contains(u"/EXTINF:227,"_s));
 }
 
 TEST_F(PlaylistCommandTest, AListIsConvertedToTheFormatOfTheExtension) {
-    PutNative();
-    EXPECT_EQ(Run({Path(u"l.rukpl"_s), u"--out"_s, Path(u"l.m3u"_s)}).Status, esDone);
-    EXPECT_EQ(BytesOf(u"l.m3u"_s),
-              QByteArray("#EXTM3U\r\n#EXTINF:227,Björk - Venus\tas a Boy\r\n/m/a.mp3\r\n/m/b.mp3\r\n"));
-    EXPECT_EQ(Run({Path(u"l.m3u"_s), u"--out"_s, Path(u"l.pls"_s)}).Status, esDone);
-    EXPECT_EQ(
-        BytesOf(u"l.pls"_s),
-        QByteArray("[playlist]\r\nFile1=/m/a.mp3\r\nFile2=/m/b.mp3\r\nNumberOfEntries=2\r\nVersion=2\r\n"));
+    const QString native = Path(u"l.rukpl"_s);
+    EXPECT_EQ(Run({List(), u"--out"_s, native}).Status, esDone);
+    EXPECT_EQ(Run({native, u"--out"_s, Path(u"l.pls"_s)}).Status, esDone);
+    EXPECT_EQ(BytesOf(u"l.pls"_s),
+              "[playlist]\r\nFile1=/m/a.mp3\r\nTitle1=Björk - Venus\tas a Boy\r\nLength1=227\r\nFile2=" +
+                  Path(u"b.mp3"_s).toUtf8() + "\r\nNumberOfEntries=2\r\nVersion=2\r\n");
 }
 
 TEST_F(PlaylistCommandTest, WhatCannotBeReadOrMeantIsSaid) {
-    PutNative();
+    Run({List(), u"--out"_s, Path(u"l.rukpl"_s)});
     const QByteArray before = BytesOf(u"l.rukpl"_s);
     Put(Path(u"cut.rukpl"_s), AsBytes({before.constData(), 60}));
     struct Case {

@@ -51,9 +51,8 @@ TEST_F(TerminalDialogsTest, WithoutATerminalEveryQuestionIsCancelled) {
 }
 
 TEST_F(TerminalDialogsTest, AFileIsReplacedOnlyAfterAYes) {
-    const QTemporaryDir folder;
-    const QString path = folder.filePath(u"a"_s);
-    ASSERT_TRUE(QFile(path).open(QIODevice::WriteOnly));
+    const SongFolder folder;
+    const QString path = folder.Put(u"a"_s, "");
     FileDialogOptions options;
     options.Preset = path;
     options.ConfirmOverwrite = true;

@@ -2,12 +2,10 @@
 
 #include <gtest/gtest.h>
 
-#include <QFile>
-#include <QTemporaryDir>
-
 #include "CommonRUKTools/Errors.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "tests/PrintQt.h"
+#include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
 
@@ -15,16 +13,6 @@ namespace {
 
 class BannListTest : public testing::Test {
  protected:
-    QString Path() const { return folder_.filePath(u"Tunestead3_BannList.str"_s); }
-    void Write(const QByteArray& text) const {
-        QFile file(Path());
-        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
-        file.write(text);
-    }
-    QByteArray Written() const {
-        QFile file(Path());
-        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
-    }
     static QStringList Entries(const SortedTextList& list) {
         QStringList entries;
         for (const auto& row : list)
@@ -32,7 +20,8 @@ class BannListTest : public testing::Test {
         return entries;
     }
 
-    QTemporaryDir folder_;
+    SongFolder folder_;
+    QString path_ = folder_.Path(u"Tunestead3_BannList.str"_s);
     SortedTextList list_;
 };
 
@@ -40,17 +29,12 @@ TEST_F(BannListTest, ComesBackAsItWasSaved) {
     const QStringList entries = {u"Die Ärzte - Zu spät"_s, u" - "_s, u"日本 - 音楽 "_s};
     for (const QString& entry : entries)
         list_.Insert(entry);
-    SaveBannList(list_, Path());
-    EXPECT_EQ(Written().count("\r\n"), 3);
+    SaveBannList(list_, path_);
+    EXPECT_EQ(folder_.Get(u"Tunestead3_BannList.str"_s).count("\r\n"), 3);
     SortedTextList loaded;
     loaded.Insert(u"of an earlier list"_s);
-    LoadBannList(loaded, Path());
+    LoadBannList(loaded, path_);
     EXPECT_EQ(Entries(loaded), Entries(list_));
-
-    list_.Clear();
-    SaveBannList(list_, Path());
-    LoadBannList(loaded, Path());
-    EXPECT_EQ(loaded.Count(), 0);
 }
 
 TEST_F(BannListTest, TakesAnyLineEndAndBothCodePages) {
@@ -67,18 +51,18 @@ TEST_F(BannListTest, TakesAnyLineEndAndBothCodePages) {
                           {"\r\n", {}},
                           {"", {}}};
     for (const Case& each : cases) {
-        Write(each.Text);
-        LoadBannList(list_, Path());
+        folder_.Put(u"Tunestead3_BannList.str"_s, each.Text);
+        LoadBannList(list_, path_);
         EXPECT_EQ(Entries(list_), each.Entries) << each.Text.toStdString();
     }
 }
 
 TEST_F(BannListTest, AFileThatCannotBeReadOrWrittenLeavesEverythingAsItWas) {
     list_.Insert(u"A - 1"_s);
-    EXPECT_THROW(LoadBannList(list_, Path()), EStreamError);
-    EXPECT_THROW(LoadBannList(list_, folder_.path()), EStreamError);
+    EXPECT_THROW(LoadBannList(list_, path_), EStreamError);
+    EXPECT_THROW(LoadBannList(list_, folder_.Path()), EStreamError);
     EXPECT_EQ(list_.Count(), 1);
-    EXPECT_THROW(SaveBannList(list_, folder_.filePath(u"missing/list.str"_s)), EStreamError);
+    EXPECT_THROW(SaveBannList(list_, folder_.Path(u"missing/list.str"_s)), EStreamError);
 }
 
 // A tag may hold a line break, a line of the file cannot.
@@ -87,9 +71,9 @@ TEST_F(BannListTest, ASongWithALineBreakStaysBannedAfterLoading) {
     song.Artist = u"Two\r\nLines"_s;
     song.Title = u"Title\n"_s;
     list_.Insert(BanEntry(song));
-    SaveBannList(list_, Path());
+    SaveBannList(list_, path_);
     TMusicDatabase database;
-    LoadBannList(database.BannList(), Path());
+    LoadBannList(database.BannList(), path_);
     EXPECT_EQ(database.BannList().Count(), 1);
     EXPECT_TRUE(database.IsBanned(song));
 }

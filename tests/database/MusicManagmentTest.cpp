@@ -271,7 +271,7 @@ TEST_F(MusicManagmentTest, ARunBeginsAndEndsWithItsObject) {
     EXPECT_EQ(log_.Take(), (QStringList{u"caption MusicDatabase v6.0"_s, u"end"_s, u"reset"_s}));
     EXPECT_FALSE(database_.ProgressRunning() || database_.MenuLocked());
     EXPECT_FALSE(database_.Progress({}));
-    const ProgressRun unlocked(database_, u"Test"_s, false);
+    const ProgressRun unlocked(database_, u"Test"_s, Operation::Commands::Stay);
     EXPECT_FALSE(database_.MenuLocked());
 }
 

@@ -2,14 +2,13 @@
 
 #include <gtest/gtest.h>
 
-#include <QDir>
-#include <QTemporaryDir>
-
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/tsdb/DatabaseFile.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
+#include "tests/ScriptedDialogs.h"
 #include "tests/database/DatabaseBuilder.h"
+#include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
 
@@ -46,13 +45,6 @@ Bytes OldRecord(const QString& path, const Stored& stored, int minor) {
 
 class OldRecordsTest : public testing::TestWithParam<int> {
  protected:
-    OldRecordsTest() {
-        Mp3Builder mp3;
-        mp3.Frames(100).Id3v1("Lied", "Gruppe");
-        QFile file(song_);
-        EXPECT_TRUE(file.open(QIODevice::WriteOnly));
-        file.write(reinterpret_cast<const char*>(mp3.Data().data()), static_cast<qint64>(mp3.Size()));
-    }
     // A file of the version under test; in 1.2 with lists that know an artist "Liste" of three songs.
     Bytes FileOf(const std::vector<Bytes>& records) const {
         DatabaseBuilder builder(1, GetParam());
@@ -74,8 +66,10 @@ class OldRecordsTest : public testing::TestWithParam<int> {
         return ReadDatabase(database, source);
     }
 
-    QTemporaryDir folder_;
-    QString song_ = folder_.filePath(u"Lied.mp3"_s);
+    SongFolder folder_;
+    ScriptedDialogs dialogs_;
+    QString song_ =
+        folder_.Put(u"Lied.mp3"_s, ByteSpan(Mp3Builder().Frames(100).Id3v1("Lied", "Gruppe").Data()));
 };
 
 }  // namespace
@@ -98,47 +92,54 @@ TEST_P(OldRecordsTest, StoredValuesReplaceWhatTheAudioFileSays) {
     EXPECT_FALSE(database.Modified());
 }
 
-TEST_P(OldRecordsTest, UnsetValuesKeepWhatTheAudioFileSays) {
+TEST_P(OldRecordsTest, UnsetValuesKeepWhatTheAudioFileSaysAndListsComeFromTheFileOrAreCounted) {
     TMusicDatabase database;
+    int inserted = 0;
+    database.OnOverviewInsert = [&](TMusicDatabase&, TOVType, int, const QString&, int) { ++inserted; };
     ASSERT_TRUE(Load(database, {OldRecord(song_, Stored(), GetParam())}));
     TID3Tag expected = Fresh();
     EXPECT_GT(expected.Length, 0);
     expected.AddTime = database.Song(0).AddTime;
     EXPECT_EQ(database.Song(0), expected);
-}
-
-TEST_P(OldRecordsTest, ListsComeFromTheFileOrAreCounted) {
-    TMusicDatabase database;
-    int inserted = 0;
-    database.OnOverviewInsert = [&](TMusicDatabase&, TOVType, int, const QString&, int) { ++inserted; };
-    ASSERT_TRUE(Load(database, {OldRecord(song_, Stored(), GetParam())}));
     ASSERT_EQ(database.Artists().Count(), 1);
     const bool fromFile = GetParam() == 2;
     EXPECT_EQ(database.Artists().At(0).Text, fromFile ? u"Liste"_s : u"Gruppe"_s);
     EXPECT_EQ(database.Artists().At(0).Number, fromFile ? 3 : 1);
     EXPECT_EQ(inserted, fromFile ? 0 : 4);
+    EXPECT_TRUE(dialogs_.Messages.isEmpty());
 }
 
-TEST_P(OldRecordsTest, ASongWithoutItsFileGoesAndOneThatCannotBeReadNowStays) {
-    const QString unreadable = folder_.filePath(u"Ordner.mp3"_s);
+TEST_P(OldRecordsTest, ASongWithoutItsFileGoesUnlessLostSongsAreKeptAndTheUserIsTold) {
+    const QString gone = folder_.Path(u"weg/Band - Lied.mp3"_s);
+    const QString unreadable = folder_.Path(u"Ordner.mp3"_s);
     ASSERT_TRUE(QDir().mkpath(unreadable));
+    const std::vector<Bytes> records = {OldRecord(gone, Stored{90, 2, 1, 7}, GetParam()),
+                                        OldRecord(unreadable, Stored{200, 3, 1, 4}, GetParam()),
+                                        OldRecord(song_, Stored(), GetParam()),
+                                        OldRecord(u":0123ABCD:\\a.mp3"_s, Stored{60}, GetParam())};
     TMusicDatabase database;
-    ASSERT_TRUE(Load(database, {OldRecord(folder_.filePath(u"weg.mp3"_s), Stored(), GetParam()),
-                                OldRecord(unreadable, Stored{200, 3, 1, 4}, GetParam()),
-                                OldRecord(QString(261, u'x'), Stored(), GetParam()),
-                                OldRecord(song_, Stored(), GetParam()),
-                                OldRecord(u":0123ABCD:\\a.mp3"_s, Stored{60}, GetParam())}));
+    ASSERT_TRUE(Load(database, records));
     ASSERT_EQ(database.Count(), 3);
     EXPECT_EQ(database.Song(0).FileName, unreadable);
     EXPECT_EQ(database.Song(0).Length, 200);
     EXPECT_EQ(database.Song(0).PlayCount, 4u);
-    EXPECT_EQ(database.Song(1).FileName, song_);
     EXPECT_EQ(database.Song(2).FileName, u":0123ABCD:\\a.mp3"_s);
     EXPECT_EQ(database.Song(2).Length, 60);
     // Songs that went are not counted, wherever the lists came from.
     EXPECT_EQ(database.Genres()[0], 2);
-    EXPECT_EQ(database.Genres()[3], 1);
     EXPECT_EQ(database.Artists().IndexOf(u"Liste"), -1);
+    ASSERT_EQ(dialogs_.Messages.size(), 1);
+    EXPECT_TRUE(dialogs_.Messages[0].contains(u"\n1 Song(s) dieser Datenbank wurden nicht übernommen"_s));
+
+    database.SetKeepLostSongs(true);
+    ASSERT_TRUE(Load(database, records));
+    ASSERT_EQ(database.Count(), 4);
+    EXPECT_EQ(database.Song(0).FileName, gone);
+    EXPECT_EQ(database.Song(0).Title, u"Lied"_s) << "as the file's name tells";
+    EXPECT_EQ(database.Song(0).Length, 90);
+    EXPECT_EQ(database.Song(0).PlayCount, 7u);
+    ASSERT_EQ(dialogs_.Messages.size(), 2);
+    EXPECT_TRUE(dialogs_.Messages[1].startsWith(u"Die Musikdateien von 3 Song(s)"_s));
 }
 
 TEST_P(OldRecordsTest, BannedSongsAreRefusedWhereSongsAreChecked) {

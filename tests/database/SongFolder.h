@@ -8,7 +8,8 @@
 
 #include "CommonRUKTools/ByteWriter.h"
 
-// A temporary folder of small WAV files, whose names tell artist and title: "Queen - Jealousy.wav".
+// A temporary folder for a test, with small WAV files whose names tell artist and title
+// ("Queen - Jealousy.wav") and whatever else it puts there.
 class SongFolder {
  public:
     SongFolder() { folder_.setAutoRemove(false); }
@@ -30,25 +31,34 @@ class SongFolder {
             paths << Path(name);
         return paths;
     }
-    // Makes the folders that are missing, and returns the path.
-    QString Add(const QString& name, std::uint32_t seconds = 0) const {
+    // Each makes the folders that are missing, and returns the path.
+    QString Put(const QString& name, const QByteArray& bytes) const {
         QDir().mkpath(QFileInfo(Path(name)).path());
         QFile file(Path(name));
-        const auto bytes = Wave(seconds);
-        if (!file.open(QIODevice::WriteOnly) ||
-            file.write(reinterpret_cast<const char*>(bytes.data()), static_cast<qint64>(bytes.size())) < 44)
+        if (!file.open(QIODevice::WriteOnly) || file.write(bytes) != bytes.size())
             qFatal("cannot write %s", qPrintable(Path(name)));
         return Path(name);
     }
+    QString Put(const QString& name, ByteSpan bytes) const {
+        return Put(name, QByteArray(reinterpret_cast<const char*>(bytes.data()),
+                                    static_cast<qsizetype>(bytes.size())));
+    }
+    QString Add(const QString& name, std::uint32_t seconds = 0) const { return Put(name, Wave(seconds)); }
     QStringList Add(const QStringList& names) const {
         for (const QString& name : names)
             Add(name);
         return Paths(names);
     }
 
+    // What a file holds; "unreadable" where there is none.
+    QByteArray Get(const QString& name) const {
+        QFile file(Path(name));
+        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("unreadable");
+    }
+
  private:
     // One channel of 8 bits, 1000 samples a second.
-    static std::vector<std::uint8_t> Wave(std::uint32_t seconds) {
+    static QByteArray Wave(std::uint32_t seconds) {
         constexpr std::uint32_t kRate = 1000;
         ByteWriter file;
         file.Raw("RIFF");
@@ -64,7 +74,8 @@ class SongFolder {
         file.Raw("data");
         file.U32Le(seconds * kRate);
         file.Zeros(seconds * kRate);
-        return {file.Bytes().begin(), file.Bytes().end()};
+        const auto& bytes = file.Bytes();
+        return {reinterpret_cast<const char*>(bytes.data()), static_cast<qsizetype>(bytes.size())};
     }
 
     QTemporaryDir folder_;

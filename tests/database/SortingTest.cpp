@@ -47,7 +47,8 @@ QString SomeText(std::mt19937& random) {
 
 TID3Tag RandomSong(std::mt19937& random) {
     TID3Tag song;
-    song.FileName = (Below(random, 4) == 0 ? u":1234ABCD:\\"_s : u"/"_s) + SomeText(random);
+    song.FileName = (Below(random, 4) == 0 ? u":1234ABCD:\\"_s : u"/"_s) +
+                    (Below(random, 2) == 0 ? u"x/"_s : QString()) + SomeText(random);
     song.Title = SomeText(random) + SomeText(random);
     // One artist has more songs than are sorted without keys.
     song.Artist = Below(random, 4) != 0 ? u"Die Ärzte"_s : SomeText(random);
@@ -56,6 +57,7 @@ TID3Tag RandomSong(std::mt19937& random) {
     song.Year = Below(random, 2) == 0 ? QString::number(1960 + Below(random, 5)) : SomeText(random);
     song.Length = static_cast<quint16>(Below(random, 3));
     song.MainGenre = static_cast<quint8>(Below(random, 2));
+    song.Track = static_cast<quint8>(Below(random, 3));
     song.PlayCount = Below(random, 3);
     song.Flags = Below(random, 16);
     song.AddTime = static_cast<double>(Below(random, 5)) - 2.0;
@@ -64,7 +66,7 @@ TID3Tag RandomSong(std::mt19937& random) {
 
 std::vector<SongOrder> AllOrders() {
     std::vector<SongOrder> orders;
-    for (int type = stTitle; type <= stCacheType; ++type)
+    for (int type = stTitle; type <= stAlbumOrder; ++type)
         for (int sub = sstGATL; sub <= sstPath; ++sub)
             for (const bool backwards : {false, true})
                 orders.push_back({static_cast<TSortType>(type), static_cast<TSubSortType>(sub), backwards});

@@ -1,4 +1,3 @@
-#include "CommonRUKTools/SafeFile.h"
 #include "MusicManagment/playlist/PlayListMenu.h"
 #include "tests/playlist/Playing.h"
 
@@ -11,44 +10,9 @@ namespace {
 class PlayListCommandsTest : public PlayingTest {
  protected:
     QString File(const QString& name) const { return folder_.Path(name); }
-    void Put(const QString& name, std::string_view text) const {
-        SafeFile file(File(name));
-        file.Write(AsBytes(text));
-        file.Commit();
-    }
 };
 
 }  // namespace
-
-TEST_F(PlayListCommandsTest, TheMenuOffersWhatThePlayListCan) {
-    struct Row {
-        int Id;
-        QString Caption;
-        QString Shortcut;
-        int Image;
-    };
-    const Row rows[] = {
-        {101, u"Neue PlayList"_s, u"Ctrl+Shift+N"_s, 60},
-        {102, u"PlayList öffnen..."_s, u"Ctrl+Shift+O"_s, 61},
-        {103, u"PlayList speichern"_s, u"Ctrl+Shift+S"_s, 62},
-        {104, u"PlayList speichern unter..."_s, u"Ctrl+Alt+Shift+S"_s, 63},
-        {105, u"PlayList als Link-Liste speichern..."_s, u""_s, 64},
-        {201, u"Markierte Einträge entfernen"_s, u"Del"_s, 65},
-        {202, u"Dieses Lied markieren"_s, u"Ctrl+Shift+F"_s, 66},
-        {203, u"Nicht verfügbare Lieder entfernen"_s, u"Ctrl+Shift+Del"_s, 67},
-    };
-    EXPECT_EQ(list_.Menu().Caption(), u"PlayList"_s);
-    EXPECT_EQ(list_.Menu().Items().size(), 9u);
-    EXPECT_EQ(list_.Menu().Items()[5]->Kind(), TMenuExItem::ItemKind::Separator);
-    for (const Row& row : rows) {
-        const TMenuExItem* item = list_.Menu().Find(row.Id);
-        ASSERT_NE(item, nullptr) << row.Id;
-        EXPECT_EQ(item->Caption(), row.Caption);
-        EXPECT_EQ(item->Shortcut(), row.Shortcut);
-        EXPECT_EQ(item->ImageIndex(), row.Image);
-    }
-    EXPECT_FALSE(list_.ClickMenuItem(106));
-}
 
 TEST_F(PlayListCommandsTest, AListIsSavedUnderItsNameOrUnderOneThatIsAskedFor) {
     Add(u"ab"_s);
@@ -67,10 +31,38 @@ TEST_F(PlayListCommandsTest, AListIsSavedUnderItsNameOrUnderOneThatIsAskedFor) {
     list_.ClickMenuItem(pcNew);
     EXPECT_EQ(list_.Count(), 0);
     EXPECT_TRUE(list_.PlayListFileName().isEmpty());
+    EXPECT_TRUE(dialogs_.Questions.isEmpty());
     dialogs_.Files = {{File(u"x.rukpl"_s)}};
     list_.ClickMenuItem(pcOpen);
     EXPECT_EQ(Listed(), u"a"_s);
     EXPECT_TRUE(dialogs_.FileDialogs.back().Filter.startsWith(u"Alle PlayLists|*.rukpl;*.rpl;*.m3u;"_s));
+}
+
+TEST_F(PlayListCommandsTest, WhatWasChangedIsNotThrownAwayWithoutAQuestion) {
+    Add(u"a"_s);
+    list_.ClickMenuItem(pcNew);  // cancelled, as is opening another
+    list_.ClickMenuItem(pcOpen);
+    EXPECT_EQ(dialogs_.Questions.size(), 2);
+    EXPECT_TRUE(dialogs_.FileDialogs.empty());
+    EXPECT_EQ(Listed(), u"a"_s);
+
+    const QString standard = File(u"standard.rukpl"_s);
+    list_.SetStandardFileName(standard);
+    list_.Save(standard);
+    list_.PlayEntry(0);
+    EXPECT_FALSE(list_.Modified());
+    Add(u"b"_s);
+    dialogs_.Answers = {0, 0};
+    list_.ClickMenuItem(pcNew);  // the next list would take the place of this one: under which name?
+    EXPECT_EQ(Listed(), u"ab"_s);
+    dialogs_.Files = {{File(u"x.rukpl"_s)}};
+    list_.ClickMenuItem(pcNew);
+    EXPECT_EQ(list_.Count(), 0);
+    EXPECT_TRUE(QFile::exists(File(u"x.rukpl"_s)));
+    Add(u"a"_s);
+    dialogs_.Answers = {1};
+    list_.ClickMenuItem(pcNew);
+    EXPECT_EQ(list_.Count(), 0);
 }
 
 TEST_F(PlayListCommandsTest, LoadingBeginsANewListAndTellsOfIt) {

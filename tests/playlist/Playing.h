@@ -2,67 +2,21 @@
 
 #include <gtest/gtest.h>
 
-#include <QSet>
-
+#include "CommonRUKTools/SafeFile.h"
 #include "MusicManagment/playlist/PlayList.h"
 #include "MusicManagment/playlist/PlayListView.h"
-#include "MusicManagment/playlist/SongPlayer.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
 #include "tests/database/SongFolder.h"
-
-class EEngine : public ERukException {
- public:
-    using ERukException::ERukException;
-};
-
-// Writes down what it is told to play, by the files' names without extension.
-class ScriptedPlayer : public SongPlayer {
- public:
-    bool CanFade = true;
-    bool PlaysAtOnce = false;
-    QSet<QString> Broken;  // songs that the engine refuses
-    std::function<void()> OnOpen;
-
-    QStringList Played;
-    QStringList Files;
-    QStringList Faded;
-    int Plays = 0;
-    int Redraws = 0;
-    int AutoStop = -1;
-
-    bool AutoPlay() const override { return PlaysAtOnce; }
-    void SetAutoStop(int milliseconds) override { AutoStop = milliseconds; }
-    void SetFileName(const QString& path) override { Played << Open(path); }
-    void Play() override { ++Plays; }
-    bool PlayWithCrossFade(const QString& path) override {
-        if (!CanFade) return false;
-        Faded << Open(path);
-        return true;
-    }
-    void RedrawPanel() override { ++Redraws; }
-
- private:
-    QString Open(const QString& path) {
-        if (OnOpen) OnOpen();
-        const QString song = QFileInfo(path).completeBaseName();
-        if (Broken.contains(song)) throw EEngine(QStringLiteral("Engine: ") + song);
-        Files << path;
-        return song;
-    }
-};
+#include "tests/playlist/ScriptedPlayer.h"
 
 class ScriptedView : public PlayListView {
  public:
     std::vector<int> Selected;
     int Current = -1;
-    int Refreshes = 0;
-    int Redraws = 0;
 
     std::vector<int> SelectedEntries() const override { return Selected; }
     int CurrentEntry() const override { return Current; }
-    void Refresh() override { ++Refreshes; }
-    void Redraw() override { ++Redraws; }
 };
 
 // A playlist of small sound files with a player.
@@ -77,6 +31,12 @@ class PlayingTest : public testing::Test {
             if (song.isLower()) folder_.Add(song + QStringLiteral(".wav"));
             list_.Insert(list_.Count(), {.Name = Path(song)});
         }
+    }
+    QString Put(const QString& name, std::string_view text) const {
+        SafeFile file(folder_.Path(name));
+        file.Write(AsBytes(text));
+        file.Commit();
+        return folder_.Path(name);
     }
     QString Names(const QStringList& paths) const {
         QString names;

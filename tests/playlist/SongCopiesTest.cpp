@@ -41,6 +41,22 @@ TEST_F(SongCopiesTest, EachSongIsPlayedFromACopyThatReplacesTheLast) {
               QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
 }
 
+TEST_F(SongCopiesTest, TheCopyThatPlaysStaysWhileAnotherIsFadedInOrCannotBe) {
+    Add(u"a"_s);
+    list_.Insert(1, {.Name = folder_.Add(u"sub/a.wav"_s)});
+    list_.SetCopyMp3sBeforePlay(true);
+    list_.PlayEntry(0);
+    const QString playing = list_.CurrentFile();
+    for (const bool canFade : {false, true}) {
+        player_.CanFade = canFade;
+        list_.StartNewRound();
+        list_.PlayNext(SongChange::CrossFadeOnly);
+        EXPECT_TRUE(QFile::exists(playing));
+        EXPECT_EQ(list_.CurrentFile() != playing, canFade);
+    }
+    EXPECT_TRUE(QFile::exists(list_.CurrentFile()));
+}
+
 TEST_F(SongCopiesTest, EmptyingTouchesOnlyWhatLiesInTheFolder) {
     Add(u"abc"_s);
     QDir().mkpath(Copies() + u"/sub"_s);

@@ -3,12 +3,35 @@
 #include <algorithm>
 
 #include "CommonRUKTools/Errors.h"
+#include "MusicManagment/database/songfiles/RecycleBin.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
 
 constexpr int kEntriesPerProgressPoint = 256;
+
+// What a system or a program keeps for itself on a volume, above all what the user has thrown away.
+constexpr QStringView kPrivateFolders[] = {u".Trash",
+                                           u".Trashes",
+                                           u"$RECYCLE.BIN",
+                                           u"RECYCLER",
+                                           u"#recycle",
+                                           kOwnRecycleFolder,
+                                           u"System Volume Information",
+                                           u"lost+found",
+                                           u".fseventsd",
+                                           u".Spotlight-V100",
+                                           u".snapshots"};
+
+bool IsPrivateFolder(const FolderEntry& entry, const QString& parent) {
+    const auto isName = [&entry](QStringView name) {
+        return entry.Name.compare(name, Qt::CaseInsensitive) == 0;
+    };
+    return entry.IsSystem || std::ranges::any_of(kPrivateFolders, isName) ||
+           entry.Name.startsWith(u".Trash-"_s) ||  // with the user's number behind
+           (entry.Name == u"Trash"_s && parent.endsWith(u"/.local/share/"_s));  // the one of the home folder
+}
 
 }  // namespace
 
@@ -62,6 +85,7 @@ bool FolderWalk::ReadEntries(const QString& folder, Found& found) {
 void FolderWalk::Sort(const FolderEntry& entry, const QString& prefix, Found& found) {
     const bool isFolder = entry.Kind == EntryKind::Folder;
     if (isFolder ? !options_.WithSubfolders : !options_.IsWanted(entry.Name)) return;
+    if (isFolder && IsPrivateFolder(entry, prefix)) return;
     const QString path = prefix + entry.Name;
     if (!entry.Reachable)
         unreadable_ << (isFolder ? u"Ungültiger Ordnername: "_s : u"Ungültiger Dateiname: "_s) + path;

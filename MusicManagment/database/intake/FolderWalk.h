@@ -18,7 +18,8 @@ struct FolderWalkOptions {
 
 // Collects the wanted files of folders. The files of a folder come before those of its sub-folders, both
 // sorted by name. Each folder is entered once, however many links lead to it and however often Walk is
-// called. Links to files are files under the link's own name.
+// called. Links to files are files under the link's own name. Recycle bins and folders that belong to the
+// system are entered only when Walk is called for them.
 class FolderWalk {
  public:
     explicit FolderWalk(FolderWalkOptions options) : options_(std::move(options)) {}

@@ -11,6 +11,8 @@
 #include "MusicManagment/database/ListGuards.h"
 #include "MusicManagment/database/intake/FolderWalk.h"
 #include "MusicManagment/database/intake/IntakeReport.h"
+#include "MusicManagment/database/intake/KnownSongs.h"
+#include "MusicManagment/database/intake/UpdateFolders.h"
 
 using namespace Qt::StringLiterals;
 
@@ -77,12 +79,15 @@ bool TakeIn(TMusicDatabase& database, const QString& path, const ReadOptions& op
     if (database.AddEntry(path, record) >= 0) {
         ++result.Added;
         result.NewFiles << path;
+        if (record.BitRate == 0) result.DamagedFiles << path;
         return true;
     }
-    if (database.IsBanned(record))
+    if (database.IsBanned(record)) {
         ++result.Banned;
-    else
+        result.BannedFiles << path;
+    } else {
         NoteUnreadable(u"Nicht aufgenommen: "_s + path, result);
+    }
     return false;
 }
 
@@ -170,6 +175,22 @@ IntakeResult AddGiven(TMusicDatabase& database, const std::vector<GivenPath>& gi
     return result;
 }
 
+void Remember(TMusicDatabase& database, const std::vector<GivenPath>& given) {
+    QStringList folders;
+    for (const GivenPath& path : given)
+        if (path.IsFolder) folders << path.Path;
+    RememberFolders(database, folders);
+}
+
+// Saved before anybody is told, for a report may stand there for hours.
+IntakeResult AddAndSave(TMusicDatabase& database, const std::vector<GivenPath>& given, bool withSubfolders,
+                        GivenFolders folders) {
+    IntakeResult result = AddGiven(database, given, withSubfolders);
+    if (folders == GivenFolders::Remembered) Remember(database, given);
+    database.SaveAfterCommand();
+    return result;
+}
+
 IntakeResult AddChosenFiles(TMusicDatabase& database, QStringList files) {
     const ProgressRun run(database, FileRunText());
     IntakeResult result;
@@ -211,26 +232,25 @@ IntakeResult AddSongsFromDialog(TMusicDatabase& database, const QStringList& fil
     const QStringList chosen = files.isEmpty() ? AskForFiles() : files;
     if (chosen.isEmpty()) return {};
     IntakeResult result = AddChosenFiles(database, chosen);
-    ReportIntake(result);
     database.SaveAfterCommand();
+    ReportIntake(result);
     return result;
 }
 
-IntakeResult AddFolder(TMusicDatabase& database, const QString& folder, bool withSubfolders) {
+IntakeResult AddFolder(TMusicDatabase& database, const QString& folder, bool withSubfolders,
+                       GivenFolders folders) {
     RefuseWhenLocked(database);
     const QString chosen = folder.isEmpty() ? AskForFolder(withSubfolders) : folder;
     if (chosen.isEmpty()) return {};
-    IntakeResult result = AddGiven(database, {{AbsolutePath(chosen), true, true}}, withSubfolders);
+    IntakeResult result = AddAndSave(database, {{AbsolutePath(chosen), true, true}}, withSubfolders, folders);
     ReportIntake(result);
-    database.SaveAfterCommand();
     return result;
 }
 
-IntakeResult AddPaths(TMusicDatabase& database, const QStringList& paths, bool withSubfolders) {
+IntakeResult AddPaths(TMusicDatabase& database, const QStringList& paths, bool withSubfolders,
+                      GivenFolders folders) {
     RefuseWhenLocked(database);
-    IntakeResult result = AddGiven(database, LookAt(paths), withSubfolders);
-    database.SaveAfterCommand();
-    return result;
+    return AddAndSave(database, LookAt(paths), withSubfolders, folders);
 }
 
 int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting, QStringList* newNames,
@@ -239,6 +259,7 @@ int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
     IntakeResult unasked;
     IntakeResult& outcome = result != nullptr ? *result : unasked;
     const QStringList candidates = std::exchange(list, {});
+    KnownSongs known(database);
     ReadOptions options = database.AudioReadOptions();
     for (qsizetype i = 0; i < candidates.size(); ++i) {
         if (i % kFilesPerProgressPoint == 0) {
@@ -249,10 +270,12 @@ int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
             options.FileTime = CurrentClock().Now();
         }
         const QString path = StoredPath(candidates[i]);
-        if (checkExisting && database.Contains(path))
+        if (checkExisting && known.Contains(path)) {
             ++outcome.Known;
-        else if (TakeIn(database, path, options, outcome))
+        } else if (TakeIn(database, path, options, outcome)) {
+            known.Add(path);
             list << path;
+        }
     }
     if (newNames != nullptr) *newNames << list;
     return static_cast<int>(list.size());

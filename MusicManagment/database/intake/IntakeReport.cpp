@@ -1,9 +1,9 @@
 #include "MusicManagment/database/intake/IntakeReport.h"
 
-#include <QDir>
-#include <QFile>
-
 #include "CommonRUKTools/CodePage.h"
+#include "CommonRUKTools/Errors.h"
+#include "CommonRUKTools/PrivateFolder.h"
+#include "CommonRUKTools/SafeFile.h"
 #include "CommonRUKTools/Shell.h"
 
 using namespace Qt::StringLiterals;
@@ -15,19 +15,31 @@ void AppendLines(const QStringList& lines, QString& text) {
         text += line + u'\n';
 }
 
-bool WriteDetails(const QString& path, const QString& details) {
-    QFile file(path);
+std::vector<ReportSection> Complaints(const IntakeResult& result) {
+    return {{u"Nicht gelesen werden konnte(n)"_s, result.UnreadableNames, true},
+            {u"Aufgenommen, aber ohne erkennbaren Ton"_s, result.DamagedFiles, true},
+            {u"Nicht aufgenommen, weil in der Bann-Liste"_s, result.BannedFiles, true}};
+}
+
+// Returns its path. In a folder of the user's own: in the common one others could put a link under the name.
+QString WriteDetails(const QString& details) {
+    const QString path =
+        PrivateTemporaryFolder(u"Tunestead"_s) + u"/Tunestead - Änderungen in der Datenbank.txt"_s;
     const QByteArray bytes = CodePage::ToSystem(details);
-    return file.open(QIODevice::WriteOnly | QIODevice::Text) && file.write(bytes) == bytes.size() &&
-           file.flush();
+    SafeFile file(path);
+    file.Write(AsBytes({bytes.constData(), static_cast<std::size_t>(bytes.size())}));
+    file.Commit();
+    return path;
 }
 
 void ShowDetails(const QString& details) {
-    const QString path = QDir::temp().filePath(u"Tunestead - Änderungen in der Datenbank.txt"_s);
-    if (!WriteDetails(path, details))
-        UserDialogs().ShowMessage(MessageKind::Error, u"Kann die Datei nicht schreiben: "_s + path);
-    else if (!CurrentShell().OpenWithDefaultProgram(path))
-        UserDialogs().ShowMessage(MessageKind::Error, u"Kann die Datei nicht anzeigen: "_s + path);
+    try {
+        const QString path = WriteDetails(details);
+        if (!CurrentShell().OpenWithDefaultProgram(path))
+            UserDialogs().ShowMessage(MessageKind::Error, u"Kann die Datei nicht anzeigen: "_s + path);
+    } catch (const EStreamError& error) {
+        UserDialogs().ShowMessage(MessageKind::Error, error.Message());
+    }
 }
 
 }  // namespace
@@ -41,15 +53,18 @@ QString IntakeDetails(const IntakeResult& result) {
     QString text =
         u"Folgende(r) Song(s) ("_s + QString::number(result.Added) + u") wurde(n) neu aufgenommen:\n"_s;
     AppendLines(result.NewFiles, text);
-    if (result.Unreadable == 0) return text;
-    text += u"\nNicht gelesen werden konnte(n) ("_s + QString::number(result.Unreadable) + u"):\n"_s;
-    AppendLines(result.UnreadableNames, text);
+    for (const ReportSection& section : Complaints(result)) {
+        if (section.Lines.isEmpty()) continue;
+        text += u'\n' + section.Caption + u" ("_s + QString::number(section.Lines.size()) + u"):\n"_s;
+        AppendLines(section.Lines, text);
+    }
     return text;
 }
 
 std::vector<ReportSection> IntakeSections(const IntakeResult& result) {
-    return {{u"Neu aufgenommen"_s, result.NewFiles},
-            {u"Nicht gelesen oder nicht aufgenommen"_s, result.UnreadableNames, true}};
+    std::vector<ReportSection> sections = Complaints(result);
+    sections.insert(sections.begin(), {u"Neu aufgenommen"_s, result.NewFiles});
+    return sections;
 }
 
 void ShowReport(const QString& message, std::vector<ReportSection> sections, const QString& details) {

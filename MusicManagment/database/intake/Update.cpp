@@ -1,13 +1,12 @@
 #include "MusicManagment/database/intake/Update.h"
 
-#include <QDir>
-#include <QFileInfo>
-#include <QHash>
+#include <algorithm>
 
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/intake/IntakeReport.h"
+#include "MusicManagment/database/intake/MissingFiles.h"
 #include "MusicManagment/database/songfiles/Removal.h"
 
 using namespace Qt::StringLiterals;
@@ -15,55 +14,7 @@ using namespace Qt::StringLiterals;
 namespace {
 
 constexpr int kProgressStep = 20;
-constexpr qsizetype kListedSongs = 15;
-
-// A folder without any entry counts as missing: that is what the mount point of an unplugged disk looks like.
-bool IsThere(const QString& folder) {
-    return QFileInfo(folder).isDir() &&
-           !QDir(folder).isEmpty(QDir::AllEntries | QDir::NoDotAndDotDot | QDir::Hidden);
-}
-
-QString WithSeparator(const QString& folder) {
-    return folder.endsWith(u'/') ? folder : folder + u'/';
-}
-
-struct UpdateFolderSets {
-    QStringList There;
-    QStringList Missing;
-};
-
-UpdateFolderSets SplitFolders(const QStringList& folders) {
-    UpdateFolderSets sets;
-    for (const QString& folder : folders)
-        (IsThere(folder) ? sets.There : sets.Missing) << folder;
-    return sets;
-}
-
-bool LiesBelow(const QString& path, const QStringList& folders) {
-    return std::any_of(folders.begin(), folders.end(),
-                       [&path](const QString& folder) { return path.startsWith(WithSeparator(folder)); });
-}
-
-// Decides of missing files whether they are gone or only out of reach.
-class GoneFiles {
- public:
-    explicit GoneFiles(const UpdateFolderSets& folders) : folders_(folders) {}
-
-    bool IsGone(const QString& path) {
-        if (IsCdPath(path) || FileSource::Exists(path)) return false;
-        if (LiesBelow(path, folders_.Missing)) return false;
-        if (LiesBelow(path, folders_.There)) return true;
-        // Elsewhere only the file's own folder can tell.
-        const QString folder = QFileInfo(path).path();
-        const auto known = folderThere_.constFind(folder);
-        if (known != folderThere_.constEnd()) return *known;
-        return *folderThere_.insert(folder, QFileInfo(folder).isDir());
-    }
-
- private:
-    const UpdateFolderSets& folders_;
-    QHash<QString, bool> folderThere_;
-};
+constexpr qsizetype kListedLines = 15;
 
 // The collection's own knowledge of a song outlives its tags.
 TID3Tag WithCollectionFields(TID3Tag read, const TID3Tag& known) {
@@ -114,35 +65,68 @@ void RereadSong(TMusicDatabase& database, const QString& path, UpdateResult& res
     if (database.UpdateEntry(database.IndexOf(path), std::move(read)) >= 0) result.Changed << path;
 }
 
-// Looks at every song: gone ones are returned, present ones are read again where asked for.
-QStringList CheckSongs(TMusicDatabase& database, UpdateTags tags, const UpdateFolderSets& folders,
-                       UpdateResult& result) {
-    GoneFiles goneFiles(folders);
-    QStringList gone;
+// Looks at every song; present ones are read again where asked for.
+void CheckSongs(TMusicDatabase& database, UpdateTags tags, MissingFiles& missing, UpdateResult& result) {
     const QStringList paths = AllPaths(database);
     for (qsizetype i = 0; i < paths.size(); ++i) {
         if (i % kProgressStep == 0 &&
             ProgressAt(database, i, paths.size(), u"Prüfe die vorhandenen Songs"_s)) {
             result.Stopped = true;
-            break;
+            return;
         }
-        if (goneFiles.IsGone(paths[i]))
-            gone << paths[i];
-        else if (tags == UpdateTags::Reread && !IsCdPath(paths[i]))
+        if (missing.IsThere(paths[i]) && tags == UpdateTags::Reread && !IsCdPath(paths[i]))
             RereadSong(database, paths[i], result);
     }
-    return gone;
 }
 
-bool ConfirmRemoval(const QStringList& gone) {
-    QString text =
-        u"Diese Songs ("_s + QString::number(gone.size()) +
-        u") sind nicht mehr auf der Festplatte vorhanden. Sollen sie aus der Datenbank entfernt werden?\n"_s;
-    for (const QString& path : gone.first(std::min(gone.size(), kListedSongs)))
-        text += u'\n' + path;
-    if (gone.size() > kListedSongs)
-        text += u"\n... und "_s + QString::number(gone.size() - kListedSongs) + u" weitere"_s;
-    return UserDialogs().Ask({.Text = text, .Buttons = {u"Entfernen"_s, u"Behalten"_s}, .Cancel = 1}) == 0;
+// The first lines of a list that may be long.
+QString FirstOf(const QStringList& lines) {
+    QString text;
+    for (const QString& line : lines.first(std::min(lines.size(), kListedLines)))
+        text += u'\n' + line;
+    if (lines.size() > kListedLines)
+        text += u"\n... und "_s + QString::number(lines.size() - kListedLines) + u" weitere"_s;
+    return text;
+}
+
+bool MayRemove(const QString& question) {
+    return UserDialogs().Ask({.Text = question, .Buttons = {u"Entfernen"_s, u"Behalten"_s}, .Cancel = 1}) ==
+           0;
+}
+
+bool MayRemoveSongs(const QStringList& gone) {
+    return !gone.isEmpty() &&
+           MayRemove(u"Diese Songs ("_s + QString::number(gone.size()) +
+                     u") sind nicht mehr auf der Festplatte vorhanden. Sollen sie aus der Datenbank entfernt "
+                     u"werden?\n"_s +
+                     FirstOf(gone));
+}
+
+// A folder without any of its songs may as well be one on a disk that is not plugged in.
+bool MayRemoveFolders(const std::vector<EmptiedFolder>& emptied) {
+    if (emptied.empty()) return false;
+    QStringList lines;
+    qsizetype songs = 0;
+    for (const auto& folder : emptied) {
+        lines << folder.Folder + u" ("_s + QString::number(folder.Songs.size()) + u')';
+        songs += folder.Songs.size();
+    }
+    return MayRemove(
+        u"Von den Songs in diesen Ordnern ist kein einziger mehr da:\n"_s + FirstOf(lines) +
+        u"\n\nLiegen sie auf einer Festplatte oder einem Netzlaufwerk, das gerade nicht angeschlossen ist, "
+        u"dann behalten Sie sie. Sollen diese "_s +
+        QString::number(songs) + u" Song(s) wirklich aus der Datenbank entfernt werden?"_s);
+}
+
+QStringList ConfirmedRemovals(const MissingFiles& missing) {
+    QStringList gone = missing.Single();
+    if (!MayRemoveSongs(gone)) gone.clear();
+    const auto emptied = missing.ByFolder();
+    if (MayRemoveFolders(emptied))
+        for (const auto& folder : emptied)
+            gone << folder.Songs;
+    gone.removeIf(FileSource::Exists);  // a disk may have been plugged in to answer
+    return gone;
 }
 
 void RequireFolders(const TMusicDatabase& database) {
@@ -172,51 +156,31 @@ void AppendLines(QString& text, const QString& heading, const QStringList& lines
 
 UpdateResult UpdateDatabase(TMusicDatabase& database, UpdateTags tags) {
     RequireFolders(database);
-    const UpdateFolderSets folders = SplitFolders(database.UpdateFolders());
+    MissingFiles missing(database.UpdateFolders());
     UpdateResult result;
-    result.MissingFolders = folders.Missing;
-    QStringList gone;
     {
         const ProgressRun run(database, u"Datenbank updaten"_s);
-        gone = CheckSongs(database, tags, folders, result);
+        CheckSongs(database, tags, missing, result);
     }
+    result.MissingFolders = missing.OutOfReach();
     if (!result.Stopped) {
         const auto unreadable = result.Intake;
-        result.Intake = AddPaths(database, folders.There, true);
+        result.Intake = AddPaths(database, missing.FoldersThere(), true);
         result.Intake.Unreadable += unreadable.Unreadable;
         result.Intake.UnreadableNames << unreadable.UnreadableNames;
+        result.Removed = ConfirmedRemovals(missing);
+        RemoveSongs(database, result.Removed);
         result.Stopped = result.Intake.Stopped;
     }
-    if (!gone.isEmpty() && ConfirmRemoval(gone)) {
-        RemoveSongs(database, gone);
-        result.Removed = gone;
-    }
-    ShowReport(UpdateMessage(result), UpdateSections(result), UpdateDetails(result));
     database.SaveAfterCommand();
+    ShowReport(UpdateMessage(result), UpdateSections(result), UpdateDetails(result));
     return result;
-}
-
-QStringList MergeFolders(QStringList folders, const QStringList& more) {
-    for (const QString& folder : more) {
-        if (folders.contains(folder) || LiesBelow(folder, folders)) continue;
-        folders.removeIf([&folder](const QString& other) { return LiesBelow(other, {folder}); });
-        folders << folder;
-    }
-    return folders;
-}
-
-void RememberFolders(TMusicDatabase& database, const QStringList& folders) {
-    const QStringList remembered = MergeFolders(database.UpdateFolders(), folders);
-    if (remembered == database.UpdateFolders()) return;
-    database.SetUpdateFolders(remembered);
-    database.SetModified(true);
 }
 
 IntakeResult SearchNewSongs(TMusicDatabase& database) {
     RequireFolders(database);
-    IntakeResult result = AddPaths(database, SplitFolders(database.UpdateFolders()).There, true);
+    IntakeResult result = AddPaths(database, MissingFiles(database.UpdateFolders()).FoldersThere(), true);
     ReportIntake(result);
-    database.SaveAfterCommand();
     return result;
 }
 

@@ -13,23 +13,19 @@ enum class UpdateTags {
 
 struct UpdateResult {
     IntakeResult Intake;
-    QStringList Changed;         // paths of songs whose tags were taken over anew
-    QStringList Removed;         // paths of songs that left the collection
-    QStringList MissingFolders;  // update folders that are not there; their songs stay
+    QStringList Changed;  // paths of songs whose tags were taken over anew
+    QStringList Removed;  // paths of songs that left the collection
+    QStringList
+        MissingFolders;  // folders that are not there or look like an unplugged disk; their songs stay
     bool Stopped = false;
 };
 
 // Searches the update folders for new songs, finds songs whose files are gone, and removes those after the
-// user has seen and confirmed the list. Songs below a folder that is not there (an unplugged disk, an empty
-// mount point) stay. Reports to the user at the end. Throws EMusicDatabaseException while another run is
+// user has seen and confirmed the list; about folders that have lost all their songs at once the user is
+// asked apart. Songs below a folder that is not there (an unplugged disk, an empty mount point) stay. Saves
+// when AutoSave is -1 and reports to the user at the end. Throws EMusicDatabaseException while another run is
 // going or when there are no update folders.
 UpdateResult UpdateDatabase(TMusicDatabase& database, UpdateTags tags);
-
-// `folders` and `more` in one list, in which no folder lies below another.
-QStringList MergeFolders(QStringList folders, const QStringList& more);
-
-// Remembers folders for later updates; one that lies below a remembered folder is not remembered twice.
-void RememberFolders(TMusicDatabase& database, const QStringList& folders);
 
 // Only searches the update folders for new songs, and reports.
 IntakeResult SearchNewSongs(TMusicDatabase& database);

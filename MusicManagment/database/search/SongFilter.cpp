@@ -2,64 +2,17 @@
 
 #include <QStringList>
 #include <algorithm>
-#include <iterator>
 #include <limits>
 #include <optional>
 
 #include "CommonRUKTools/FoldedText.h"
-#include "MusicManagment/database/GroupLists.h"
-#include "MusicManagment/database/SongTypes.h"
-#include "ReadMPEGHeader/Genres.h"
+#include "MusicManagment/database/SongFields.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
 
 using Test = std::function<bool(const TID3Tag&)>;
-using NumberOf = qint64 (*)(const TID3Tag&);
-using TextOf = QString (*)(const TID3Tag&);
-
-struct NumberField {
-    QStringView Name;
-    NumberOf Value;
-};
-struct TextField {
-    QStringView Name;
-    TextOf Value;
-};
-
-// The first name of each field is the one that is told the user; the others are understood as well.
-constexpr TextField kTexts[] = {
-    {u"titel", [](const TID3Tag& song) { return song.Title; }},
-    {u"artist", [](const TID3Tag& song) { return song.Artist; }},
-    {u"album", [](const TID3Tag& song) { return song.Album; }},
-    {u"kommentar", [](const TID3Tag& song) { return song.Comment; }},
-    {u"pfad", [](const TID3Tag& song) { return song.FileName; }},
-    {u"format", [](const TID3Tag& song) { return song.MPEGLayer; }},
-    {u"genre", [](const TID3Tag& song) { return MainGenreLongName(song.MainGenre); }},
-    {u"id3genre", [](const TID3Tag& song) { return GenreName(song.Genre); }},
-    {u"flag", [](const TID3Tag& song) { return FormatSongFlags(song.Flags); }},
-    {u"title", [](const TID3Tag& song) { return song.Title; }},
-    {u"interpret", [](const TID3Tag& song) { return song.Artist; }},
-    {u"comment", [](const TID3Tag& song) { return song.Comment; }},
-    {u"path", [](const TID3Tag& song) { return song.FileName; }},
-};
-
-constexpr NumberField kNumbers[] = {
-    {u"jahr", [](const TID3Tag& song) -> qint64 { return YearNumber(song.Year); }},
-    {u"länge", [](const TID3Tag& song) -> qint64 { return song.Length; }},
-    {u"bitrate", [](const TID3Tag& song) -> qint64 { return song.BitRate; }},
-    {u"abtastrate", [](const TID3Tag& song) -> qint64 { return song.SampleRate; }},
-    {u"track", [](const TID3Tag& song) -> qint64 { return song.Track; }},
-    {u"beliebtheit", [](const TID3Tag& song) -> qint64 { return song.PlayCount; }},
-    {u"year", [](const TID3Tag& song) -> qint64 { return YearNumber(song.Year); }},
-    {u"length", [](const TID3Tag& song) -> qint64 { return song.Length; }},
-    {u"laenge", [](const TID3Tag& song) -> qint64 { return song.Length; }},
-    {u"samplerate", [](const TID3Tag& song) -> qint64 { return song.SampleRate; }},
-    {u"playcount", [](const TID3Tag& song) -> qint64 { return song.PlayCount; }},
-};
-constexpr std::size_t kToldTexts = 9;
-constexpr std::size_t kToldNumbers = 6;
 
 struct Range {
     qint64 Low = std::numeric_limits<qint64>::min();
@@ -115,31 +68,37 @@ std::optional<Range> ParseRange(QStringView text) {
 
 Test AnywhereTest(const QString& needle) {
     return [needle](const TID3Tag& song) {
-        return ContainsFolded(song.Title, needle) || ContainsFolded(song.Artist, needle) ||
-               ContainsFolded(song.Album, needle) || ContainsFolded(song.Comment, needle) ||
-               ContainsFolded(song.Year, needle) || ContainsFolded(song.FileName, needle);
+        return std::ranges::any_of(SongFields(), [&](const SongField& field) {
+            return field.InPlainSearch && ContainsFolded(field.Text(song), needle);
+        });
     };
 }
 
-// Nothing when there is no such field, or a field of numbers has no range: then the term is an ordinary word.
-std::optional<Test> FieldTest(QStringView name, QStringView value) {
+bool HasName(const SongField& field, const QString& name) {
+    const auto names = QStringView(field.FilterNames).split(u' ', Qt::SkipEmptyParts);
+    return std::ranges::find(names, QStringView(name)) != names.end();
+}
+
+// nullptr when there is no such field.
+const SongField* FieldNamed(QStringView name) {
     const QString folded = name.toString().toLower();
-    for (const TextField& field : kTexts) {
-        if (folded != field.Name) continue;
-        return [text = field.Value, needle = FoldText(value)](const TID3Tag& song) {
-            return ContainsFolded(text(song), needle);
+    const auto found = std::ranges::find_if(
+        SongFields(), [&folded](const SongField& field) { return HasName(field, folded); });
+    return found != SongFields().end() ? &*found : nullptr;
+}
+
+// Nothing when a field of numbers has no range: then the term is an ordinary word.
+std::optional<Test> FieldTest(const SongField& field, QStringView value) {
+    if (field.Number == nullptr)
+        return [&field, needle = FoldText(value)](const TID3Tag& song) {
+            return ContainsFolded(SearchedText(field, song), needle);
         };
-    }
     const auto range = ParseRange(value);
     if (!range) return std::nullopt;
-    for (const NumberField& field : kNumbers) {
-        if (folded != field.Name) continue;
-        return [number = field.Value, range = *range](const TID3Tag& song) {
-            const qint64 held = number(song);
-            return held >= range.Low && held <= range.High;
-        };
-    }
-    return std::nullopt;
+    return [number = field.Number, range = *range](const TID3Tag& song) {
+        const qint64 held = number(song);
+        return held >= range.Low && held <= range.High;
+    };
 }
 
 // Words; blanks between quotation marks do not separate, the marks themselves are dropped.
@@ -160,13 +119,6 @@ QStringList SplitWords(QStringView text) {
     return words;
 }
 
-bool IsFieldName(QStringView name) {
-    const QString folded = name.toString().toLower();
-    const auto isIt = [&folded](const auto& field) { return folded == field.Name; };
-    return std::any_of(std::begin(kTexts), std::end(kTexts), isIt) ||
-           std::any_of(std::begin(kNumbers), std::end(kNumbers), isIt);
-}
-
 // "artist:" or "bitrate:>=" on the way to something: the list is not emptied meanwhile.
 bool IsStillBeingTyped(QStringView value) {
     return std::all_of(value.begin(), value.end(), [](QChar c) { return QStringView(u"<>=.").contains(c); });
@@ -175,10 +127,11 @@ bool IsStillBeingTyped(QStringView value) {
 Test WordTest(QStringView word) {
     const qsizetype colon = word.indexOf(u':');
     if (colon <= 0) return AnywhereTest(FoldText(word));
-    const QStringView name = word.left(colon);
+    const SongField* field = FieldNamed(word.left(colon));
+    if (field == nullptr) return AnywhereTest(FoldText(word));
     const QStringView value = word.mid(colon + 1);
-    if (IsFieldName(name) && IsStillBeingTyped(value)) return [](const TID3Tag&) { return true; };
-    if (auto test = FieldTest(name, value)) return *std::move(test);
+    if (IsStillBeingTyped(value)) return [](const TID3Tag&) { return true; };
+    if (auto test = FieldTest(*field, value)) return *std::move(test);
     return AnywhereTest(FoldText(word));
 }
 
@@ -200,9 +153,9 @@ bool SongFilter::Matches(const TID3Tag& song) const {
 
 QStringList SongFilter::FieldNames() {
     QStringList names;
-    for (std::size_t i = 0; i < kToldTexts; ++i)
-        names << kTexts[i].Name.toString();
-    for (std::size_t i = 0; i < kToldNumbers; ++i)
-        names << kNumbers[i].Name.toString();
+    for (const SongField& field : SongFields()) {
+        const auto all = QStringView(field.FilterNames).split(u' ', Qt::SkipEmptyParts);
+        if (!all.isEmpty()) names << all.first().toString();
+    }
     return names;
 }

@@ -89,10 +89,7 @@ class Copier {
 
 }  // namespace
 
-CopyResult CopySongs(TMusicDatabase& database, const std::vector<SongIndex>& songs, const QString& folder) {
-    QStringList paths;
-    for (const SongIndex index : songs)
-        paths << database.Song(index).FileName;
+CopyResult CopySongs(TMusicDatabase& database, const QStringList& paths, const QString& folder) {
     const ProgressRun run(database, u"Kopiere die Songs an die Zielorte"_s);
     Copier copier(database, folder, static_cast<int>(paths.size()));
     CopyResult result;

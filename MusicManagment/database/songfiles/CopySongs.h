@@ -1,7 +1,7 @@
 #pragma once
 
 #include <QString>
-#include <vector>
+#include <QStringList>
 
 #include "MusicManagment/database/MusicManagment.h"
 
@@ -13,4 +13,4 @@ struct CopyResult {
 
 // Copies the files of songs into a folder, with progress. A file of the same name is only replaced when the
 // user says so. A copy that fails or is stopped half-way leaves nothing behind.
-CopyResult CopySongs(TMusicDatabase& database, const std::vector<SongIndex>& songs, const QString& folder);
+CopyResult CopySongs(TMusicDatabase& database, const QStringList& paths, const QString& folder);

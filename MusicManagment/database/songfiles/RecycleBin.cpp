@@ -15,7 +15,7 @@ namespace {
 // A file of the same name that is there already is not replaced: the move fails.
 bool MoveToOwnFolder(const QString& path) {
     const QDir folder(
-        QDir(QStorageInfo(QFileInfo(path).absolutePath()).rootPath()).filePath(u"Tunestead Recycle-Bin"_s));
+        QDir(QStorageInfo(QFileInfo(path).absolutePath()).rootPath()).filePath(kOwnRecycleFolder.toString()));
     if (!folder.mkpath(u"."_s)) return false;
     return QFile::rename(path, folder.filePath(QFileInfo(path).fileName()));
 }

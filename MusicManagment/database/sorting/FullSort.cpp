@@ -106,7 +106,8 @@ class TextRanks {
     quint32 last_ = 0;
 };
 
-std::vector<quint32> RankAll(Entries entries, const QString& (*text)(const TID3Tag&)) {
+template <typename TextOf>
+std::vector<quint32> RankAll(Entries entries, TextOf text) {
     TextRanks ranks(entries.size());
     std::vector<quint32> result;
     result.reserve(entries.size());
@@ -139,6 +140,15 @@ std::vector<quint32> PrimaryRanks(TSortType type, Entries entries) {
 
 bool ComparesText(TSortType type) {
     return PrimaryText(type, TID3Tag()) != nullptr;
+}
+
+void FillAlbumOrder(Entries entries, std::vector<SortItem>& items) {
+    const auto albums = RankAll(entries, [](const TID3Tag& song) -> const QString& { return song.Album; });
+    const auto folders = RankAll(entries, [](const TID3Tag& song) { return FolderOf(song.FileName); });
+    for (SortItem& item : items) {
+        item.Primary = quint64{albums[item.Index]} << 32 | folders[item.Index];
+        item.Secondary = entries[item.Index]->Track;
+    }
 }
 
 void FillPrimary(const SongOrder& order, Entries entries, std::vector<SortItem>& items) {
@@ -209,7 +219,7 @@ constexpr std::size_t kShortRun = 16;
 
 // Orders songs that are equal up to here by the last text of the sub sort type, then by length.
 void SortRun(const SongOrder& order, Entries entries, std::span<SortItem> run, std::vector<quint32>& places) {
-    const bool byPath = order.SubSortType == sstPath;
+    const bool byPath = order.SubSortType == sstPath || order.SortType == stAlbumOrder;
     std::vector<RunItem> items;
     items.reserve(run.size());
     for (const SortItem& item : run) {
@@ -230,8 +240,12 @@ std::vector<quint32> SortedPlaces(const SongOrder& order, Entries entries) {
     std::vector<SortItem> items(entries.size());
     for (std::size_t i = 0; i < items.size(); ++i)
         items[i].Index = static_cast<quint32>(i);
-    FillPrimary(order, entries, items);
-    FillSecondary(order, entries, items);
+    if (order.SortType == stAlbumOrder) {
+        FillAlbumOrder(entries, items);
+    } else {
+        FillPrimary(order, entries, items);
+        FillSecondary(order, entries, items);
+    }
     if (order.Backwards) {
         for (SortItem& item : items) {
             item.Primary = ~item.Primary;

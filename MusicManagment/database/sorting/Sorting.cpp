@@ -19,6 +19,14 @@ int ComparePrimary(const SongOrder& order, const TID3Tag& a, const TID3Tag& b) {
     return CompareNumbers(PrimaryNumber(order, a), PrimaryNumber(order, b));
 }
 
+// As the songs of an album follow each other, also where another album has its name.
+int CompareAlbumOrder(const TID3Tag& a, const TID3Tag& b) {
+    int result = Collation::CompareIgnoringCase(a.Album, b.Album);
+    if (result == 0) result = Collation::CompareIgnoringCase(FolderOf(a.FileName), FolderOf(b.FileName));
+    if (result == 0) result = CompareNumbers(a.Track, b.Track);
+    return result != 0 ? result : Collation::CompareIgnoringCase(a.FileName, b.FileName);
+}
+
 int CompareTies(TSubSortType type, const TID3Tag& a, const TID3Tag& b) {
     if (type == sstPath) return ComparePaths(a.FileName, b.FileName);
     int result = type == sstGATL ? CompareNumbers(a.MainGenre, b.MainGenre) : 0;
@@ -30,8 +38,9 @@ int CompareTies(TSubSortType type, const TID3Tag& a, const TID3Tag& b) {
 }  // namespace
 
 int CompareSongs(const SongOrder& order, const TID3Tag& a, const TID3Tag& b) {
-    int result = ComparePrimary(order, a, b);
-    if (result == 0) result = CompareTies(order.SubSortType, a, b);
+    const bool albums = order.SortType == stAlbumOrder;
+    int result = albums ? CompareAlbumOrder(a, b) : ComparePrimary(order, a, b);
+    if (result == 0 && !albums) result = CompareTies(order.SubSortType, a, b);
     return order.Backwards ? -result : result;
 }
 

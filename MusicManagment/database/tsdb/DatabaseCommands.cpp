@@ -41,6 +41,7 @@ bool TMusicDatabase::SaveDatabase(const QString& fileName, bool keepName, bool a
     if (askForName || target->isEmpty()) target = AskForTarget(*target);
     if (!target || target->isEmpty()) return false;
 
+    std::unique_ptr<FileLock> lock = fileLock_.ForSaving(*target);
     const bool wasModified = modified_;
     try {
         SafeFile file(*target);
@@ -50,7 +51,10 @@ bool TMusicDatabase::SaveDatabase(const QString& fileName, bool keepName, bool a
         SetModified(wasModified);  // the songs were written, but not to where they will be looked for
         throw EMusicDatabaseException(error.Message());
     }
-    if (!keepName) fileName_ = *target;
+    if (!keepName) {
+        fileName_ = *target;
+        fileLock_.Adopt(std::move(lock));
+    }
     return true;
 }
 
@@ -58,8 +62,12 @@ bool TMusicDatabase::OpenDatabase(const QString& fileName, bool keepName) {
     RefuseReadingNow(*this);
     if (fileName.isEmpty()) {
         Clear(true, keepName);
+        if (!keepName) fileLock_.Release();
         return true;
     }
+    OpenSource(fileName);  // a file that cannot be read leaves everything as it is
+    // Before reading: what somebody else saves in between would be missing.
+    if (!keepName) fileLock_.Claim(fileName);
     FileSource source = OpenSource(fileName);
     // A part of the songs must not be saved over the file that holds them all, which the automatic save would
     // do; so the name comes last.

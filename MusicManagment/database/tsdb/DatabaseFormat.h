@@ -28,19 +28,23 @@ struct GroupList {
     TOVType Type;
     std::size_t Block;
 };
+inline constexpr std::size_t kCaptionBlock = 512;
+inline constexpr std::size_t kBucketBlock = 128;
 inline constexpr std::array<GroupList, 4> kGroupLists = {
-    {{ovArtist, 512}, {ovAlbum, 512}, {ovYear, 128}, {ovLength, 128}}};
+    {{ovArtist, kCaptionBlock}, {ovAlbum, kCaptionBlock}, {ovYear, kBucketBlock}, {ovLength, kBucketBlock}}};
 
 // The texts behind the fixed part of a song record, each with a 32-bit length before it.
 struct SongText {
     QString TID3Tag::*Field;
     QStringView Word;  // its name in messages
     bool Repeats;      // many songs have the same one
+    // Bytes of it that its group's caption has room for; 0 where it makes no group.
+    std::size_t CaptionRoom = 0;
 };
 inline constexpr std::array<SongText, 6> kSongTexts = {{{&TID3Tag::FileName, u"FileName", false},
                                                         {&TID3Tag::Title, u"Title", false},
-                                                        {&TID3Tag::Artist, u"Artist", true},
-                                                        {&TID3Tag::Album, u"Album", true},
+                                                        {&TID3Tag::Artist, u"Artist", true, kCaptionBlock},
+                                                        {&TID3Tag::Album, u"Album", true, kCaptionBlock},
                                                         {&TID3Tag::Comment, u"Kommentar", true},
                                                         {&TID3Tag::MPEGLayer, u"MPEGLayer", true}}};
 inline constexpr std::size_t kLongestText = 65535;

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "CommonRUKTools/CodePage.h"
+#include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/TextPool.h"
 #include "MusicManagment/database/ListGuards.h"
 #include "MusicManagment/database/MusicManagment.h"
@@ -126,8 +127,9 @@ class BodyReader {
         return true;
     }
 
-    // Whether the group lists that were read count exactly the songs that were taken in.
-    bool ListsAreValid() const { return !header_.HasLists() || refused_ == 0; }
+    // Whether the group lists that were read count exactly the songs that were taken in, by their own names.
+    bool ListsAreValid() const { return !header_.HasLists() || (lost_.Left == 0 && !captionWasCut_); }
+    const LostSongs& Lost() const { return lost_; }
 
  private:
     ByteSpan Take(std::size_t size) {
@@ -178,7 +180,8 @@ class BodyReader {
     YearTexts years_;
     std::array<RecentTexts, kSongTexts.size()> recent_;
     bool endIsKnown_ = true;
-    int refused_ = 0;
+    bool captionWasCut_ = false;
+    LostSongs lost_;
 };
 
 bool BodyReader::ReadUpdateFolders() {
@@ -245,6 +248,7 @@ void BodyReader::ReadTexts(TID3Tag& song) {
         const std::uint32_t length = TakeNumber();
         if (length > kLongestText) ThrowTooLong(text, length);
         const ByteSpan bytes = Take(length);
+        if (text.CaptionRoom > 0 && length > text.CaptionRoom) captionWasCut_ = true;
         song.*text.Field = text.Repeats ? recent_[i].Get(bytes, pool_) : CodePage::FromSystem(bytes);
     }
 }
@@ -253,15 +257,30 @@ void BodyReader::ReadOldSong() {
     const std::size_t size = OldRecordSize(header_.Version);
     const ByteSpan bytes = stream_.Take(size);
     if (bytes.size() < size) throw EMusicDatabaseException(u"Fehler in der Datenbank"_s);
-    if (!AddOldSong(database_, bytes, header_.Version, header_.HasLists())) ++refused_;
+    AddOldSong(database_, bytes, header_.Version, header_.HasLists(), lost_);
+}
+
+void TellLostSongs(const LostSongs& lost) {
+    QStringList lines;
+    if (lost.Kept > 0)
+        lines << u"Die Musikdateien von "_s + QString::number(lost.Kept) +
+                     u" Song(s) dieser Datenbank sind nicht da oder nicht lesbar. Diese Songs bleiben ohne "
+                     "ihre Tags in der Datenbank."_s;
+    if (lost.Left > 0)
+        lines << QString::number(lost.Left) +
+                     u" Song(s) dieser Datenbank wurden nicht übernommen, weil ihre Musikdateien nicht da "
+                     "sind oder weil sie in der Bann-Liste stehen."_s;
+    if (!lines.isEmpty()) UserDialogs().ShowMessage(MessageKind::Warning, lines.join(u'\n'));
 }
 
 // False when the user stopped the run.
-bool ReadBody(TMusicDatabase& database, ByteSource& source, const Header& header) {
+bool ReadBody(TMusicDatabase& database, ByteSource& source, const Header& header, LostSongs& lost) {
     const ProgressRun run(database, u"Entpacke und lese Datenbank"_s);
     const LoadingGuard loading(database);
     BodyReader reader(database, source, header);
-    if (!reader.Read()) return false;
+    const bool finished = reader.Read();
+    lost = reader.Lost();
+    if (!finished) return false;
     if (!reader.ListsAreValid())
         database.RecountGroups();
     else if (header.HasLists())
@@ -272,6 +291,7 @@ bool ReadBody(TMusicDatabase& database, ByteSource& source, const Header& header
 // The songs that were read before the end stay; the lists, which count all songs of the file, cannot.
 void SettleForPart(TMusicDatabase& database) {
     database.RecountGroups();
+    database.SetModified(false);
     database.Events().Replaced.Tell();
 }
 
@@ -282,8 +302,9 @@ bool ReadDatabase(TMusicDatabase& database, ByteSource& stream) {
     database.Clear(true, true);
     const Header header = ReadHeader(stream);
     bool finished = false;
+    LostSongs lost;
     try {
-        finished = ReadBody(database, stream, header);
+        finished = ReadBody(database, stream, header, lost);
     } catch (...) {
         SettleForPart(database);
         throw;
@@ -294,6 +315,7 @@ bool ReadDatabase(TMusicDatabase& database, ByteSource& stream) {
     }
     database.Events().Replaced.Tell();
     database.SetModified(false);
+    TellLostSongs(lost);
     return true;
 }
 

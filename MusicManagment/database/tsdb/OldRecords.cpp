@@ -3,8 +3,10 @@
 #include <optional>
 
 #include "CommonRUKTools/CodePage.h"
+#include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/tsdb/DatabaseFormat.h"
+#include "ReadMPEGHeader/FileNameTag.h"
 
 namespace {
 
@@ -38,9 +40,13 @@ SongOverrides StoredValues(ByteSpan bytes, int version) {
 }
 
 // What is known about a song without its file.
-TID3Tag RecordOf(const SongOverrides& values) {
+TID3Tag RecordOf(const QString& path, const SongOverrides& values, const TMusicDatabase& database) {
     TID3Tag record;
-    ResetTag(false, record, values.AddTime.value_or(0));
+    if (database.KeepLostSongs() && !IsCdPath(path))
+        record = TagFromFileName(path, database.AudioReadOptions().ExcludedArtistFolders);
+    else
+        ResetTag(false, record, 0);
+    record.AddTime = values.AddTime.value_or(0);
     record.Length = values.Length.value_or(0);
     record.MainGenre = values.MainGenre.value_or(0);
     record.Reserved = values.Reserved.value_or(record.Reserved);
@@ -55,16 +61,23 @@ std::size_t OldRecordSize(int version) {
     return version == DatabaseFormat::kVersion10 ? 1297 : 1337;
 }
 
-bool AddOldSong(TMusicDatabase& database, ByteSpan bytes, int version, bool isCounted) {
+void AddOldSong(TMusicDatabase& database, ByteSpan bytes, int version, bool isCounted, LostSongs& lost) {
     const AddAs as = isCounted ? AddAs::Loaded : AddAs::LoadedUncounted;
     const QString path = TextUpToZero(bytes.first(kFileNameField));
     const SongOverrides values = StoredValues(bytes, version);
+    bool isThere = true;
     try {
-        if (database.AddSong(path, values, as) >= 0) return true;
-        if (!IsCdPath(path)) return false;
+        if (database.AddSong(path, values, as) >= 0) return;
+        isThere = FileSource::Exists(path);
+        if (isThere || !(IsCdPath(path) || database.KeepLostSongs())) {
+            ++lost.Left;
+            return;
+        }
     } catch (const EStreamError&) {
         // The file is there but cannot be read now: rights, a bad sector. The song stays, as below.
     }
-    // Such a song, and one on a CD that is not inserted, loses its tags but not its place in the collection.
-    return database.AddEntry(path, RecordOf(values), as) >= 0;
+    // Such a song, and one on a medium that is not there, loses its tags but not its place in the collection.
+    const AddAs unseen = isThere || isCounted || IsCdPath(path) ? as : AddAs::Returning;
+    const bool added = database.AddEntry(path, RecordOf(path, values, database), unseen) >= 0;
+    ++(added ? lost.Kept : lost.Left);
 }

@@ -17,7 +17,7 @@ class CdsPage : public OptionsPage {
     std::optional<OptionsFault> Check() override;
     void Apply(TMusicDatabase& database, TRWReg& settings) override;
     // The list is the user's own.
-    void LoadDefaults(const TMusicDatabase&, const TRWReg&) override {}
+    void LoadDefaults() override {}
     bool HasDefaults() const override { return false; }
 
  private:

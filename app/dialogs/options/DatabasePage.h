@@ -10,12 +10,10 @@ class DatabasePage : public OptionsPage {
  public:
     DatabasePage();
 
-    void Load(const TMusicDatabase& database, const TRWReg& settings) override;
-    void Apply(TMusicDatabase& database, TRWReg& settings) override;
-
  private:
+    void ShowAutoSave(int autoSave);
+    int ChosenAutoSave() const;
+
     QComboBox* autoSave_;
     DurationBox* interval_;
-    QComboBox* compression_;
-    QCheckBox* deleteBanned_;
 };

@@ -4,9 +4,8 @@
 
 using namespace Qt::StringLiterals;
 
-DurationBox::DurationBox(Unit unit, int least, int most) : unit_(unit == Unit::Seconds ? 1000 : 60'000) {
+DurationBox::DurationBox(Unit unit) : unit_(unit == Unit::Seconds ? 1000 : 60'000) {
     setSuffix(unit == Unit::Seconds ? u" s"_s : u" min"_s);
-    setRange(least, most);
     setSingleStep(unit_);
 }
 

@@ -8,8 +8,7 @@
 class DurationBox : public QSpinBox {
  public:
     enum class Unit { Seconds, Minutes };
-    // `least` and `most` in milliseconds.
-    DurationBox(Unit unit, int least, int most);
+    explicit DurationBox(Unit unit);
 
  protected:
     QString textFromValue(int value) const override;

@@ -6,7 +6,8 @@
 #include <QLineEdit>
 
 #include "CommonRUKTools/AbsolutePath.h"
-#include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/commands/DatabaseSettings.h"
+#include "MusicManagment/database/songfiles/NamePattern.h"
 #include "app/desktop/Icons.h"
 #include "app/dialogs/FolderList.h"
 #include "app/dialogs/NamePatternEdit.h"
@@ -32,6 +33,8 @@ FilesPage::FilesPage()
     byGenre_ =
         AddCheck(naming, u"MoveMP3sAfterGenreChange"_s, u"Dateien in den Ordner ihres &Genres verschieben"_s,
                  u"Der Ordner liegt im Stammordner. Songs ohne Genre bleiben, wo sie sind."_s);
+    fields_.Bind(rename_, DatabaseSettings::kRenameAndMoveMP3s);
+    fields_.Bind(byGenre_, DatabaseSettings::kMoveMP3sAfterGenreChange);
     connect(rename_, &QCheckBox::toggled, this, [this] { EnableNaming(); });
     QFormLayout& genres = AddGroup(u"Ordner der Genres"_s);
     genreFolders_ =
@@ -39,52 +42,62 @@ FilesPage::FilesPage()
                 u"Diese Namen gelten beim Aufnehmen auch nie als Artist."_s);
 }
 
-void FilesPage::Load(const TMusicDatabase& database, const TRWReg&) {
+void FilesPage::Load(const TMusicDatabase& database, const TRWReg& settings) {
+    OptionsPage::Load(database, settings);
     folders_->SetFolders(database.UpdateFolders());
-    loadedRoot_ = AbsolutePath(database.MP3MoveRootDir());
-    loadedRename_ = database.RenameAndMoveMP3s();
-    LoadNaming(database);
+    ShowNaming(database.MP3MoveRootDir(), database.MP3NamePattern(), database.MP3MoveSubDirs());
+    RememberShown();
 }
 
-void FilesPage::LoadDefaults(const TMusicDatabase& database, const TRWReg&) {
-    LoadNaming(database);
+void FilesPage::LoadDefaults() {
+    OptionsPage::LoadDefaults();
+    const TMusicDatabase fresh;
+    ShowNaming(fresh.MP3MoveRootDir(), fresh.MP3NamePattern(), DefaultGenreFolderNames());
 }
 
-void FilesPage::LoadNaming(const TMusicDatabase& database) {
-    rename_->setChecked(database.RenameAndMoveMP3s());
-    byGenre_->setChecked(database.MoveMP3sAfterGenreChange());
-    root_->SetFolder(AbsolutePath(database.MP3MoveRootDir()));
-    pattern_->SetPattern(database.MP3NamePattern());
-    genreFolders_->SetNames(database.MP3MoveSubDirs());
+void FilesPage::ShowNaming(const QString& root, const QString& pattern, const QStringList& genreFolders) {
+    root_->SetFolder(AbsolutePath(root));
+    pattern_->SetPattern(pattern);
+    genreFolders_->SetNames(genreFolders);
     EnableNaming();
 }
 
-// Asks about the folder only where something about it was changed here: who comes for another option is not
-// to be bothered with it each time.
+void FilesPage::RememberShown() {
+    loadedRoot_ = root_->Folder();
+    loadedPattern_ = pattern_->Pattern();
+    loadedGenreFolders_ = genreFolders_->Names();
+    loadedRename_ = rename_->isChecked();
+}
+
+// Only what was changed here is looked at: who comes for another option is not to be bothered with the rest
+// each time.
 std::optional<OptionsFault> FilesPage::Check() {
     if (rename_->isChecked()) {
-        if (const auto fault = FaultOfPattern(pattern_->Pattern()))
-            return OptionsFault{*fault, &pattern_->Edit()};
-        if (root_->Folder() != loadedRoot_ || !loadedRename_)
+        const bool begins = !loadedRename_;
+        if (begins || pattern_->Pattern() != loadedPattern_)
+            if (const auto fault = FaultOfPattern(pattern_->Pattern()))
+                return OptionsFault{*fault, &pattern_->Edit()};
+        if (begins || root_->Folder() != loadedRoot_)
             if (const auto fault = root_->Fault()) return OptionsFault{*fault, &root_->Edit()};
     }
-    if (const auto fault = genreFolders_->Fault()) return OptionsFault{*fault, genreFolders_};
+    if (genreFolders_->Names() != loadedGenreFolders_)
+        if (const auto fault = genreFolders_->Fault()) return OptionsFault{*fault, genreFolders_};
     return std::nullopt;
 }
 
-void FilesPage::Apply(TMusicDatabase& database, TRWReg&) {
+void FilesPage::Apply(TMusicDatabase& database, TRWReg& settings) {
     if (folders_->Folders() != database.UpdateFolders()) {
         database.SetUpdateFolders(folders_->Folders());
         database.SetModified(true);
     }
-    database.SetRenameAndMoveMP3s(rename_->isChecked());
-    database.SetMoveMP3sAfterGenreChange(byGenre_->isChecked());
+    OptionsPage::Apply(database, settings);
     // Without renaming these are not checked, and what cannot be used is not stored either.
-    if (!FaultOfPattern(pattern_->Pattern())) database.SetMP3NamePattern(pattern_->Pattern());
-    if (QDir::isAbsolutePath(root_->Folder())) database.SetMP3MoveRootDir(root_->Folder());
-    database.SetMP3MoveSubDirs(genreFolders_->Names());
-    loadedRoot_ = AbsolutePath(database.MP3MoveRootDir());
-    loadedRename_ = rename_->isChecked();
+    const QString pattern = pattern_->Pattern();
+    if (pattern != loadedPattern_ && !FaultOfPattern(pattern)) database.SetMP3NamePattern(pattern);
+    const QString root = root_->Folder();
+    if (root != loadedRoot_ && QDir::isAbsolutePath(root)) database.SetMP3MoveRootDir(root);
+    if (genreFolders_->Names() != loadedGenreFolders_) database.SetMP3MoveSubDirs(genreFolders_->Names());
+    RememberShown();
 }
 
 void FilesPage::EnableNaming() {

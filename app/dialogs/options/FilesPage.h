@@ -15,10 +15,11 @@ class FilesPage : public OptionsPage {
     void Load(const TMusicDatabase& database, const TRWReg& settings) override;
     std::optional<OptionsFault> Check() override;
     void Apply(TMusicDatabase& database, TRWReg& settings) override;
-    void LoadDefaults(const TMusicDatabase& database, const TRWReg& settings) override;
+    void LoadDefaults() override;
 
  private:
-    void LoadNaming(const TMusicDatabase& database);
+    void ShowNaming(const QString& root, const QString& pattern, const QStringList& genreFolders);
+    void RememberShown();
     void EnableNaming();
 
     FolderList* folders_;
@@ -27,6 +28,9 @@ class FilesPage : public OptionsPage {
     RootFolderField* root_;
     NamePatternEdit* pattern_;
     GenreFolderTable* genreFolders_;
+    // What was shown at first: who touches nothing changes nothing.
     QString loadedRoot_;
+    QString loadedPattern_;
+    QStringList loadedGenreFolders_;
     bool loadedRename_ = false;
 };

@@ -4,7 +4,7 @@
 #include <QComboBox>
 #include <QFormLayout>
 
-#include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/commands/DatabaseSettings.h"
 #include "app/desktop/Icons.h"
 
 using namespace Qt::StringLiterals;
@@ -27,34 +27,27 @@ QStringList SubSortTypes() {
 GeneralPage::GeneralPage()
     : OptionsPage(u"Allgemein"_s, ThemeIcon(u"configure"_s, QStyle::SP_FileDialogDetailedView)) {
     QFormLayout& use = AddGroup(u"Bedienung"_s);
-    asynchronous_ =
-        AddCheck(use, u"Asynchronous"_s, u"O&berfläche während langer Vorgänge bedienbar halten"_s,
-                 u"Ohne diese Option lässt sich ein Vorgang nicht anhalten, bis er fertig ist."_s);
+    fields_.Bind(AddCheck(use, u"Asynchronous"_s, u"O&berfläche während langer Vorgänge bedienbar halten"_s,
+                          u"Ohne diese Option lässt sich ein Vorgang nicht anhalten, bis er fertig ist."_s),
+                 DatabaseSettings::kAsynchronous);
     QFormLayout& list = AddGroup(u"Liste"_s);
     sortType_ = AddField(list, u"SortType"_s, u"Songs an&ordnen nach"_s, new QComboBox);
     sortType_->addItems(SortTypes());
+    fields_.Bind(sortType_, DatabaseSettings::kSortType);
     subSortType_ = AddField(list, u"SubSortType"_s, u"&Untergeordnet nach"_s, new QComboBox,
                             u"Entscheidet zwischen Songs, die sonst gleich sind"_s);
     subSortType_->addItems(SubSortTypes());
+    fields_.Bind(subSortType_, DatabaseSettings::kSubSortType);
     sortBackwards_ = AddCheck(list, u"SortBackwards"_s, u"&Reihenfolge umkehren"_s);
-    followFocus_ = AddCheck(list, u"FollowFocus"_s, u"&Markierung verfolgen"_s,
-                            u"Der gewählte Song bleibt im Blick, wenn die Liste neu sortiert wird."_s);
+    fields_.Bind(sortBackwards_, DatabaseSettings::kSortBackwards);
+    fields_.Bind(AddCheck(list, u"FollowFocus"_s, u"&Markierung verfolgen"_s,
+                          u"Der gewählte Song bleibt im Blick, wenn die Liste neu sortiert wird."_s),
+                 DatabaseSettings::kFollowFocus);
 }
 
-void GeneralPage::Load(const TMusicDatabase& database, const TRWReg&) {
-    asynchronous_->setChecked(database.Asynchronous());
-    sortType_->setCurrentIndex(database.SortType());
-    subSortType_->setCurrentIndex(database.SubSortType());
-    sortBackwards_->setChecked(database.SortBackwards());
-    followFocus_->setChecked(database.FollowFocus());
-}
-
-void GeneralPage::Apply(TMusicDatabase& database, TRWReg&) {
-    database.SetAsynchronous(asynchronous_->isChecked());
-    database.SetFollowFocus(followFocus_->isChecked());
-    SongOrder order = database.Order();
-    order.SortType = static_cast<TSortType>(sortType_->currentIndex());
-    order.SubSortType = static_cast<TSubSortType>(subSortType_->currentIndex());
-    order.Backwards = sortBackwards_->isChecked();
-    database.SetOrder(order);
+// What the order consists of is set at once, which sorts once.
+void GeneralPage::Apply(TMusicDatabase& database, TRWReg& settings) {
+    database.SetOrder({static_cast<TSortType>(sortType_->currentIndex()),
+                       static_cast<TSubSortType>(subSortType_->currentIndex()), sortBackwards_->isChecked()});
+    OptionsPage::Apply(database, settings);
 }

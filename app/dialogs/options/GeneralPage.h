@@ -9,13 +9,10 @@ class GeneralPage : public OptionsPage {
  public:
     GeneralPage();
 
-    void Load(const TMusicDatabase& database, const TRWReg& settings) override;
     void Apply(TMusicDatabase& database, TRWReg& settings) override;
 
  private:
-    QCheckBox* asynchronous_;
     QComboBox* sortType_;
     QComboBox* subSortType_;
     QCheckBox* sortBackwards_;
-    QCheckBox* followFocus_;
 };

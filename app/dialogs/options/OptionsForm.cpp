@@ -8,7 +8,6 @@
 #include <QScreen>
 #include <QStackedWidget>
 #include <QStyledItemDelegate>
-#include <QTemporaryDir>
 #include <QVBoxLayout>
 
 #include "CommonRUKTools/Dialogs.h"
@@ -23,7 +22,7 @@
 #include "app/dialogs/options/GeneralPage.h"
 #include "app/dialogs/options/PlaybackPage.h"
 #include "app/dialogs/options/RemoteControlPage.h"
-#include "app/dialogs/options/TagsPage.h"
+#include "app/dialogs/options/RulesPage.h"
 #include "app/dialogs/options/WatchChanges.h"
 
 using namespace Qt::StringLiterals;
@@ -61,7 +60,7 @@ TOptionsForm::TOptionsForm(TMusicDatabase& database, TRWReg& settings, QWidget* 
     AddPage(new GeneralPage);
     AddPage(new DatabasePage);
     AddPage(new FilesPage);
-    AddPage(new TagsPage);
+    AddPage(new RulesPage(database_));
     AddPage(new PlaybackPage(database_));
     AddPage(new CdsPage);
     AddPage(new RemoteControlPage(database_));
@@ -151,12 +150,7 @@ void TOptionsForm::Load() {
 }
 
 void TOptionsForm::LoadDefaults() {
-    const QTemporaryDir folder;
-    const TRWReg nothing(u"\\"_s, folder.filePath(u"leer.conf"_s));
-    TMusicDatabase fresh;
-    fresh.SetModernTags(true);  // as the program does before it reads its settings
-    LoadDatabaseSettings(fresh, nothing);
-    CurrentPage().LoadDefaults(fresh, nothing);
+    CurrentPage().LoadDefaults();
 }
 
 // A button that is chosen by its key leaves the focus where it is; the cell being edited counts all the same.

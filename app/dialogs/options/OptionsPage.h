@@ -5,11 +5,10 @@
 #include <QWidget>
 #include <optional>
 
-class QCheckBox;
+#include "app/dialogs/options/SettingFields.h"
+
 class QFormLayout;
 class QVBoxLayout;
-class TMusicDatabase;
-class TRWReg;
 
 // Why the values of a page cannot be taken over.
 struct OptionsFault {
@@ -27,15 +26,16 @@ class OptionsPage : public QWidget {
     const QIcon& Icon() const { return icon_; }
 
     // Shows the values in force.
-    virtual void Load(const TMusicDatabase& database, const TRWReg& settings) = 0;
+    virtual void Load(const TMusicDatabase& database, const TRWReg& settings) {
+        fields_.Load(database, settings);
+    }
     // May ask the user. Nothing when everything can be applied.
     virtual std::optional<OptionsFault> Check() { return std::nullopt; }
-    virtual void Apply(TMusicDatabase& database, TRWReg& settings) = 0;
-    // Shows the values of a new installation, which are those of the arguments; nothing is stored. Lists that
-    // the user has put together are no values and stay.
-    virtual void LoadDefaults(const TMusicDatabase& database, const TRWReg& settings) {
-        Load(database, settings);
-    }
+    // Takes over what the user has touched.
+    virtual void Apply(TMusicDatabase& database, TRWReg& settings) { fields_.Store(database, settings); }
+    // Shows the values of a new installation; nothing is stored. Lists that the user has put together are no
+    // values and stay.
+    virtual void LoadDefaults() { fields_.ShowNewValues(); }
     virtual bool HasDefaults() const { return true; }
 
  protected:
@@ -63,6 +63,8 @@ class OptionsPage : public QWidget {
     static void AddExplanation(QFormLayout& group, const QString& text);
     // Greys out a group whose options do nothing yet, and says why.
     static void SetAvailable(QFormLayout& group, bool available, const QString& reason);
+
+    SettingFields fields_;
 
  private:
     static void AddRow(QFormLayout& group, const QString& name, const QString& caption, QWidget& field,

@@ -7,7 +7,9 @@
 #include <QSpinBox>
 #include <algorithm>
 
-#include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/commands/DatabaseSettings.h"
+#include "MusicManagment/playback/PlayerSettings.h"
+#include "MusicManagment/playlist/PlayListSettings.h"
 #include "app/desktop/Icons.h"
 #include "app/dialogs/options/DurationBox.h"
 #include "app/models/SoundOutputs.h"
@@ -17,15 +19,15 @@ using namespace Qt::StringLiterals;
 namespace {
 
 struct Engine {
-    const char16_t* Name;  // of the setting
+    Setting<bool> Row;
     const char16_t* Caption;
 };
 
 constexpr Engine kEngines[] = {
-    {u"UseFMOD", u"&FMOD"},
-    {u"UseMCI", u"&MCI (Player des Systems)"},
-    {u"UseEldoS", u"&EldoS"},
-    {u"UseWinamp", u"Win&amp (anderes Programm)"},
+    {PlayerSettings::kUseFMOD, u"&FMOD"},
+    {PlayerSettings::kUseMCI, u"&MCI (Player des Systems)"},
+    {PlayerSettings::kUseEldoS, u"&EldoS"},
+    {PlayerSettings::kUseWinAmp, u"Win&amp (anderes Programm)"},
 };
 
 // In the order of the stored numbers.
@@ -33,9 +35,6 @@ QStringList Crossovers() {
     return {u"nie"_s, u"am Ende eines Songs"_s, u"bei jedem Wechsel"_s,
             u"bei jedem Wechsel und beim Anhalten"_s};
 }
-
-constexpr int kCrossoverAtEnd = 1;
-constexpr int kDirectSound = 2;
 
 }  // namespace
 
@@ -52,57 +51,58 @@ PlaybackPage::PlaybackPage(const TMusicDatabase& database)
     SetAvailable(*playListGroup_, database.PlayList() != nullptr, u"Wird mit der PlayList wirksam."_s);
 }
 
-QSpinBox* PlaybackPage::AddNumber(QFormLayout& group, const QString& name, const QString& caption, int least,
-                                  int most, int standard, const QString& unit) {
-    auto* field = AddField(group, name, caption, new QSpinBox);
-    field->setRange(least, most);
+void PlaybackPage::AddNumber(QFormLayout& group, const Setting<int>& setting, const QString& caption,
+                             const QString& unit) {
+    auto* field = AddField(group, setting.Name.toString(), caption, new QSpinBox);
     field->setGroupSeparatorShown(true);
     field->setSuffix(unit);
-    fields_.BindInteger(field, name, standard);
-    return field;
+    fields_.Bind(field, setting);
 }
 
-QLineEdit* PlaybackPage::AddLine(QFormLayout& group, const QString& name, const QString& caption,
-                                 const QString& standard) {
-    auto* field = AddField(group, name, caption, new QLineEdit);
-    fields_.BindText(field, name, standard);
+void PlaybackPage::AddTime(QFormLayout& group, const Setting<int>& setting, const QString& caption,
+                           const QString& toolTip) {
+    auto* field = new DurationBox(DurationBox::Unit::Seconds);
+    fields_.Bind(AddField(group, setting.Name.toString(), caption, field, toolTip), setting);
+}
+
+QLineEdit* PlaybackPage::AddLine(QFormLayout& group, const Setting<QString>& setting,
+                                 const QString& caption) {
+    auto* field = AddField(group, setting.Name.toString(), caption, new QLineEdit);
+    fields_.Bind(field, setting);
     return field;
 }
 
 void PlaybackPage::AddPlayer() {
     QFormLayout& player = AddGroup(u"Player"_s);
     playerGroups_.push_back(&player);
-    auto* autoPlay = AddCheck(player, u"PSAutoPlay"_s, u"&Gleich abspielen, wenn ein Song geladen wird"_s);
-    fields_.BindBool(autoPlay, u"PSAutoPlay"_s, false);
-    AddNumber(player, u"PSTimerInterval"_s, u"Anzeige erne&uern alle"_s, 20, 5000, 250, u" ms"_s);
+    fields_.Bind(AddCheck(player, u"PSAutoPlay"_s, u"&Gleich abspielen, wenn ein Song geladen wird"_s),
+                 PlayerSettings::kAutoPlay.Row);
+    AddNumber(player, PlayerSettings::kTimerInterval.Row, u"Anzeige erne&uern alle"_s, u" ms"_s);
 }
 
 void PlaybackPage::AddPlayList() {
     QFormLayout& list = AddGroup(u"PlayList"_s);
     playListGroup_ = &list;
-    auto* repeat = AddCheck(list, u"RepeatAll"_s, u"Am Ende von &vorn beginnen"_s);
-    fields_.BindBool(repeat, u"RepeatAll"_s, false);
+    fields_.Bind(AddCheck(list, u"RepeatAll"_s, u"Am Ende von &vorn beginnen"_s),
+                 PlayListSettings::kRepeatAll.Row);
     auto* copy =
         AddCheck(list, u"CopyMp3sBeforePlay"_s, u"Songs vor dem Abspielen &zwischenspeichern"_s,
                  u"Kopiert jeden Song vorher in den Ordner für temporäre Dateien, etwa von einer CD."_s);
-    fields_.BindBool(copy, u"CopyMp3sBeforePlay"_s, false);
-    auto* scan = AddField(list, u"ScanTime"_s, u"Spielzeit beim Ans&pielen"_s,
-                          new DurationBox(DurationBox::Unit::Seconds, 1000, 600'000));
-    fields_.BindInteger(scan, u"ScanTime"_s, 10'000);
+    fields_.Bind(copy, PlayListSettings::kCopyMp3sBeforePlay.Row);
+    AddTime(list, PlayListSettings::kScanTime.Row, u"Spielzeit beim Ans&pielen"_s);
 }
 
 void PlaybackPage::AddEngines() {
     QFormLayout& group = AddGroup(u"Abspielen mit"_s);
     playerGroups_.push_back(&group);
     for (const Engine& engine : kEngines) {
-        const QString name = QString::fromUtf16(engine.Name);
-        auto* box = AddCheck(group, name, QString::fromUtf16(engine.Caption));
-        fields_.BindBool(box, name, true);
+        auto* box = AddCheck(group, engine.Row.Name.toString(), QString::fromUtf16(engine.Caption));
+        fields_.Bind(box, engine.Row);
         engines_.push_back(box);
     }
     auto* apart = AddCheck(group, u"PSPlayExtern"_s, u"In einem eigenen Programm (TSPla&yer)"_s,
                            u"Die Songs spielt dann ein zweites Programm, das dieses hier steuert."_s);
-    fields_.BindBool(apart, u"PSPlayExtern"_s, false);
+    fields_.Bind(apart, PlayerSettings::kPlayExtern.Row);
 }
 
 void PlaybackPage::AddFmod() {
@@ -110,53 +110,51 @@ void PlaybackPage::AddFmod() {
     playerGroups_.push_back(&fmod);
     auto* crossover = AddField(fmod, u"Crossover"_s, u"Ü&berblenden"_s, new QComboBox);
     crossover->addItems(Crossovers());
-    fields_.BindChoice(crossover, u"Crossover"_s, kCrossoverAtEnd);
-    auto* time = AddField(fmod, u"CrossoverTime"_s, u"&Dauer der Überblendung"_s,
-                          new DurationBox(DurationBox::Unit::Seconds, 0, 60'000),
-                          u"Unter 3 Sekunden wird nicht übergeblendet."_s);
-    fields_.BindInteger(time, u"CrossoverTime"_s, 10'000);
+    fields_.Bind(crossover, PlayerSettings::kCrossover);
+    AddTime(fmod, PlayerSettings::kCrossoverTime, u"&Dauer der Überblendung"_s,
+            u"Unter 3 Sekunden wird nicht übergeblendet."_s);
     auto* output = AddField(fmod, u"FMODSoundOutput"_s, u"Au&sgabe"_s, new QComboBox);
     output->addItems(SoundOutputNames());
-    fields_.BindChoice(output, u"FMODSoundOutput"_s, kDirectSound);
-    AddNumber(fmod, u"FMODMixRate"_s, u"M&ischrate"_s, 4000, 192'000, 44'100, u" Hz"_s);
-    AddNumber(fmod, u"FMODSoftChannels"_s, u"Software-&Kanäle"_s, 1, 1024, 32);
+    fields_.Bind(output, PlayerSettings::kSoundOutput);
+    AddNumber(fmod, PlayerSettings::kMixRate, u"M&ischrate"_s, u" Hz"_s);
+    AddNumber(fmod, PlayerSettings::kSoftChannels, u"Software-&Kanäle"_s);
 }
 
 void PlaybackPage::AddEldoS() {
     QFormLayout& eldos = AddGroup(u"EldoS"_s);
     playerGroups_.push_back(&eldos);
-    AddNumber(eldos, u"EldoSBufferCount"_s, u"Za&hl der Puffer"_s, 1, 64, 4);
-    AddNumber(eldos, u"EldoSBufferSize"_s, u"G&röße eines Puffers"_s, 1024, 1'048'576, 32'768, u" Byte"_s);
+    AddNumber(eldos, PlayerSettings::kEldoSBufferCount, u"Za&hl der Puffer"_s);
+    AddNumber(eldos, PlayerSettings::kEldoSBufferSize, u"G&röße eines Puffers"_s, u" Byte"_s);
 }
 
 void PlaybackPage::AddWinamp() {
     QFormLayout& winamp = AddGroup(u"Winamp"_s);
     playerGroups_.push_back(&winamp);
-    winampClass_ = AddLine(winamp, u"WinAmpClassName"_s, u"Fensterk&lasse"_s, u"WinAmp v1.x"_s);
-    winampFile_ = AddLine(winamp, u"WinAmpFileName"_s, u"Pr&ogrammdatei"_s, u"WinAmp.exe"_s);
-    winampLength_ = AddCheck(winamp, u"UseWinAmpForLenCheck"_s, u"Länge von Songs mi&t Winamp prüfen"_s);
+    winampClass_ = AddLine(winamp, PlayerSettings::kWinAmpClassName, u"Fensterk&lasse"_s);
+    winampFile_ = AddLine(winamp, PlayerSettings::kWinAmpFile, u"Pr&ogrammdatei"_s);
+    fields_.Bind(AddCheck(winamp, u"UseWinAmpForLenCheck"_s, u"Länge von Songs mi&t Winamp prüfen"_s),
+                 DatabaseSettings::kUseWinAmpForLenCheck);
+}
+
+bool PlaybackPage::EngineChosen() const {
+    return std::ranges::any_of(engines_, &QCheckBox::isChecked);
 }
 
 void PlaybackPage::Load(const TMusicDatabase& database, const TRWReg& settings) {
-    fields_.Load(settings);
-    winampLength_->setChecked(database.UseWinAmpForLenCheck());
+    OptionsPage::Load(database, settings);
+    loadedEngine_ = EngineChosen();
+    loadedClass_ = winampClass_->text();
+    loadedFile_ = winampFile_->text();
 }
 
+// What cannot be used is refused where it was chosen here, and not where it was found.
 std::optional<OptionsFault> PlaybackPage::Check() {
-    const bool noEngine =
-        std::none_of(engines_.begin(), engines_.end(), [](const QCheckBox* box) { return box->isChecked(); });
-    if (engines_.front()->isEnabled() && noEngine)
+    if (loadedEngine_ && !EngineChosen())
         return OptionsFault{u"Mindestens ein System zum Abspielen muss eingeschaltet sein."_s,
                             engines_.front()};
-    if (!winampClass_->isEnabled()) return std::nullopt;
-    if (winampClass_->text().trimmed().isEmpty())
+    if (winampClass_->text() != loadedClass_ && winampClass_->text().trimmed().isEmpty())
         return OptionsFault{u"Die Fensterklasse von Winamp fehlt."_s, winampClass_};
-    if (winampFile_->text().trimmed().isEmpty())
+    if (winampFile_->text() != loadedFile_ && winampFile_->text().trimmed().isEmpty())
         return OptionsFault{u"Die Programmdatei von Winamp fehlt."_s, winampFile_};
     return std::nullopt;
-}
-
-void PlaybackPage::Apply(TMusicDatabase& database, TRWReg& settings) {
-    fields_.Store(settings);
-    database.SetUseWinAmpForLenCheck(winampLength_->isChecked());
 }

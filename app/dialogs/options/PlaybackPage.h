@@ -3,10 +3,8 @@
 #include <vector>
 
 #include "app/dialogs/options/OptionsPage.h"
-#include "app/dialogs/options/StoredFields.h"
 
 class QLineEdit;
-class QSpinBox;
 
 // "Wiedergabe": settings of the player and the playlist, which these components read from the store.
 class PlaybackPage : public OptionsPage {
@@ -16,7 +14,6 @@ class PlaybackPage : public OptionsPage {
 
     void Load(const TMusicDatabase& database, const TRWReg& settings) override;
     std::optional<OptionsFault> Check() override;
-    void Apply(TMusicDatabase& database, TRWReg& settings) override;
 
  private:
     void AddPlayer();
@@ -25,16 +22,20 @@ class PlaybackPage : public OptionsPage {
     void AddFmod();
     void AddEldoS();
     void AddWinamp();
-    QSpinBox* AddNumber(QFormLayout& group, const QString& name, const QString& caption, int least, int most,
-                        int standard, const QString& unit = QString());
-    QLineEdit* AddLine(QFormLayout& group, const QString& name, const QString& caption,
-                       const QString& standard);
+    void AddNumber(QFormLayout& group, const Setting<int>& setting, const QString& caption,
+                   const QString& unit = QString());
+    void AddTime(QFormLayout& group, const Setting<int>& setting, const QString& caption,
+                 const QString& toolTip = QString());
+    QLineEdit* AddLine(QFormLayout& group, const Setting<QString>& setting, const QString& caption);
+    bool EngineChosen() const;
 
-    StoredFields fields_;
     std::vector<QFormLayout*> playerGroups_;  // those that only a player makes use of
     QFormLayout* playListGroup_ = nullptr;
     std::vector<QCheckBox*> engines_;
     QLineEdit* winampClass_ = nullptr;
     QLineEdit* winampFile_ = nullptr;
-    QCheckBox* winampLength_ = nullptr;
+    // What was shown at first.
+    bool loadedEngine_ = true;
+    QString loadedClass_;
+    QString loadedFile_;
 };

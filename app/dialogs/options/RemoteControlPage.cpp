@@ -3,7 +3,7 @@
 #include <QCheckBox>
 #include <QFormLayout>
 
-#include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/commands/DatabaseSettings.h"
 #include "app/desktop/Icons.h"
 
 using namespace Qt::StringLiterals;
@@ -14,15 +14,7 @@ RemoteControlPage::RemoteControlPage(const TMusicDatabase& database)
     auto* enabled =
         AddCheck(group, u"RCEnabled"_s, u"Andere Programme &dürfen Tunestead steuern"_s,
                  u"Andere Programme Ihres Rechners können dann den Player und die PlayList bedienen."_s);
-    fields_.BindBool(enabled, u"RCEnabled"_s, true);
+    fields_.Bind(enabled, DatabaseSettings::kRCEnabled);
     SetAvailable(group, database.RemoteControl() != nullptr,
                  u"Wird mit der Fernsteuerung wirksam, die mit einer der nächsten Versionen kommt."_s);
-}
-
-void RemoteControlPage::Load(const TMusicDatabase&, const TRWReg& settings) {
-    fields_.Load(settings);
-}
-
-void RemoteControlPage::Apply(TMusicDatabase&, TRWReg& settings) {
-    fields_.Store(settings);
 }

@@ -1,17 +1,10 @@
 #pragma once
 
 #include "app/dialogs/options/OptionsPage.h"
-#include "app/dialogs/options/StoredFields.h"
 
 // "Fernsteuerung": a setting of the remote control, which that component reads from the store.
 class RemoteControlPage : public OptionsPage {
  public:
     // The group is greyed out where `database` is not linked to a remote control.
     explicit RemoteControlPage(const TMusicDatabase& database);
-
-    void Load(const TMusicDatabase& database, const TRWReg& settings) override;
-    void Apply(TMusicDatabase& database, TRWReg& settings) override;
-
- private:
-    StoredFields fields_;
 };

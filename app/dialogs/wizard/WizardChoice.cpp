@@ -1,15 +1,15 @@
 #include "app/dialogs/wizard/WizardChoice.h"
 
 #include <QFileInfo>
-#include <QStandardPaths>
 
 #include "CommonRUKTools/AbsolutePath.h"
+#include "CommonRUKTools/MusicFolder.h"
 #include "MusicManagment/database/MusicManagment.h"
 
 WizardChoice FirstChoice(const TMusicDatabase& database) {
     WizardChoice choice = CurrentChoice(database);
     choice.RenameAndMove = false;
-    const QString music = QStandardPaths::writableLocation(QStandardPaths::MusicLocation);
+    const QString music = MusicFolder();
     if (choice.Folders.isEmpty() && QFileInfo(music).isDir()) choice.Folders << AbsolutePath(music);
     return choice;
 }

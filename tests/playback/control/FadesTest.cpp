@@ -6,19 +6,11 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-class FadesTest : public PlayerTest {
+class FadesTest : public ListedSongsTest {
  protected:
-    FadesTest() {
-        player_.SetPanel(&panel_);
-        player_.SetPlayList(&list_);
-    }
-    void List(const QStringList& songs) {
-        for (const QString& song : songs)
-            list_.Insert(list_.Count(), {.Name = Add(song)});
-    }
+    FadesTest() { player_.SetPanel(&panel_); }
 
     ScriptedPanel panel_;
-    TPlayList list_;
 };
 
 TEST_F(FadesTest, FadingStopEndsWhenTheFadeHasRunOut) {
@@ -225,25 +217,33 @@ TEST_F(FadesTest, SongMayChangeWhileTheModeIsAskedFor) {
     EXPECT_EQ(crossovers, 0);
 }
 
-TEST_F(FadesTest, ListWaitsForTheEndWhereSongsCannotCross) {
+TEST_F(FadesTest, NeighboursOnAnAlbumFollowWithoutAFade) {
     length_ = 20'000;
-    List({u"a.mp3"_s, u"track.cda"_s});
+    const auto list = [this](const QString& song, const QString& album, quint8 track) {
+        TID3Tag record;
+        record.Artist = u"Band"_s;
+        record.Album = album;
+        record.Track = track;
+        record.FileName = Add(song);
+        list_.Insert(list_.Count(), {.Name = record.FileName, .Record = record});
+    };
+    list(u"a.mp3"_s, u"Platte"_s, 1);
+    list(u"b.mp3"_s, u"Platte"_s, 2);
+    list(u"c.mp3"_s, u"Platte"_s, 4);
+    player_.SetKeepAlbums(true);
     list_.PlayNext();
-    Pass(19'000);
-    EXPECT_EQ(list_.CurrentSong(), folder_.Path(u"a.mp3"_s));
-    EXPECT_EQ(list_.History().size(), 1);
-    Pass(1500);
-    EXPECT_EQ(Open(), u"MCI:track"_s);
-}
+    Pass(15'000);
+    EXPECT_EQ(Open(), u"FMOD:a"_s);
+    Pass(5500);
+    EXPECT_EQ(Open(), u"FMOD:b"_s);
+    Pass(11'000);
+    EXPECT_EQ(Open(), u"FMOD:b FMOD:c"_s);
 
-TEST_F(FadesTest, EndOfTheListIsToldOnceAndAtTheEnd) {
-    length_ = 20'000;
-    List({u"a.mp3"_s});
-    list_.PlayNext();
-    Pass(19'000);
-    EXPECT_TRUE(Messages().isEmpty());
-    Pass(1500);
-    EXPECT_EQ(Messages().size(), 1);
+    // What the user asks for is faded.
+    panel_.Mode = coAllChanges;
+    list_.PlayEntry(0);
+    list_.PlayEntry(1, {.Change = player_.ChangeOnDemand()});
+    EXPECT_EQ(Open(), u"FMOD:a FMOD:b"_s);
 }
 
 TEST_F(FadesTest, SongThatWasFadedInCountsToo) {
@@ -260,22 +260,6 @@ TEST_F(FadesTest, SongThatWasFadedInCountsToo) {
     Pass(250);
     EXPECT_EQ(database.Song(database.IndexOf(folder_.Path(u"a.wav"_s))).PlayCount, 1U);
     EXPECT_EQ(database.Song(database.IndexOf(folder_.Path(u"b.wav"_s))).PlayCount, 1U);
-}
-
-TEST_F(FadesTest, AnotherSongSoundsBesideTheCurrentOne) {
-    PlaySong(u"a.mp3"_s);
-    player_.SetCOFileName(Add(u"b.mp3"_s));
-    EXPECT_EQ(player_.COFileName(), folder_.Path(u"b.mp3"_s));
-    EXPECT_EQ(Open(), u"FMOD:a FMOD:b"_s);
-    EXPECT_TRUE(Fading(u"b"_s).IsFadingOut());
-    EXPECT_EQ(Fading(u"b"_s).Status, psPlaying);
-    EXPECT_EQ(Fading(u"b"_s).FadeTime, 10'000U);
-    Pass(10'250);
-    EXPECT_EQ(Open(), u"FMOD:a"_s);
-    EXPECT_EQ(player_.COFileName(), QString());
-    panel_.Mode = coNone;
-    player_.SetCOFileName(Add(u"c.mp3"_s));
-    EXPECT_EQ(Open(), u"FMOD:a"_s);
 }
 
 }  // namespace

@@ -6,19 +6,15 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-class OutputTest : public PlayerTest {
+class OutputTest : public ListedSongsTest {
  protected:
     OutputTest() {
-        player_.SetPlayList(&list_);
         Change([](EngineSettings& s) { s.FMODCrossoverTime = 0; });
-        for (const QString& song : {u"a.mp3"_s, u"b.mp3"_s, u"c.mp3"_s})
-            list_.Insert(list_.Count(), {.Name = Add(song)});
+        List({u"a.mp3"_s, u"b.mp3"_s, u"c.mp3"_s});
     }
     void LoseOutputOf(const QString& song) {
         Any(song).OnStatusAsked = [] { throw EOutputException(u"weg"_s); };
     }
-
-    TPlayList list_;
 };
 
 TEST_F(OutputTest, WithoutADeviceTheFirstSongWaitsForIt) {
@@ -113,9 +109,21 @@ TEST_F(OutputTest, SongsThatFailWhileAMessageStandsOpenNoOtherOne) {
     Pass(20'000);
     EXPECT_EQ(most, 1);
     QStringList texts;
-    for (const auto& message : dialogs.Messages)
-        texts << message.second.split(u"\r\n\r\n"_s);
+    for (const QString& message : dialogs.Messages)
+        texts << message.split(u"\r\n\r\n"_s);
     EXPECT_EQ(texts, (QStringList{u"kaputt a"_s, u"kaputt b"_s, u"kaputt c"_s}));
+
+    // With the modern rule there is a line for each, and no box.
+    QStringList lines;
+    const Subscription notices =
+        player_.Events().Notice.Subscribe([&](const QString& line) { lines << line; });
+    player_.SetQuietFailures(true);
+    dialogs.Messages.clear();
+    list_.StartNewRound();
+    list_.PlayEntry(1);
+    Pass(20'000);
+    EXPECT_EQ(lines.first(), u"kaputt b"_s);
+    EXPECT_TRUE(dialogs.Messages.empty());
 }
 
 TEST_F(OutputTest, AfterASongThatFailedThePanelShowsIt) {

@@ -252,6 +252,18 @@ class PlayerTest : public testing::Test {
     }
 };
 
+// The same with a playlist.
+class ListedSongsTest : public PlayerTest {
+ protected:
+    ListedSongsTest() { player_.SetPlayList(&list_); }
+    void List(const QStringList& songs) {
+        for (const QString& song : songs)
+            list_.Insert(list_.Count(), {.Name = Add(song)});
+    }
+
+    TPlayList list_;
+};
+
 // Has an engine refuse every song.
 template <typename Exception>
 std::function<void()> Refuse(const QString& message) {

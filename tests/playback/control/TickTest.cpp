@@ -6,18 +6,12 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-// With a playlist of the songs that were added.
-class TickTest : public PlayerTest {
+class TickTest : public ListedSongsTest {
  protected:
     TickTest() {
-        player_.SetPlayList(&list_);
         player_.SetMusicDatabase(&database_);
         player_.OnReachedEndOfSong = [this](TPlaySound&) { ++ends_; };
         player_.OnCrossover = [this](TPlaySound&) { ++crossovers_; };
-    }
-    void List(const QStringList& songs) {
-        for (const QString& song : songs)
-            list_.Insert(list_.Count(), {.Name = Add(song)});
     }
     // Fades nothing.
     void HardChanges() {
@@ -25,7 +19,6 @@ class TickTest : public PlayerTest {
     }
 
     TMusicDatabase database_;
-    TPlayList list_;
     int ends_ = 0;
     int crossovers_ = 0;
 };
@@ -102,16 +95,6 @@ TEST_F(TickTest, AfterTheLastSongTheTimersRest) {
     EXPECT_EQ(Messages(), QStringList{u"Es wurden alle in der PlayList enthaltenen Lieder abgespielt."_s});
 }
 
-TEST_F(TickTest, ErrorWhilePlayingIsToldOnceAndEndsTheSong) {
-    HardChanges();
-    List({u"a.mp3"_s, u"b.mp3"_s});
-    list_.PlayNext();
-    Any(u"a"_s).OnPositionAsked = [] { throw EMCIException(u"weg"_s); };
-    Pass(3000);
-    EXPECT_EQ(Messages(), QStringList{u"weg"_s});
-    EXPECT_EQ(Open(), u"FMOD:b"_s);
-}
-
 TEST_F(TickTest, SongWhoseEngineFailsIsAsGoodAsClosedForThoseWhoAsk) {
     HardChanges();
     List({u"a.cda"_s});
@@ -152,15 +135,6 @@ TEST_F(TickTest, NewLimitCountsFromTheStartOfTheSong) {
     EXPECT_EQ(Open(), u"FMOD:a"_s);
     player_.SetAutoStop(7999);  // within the last second: at once
     EXPECT_EQ(Open(), u"FMOD:b"_s);
-}
-
-TEST_F(TickTest, ASongThatDoesNotPlayIsNotAutoStopped) {
-    player_.SetAutoStop(500);
-    EXPECT_EQ(ends_, 0);
-    player_.SetAutoStop(2000);
-    player_.SetFileName(Add(u"a.mp3"_s));
-    player_.HandleAutoStop();
-    EXPECT_EQ(ends_, 0);
 }
 
 TEST_F(TickTest, SongCountsOnceAfterThirtySeconds) {
@@ -226,17 +200,6 @@ TEST_F(TickTest, WithoutAPlaylistTheCollectionIsPlayedInItsOrder) {
     Pass(3500);
     EXPECT_EQ(Open(), u"FMOD:b"_s);
     EXPECT_EQ(ends_, 2);
-}
-
-TEST_F(TickTest, MarkedSongIsTheOneThatPlays) {
-    SongIndex marked = -1;
-    database_.SetSortType(stPath);
-    database_.OnMarkSong = [&](TMusicDatabase&, SongIndex song) { marked = song; };
-    for (const QString& song : {u"a.wav"_s, u"b.wav"_s})
-        database_.AddSong(Add(song));
-    player_.SetFileName(folder_.Path(u"b.wav"_s));
-    player_.ClickMenuItem(131);
-    EXPECT_EQ(marked, 1);
 }
 
 }  // namespace

@@ -104,7 +104,7 @@ TEST_F(PlayerServiceTest, ASongIsPlayedThereAsIfItWereHere) {
 TEST_F(PlayerServiceTest, EverySettingArrives) {
     EngineSettings settings;
     settings.UseMCI = settings.UseEldoS = settings.UseWinAmp = false;
-    settings.FMODCrossoverTime = 4'000'000'000;
+    settings.FMODCrossoverTime = 40'000;
     settings.FMODSoundOutputTypes = FSOUND_OUTPUT_ALSA;
     settings.FMODMixRate = 48000;
     settings.FMODSoftChannels = 8;
@@ -130,7 +130,7 @@ TEST_F(PlayerServiceTest, EverySettingArrives) {
     stranger.SendText(ecPlay, u"x"_s);    // and this a number
     EXPECT_EQ(stranger.SendCommand(static_cast<ExternalCommand>(99), 1), 0);
     other_.Do([&](PlayerProgram& program) {
-        EXPECT_EQ(program.player.Engines().FMODMixRate, std::numeric_limits<int>::min());
+        EXPECT_EQ(program.player.Engines().FMODMixRate, 22050);
         EXPECT_EQ(program.player.Engines().FMODSoundOutputTypes, FSOUND_OUTPUT_ALSA);
         EXPECT_EQ(program.player.FileName(), controller->FileName());
     });

@@ -1,4 +1,4 @@
-#include "app/desktop/StandardFiles.h"
+#include "CommonRUKTools/StandardFiles.h"
 
 #include <QCoreApplication>
 #include <QDir>

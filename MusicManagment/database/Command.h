@@ -1,0 +1,86 @@
+#pragma once
+
+#include <QStringView>
+#include <span>
+
+class TMusicDatabase;
+
+// Numbers of the commands of the database's menu.
+enum MenuCommand : int {
+    mcNew = 101,
+    mcOpen = 102,
+    mcSave = 103,
+    mcSaveAs = 104,
+    mcUpdate = 111,
+    mcUpdateWithTags = 112,
+    mcAddSongs = 113,
+    mcAddFolder = 114,
+    mcFind = 201,
+    mcFindNext = 202,
+    mcFindOnline = 203,
+    mcMarkAll = 211,
+    mcInvertMarks = 212,
+    mcMarkByFilter = 213,
+    mcRemoveFromDatabase = 221,
+    mcRemoveFromDisk = 222,
+    mcCopyTo = 223,
+    mcBan = 224,
+    mcListArtists = 301,  // 302 to 305: albums, years, lengths, genres
+    mcListGenres = 305,
+    mcRecount = 311,
+    mcPlay = 401,
+    mcAddToPlayList = 402,
+    mcOpenExternally = 403,
+    mcTakeGenre = 404,
+    mcSortSubmenu = 410,
+    mcSortFirst = 411,  // to 423, in the order of TSortType
+    mcSortLast = 423,
+    mcSubSortSubmenu = 430,
+    mcSubSortFirst = 431,  // to 433, in the order of TSubSortType
+    mcSubSortLast = 433,
+    mcReverse = 441,
+    mcFollowFocus = 442,
+    mcFindDuplicates = 501,
+    mcSearchNew = 502,
+    mcReadBackupCd = 503,
+    mcVerifyLengths = 504,
+    mcFindSimilarArtists = 505,
+    mcFindDuplicatesOfArtists = 506,
+    mcPrepareBurning = 507,
+    mcLoadLyrics = 508,
+    mcEnterLength = 509,
+    mcConvert = 510,
+    mcCacheCdSongs = 512,
+    mcDropCaches = 513,
+    mcRenameCds = 514,
+};
+
+// A command of the database: what its menu says of it and what it does. Each belongs to the capability that
+// it starts, which lists it in a source of its own.
+struct DatabaseCommand {
+    enum class Mark { None, Switch, Radio };
+    enum class Needs { Nothing, Writing };
+
+    int Id = 0;
+    QStringView Caption{};
+    QStringView Keys{};  // as "Ctrl+Alt+N"
+    QStringView Icon{};  // its name in the freedesktop icon themes
+    // What the engine does, unless the shell has a handler of its own. None: it takes a window, or is still
+    // to be built. May throw.
+    void (*Run)(TMusicDatabase& database, int id) = nullptr;
+    Needs For = Needs::Nothing;
+    Mark Kind = Mark::None;
+    bool (*IsOn)(const TMusicDatabase& database, int id) = nullptr;  // whether its mark is set
+};
+
+using DatabaseCommands = std::span<const DatabaseCommand>;
+
+// One list a capability.
+extern const DatabaseCommands kFileCommands;
+extern const DatabaseCommands kIntakeCommands;
+extern const DatabaseCommands kFindCommands;
+extern const DatabaseCommands kSongFileCommands;
+extern const DatabaseCommands kOrderCommands;
+extern const DatabaseCommands kOverviewCommands;
+extern const DatabaseCommands kPlayCommands;
+extern const DatabaseCommands kLaterCommands;  // still to be built

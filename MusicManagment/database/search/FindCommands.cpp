@@ -1,0 +1,17 @@
+#include "MusicManagment/database/Command.h"
+
+// All of these are about what a view shows and marks.
+
+namespace {
+
+constexpr DatabaseCommand kRows[] = {
+    {.Id = mcFind, .Caption = u"Suchen...", .Keys = u"Ctrl+F", .Icon = u"edit-find"},
+    {.Id = mcFindNext, .Caption = u"Weitersuchen", .Keys = u"F3"},
+    {.Id = mcMarkAll, .Caption = u"Alles markieren", .Keys = u"Ctrl+A", .Icon = u"edit-select-all"},
+    {.Id = mcInvertMarks, .Caption = u"Markierung umkehren", .Keys = u"Ctrl+Alt+A"},
+    {.Id = mcMarkByFilter, .Caption = u"Mit Filter markieren", .Keys = u"Alt+F"},
+};
+
+}  // namespace
+
+constinit const DatabaseCommands kFindCommands = kRows;

@@ -1,0 +1,52 @@
+#include "app/ShownFollowers.h"
+
+#include <utility>
+
+#include "CommonRUKTools/RWReg.h"
+
+using namespace Qt::StringLiterals;
+
+void ShownFollowers::Begin(std::vector<QString> songs) {
+    End();
+    if (onlyThisSong_) return;
+    songs_ = std::move(songs);
+    waiting_ = next_ = 1;
+    QueueNext();
+}
+
+void ShownFollowers::End() {
+    for (; waiting_ < next_; ++waiting_)
+        list_.Dequeue(list_.IndexOf(songs_[waiting_]));
+    songs_.clear();
+    waiting_ = next_ = 0;
+}
+
+// What has left the queue plays, or was passed over.
+void ShownFollowers::FollowSong() {
+    const QStringList queue = list_.Queue();
+    while (waiting_ < next_ && !queue.contains(songs_[waiting_]))
+        ++waiting_;
+    QueueNext();
+}
+
+// Songs that have left the collection meanwhile are left out.
+void ShownFollowers::QueueNext() {
+    const TMusicDatabase* database = list_.MusicDatabase();
+    for (; next_ < songs_.size() && next_ - waiting_ < kAhead; ++next_) {
+        int entry = list_.IndexOf(songs_[next_]);
+        const SongIndex song = entry < 0 ? database->IndexOf(songs_[next_]) : -1;
+        if (song >= 0) {
+            entry = list_.Count();
+            list_.InsertSong(entry, song);
+        }
+        list_.Enqueue(entry);
+    }
+}
+
+void ShownFollowers::LoadSettings(const TRWReg& settings) {
+    onlyThisSong_ = settings.ReadBool(u"PlayOnlyThisSong"_s).value_or(onlyThisSong_);
+}
+
+void ShownFollowers::SaveSettings(TRWReg& settings) const {
+    settings.WriteBool(u"PlayOnlyThisSong"_s, onlyThisSong_);
+}

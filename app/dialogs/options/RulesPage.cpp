@@ -1,0 +1,86 @@
+#include "app/dialogs/options/RulesPage.h"
+
+#include <QCheckBox>
+#include <QFormLayout>
+#include <QRadioButton>
+#include <algorithm>
+
+#include "MusicManagment/database/commands/DatabaseSettings.h"
+#include "app/desktop/Icons.h"
+
+using namespace Qt::StringLiterals;
+
+RulesPage::RulesPage(const TMusicDatabase&)
+    : OptionsPage(u"Regeln"_s, ThemeIcon(u"view-list-details"_s, QStyle::SP_FileDialogInfoView)),
+      modern_(new QRadioButton(u"&Modern"_s)),
+      classic_(new QRadioButton(u"&Klassisch"_s)),
+      single_(new QRadioButton(u"&Einzeln gewählt"_s)) {
+    AddChoice();
+    QFormLayout& reading = AddGroup(u"Dateien lesen"_s);
+    fields_.Bind(AddRule(reading, DatabaseSettings::kModernTags.Row.Name, u"&Tags nach ihren Standards"_s,
+                         u"Versteht ID3v2.2 bis 2.4 mit allen Zeichensätzen und misst die Länge genauer. "
+                         "Klassisch wird gelesen wie in den früheren Versionen."_s),
+                 DatabaseSettings::kModernTags);
+    fields_.Bind(
+        AddRule(reading, DatabaseSettings::kKeepLostSongs.Row.Name,
+                u"Songs &alter Datenbanken behalten, deren Dateien fehlen"_s,
+                u"Beim Öffnen einer Datenbank der Versionen 1.0 bis 1.2 bleiben auch Songs erhalten, "
+                "deren Datenträger nicht angeschlossen ist. Klassisch gehen sie verloren."_s),
+        DatabaseSettings::kKeepLostSongs);
+    AddText(reading,
+            u"Gilt für Dateien, die von nun an gelesen werden. Songs, die schon in der Datenbank sind, "
+            "liest „Datenbank updaten (Auch ID3-Tags auf Änderungen prüfen)...“ neu."_s);
+}
+
+void RulesPage::AddChoice() {
+    QFormLayout& group = AddGroup(u"Regeln"_s);
+    modern_->setObjectName(u"ModernRules"_s);
+    classic_->setObjectName(u"ClassicRules"_s);
+    single_->setObjectName(u"SingleRules"_s);
+    group.addRow(modern_);
+    AddExplanation(group, u"Für fast alle Sammlungen richtig."_s);
+    group.addRow(classic_);
+    AddExplanation(group,
+                   u"Wie die früheren Versionen, damit eine ältere Sammlung dieselben Angaben behält."_s);
+    group.addRow(single_);
+    connect(modern_, &QRadioButton::clicked, this, [this] { SetAll(true); });
+    connect(classic_, &QRadioButton::clicked, this, [this] { SetAll(false); });
+    connect(single_, &QRadioButton::toggled, this, [this] { EnableRules(); });
+}
+
+QCheckBox* RulesPage::AddRule(QFormLayout& group, QStringView name, const QString& caption,
+                              const QString& explanation) {
+    auto* rule = AddCheck(group, name.toString(), caption, explanation);
+    AddExplanation(group, explanation);
+    rules_.push_back(rule);
+    return rule;
+}
+
+void RulesPage::Load(const TMusicDatabase& database, const TRWReg& settings) {
+    OptionsPage::Load(database, settings);
+    ShowChoice();
+}
+
+void RulesPage::LoadDefaults() {
+    OptionsPage::LoadDefaults();
+    ShowChoice();
+}
+
+void RulesPage::SetAll(bool modern) {
+    for (QCheckBox* rule : rules_)
+        rule->setChecked(modern);
+}
+
+void RulesPage::ShowChoice() {
+    const auto modern = std::ranges::count_if(rules_, &QCheckBox::isChecked);
+    QRadioButton* choice = single_;
+    if (modern == std::ssize(rules_)) choice = modern_;
+    if (modern == 0) choice = classic_;
+    choice->setChecked(true);
+    EnableRules();
+}
+
+void RulesPage::EnableRules() {
+    for (QCheckBox* rule : rules_)
+        rule->setEnabled(single_->isChecked());
+}

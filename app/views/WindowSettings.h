@@ -1,0 +1,22 @@
+#pragma once
+
+#include "CommonRUKTools/SettingsSchema.h"
+#include "MusicManagment/database/SongTypes.h"
+#include "app/views/SpectrumPainter.h"
+
+// What the windows and their views keep in the settings: their values and what these may be.
+namespace WindowSettings {
+
+// A form placement: what Qt makes of the position and size of a window, or of the state of its docks.
+inline constexpr Setting<QByteArray> kMainForm{u"MainForm"};
+inline constexpr Setting<QByteArray> kMainFormState{u"MainFormState"};
+inline constexpr Setting<QByteArray> kSongListColumns{u"SongListColumns"};
+inline constexpr Setting<QString> kLinkPath{u"LinkPath"};
+// Absent counts as true.
+inline constexpr Setting<bool> kFirstTime{u"FirstTime", true};
+
+inline constexpr Setting<int> kOVType{u"OVType", ovArtist, ovArtist, kOverviewTypeCount - 1};
+inline constexpr Setting<int> kVolume{u"Volume", 100, 0, 100};  // per cent
+inline constexpr Setting<int> kSpectrumStyle{u"SpectrumStyle", ssBars, ssBars, ssCircle};
+
+}  // namespace WindowSettings
