@@ -145,8 +145,20 @@ quint32 TPlaySound::GetPosition() {
 
 void TPlaySound::SetPosition(quint32 milliseconds) {
     if (waiting_) waiting_->Position = milliseconds;
-    GuardOutput(true, [&] { Chosen().SetPosition(milliseconds); });
+    GuardOutput(true, [&] {
+        Chosen().SetPosition(milliseconds);
+        NoticeResumed();
+    });
     events_.Seeked.Tell(milliseconds);
+}
+
+// Some engines play on from where they are sent, also when they were paused.
+void TPlaySound::NoticeResumed() {
+    if (playExtern_ || waiting_ || timers_.Ticking() || engines_.Status() != psPlaying) return;
+    StartTimers();
+    events_.Resumed.Tell();
+    Feedback(fbResumed);
+    StateChanged();
 }
 
 quint32 TPlaySound::GetLength() {

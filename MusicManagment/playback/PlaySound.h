@@ -182,6 +182,7 @@ class TPlaySound : public TPlaySoundContainer,
     void ForwardEvents();
     void AnnounceSong();
     void FinishStop();
+    void NoticeResumed();
     void StartTimers();
     void StopTimers();
     void RestartAutoStop();

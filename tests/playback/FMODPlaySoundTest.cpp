@@ -205,28 +205,6 @@ TEST_F(FMODPlaySoundTest, VolumeIsBoundedAndRounded) {
     }
 }
 
-TEST_F(FMODPlaySoundTest, FadesFollowALineInWholePercent) {
-    struct Moment {
-        quint32 after;  // ms
-        int in, out;    // percent
-    };
-    PlaySong("a.mod");
-    sound.SetFadeTime(3000);
-    for (const auto& [after, in, out] : {Moment{0, 0, 100}, Moment{1, 1, 99}, Moment{30, 1, 99},
-                                         Moment{31, 2, 98}, Moment{1500, 50, 50}, Moment{2999, 100, 0}}) {
-        sound.StartFadeIn();
-        clock.Milliseconds += after;
-        EXPECT_FALSE(sound.FadeStep());
-        EXPECT_EQ(noting.volume, (in * 256 + 50) / 100) << after;
-        sound.CancelFades();
-        sound.StartFadeOut();
-        clock.Milliseconds += after;
-        EXPECT_FALSE(sound.FadeStep());
-        EXPECT_EQ(noting.volume, (out * 256 + 50) / 100) << after;
-        sound.CancelFades();
-    }
-}
-
 TEST_F(FMODPlaySoundTest, FadesEndOnTheTickAfterTheirEnd) {
     PlaySong("a.wav");
     noting.volume = -1;

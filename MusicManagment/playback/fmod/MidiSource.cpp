@@ -6,7 +6,6 @@
 #include <algorithm>
 #include <array>
 #include <bitset>
-#include <ranges>
 
 #include "MusicManagment/playback/fmod/MidiFile.h"
 
@@ -183,8 +182,10 @@ std::uint64_t MidiSong::Seek(std::uint64_t frame) {
     std::vector<const MidiEvent*> counting;
     for (std::size_t i = next_; i > 0; --i)
         if (shaping.Counts(song_.events[i - 1])) counting.push_back(&song_.events[i - 1]);
-    for (const MidiEvent* event : std::views::reverse(counting))
-        Tell(*event);
+    while (!counting.empty()) {
+        Tell(*counting.back());
+        counting.pop_back();
+    }
     return frame_;
 }
 

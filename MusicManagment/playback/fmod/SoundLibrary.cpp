@@ -13,8 +13,8 @@ constexpr int kLowestRate = 4000;
 constexpr int kHighestRate = 192000;
 constexpr int kMostChannels = 1024;
 constexpr std::size_t kSmallestBuffer = 64;  // frames
-// ms; each attempt takes some tenths of a second. Below the five seconds in which the player asks, so that it meets
-// one each time.
+// ms; each attempt takes some tenths of a second. Below the five seconds in which the player asks, so that it
+// meets one each time.
 constexpr qint64 kReopenEvery = 4500;
 
 }  // namespace

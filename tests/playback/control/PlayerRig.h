@@ -36,6 +36,7 @@ class ScriptedBackend : public TPlaySoundContainer, public GainBackend {
     TPSStatus Status = psClosed;
     quint32 Length = 180'000;
     float Gain = -1;  // until one is set
+    bool SeekPlays = false;
     std::function<void()> OnPositionAsked;
     std::function<void()> OnStatusAsked;
     std::function<void()> OnOpening;  // what happens while the engine waits
@@ -75,6 +76,7 @@ class ScriptedBackend : public TPlaySoundContainer, public GainBackend {
     void SetPosition(quint32 milliseconds) override {
         passed_ = milliseconds;
         started_ = CurrentClock().Ticks();
+        if (SeekPlays) Status = psPlaying;
     }
     quint32 GetLength() override { return Length; }
     TPSStatus GetStatus() override {

@@ -40,6 +40,19 @@ TEST_F(TickTest, NextSongFollowsAMomentAfterTheEnd) {
     EXPECT_EQ(ends_, 1);
 }
 
+// The system's player goes on from where it is sent.
+TEST_F(TickTest, ASongThatASeekWakesIsFollowedByTheNext) {
+    HardChanges();
+    length_ = 5000;
+    List({u"a.mp3"_s, u"b.mp3"_s});
+    list_.PlayNext();
+    player_.PauseResume();
+    Any(u"a"_s).SeekPlays = true;
+    player_.SetPosition(4500);
+    Pass(1700);
+    EXPECT_EQ(Open(), u"FMOD:b"_s);
+}
+
 TEST_F(TickTest, ShortSongsEndAtOnce) {
     HardChanges();
     length_ = 900;
