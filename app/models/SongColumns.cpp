@@ -23,7 +23,7 @@ constexpr SongColumn kColumns[] = {
     {Id::Format, 25, Qt::AlignLeft},
     {Id::PlayCount, 11, Qt::AlignRight},
     {Id::Comment, 20, Qt::AlignLeft},
-    {Id::AddTime, 17, Qt::AlignLeft},
+    {Id::AddTime, 21, Qt::AlignLeft},
     {Id::Flags, 20, Qt::AlignLeft},
     {Id::Path, 50, Qt::AlignLeft},
 };
