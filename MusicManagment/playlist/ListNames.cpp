@@ -53,8 +53,9 @@ QString LocalPath(const QString& text) {
     if (bytes.contains('\0')) return {};
     const QString path =
         CodePage::FromSystem(AsBytes({bytes.constData(), static_cast<std::size_t>(bytes.size())}));
-    // "/C:/Musik" names a drive where there are drives.
-    return QDir::isAbsolutePath(path.sliced(1)) && !path.startsWith("//"_L1) ? path.sliced(1) : path;
+    // "/C:/Musik" names a drive where there are drives. Qt takes what begins with a colon for absolute, too.
+    const bool namesDrive = path.size() > 1 && path[1] != u'/' && path[1] != u':';
+    return namesDrive && QDir::isAbsolutePath(path.sliced(1)) ? path.sliced(1) : path;
 }
 
 bool ReadsBack(const QString& name) {
