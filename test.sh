@@ -11,6 +11,7 @@ git ls-files '*.h' '*.cpp' | xargs clang-format --dry-run -Werror
 echo "== Build and test"
 cmake --preset release -DTUNESTEAD_TESTS=ON -DTUNESTEAD_BENCH=ON >/dev/null
 cmake --build --preset release
+tools/check_includes.sh build/release
 tools/check_data.sh build/release/bin
 ctest --preset release
 

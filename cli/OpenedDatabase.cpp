@@ -3,7 +3,7 @@
 #include "CommonRUKTools/AbsolutePath.h"
 #include "CommonRUKTools/FileSource.h"
 #include "CommonRUKTools/StandardFiles.h"
-#include "MusicManagment/database/intake/BannList.h"
+#include "MusicManagment/database/BannList.h"
 
 using namespace Qt::StringLiterals;
 

@@ -8,8 +8,8 @@
 #include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/FileSource.h"
 #include "CommonRUKTools/MusicFolder.h"
-#include "MusicManagment/database/intake/BannList.h"
-#include "MusicManagment/database/songfiles/RecycleBin.h"
+#include "MusicManagment/database/BannList.h"
+#include "MusicManagment/database/RecycleBin.h"
 
 using namespace Qt::StringLiterals;
 

@@ -148,7 +148,6 @@ class TPlaySound : public TPlaySoundContainer,
     void UseRules(Rules rules) override;
     void LoadSettings(const TRWReg& settings) override;
     void SaveSettings(TRWReg& settings) const override;
-    void UseRules(Rules rules) override;
 
     // --- Events. The members called On... are told first, all others are listeners. ---
     PlayerEvents& Events() { return events_; }

@@ -6,10 +6,6 @@
 
 using namespace PlayerSettings;
 
-void TPlaySound::UseRules(Rules rules) {
-    SetRulesOf(*this, kRules, rules);
-}
-
 void TPlaySound::LoadSettings(const TRWReg& settings) {
     EngineSettings engines = settings_;
     LoadSettingsOf(engines, kEngines, settings);

@@ -3,7 +3,7 @@
 #include <QFileInfo>
 
 #include "CommonRUKTools/Errors.h"
-#include "MusicManagment/database/intake/BannList.h"
+#include "MusicManagment/database/BannList.h"
 
 using namespace Qt::StringLiterals;
 

@@ -3,7 +3,7 @@
 #include <algorithm>
 
 #include "CommonRUKTools/Errors.h"
-#include "MusicManagment/database/songfiles/RecycleBin.h"
+#include "MusicManagment/database/RecycleBin.h"
 
 using namespace Qt::StringLiterals;
 

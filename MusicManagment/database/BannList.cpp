@@ -1,4 +1,4 @@
-#include "MusicManagment/database/intake/BannList.h"
+#include "MusicManagment/database/BannList.h"
 
 #include <algorithm>
 #include <string_view>

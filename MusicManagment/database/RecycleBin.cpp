@@ -1,4 +1,4 @@
-#include "MusicManagment/database/songfiles/RecycleBin.h"
+#include "MusicManagment/database/RecycleBin.h"
 
 #include <QDir>
 #include <QFileInfo>
