@@ -4,8 +4,8 @@
 #include <functional>
 
 #include "CommonRUKTools/Listeners.h"
-#include "app/desktop/BannListFile.h"
 #include "CommonRUKTools/StandardFiles.h"
+#include "app/desktop/BannListFile.h"
 
 class TMusicDatabase;
 struct IntakeResult;

@@ -11,13 +11,13 @@
 
 #include "CommonRUKTools/Errors.h"
 #include "MusicManagment/database/CollectionEvents.h"
+#include "MusicManagment/database/ConversionSettings.h"
 #include "MusicManagment/database/DatabaseLock.h"
 #include "MusicManagment/database/GroupLists.h"
 #include "MusicManagment/database/Operation.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/SongList.h"
 #include "MusicManagment/database/SongTypes.h"
-#include "MusicManagment/database/commands/ConversionSettings.h"
 #include "MusicManagment/database/sorting/Sorting.h"
 #include "ReadMPEGHeader/AudioFile.h"
 
@@ -205,8 +205,8 @@ class TMusicDatabase : public QObject {
     // component, switched on by the programs.
     bool KeepLostSongs() const { return keepLostSongs_; }
     void SetKeepLostSongs(bool value) { keepLostSongs_ = value; }
-    // Whether a song that comes in without a main genre gets the one that its tag's genre belongs to; off in a
-    // new component, switched on by the programs.
+    // Whether a song that comes in without a main genre gets the one that its tag's genre belongs to; off in
+    // a new component, switched on by the programs.
     bool DerivedGenres() const { return derivedGenres_; }
     void SetDerivedGenres(bool value) { derivedGenres_ = value; }
 

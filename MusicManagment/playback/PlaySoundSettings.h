@@ -6,7 +6,7 @@
 #include "CommonRUKTools/SettingsSchema.h"
 #include "MusicManagment/playback/ExternalPlayer.h"
 #include "MusicManagment/playback/PlayerPanel.h"
-#include "MusicManagment/playback/fmod/FmodLibrary.h"
+#include "MusicManagment/playback/backend/SoundOutputTypes.h"
 
 // The settings of the player: which there are and what they may be.
 namespace PlayerSettings {

@@ -21,7 +21,4 @@ inline constexpr Setting<int> kVolume{u"Volume", 100, 0, 100};  // per cent
 inline constexpr Setting<bool> kPlayOnlyThisSong{u"PlayOnlyThisSong"};
 inline constexpr Setting<int> kSpectrumStyle{u"SpectrumStyle", ssBars, ssBars, ssCircle};
 
-// A double click plays this song and not what follows it in the shown list.
-inline constexpr Setting<bool> kPlayOnlyThisSong{u"PlayOnlyThisSong"};
-
 }  // namespace WindowSettings

@@ -27,9 +27,9 @@ class EWinAmpException : public ERukException {
     using ERukException::ERukException;
 };
 
-// The way to the loudspeaker failed: no device, or the sound server has gone. Nothing is said of the song, and
-// no other engine would do better. Not derived from the engines' own classes, so that nobody takes it for a
-// failure of theirs.
+// The way to the loudspeaker failed: no device, or the sound server has gone. Nothing is said of the song,
+// and no other engine would do better. Not derived from the engines' own classes, so that nobody takes it for
+// a failure of theirs.
 class EOutputException : public ERukException {
  public:
     using ERukException::ERukException;

@@ -3,19 +3,8 @@
 #include <QString>
 #include <cstdint>
 
+#include "MusicManagment/playback/backend/SoundOutputTypes.h"
 #include "MusicManagment/playback/fmod/FMODErrors.h"
-
-// Ways to the loudspeaker. The numbers stand in the settings.
-enum TFSoundOutputTypes : int {
-    FSOUND_OUTPUT_NOSOUND,
-    FSOUND_OUTPUT_WINMM,
-    FSOUND_OUTPUT_DSOUND,
-    FSOUND_OUTPUT_A3D,
-    FSOUND_OUTPUT_OSS,
-    FSOUND_OUTPUT_ESD,
-    FSOUND_OUTPUT_ALSA,
-    FSOUND_OUTPUT_XBOX,
-};
 
 // Tells a stream or a song of the library; never used again for another one, 0 = none. The library answers a
 // handle that it does not know with FMOD_ERR_INVALID_PARAM.
