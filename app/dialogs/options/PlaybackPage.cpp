@@ -95,9 +95,6 @@ void PlaybackPage::AddPlayList() {
                  u"Kopiert jeden Song vorher in den Ordner für temporäre Dateien, etwa von einer CD."_s);
     fields_.Bind(copy, PlayListSettings::kCopyMp3sBeforePlay.Row);
     AddTime(list, PlayListSettings::kScanTime.Row, u"Spielzeit beim Ans&pielen"_s);
-    auto* onlyThis = AddCheck(list, u"PlayOnlyThisSong"_s, u"Doppelklick spielt &nur diesen Song"_s,
-                              u"Sonst folgt, was in der gezeigten Liste unter ihm steht."_s);
-    fields_.Bind(onlyThis, WindowSettings::kPlayOnlyThisSong);
 }
 
 void PlaybackPage::AddEngines() {
