@@ -71,7 +71,7 @@ class Classic : public ReadingProfile {
         return std::nullopt;
     }
 
-    VbrFinder VbrHeaderFinder() const override { return FindVbrHeaderClassic; }
+    const MpegRules& FrameRules() const override { return kClassicMpegRules; }
     AsfLength WmaLength() const override { return AsfLength::AsStored; }
 };
 

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <array>
 
+#include "ReadMPEGHeader/Genres.h"
+
 using namespace Qt::StringLiterals;
 
 namespace {
@@ -103,6 +105,11 @@ QString FormatHeaderFlags(const TID3Tag& tag) {
 QString FormatChannelCount(int count) {
     const QString known = TextOf(kChannelCounts, count);
     return known.isNull() ? QString::number(count) + u" Kanäle"_s : known;
+}
+
+QString GenreDisplayText(const TID3Tag& tag) {
+    const bool isUnknown = MainGenreGenre(tag.MainGenre) == kNoGenre;
+    return isUnknown && tag.Genre != kNoGenre ? GenreName(tag.Genre) : MainGenreLongName(tag.MainGenre);
 }
 
 bool IsValidYearText(const QString& text) {

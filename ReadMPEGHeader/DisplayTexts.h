@@ -17,6 +17,9 @@ QString FormatHeaderFlags(const TID3Tag& tag);
 // For containers that count channels (WAV, WMA).
 QString FormatChannelCount(int count);
 
+// The genre as people know it: the long name of the main genre; where that is unknown the tag's genre.
+QString GenreDisplayText(const TID3Tag& tag);
+
 // Exactly four characters, each a digit or a capital letter A to Z.
 bool IsValidYearText(const QString& text);
 // The year that a text means: two digits below 21 are in this century, 21 to 98 in the last; 0 when no

@@ -1,27 +1,10 @@
 #include "ReadMPEGHeader/ID3Tag.h"
 
-#include <QFileInfo>
-#include <array>
+#include "ReadMPEGHeader/SongFileKinds.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
-
-struct FileType {
-    QStringView Extension;
-    QStringView Description;
-};
-
-constexpr std::array<FileType, 8> kFileTypes = {{
-    {u".wav", u"Wave"},
-    {u".wma", u"Windows Media Audio"},
-    {u".voc", u"VOC Soundfile"},
-    {u".avi", u"Video (AVI)"},
-    {u".mpg", u"Video (MPG)"},
-    {u".mpeg", u"Video (MPG)"},
-    {u".mid", u"Midi Soundfile"},
-    {u".mod", u"MOD Soundfile"},
-}};
 
 void CopyTags(TID3Tag& target, const TID3Tag& source) {
     if (target.FileName.isEmpty()) target.FileName = source.FileName;
@@ -70,9 +53,6 @@ void MergeTag(TID3Tag& target, const TID3Tag& source, MergeMode mode) {
 }
 
 void DescribeByExtension(const QString& path, TID3Tag& tag) {
-    const qsizetype dot = path.lastIndexOf(u'.');
-    if (dot < 0) return;
-    const QString extension = path.mid(dot).toLower();
-    for (const auto& type : kFileTypes)
-        if (extension == type.Extension) tag.MPEGLayer = type.Description.toString();
+    const SongFileKind* kind = KindOfSongFile(path);
+    if (kind != nullptr && !kind->Description.isEmpty()) tag.MPEGLayer = kind->Description.toString();
 }

@@ -47,7 +47,7 @@ std::int64_t ReadLeadingTags(ByteSource& stream, const LeadingTagReader& readTag
 
 bool HoldsVbrHeader(ByteSpan frame) {
     if (frame.size() < kVbrHeaderSpan) return false;
-    const auto header = MpegHeader::Decode({frame[0], frame[1], frame[2], frame[3]});
+    const auto header = MpegHeader::DecodeModern({frame[0], frame[1], frame[2], frame[3]});
     return FindVbrHeaderModern(frame, header).has_value();
 }
 
@@ -114,7 +114,7 @@ class Modern : public ReadingProfile {
         return FindConfirmedFrame(stream, ReadLeadingTags(stream, readTag));
     }
 
-    VbrFinder VbrHeaderFinder() const override { return FindVbrHeaderModern; }
+    const MpegRules& FrameRules() const override { return kModernMpegRules; }
     AsfLength WmaLength() const override { return AsfLength::LessPreroll; }
 };
 

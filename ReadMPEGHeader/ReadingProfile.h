@@ -5,10 +5,10 @@
 #include <optional>
 
 #include "CommonRUKTools/FileSource.h"
-#include "ReadMPEGHeader/AudioFile.h"
+#include "ReadMPEGHeader/SongReading.h"
 #include "ReadMPEGHeader/asf/Asf.h"
 #include "ReadMPEGHeader/id3v2/ID3v2Reader.h"
-#include "ReadMPEGHeader/mpeg/VbrHeader.h"
+#include "ReadMPEGHeader/mpeg/MpegFrame.h"
 
 // At most so many bytes of a file's head are searched for sound.
 inline constexpr std::int64_t kSearchBytes = 256 * 1024;
@@ -29,7 +29,7 @@ class ReadingProfile {
     // at most one.
     virtual std::optional<std::int64_t> FindFirstFrame(ByteSource& stream,
                                                        const LeadingTagReader& readTag) const = 0;
-    virtual VbrFinder VbrHeaderFinder() const = 0;
+    virtual const MpegRules& FrameRules() const = 0;
     // Which length of a WMA file is shown.
     virtual AsfLength WmaLength() const = 0;
 };

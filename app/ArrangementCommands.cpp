@@ -55,6 +55,7 @@ Arrangement ArrangementCommands::Current() const {
 }
 
 bool ArrangementCommands::Apply(const Arrangement& arrangement) {
-    return window_.restoreState(arrangement.Docks) && window_.restoreGeometry(arrangement.Placement) &&
+    // The size first: the docks' are parts of it.
+    return window_.restoreGeometry(arrangement.Placement) && window_.restoreState(arrangement.Docks) &&
            list_.RestoreColumns(arrangement.Columns);
 }

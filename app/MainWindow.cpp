@@ -203,12 +203,14 @@ void TTunesteadMainWnd::StoreSettings() {
 
 void TTunesteadMainWnd::SetUpPlacement() {
     const TRWReg settings(kSettingsKey.toString(), options_.SettingsFile);
+    if (!restoreGeometry(ReadSetting(settings, WindowSettings::kMainForm).value_or(QByteArray()))) {
+        constexpr int kWidth = 190;  // average characters
+        constexpr int kHeight = 42;  // lines
+        const QSize wanted(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
+        resize(wanted.boundedTo(screen()->availableSize() * 0.9));
+    }
+    // After the window's size: the docks' are parts of it.
     restoreState(ReadSetting(settings, WindowSettings::kMainFormState).value_or(QByteArray()));
-    if (restoreGeometry(ReadSetting(settings, WindowSettings::kMainForm).value_or(QByteArray()))) return;
-    constexpr int kWidth = 190;  // average characters
-    constexpr int kHeight = 42;  // lines
-    const QSize wanted(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
-    resize(wanted.boundedTo(screen()->availableSize() * 0.9));
 }
 
 // --- Starting ---

@@ -16,6 +16,7 @@
 #include "app/desktop/RaiseWindow.h"
 #include "app/models/CollectionTotals.h"
 #include "app/views/DSPDraw.h"
+#include "app/views/DockAction.h"
 #include "app/views/PlayerForm.h"
 #include "app/views/PlaylistForm.h"
 #include "app/views/SongListWidget.h"
@@ -46,11 +47,10 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
       playerForm_(new TPlayerForm(player_, list_, &window)),
       spectrumForm_(new TSpectrumForm(&window)),
       contextMenu_(new QMenu(listForm_)) {
-    player_.SetKeepAlbums(true);
-    player_.SetQuietFailures(true);
+    player_.UseRules(Rules::Modern);
     // Before the settings, which may ask for it.
     if (options.MakeExternalPlayer) player_.SetExternalPlayer(options.MakeExternalPlayer());
-    list_.SetModernLists(true);
+    list_.UseRules(Rules::Modern);
     list_.SetStandardFileName(standardList_);
     list_.SetMusicDatabase(&database);
     player_.SetMusicDatabase(&database);
@@ -127,11 +127,6 @@ void Playing::JoinDesktop(QMainWindow& window) {
                      .SetVolume = [this](double volume) { playerForm_->Panel().Volume().SetPart(volume); }});
     mpris_->Register(QDBusConnection::sessionBus());
     awake_ = std::make_unique<StayAwake>(QDBusConnection::sessionBus());
-    const auto update = [this] { mpris_->Update(); };
-    const QAbstractItemModel* list = listForm_->View().model();
-    QObject::connect(list, &QAbstractItemModel::modelReset, mpris_.get(), update);
-    QObject::connect(list, &QAbstractItemModel::rowsInserted, mpris_.get(), update);
-    QObject::connect(list, &QAbstractItemModel::rowsRemoved, mpris_.get(), update);
 }
 
 void Playing::FollowPlayer() {
@@ -178,9 +173,9 @@ void Playing::SetUpContextMenu() {
 }
 
 void Playing::AddTo(QMenu& menu) {
-    menu.addAction(listForm_->toggleViewAction());
-    menu.addAction(playerForm_->toggleViewAction());
-    menu.addAction(spectrumForm_->toggleViewAction());
+    AddDockAction(menu, *listForm_);
+    AddDockAction(menu, *playerForm_);
+    AddDockAction(menu, *spectrumForm_);
 }
 
 void Playing::RunPlayListCommand(int id) {

@@ -2,9 +2,7 @@
 
 #include <utility>
 
-#include "CommonRUKTools/RWReg.h"
-
-using namespace Qt::StringLiterals;
+#include "app/views/WindowSettings.h"
 
 void ShownFollowers::Begin(std::vector<QString> songs) {
     End();
@@ -44,9 +42,9 @@ void ShownFollowers::QueueNext() {
 }
 
 void ShownFollowers::LoadSettings(const TRWReg& settings) {
-    onlyThisSong_ = settings.ReadBool(u"PlayOnlyThisSong"_s).value_or(onlyThisSong_);
+    onlyThisSong_ = ReadSetting(settings, WindowSettings::kPlayOnlyThisSong).value_or(onlyThisSong_);
 }
 
 void ShownFollowers::SaveSettings(TRWReg& settings) const {
-    settings.WriteBool(u"PlayOnlyThisSong"_s, onlyThisSong_);
+    WriteSetting(settings, WindowSettings::kPlayOnlyThisSong, onlyThisSong_);
 }

@@ -83,7 +83,7 @@ bool Startup::ReadStandardDatabase() {
 
 void Startup::OpenStandardLists() {
     RunCommand([this] { commands_.BannList().Load(); });
-    if (OpenStandardPlayList) RunCommand(OpenStandardPlayList);
+    RunCommand(OpenStandardPlayList);
 }
 
 bool Startup::Uninstall() {
@@ -104,7 +104,7 @@ void Startup::OpenFiles(const QStringList& arguments) {
         const FileKind kind = KindOfFile(path);
         if (!file.exists()) {
             RunCommand([&] { throw EMusicDatabaseException(u"Datei nicht gefunden: "_s + path); });
-        } else if (OpenSong && !songOpened && kind == FileKind::Song && !file.isDir()) {
+        } else if (!songOpened && kind == FileKind::Song && !file.isDir()) {
             RunCommand([&] { OpenSong(path); });
             songOpened = true;
         } else if (file.isDir() || IsSongFile(path)) {
@@ -123,10 +123,9 @@ void Startup::OpenFile(FileKind kind, const QString& path) {
         RunCommand([&] { opener(path); });
     };
     if (kind == FileKind::Database) return OfferDatabase(path);
-    if (kind == FileKind::PlayList && OpenPlayList) return open(OpenPlayList);
-    if (kind == FileKind::Arrangement && OpenArrangement) return open(OpenArrangement);
-    Warn(kind == FileKind::PlayList ? u"PlayLists können noch nicht geöffnet werden: "_s + path
-                                    : u"Unbekannter Dateityp: "_s + FileExtension(path));
+    if (kind == FileKind::PlayList) return open(OpenPlayList);
+    if (kind == FileKind::Arrangement) return open(OpenArrangement);
+    Warn(u"Unbekannter Dateityp: "_s + FileExtension(path));
 }
 
 void Startup::OfferDatabase(const QString& path) {

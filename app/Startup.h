@@ -16,11 +16,12 @@ class Startup {
     Startup(TMusicDatabase& database, CollectionCommands& commands, InstallationSteps& installation)
         : database_(database), commands_(commands), installation_(installation) {}
 
+    // All of these are to be set before the start.
     // Opens the playlist of the last run.
     std::function<void()> OpenStandardPlayList;
-    // Makes it the playlist's file. Unset, the user is told that playlists cannot be opened.
+    // Makes it the playlist's file.
     std::function<void(const QString& path)> OpenPlayList;
-    // Makes it the player's current file. Unset, a song is taken into the collection instead.
+    // Makes it the player's current file.
     std::function<void(const QString& path)> OpenSong;
     // Puts the windows where a desktop file says.
     std::function<void(const QString& path)> OpenArrangement;

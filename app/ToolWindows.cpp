@@ -5,13 +5,15 @@
 
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/commands/Menu.h"
+#include "app/views/DockAction.h"
 #include "app/views/MusicOverview.h"
 #include "app/views/OverviewForm.h"
 #include "app/views/PropertyForm.h"
 #include "app/views/TagForm.h"
 
 ToolWindows::ToolWindows(QMainWindow& window, TMusicDatabase& database)
-    : overview_(new TOverviewForm(database, &window)),
+    : database_(database),
+      overview_(new TOverviewForm(database, &window)),
       properties_(new TPropertyForm(database, &window)),
       tag_(new TID3TagForm(&window)) {
     window.addDockWidget(Qt::LeftDockWidgetArea, overview_);
@@ -26,6 +28,19 @@ ToolWindows::ToolWindows(QMainWindow& window, TMusicDatabase& database)
     };
     overview_->Overview().OnTypeChanged = [&database](TOVType) { database.Commands().Changed.Tell(); };
     HandleCommands(database);
+    FollowSong();
+}
+
+void ToolWindows::FollowSong() {
+    CollectionEvents& events = database_.Events();
+    subscriptions_ += events.Changed.Subscribe([this](SongIndex index, const TID3Tag&, const TID3Tag& song) {
+        if (index == database_.Songs().PositionOf(song_)) Show(&song);
+    });
+    const auto forget = [this] {
+        if (database_.Songs().Find(song_) == nullptr) Show(nullptr);
+    };
+    subscriptions_ += events.Replaced.Subscribe(forget);
+    subscriptions_ += events.Cleared.Subscribe(forget);
 }
 
 void ToolWindows::HandleCommands(TMusicDatabase& database) {
@@ -42,6 +57,11 @@ void ToolWindows::HandleCommands(TMusicDatabase& database) {
 }
 
 void ToolWindows::ShowSong(const TID3Tag* song) {
+    song_ = song != nullptr ? database_.Songs().HandleOf(*song) : SongHandle();
+    Show(song);
+}
+
+void ToolWindows::Show(const TID3Tag* song) {
     properties_->ShowSong(song);
     tag_->ShowSong(song);
 }
@@ -49,5 +69,5 @@ void ToolWindows::ShowSong(const TID3Tag* song) {
 void ToolWindows::AddTo(QMenu& menu) {
     for (QDockWidget* window : {static_cast<QDockWidget*>(overview_), static_cast<QDockWidget*>(properties_),
                                 static_cast<QDockWidget*>(tag_)})
-        menu.addAction(window->toggleViewAction());
+        AddDockAction(menu, *window);
 }

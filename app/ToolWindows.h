@@ -3,8 +3,7 @@
 #include <functional>
 
 #include "CommonRUKTools/Listeners.h"
-#include "MusicManagment/database/SongTypes.h"
-#include "ReadMPEGHeader/ID3Tag.h"
+#include "MusicManagment/database/SongList.h"
 #include "app/models/GroupSelection.h"
 
 class QMainWindow;
@@ -24,16 +23,22 @@ class ToolWindows {
     // Told when other groups are chosen in the overview.
     std::function<void(const GroupSelection&)> OnSelectionChanged;
 
-    // Shows a song in the windows that are about one; nullptr for none.
+    // Shows a song of the database in the windows that are about one, which follow its changes; nullptr for
+    // none.
     void ShowSong(const TID3Tag* song);
     // Adds the items that show and hide the windows.
     void AddTo(QMenu& menu);
 
  private:
     void HandleCommands(TMusicDatabase& database);
+    void FollowSong();
+    void Show(const TID3Tag* song);
 
+    TMusicDatabase& database_;
     TOverviewForm* overview_;
     TPropertyForm* properties_;
     TID3TagForm* tag_;
+    SongHandle song_;
     Subscriptions handlers_;
+    Subscriptions subscriptions_;
 };

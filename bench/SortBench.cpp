@@ -33,7 +33,7 @@ Entries MakeEntries() {
     Entries entries;
     entries.reserve(kSongs);
     for (std::size_t i = 0; i < kSongs; ++i)
-        entries.push_back(std::make_unique<TID3Tag>(Songs()[i]));
+        entries.push_back(std::make_unique<SongEntry>(Songs()[i]));
     return entries;
 }
 

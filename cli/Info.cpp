@@ -1,8 +1,7 @@
 #include <optional>
 #include <vector>
 
-#include "ReadMPEGHeader/AudioFile.h"
-#include "ReadMPEGHeader/mpeg/MpegResults.h"
+#include "ReadMPEGHeader/SongReading.h"
 #include "cli/CommandLine.h"
 #include "cli/Commands.h"
 #include "cli/InfoSheet.h"
@@ -16,14 +15,10 @@ FileInfo ReadInfo(const QString& path, ReadProfile profile) {
     FileInfo info;
     ReadOptions options;
     options.Profile = profile;
+    options.DeriveMainGenre = profile == ReadProfile::Modern;
     options.OnFrame = [&info](const FrameReport& frame) { info.Frames.push_back(frame); };
-    try {
-        info.Error = ReadAudioFile(path, options, info.Tag);
-    } catch (const EStreamError& error) {
-        info.Error = error.Message();
-    }
-    if (info.Tag.FileName.isEmpty()) info.Tag.FileName = path;
-    info.Mpeg = LastMpegResults();
+    info.Reading = ReadSong(path, options);
+    if (info.Reading.Tag.FileName.isEmpty()) info.Reading.Tag.FileName = path;
     return info;
 }
 
@@ -41,10 +36,10 @@ void WriteFrames(JsonLine& line, const std::vector<FrameReport>& frames) {
 
 QByteArrayView InfoLine(const FileInfo& info, bool withFrames, JsonLine& line) {
     line.Begin();
-    WriteSongFields(line, info.Tag);
-    info.Error.isEmpty() ? line.Null("error") : line.Text("error", info.Error);
-    line.Text("vbr", info.Mpeg.VbrName);
-    line.Number("frameCount", info.Mpeg.FrameCount);
+    WriteSongFields(line, info.Reading.Tag);
+    info.Reading.Succeeded() ? line.Null("error") : line.Text("error", info.Reading.Failure());
+    line.Text("vbr", info.Reading.Mpeg.VbrName);
+    line.Number("frameCount", info.Reading.Mpeg.FrameCount);
     if (withFrames) WriteFrames(line, info.Frames);
     return line.End();
 }
@@ -61,8 +56,8 @@ int RunInfo(const Arguments& arguments, Console& console) {
             console.Write(InfoLine(info, withFrames, line));
         else
             console.Write(InfoSheet(info, withFrames).toUtf8());
-        if (info.Error.isEmpty()) continue;
-        console.Message(path + u": "_s + info.Error);
+        if (info.Reading.Succeeded()) continue;
+        console.Message(path + u": "_s + info.Reading.Failure());
         status = esFailed;
     }
     return status;

@@ -36,19 +36,19 @@ void AddTags(QString& sheet, const TID3Tag& tag) {
     AddText(sheet, u"Kommentar"_s, tag.Comment);
 }
 
-void AddTechnicalData(QString& sheet, const FileInfo& info) {
-    const TID3Tag& tag = info.Tag;
+void AddTechnicalData(QString& sheet, const SongReading& reading) {
+    const TID3Tag& tag = reading.Tag;
     AddRow(sheet, u"Länge"_s, FormatLength(tag.Length, true));
     AddRow(sheet, u"Format"_s, tag.MPEGLayer);
     AddRow(sheet, u"Bitrate"_s,
            FormatBitRate(tag.BitRate) +
-               (info.Mpeg.VbrName.isEmpty() ? QString() : u" (VBR, "_s + info.Mpeg.VbrName + u')'));
+               (reading.Mpeg.VbrName.isEmpty() ? QString() : u" (VBR, "_s + reading.Mpeg.VbrName + u')'));
     AddRow(sheet, u"Abtastrate"_s, FormatSampleRate(tag.SampleRate));
     AddRow(sheet, u"Kanäle"_s, FormatChannelMode(tag.ChannelMode));
     AddRow(sheet, u"Emphasis"_s, FormatEmphasis(tag.Emphasis));
     AddText(sheet, u"Kennzeichen"_s, FormatHeaderFlags(tag));
     AddNumber(sheet, u"Framegröße"_s, tag.FrameSize);
-    AddNumber(sheet, u"Frames"_s, info.Mpeg.FrameCount);
+    AddNumber(sheet, u"Frames"_s, reading.Mpeg.FrameCount);
 }
 
 void AddCollectionData(QString& sheet, const TID3Tag& tag) {
@@ -66,11 +66,12 @@ void AddFrames(QString& sheet, const std::vector<FrameReport>& frames) {
 }  // namespace
 
 QString InfoSheet(const FileInfo& info, bool withFrames) {
-    QString sheet = Printable(info.Tag.FileName) + u'\n';
-    AddTags(sheet, info.Tag);
-    AddTechnicalData(sheet, info);
-    AddCollectionData(sheet, info.Tag);
-    AddText(sheet, u"Fehler"_s, info.Error);
+    const SongReading& reading = info.Reading;
+    QString sheet = Printable(reading.Tag.FileName) + u'\n';
+    AddTags(sheet, reading.Tag);
+    AddTechnicalData(sheet, reading);
+    AddCollectionData(sheet, reading.Tag);
+    AddText(sheet, u"Fehler"_s, reading.Failure());
     if (withFrames) AddFrames(sheet, info.Frames);
     return sheet + u'\n';
 }

@@ -3,16 +3,12 @@
 #include <QString>
 #include <vector>
 
-#include "ReadMPEGHeader/ID3Tag.h"
-#include "ReadMPEGHeader/id3v2/FrameListener.h"
-#include "ReadMPEGHeader/mpeg/MpegResults.h"
+#include "ReadMPEGHeader/SongReading.h"
 
 // What is known of one file.
 struct FileInfo {
-    TID3Tag Tag;
-    MpegResults Mpeg;
-    std::vector<FrameReport> Frames;
-    QString Error;  // empty: the file was read
+    SongReading Reading;
+    std::vector<FrameReport> Frames;  // of its ID3v2 tag
 };
 
 // A sheet for people, with an empty line at its end.

@@ -100,7 +100,9 @@ constexpr OptionRow kOptions[] = {
     {u"--mode", u"ART",
      u"wann überblendet wird: none, auto (am Ende eines Songs; Vorgabe),\n"
      u"all (auch bei n und p) oder always"},
-    {u"--classic", u"", u"blendet auch zwischen aufeinander folgenden Songs eines Albums über"},
+    {u"--classic", u"",
+     u"liest PlayLists nach den ursprünglichen Regeln und blendet auch zwischen\n"
+     u"aufeinander folgenden Songs eines Albums über"},
     {u"--engine", u"ENGINE", u"nur diese: fmod, eldos, mci oder winamp (Vorgabe: fmod, ersatzweise mci)"},
     {u"--output", u"AUSGABE",
      u"null, file:DATEI.wav oder ein Treiber wie pulseaudio, pipewire\n"

@@ -131,14 +131,15 @@ class Session {
         player_.SetPanel(&panel_);
         player_.SetPlayList(&list_);
         player_.SetEngines(options.Engines);
-        player_.SetKeepAlbums(!options.Classic);
+        const Rules rules = options.Classic ? Rules::Classic : Rules::Modern;
+        player_.UseRules(rules);
         // The end of the list needs no message here.
         list_.OnAllFilesPlayed = [](TPlayList&, bool&) {};
         player_.OnPlayingStarted = [this](TPlaySound&) {
             begun_ << list_.CurrentSong();
             heard_ = true;
         };
-        list_.SetModernLists(!options.Classic);
+        list_.UseRules(rules);
         list_.SetPlayOrder(options.Order);
         list_.SetRepeatAll(options.Repeat);
         if (options.ScanTime) list_.SetScanTime(*options.ScanTime);

@@ -19,7 +19,7 @@ struct PlaySessionOptions {
     TCrossover Mode = coAutoChange;
     EngineSettings Engines{};
     std::optional<OutputChoice> Output{};  // otherwise as the environment says
-    bool Classic = false;                  // neighbours on an album are faded as any others
+    bool Classic = false;                  // playlists and albums by the rules of the first versions
     bool Fast = false;                     // as fast as the output takes it; it must be one that waits for it
 };
 

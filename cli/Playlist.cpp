@@ -35,7 +35,7 @@ int RunPlaylist(const Arguments& arguments, Console& console) {
     if (arguments.Has(u"--out") && arguments.Has(u"--json"))
         throw EUsageError(u"--out und --json schließen sich aus."_s);
     TPlayList list;
-    list.SetModernLists(!arguments.Has(u"--classic"));
+    list.UseRules(arguments.Has(u"--classic") ? Rules::Classic : Rules::Modern);
     list.SetPlayListFileName(arguments.Operands().first());
     if (arguments.Has(u"--out"))
         list.Save(arguments.Value(u"--out"));

@@ -4,7 +4,7 @@
 #include <cstdlib>
 
 #include "CommonRUKTools/FileSource.h"
-#include "ReadMPEGHeader/AudioFile.h"
+#include "ReadMPEGHeader/SongReading.h"
 
 using namespace Qt::StringLiterals;
 
@@ -29,9 +29,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     if (size == 0) return 0;
     const ByteSpan input(data, size);
     MemorySource source(input.subspan(1));
-    TID3Tag tag;
-    ReadAudioStream(source, u"/music/Artist - Title.mp3"_s, OptionsFrom(input[0]), tag);
+    const SongReading reading = ReadSong(source, u"/music/Artist - Title.mp3"_s, OptionsFrom(input[0]));
     // The name at least gives these to whatever is no WMA file.
-    if (tag.FileName.isEmpty() || tag.MPEGLayer.isNull()) std::abort();
+    if (!reading.Succeeded() || reading.Tag.FileName.isEmpty() || reading.Tag.MPEGLayer.isNull())
+        std::abort();
     return 0;
 }

@@ -23,6 +23,8 @@ class ScriptedDialogs : public Dialogs {
     std::vector<MessageKind> MessageKinds;
     QStringList Questions;
     std::vector<Question> Asked;  // the same with their buttons
+    std::vector<Report> Reports;
+    std::function<void()> OnReport;
     QStringList Prompts;
     std::vector<FileDialogOptions> FileDialogs;
     QStringList FolderCaptions;
@@ -36,6 +38,10 @@ class ScriptedDialogs : public Dialogs {
         Questions << question.Text;
         Asked.push_back(question);
         return Next(Answers).value_or(question.Cancel);
+    }
+    void ShowReport(const Report& report) override {
+        Reports.push_back(report);
+        if (OnReport) OnReport();
     }
     std::optional<QString> Input(const QString&, const QString& prompt, const QStringList&,
                                  const QString&) override {

@@ -318,6 +318,7 @@ void TMusicDatabase::SetCDNames(std::vector<CdName> names) {
 ReadOptions TMusicDatabase::AudioReadOptions() const {
     ReadOptions options;
     options.Profile = modernTags_ ? ReadProfile::Modern : ReadProfile::Classic;
+    options.DeriveMainGenre = derivedGenres_;
     // A song in a genre folder is not by an artist of that name.
     for (const QString& name : mp3MoveSubDirs_)
         options.ExcludedArtistFolders << name.toUpper();

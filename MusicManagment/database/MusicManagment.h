@@ -205,6 +205,10 @@ class TMusicDatabase : public QObject {
     // component, switched on by the programs.
     bool KeepLostSongs() const { return keepLostSongs_; }
     void SetKeepLostSongs(bool value) { keepLostSongs_ = value; }
+    // Whether a song that comes in without a main genre gets the one that its tag's genre belongs to; off in a
+    // new component, switched on by the programs.
+    bool DerivedGenres() const { return derivedGenres_; }
+    void SetDerivedGenres(bool value) { derivedGenres_ = value; }
 
     // Linked components; each reference clears itself when the other goes.
     QObject* PlayList() const { return playList_; }
@@ -339,6 +343,7 @@ class TMusicDatabase : public QObject {
     bool modernTags_ = false;
     bool keepLostSongs_ = false;
     DatabaseLock fileLock_{*this};
+    bool derivedGenres_ = false;
 
     QPointer<QObject> playList_;
     QPointer<QObject> playSound_;

@@ -19,12 +19,6 @@ QString YearText(Song song) {
     return onlyZeros ? QString() : song.Year;
 }
 
-// Few tags know the program's own groups; the tag's genre says more than that the group is unknown.
-QString MainGenreText(Song song) {
-    const bool onlyTag = song.MainGenre == 0 && song.Genre != kNoGenre;
-    return onlyTag ? GenreName(song.Genre) : MainGenreLongName(song.MainGenre);
-}
-
 QString GenreText(Song song) {
     if (song.Genre == kNoGenre && !song.Remix) return {};
     return GenreName(song.Genre) + (song.Remix ? u" (Remix)"_s : QString());
@@ -120,7 +114,7 @@ constexpr SongField kFields[] = {
      .Caption = u"Hauptgenre",
      .ShortCaption = u"Genre",
      .Group = Group::Collection,
-     .Text = &MainGenreText,
+     .Text = &GenreDisplayText,
      .Sort = stGenre,
      .FilterNames = u"genre",
      .Editable = true,

@@ -126,6 +126,7 @@ class TPlaySound : public TPlaySoundContainer,
     void SetController(PlayController* controller) { controller_ = controller; }
     // The way to a separate player program; nullptr: there is none.
     void SetExternalPlayer(std::unique_ptr<ExternalPlayer> player);
+    bool TellQuietly(const QString& text) override;
     void RedrawPanel() override;
 
     // --- Handlers of the timers (PlaySoundTick.cpp, PlaySoundOutput.cpp); they throw what playing throws ---
@@ -144,8 +145,10 @@ class TPlaySound : public TPlaySoundContainer,
     bool ClickMenuItem(int id);
 
     // --- Settings ---
+    void UseRules(Rules rules) override;
     void LoadSettings(const TRWReg& settings) override;
     void SaveSettings(TRWReg& settings) const override;
+    void UseRules(Rules rules) override;
 
     // --- Events. The members called On... are told first, all others are listeners. ---
     PlayerEvents& Events() { return events_; }

@@ -44,8 +44,7 @@ void TPlaySound::RunGuarded(const std::function<void()>& action, const std::func
 // A message box lets timers run, and songs fail on: what they say waits until the user has closed the first
 // box.
 void TPlaySound::TellFailure(const QString& text) {
-    events_.Notice.Tell(text);
-    if (quietFailures_) return;
+    if (TellQuietly(text)) return;
     if (!untold_.contains(text)) untold_ << text;  // a list that is repeated fails for ever
     if (telling_) return;
     const QScopedValueRollback<bool> telling(telling_, true);
@@ -58,10 +57,14 @@ void TPlaySound::TellFailure(const QString& text) {
     }
 }
 
+bool TPlaySound::TellQuietly(const QString& text) {
+    if (quietFailures_) events_.Notice.Tell(text);
+    return quietFailures_;
+}
+
 // An engine has refused a song, and another one is tried.
 void TPlaySound::TellRefusal(const QString& text) {
-    events_.Notice.Tell(text);
-    if (!quietFailures_) TellWhileOpening(MessageKind::Warning, text);
+    if (!TellQuietly(text)) TellWhileOpening(MessageKind::Warning, text);
 }
 
 // Whoever opens or closes a song while the message stands has the last word.

@@ -6,6 +6,10 @@
 
 using namespace PlayerSettings;
 
+void TPlaySound::UseRules(Rules rules) {
+    SetRulesOf(*this, kRules, rules);
+}
+
 void TPlaySound::LoadSettings(const TRWReg& settings) {
     EngineSettings engines = settings_;
     LoadSettingsOf(engines, kEngines, settings);
@@ -19,6 +23,10 @@ void TPlaySound::SaveSettings(TRWReg& settings) const {
     SaveSettingsOf(settings_, kEngines, settings);
     SaveSettingsOf(*this, kOwn, settings);
     if (panel_ != nullptr) WriteSetting(settings, kCrossover, panel_->Crossover());
+}
+
+void TPlaySound::UseRules(Rules rules) {
+    SetRulesOf(*this, kRules, rules);
 }
 
 // --- What a player program is told ---

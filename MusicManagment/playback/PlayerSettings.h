@@ -14,6 +14,13 @@ inline constexpr PropertySetting kPlayExtern{Setting<bool>{u"PSPlayExtern"}, &TP
 inline constexpr PropertySetting kTimerInterval{Setting<int>{u"PSTimerInterval", 250, 1, 10'000},  // ms
                                                 &TPlaySound::TimerInterval, &TPlaySound::SetTimerInterval};
 
-inline constexpr std::tuple kOwn{kAutoPlay, kPlayExtern, kTimerInterval};
+// Rules; false is the classic one.
+inline constexpr PropertySetting kKeepAlbums{Setting<bool>{u"KeepAlbums", false, true},
+                                             &TPlaySound::KeepAlbums, &TPlaySound::SetKeepAlbums};
+inline constexpr PropertySetting kQuietFailures{Setting<bool>{u"QuietFailures", false, true},
+                                                &TPlaySound::QuietFailures, &TPlaySound::SetQuietFailures};
+
+inline constexpr std::tuple kRules{kKeepAlbums, kQuietFailures};
+inline constexpr auto kOwn = std::tuple_cat(std::tuple{kAutoPlay, kPlayExtern, kTimerInterval}, kRules);
 
 }  // namespace PlayerSettings

@@ -23,11 +23,14 @@ bool IsLineEnd(std::uint8_t byte) {
     return byte == '\r' || byte == '\n';
 }
 
-// Behind the magic comes a version word; in a text that begins with these letters there are others.
-bool IsNative(ByteSpan file) {
-    constexpr std::size_t kMagicSize = 9;
+constexpr std::size_t kMagicSize = 9;
+
+// Behind the magic comes a version word; in a text that begins with the same letters others follow. A file
+// that is named so is no text, whatever version it claims.
+bool IsNative(ByteSpan file, PlayListFormat named) {
     if (!StartsWith(file, "RUKPLYLST")) return false;
-    return file.size() == kMagicSize || (file[kMagicSize] < 0x20 && !IsLineEnd(file[kMagicSize]));
+    if (named == PlayListFormat::Native || file.size() == kMagicSize) return true;
+    return file[kMagicSize] < 0x20 && !IsLineEnd(file[kMagicSize]);
 }
 
 QString FirstLine(ByteSpan text) {
@@ -45,11 +48,10 @@ PlayListFormat FormatOf(const QString& fileName) {
 // By its contents where they tell, and else by its name: M3U lists need no head, and all that they share with
 // plain ones are the names.
 RecognizedList Recognize(ByteSpan file, const QString& fileName) {
-    constexpr std::size_t kMagicSize = 9;
-    if (IsNative(file)) return {PlayListFormat::Native, file.subspan(kMagicSize)};
+    const PlayListFormat named = FormatOf(fileName);
+    if (IsNative(file, named)) return {PlayListFormat::Native, file.subspan(kMagicSize)};
     const ByteSpan text = StartsWith(file, "\xEF\xBB\xBF") ? file.subspan(3) : file;
     const QString line = FirstLine(text);
-    const PlayListFormat named = FormatOf(fileName);
     const bool isNamedM3u = named == PlayListFormat::M3u || named == PlayListFormat::M3u8;
     if (line.startsWith("[playlist]"_L1, Qt::CaseInsensitive)) return {PlayListFormat::Pls, text};
     if (isNamedM3u || line.startsWith("#EXT"_L1, Qt::CaseInsensitive)) return {PlayListFormat::M3u, text};

@@ -236,5 +236,6 @@ void TPlayList::TellReasons(bool found) {
     if (reasons.size() > kMostReasons) parts << u"und %1 weitere"_s.arg(reasons.size() - kMostReasons);
     // Without a round that ends there is no other word on it.
     if (!found && repeatAll_) parts.prepend(u"Keines der Lieder in der PlayList konnte abgespielt werden."_s);
-    if (!parts.isEmpty()) UserDialogs().ShowMessage(MessageKind::Error, parts.join(u"\r\n\r\n"_s));
+    const QString text = parts.join(u"\r\n\r\n"_s);
+    if (!text.isEmpty() && !player_->TellQuietly(text)) UserDialogs().ShowMessage(MessageKind::Error, text);
 }

@@ -121,14 +121,11 @@ std::optional<TID3Tag> TPlayList::FindRecord(const QString& name, SongIndex data
     ReadOptions options;
     options.Profile = ReadProfile::Modern;
     if (database_) options = database_->AudioReadOptions();
-    TID3Tag record;
-    try {
-        if (!ReadAudioFile(path, options, record).isEmpty()) return std::nullopt;
-    } catch (const EStreamError&) {
-        return std::nullopt;  // a list shows what it can; playing the file will say what is wrong with it
-    }
-    record.FileName = name;
-    return record;
+    SongReading reading = ReadSong(path, options);
+    // A list shows what it can; playing the file will say what is wrong with it.
+    if (!reading.Succeeded()) return std::nullopt;
+    reading.Tag.FileName = name;
+    return std::move(reading.Tag);
 }
 
 QString TPlayList::ResolvedPath(const QString& name, const ResolveOptions& options) const {

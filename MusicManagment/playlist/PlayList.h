@@ -172,6 +172,7 @@ class TPlayList : public QObject, public SettingsClient {
     // --- Settings ---
     void LoadSettings(const TRWReg& settings) override;
     void SaveSettings(TRWReg& settings) const override;
+    void UseRules(Rules rules) override;
 
     // --- Events ---
     // Everything that happens to the list, for any number of listeners.

@@ -7,3 +7,7 @@ void TPlayList::LoadSettings(const TRWReg& settings) {
 void TPlayList::SaveSettings(TRWReg& settings) const {
     SaveSettingsOf(*this, PlayListSettings::kAll, settings);
 }
+
+void TPlayList::UseRules(Rules rules) {
+    SetRulesOf(*this, PlayListSettings::kRules, rules);
+}

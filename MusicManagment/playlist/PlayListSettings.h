@@ -18,7 +18,14 @@ inline constexpr PropertySetting kRepeatAll{Setting<bool>{u"RepeatAll"}, &TPlayL
 inline constexpr PropertySetting kCopyMp3sBeforePlay{
     Setting<bool>{u"CopyMp3sBeforePlay"}, &TPlayList::CopyMp3sBeforePlay, &TPlayList::SetCopyMp3sBeforePlay};
 
+// Pairs of rules, classic when false and modern when true (Rules.h).
+inline constexpr PropertySetting kModernLists{Setting<bool>{u"ModernLists", false, true},
+                                              &TPlayList::ModernLists, &TPlayList::SetModernLists};
+
+inline constexpr std::tuple kRules{kModernLists};
+
 // The time before the switch: the player is then told once.
-inline constexpr std::tuple kAll{kPlayOrder, kScanTime, kScan, kRepeatAll, kCopyMp3sBeforePlay};
+inline constexpr std::tuple kOwn{kPlayOrder, kScanTime, kScan, kRepeatAll, kCopyMp3sBeforePlay};
+inline constexpr auto kAll = std::tuple_cat(kOwn, kRules);
 
 }  // namespace PlayListSettings

@@ -16,6 +16,8 @@ class SongPlayer {
     virtual void Play() = 0;
     // Fades from the current file to this one. False when that is not possible now.
     virtual bool PlayWithCrossFade(const QString& path) = 0;
+    // Tells in one line, where the player does that, why songs were passed over. False: tell it in a message.
+    virtual bool TellQuietly(const QString&) { return false; }
     // The song that is shown has changed.
     virtual void RedrawPanel() = 0;
 };

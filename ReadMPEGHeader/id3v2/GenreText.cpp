@@ -1,5 +1,6 @@
 #include "ReadMPEGHeader/id3v2/GenreText.h"
 
+#include "ReadMPEGHeader/DerivedGenre.h"
 #include "ReadMPEGHeader/Genres.h"
 
 using namespace Qt::StringLiterals;
@@ -33,9 +34,11 @@ class GenreSearch {
         }
         TakeReference(value);
         if (!known_) known_ = GenreByName(value);
+        if (named_ == 0) named_ = MainGenreNamed(value);
+        if (meant_ == 0) meant_ = MainGenreOfText(value);
     }
 
-    GenreText Result() const { return {known_ ? known_ : unknown_, remix_}; }
+    GenreText Result() const { return {known_ ? known_ : unknown_, remix_, MainGenre()}; }
 
  private:
     void TakeReference(QStringView reference) {
@@ -46,9 +49,17 @@ class GenreSearch {
         if (!place) place = number;
     }
 
+    quint8 MainGenre() const {
+        if (named_ != 0) return named_;
+        const quint8 numbered = known_ ? MainGenreOfGenre(*known_) : quint8{0};
+        return numbered != 0 ? numbered : meant_;
+    }
+
     std::optional<quint8> known_;
     std::optional<quint8> unknown_;  // a number without a name is better than none
     bool remix_ = false;
+    quint8 named_ = 0;  // main genre whose name the text is
+    quint8 meant_ = 0;  // main genre to which the text belongs
 };
 
 GenreText ParseClassic(const QString& text) {

@@ -65,7 +65,7 @@ ID3v2Frames::Effect ID3v2Frames::EffectOf(std::string_view id) {
 }
 
 bool ID3v2Frames::NeedsBody(std::string_view id) const {
-    return listener_ || EffectOf(id) != nullptr;
+    return listener_ || FillsRecord(id);
 }
 
 void ID3v2Frames::Take(std::string_view id, const QString& shownId, ByteSpan body) {
@@ -125,6 +125,7 @@ void ID3v2Frames::TakeGenre(FrameBody& body) {
     const GenreText genre = ParseGenre(rules_, body.Values());
     if (genre.Genre) tag_.Genre = *genre.Genre;
     if (genre.Remix) tag_.Remix = true;
+    tag_.MainGenre = genre.MainGenre;
 }
 
 void ID3v2Frames::TakeComment(FrameBody& body) {

@@ -34,6 +34,8 @@ class ID3v2Frames : public ID3v2FrameSink {
         Finish();
     }
 
+    // False for a frame that is the listener's alone.
+    static bool FillsRecord(std::string_view id) { return EffectOf(id) != nullptr; }
     // False for a frame whose body changes nothing, so that it need not be read.
     bool NeedsBody(std::string_view id) const override;
     void Take(std::string_view id, const QString& shownId, ByteSpan body) override;

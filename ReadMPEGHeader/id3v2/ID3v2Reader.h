@@ -12,8 +12,8 @@
 // this program's own reading of it: frames follow the 10-byte header directly, sizes are plain 32-bit numbers
 // in every version, any encoding but 0 is UTF-16 little-endian). `endPosition` becomes the first byte after
 // the tag, also when a frame reaches beyond the file. `xruk`, when given, receives the program's private
-// frame. Returns true when a tag was read. Throws EStreamError when the tag ends beyond the file; `tag` then
-// holds the frames read so far.
+// frame. Returns true when a tag was read. Throws EStreamError when something that the record needs, or
+// padding, ends beyond the file; `tag` then holds the frames read so far.
 bool ReadID3v2(ByteSource& stream, std::int64_t position, std::int64_t& endPosition, TID3Tag& tag,
                const FrameListener& listener, std::optional<XrukFrame>* xruk = nullptr);
 

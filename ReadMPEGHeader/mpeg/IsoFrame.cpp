@@ -4,7 +4,7 @@
 
 namespace {
 
-using BitRateRow = std::array<std::size_t, 15>;
+using BitRateRow = std::array<int, 15>;
 
 // kbit/s by index, 0 free format.
 constexpr std::array<BitRateRow, 3> kMpeg1 = {{
@@ -28,13 +28,19 @@ std::size_t SampleRate(const IsoFrame& frame) {
     return kSampleRates[frame.SampleRateIndex] / divisor;
 }
 
-std::size_t FrameSize(const IsoFrame& frame, std::size_t bitRate, std::size_t padding) {
-    if (bitRate == 0) return 0;
-    const std::size_t bits = bitRate * 1000;
-    if (frame.Layer == 1) return (12 * bits / SampleRate(frame) + padding) * 4;
-    // Samples of a frame, in bytes: only Layer III has shorter frames at low sample rates.
-    const std::size_t coefficient = frame.Layer == 3 && frame.Version != kMpeg1Code ? 72 : 144;
-    return coefficient * bits / SampleRate(frame) + padding;
+// Only Layer III has shorter frames at low sample rates.
+int CoefficientOf(const IsoFrame& frame) {
+    if (frame.Layer == 1) return 48;
+    return frame.Layer == 3 && frame.Version != kMpeg1Code ? 72 : 144;
+}
+
+std::size_t FrameSize(const IsoFrame& frame, std::size_t padding) {
+    if (frame.BitRate == 0) return 0;
+    // Layer I counts in slots of four bytes.
+    const std::size_t slot = frame.Layer == 1 ? 4 : 1;
+    const auto bits = static_cast<std::size_t>(frame.BitRate) * 1000;
+    const auto slots = static_cast<std::size_t>(frame.Coefficient) / slot * bits / SampleRate(frame);
+    return (slots + padding) * slot;
 }
 
 }  // namespace
@@ -46,8 +52,10 @@ std::optional<IsoFrame> IsoFrame::Parse(ByteSpan bytes) {
     const unsigned bitRateIndex = bytes[2] >> 4;
     const unsigned sampleRateIndex = (bytes[2] >> 2) & 3u;
     if (version == 1 || layerCode == 0 || bitRateIndex == 15 || sampleRateIndex == 3) return std::nullopt;
-    IsoFrame frame{version, 4 - layerCode, sampleRateIndex, 0};
     const auto& rows = version == kMpeg1Code ? kMpeg1 : kLowSampleRates;
-    frame.Size = FrameSize(frame, rows[frame.Layer - 1][bitRateIndex], (bytes[2] >> 1) & 1u);
+    IsoFrame frame{.Version = version, .Layer = 4 - layerCode, .SampleRateIndex = sampleRateIndex};
+    frame.BitRate = rows[frame.Layer - 1][bitRateIndex];
+    frame.Coefficient = CoefficientOf(frame);
+    frame.Size = FrameSize(frame, (bytes[2] >> 1) & 1u);
     return frame;
 }

@@ -11,7 +11,9 @@ struct IsoFrame {
     unsigned Version = 0;  // as coded: 0 MPEG 2.5, 2 MPEG 2, 3 MPEG 1
     unsigned Layer = 0;    // 1 to 3
     unsigned SampleRateIndex = 0;
-    std::size_t Size = 0;  // bytes with header; 0 in free format, where the header does not tell it
+    int BitRate = 0;       // kbit/s; 0 in free format, where the header does not tell it
+    int Coefficient = 0;   // samples of a frame divided by 8
+    std::size_t Size = 0;  // bytes with header; 0 in free format
 
     // Nothing when the bytes begin with no sync or with a code that the standards reserve.
     static std::optional<IsoFrame> Parse(ByteSpan bytes);

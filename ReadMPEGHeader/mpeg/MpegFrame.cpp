@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "ReadMPEGHeader/FieldValues.h"
+#include "ReadMPEGHeader/mpeg/IsoFrame.h"
 
 using namespace Qt::StringLiterals;
 
@@ -61,6 +62,11 @@ int TableSampleRate(MpegVersion version, unsigned index) {
     return version == MpegVersion::Reserved ? 0 : kSampleRates[VersionRow(version)][index];
 }
 
+int TableCoefficient(MpegVersion version, int layer) {
+    if (version == MpegVersion::Mpeg1) return layer == 1 ? 48 : 144;
+    return layer == 1 ? 24 : 72;
+}
+
 struct Estimate {
     std::int64_t FrameSize = 0;  // bytes
     std::int64_t FrameCount = 0;
@@ -79,23 +85,23 @@ Estimate ConstantBitRate(const MpegHeader& header, std::int64_t audioBytes) {
 }
 
 std::int64_t LengthOfFrames(const MpegHeader& header, std::int64_t frames) {
-    return header.Coefficient() * frames * 8 / header.SampleRate;
+    return header.Coefficient * frames * 8 / header.SampleRate;
 }
 
 void ApplyVariableBitRate(const MpegHeader& header, std::int64_t frames, std::int64_t bytes,
                           Estimate& estimate) {
-    const std::int64_t coefficient = header.Coefficient();
+    const std::int64_t coefficient = header.Coefficient;
     estimate.FrameCount = frames;
     estimate.FrameSize = (bytes + frames / 2) / frames + header.PaddingBytes();
     estimate.Length = LengthOfFrames(header, frames);
     estimate.BitRate = estimate.FrameSize * header.SampleRate / coefficient / 1000;
 }
 
-// A constant stream: the header counts its frames, and its size gives the bit rate where the program's table
-// differs from the standard. The frame with the header is not counted but is part of the bytes.
+// A constant stream: the header counts its frames, and its size gives the bit rate. The frame with the header
+// is not counted but is part of the bytes.
 void ApplyExactConstantBitRate(const MpegHeader& header, std::int64_t frames, std::int64_t bytes,
                                Estimate& estimate) {
-    const std::int64_t coefficient = header.Coefficient() * 1000;
+    const std::int64_t coefficient = header.Coefficient * 1000;
     const std::int64_t divisor = coefficient * (frames + 1);
     estimate.FrameCount = frames;
     estimate.Length = LengthOfFrames(header, frames);
@@ -106,7 +112,7 @@ void ApplyExactConstantBitRate(const MpegHeader& header, std::int64_t frames, st
 void ApplyVbrHeader(const MpegHeader& header, const VbrHeader& vbr, std::int64_t audioBytes,
                     Estimate& estimate) {
     const std::int64_t bytes = vbr.StreamBytes ? std::int64_t{*vbr.StreamBytes} : audioBytes;
-    if (vbr.FrameCount == 0 || bytes == 0) return;
+    if (vbr.FrameCount == 0) return;
     if (vbr.Type == VbrHeader::Kind::Info)
         ApplyExactConstantBitRate(header, vbr.FrameCount, bytes, estimate);
     else
@@ -139,11 +145,6 @@ void StoreHeader(const MpegHeader& header, TID3Tag& tag) {
 
 }  // namespace
 
-int MpegHeader::Coefficient() const {
-    if (Version == MpegVersion::Mpeg1) return Layer == 1 ? 48 : 144;
-    return Layer == 1 ? 24 : 72;
-}
-
 int MpegHeader::PaddingBytes() const {
     if (!Padding) return 0;
     return Layer == 1 ? 4 : 1;
@@ -151,7 +152,7 @@ int MpegHeader::PaddingBytes() const {
 
 int MpegHeader::FrameSize() const {
     if (SampleRate == 0) return 0;
-    return Coefficient() * BitRate * 1000 / SampleRate + PaddingBytes();
+    return Coefficient * BitRate * 1000 / SampleRate + PaddingBytes();
 }
 
 const QString& MpegHeader::FormatText() const {
@@ -169,7 +170,7 @@ const QString& MpegHeader::FormatText() const {
     return texts[row][static_cast<std::size_t>(Layer)];
 }
 
-MpegHeader MpegHeader::Decode(std::array<std::uint8_t, 4> bytes) {
+MpegHeader MpegHeader::DecodeClassic(std::array<std::uint8_t, 4> bytes) {
     MpegHeader header;
     const unsigned sampleRateIndex = (bytes[2] >> 2) & 3u;
     header.Version = kVersions[(bytes[1] >> 3) & 3u];
@@ -189,14 +190,24 @@ MpegHeader MpegHeader::Decode(std::array<std::uint8_t, 4> bytes) {
         header.Layer = 1;
         header.SampleRate = 24000;
     }
+    header.Coefficient = TableCoefficient(header.Version, header.Layer);
     return header;
 }
 
-MpegResults AnalyseMpegFrame(ByteSource& stream, std::int64_t position, VbrFinder findVbrHeader,
+MpegHeader MpegHeader::DecodeModern(std::array<std::uint8_t, 4> bytes) {
+    MpegHeader header = DecodeClassic(bytes);
+    const auto frame = IsoFrame::Parse(bytes);
+    if (!frame || header.Version == MpegVersion::Mpeg1) return header;
+    header.BitRate = frame->BitRate;
+    header.Coefficient = frame->Coefficient;
+    return header;
+}
+
+MpegResults AnalyseMpegFrame(ByteSource& stream, std::int64_t position, const MpegRules& rules,
                              TID3Tag& tag) {
     std::array<std::uint8_t, kVbrHeaderSpan> frame{};
     const auto held = stream.ReadAt(position, frame);
-    const auto header = MpegHeader::Decode({frame[0], frame[1], frame[2], frame[3]});
+    const auto header = rules.DecodeHeader({frame[0], frame[1], frame[2], frame[3]});
     const std::int64_t left = stream.Size() - position;
     // A file that ends within the bytes set aside holds no whole frame: nothing is counted.
     const std::int64_t audioBytes = std::max<std::int64_t>(0, left - kBytesBehindAudio);
@@ -205,7 +216,7 @@ MpegResults AnalyseMpegFrame(ByteSource& stream, std::int64_t position, VbrFinde
     MpegResults results;
     results.VbrMarker = 0;
     if (estimate.FrameSize > 0 && left > kLeastBytesForVbr) {
-        if (const auto vbr = findVbrHeader(ByteSpan(frame).first(held), header)) {
+        if (const auto vbr = rules.FindVbrHeader(ByteSpan(frame).first(held), header)) {
             if (vbr->Type != VbrHeader::Kind::Info) results.VbrMarker = vbr->Marker;
             results.VbrName = VbrName(vbr->Type);
             ApplyVbrHeader(header, *vbr, audioBytes, estimate);

@@ -10,9 +10,7 @@
 #include "ReadMPEGHeader/mpeg/MpegResults.h"
 #include "ReadMPEGHeader/mpeg/VbrHeader.h"
 
-// Audio frames of MPEG 1, 2 and 2.5 (ISO 11172-3, ISO 13818-3). The tables of bit rates and sample rates are
-// this program's own and differ from the standards on purpose: collections hold values that were read with
-// them.
+// Audio frames of MPEG 1, 2 and 2.5 (ISO 11172-3, ISO 13818-3).
 
 enum class MpegVersion { Reserved = 0, Mpeg1 = 10, Mpeg2 = 20, Mpeg25 = 25 };
 
@@ -30,9 +28,10 @@ struct MpegHeader {
     quint8 ChannelMode = 0;  // as in TID3Tag
     quint8 Emphasis = 0;     // as in TID3Tag
 
-    bool IsMono() const { return ChannelMode == 1; }
     // Samples of one frame divided by 8: bytes of a frame = coefficient * bit rate / sample rate.
-    int Coefficient() const;
+    int Coefficient = 0;
+
+    bool IsMono() const { return ChannelMode == 1; }
     // Bytes that the padding bit adds.
     int PaddingBytes() const;
     // Bytes of a frame at this header's bit rate, 0 when the sample rate is unknown.
@@ -40,8 +39,22 @@ struct MpegHeader {
     // "MPEG 1.0 Layer III"
     const QString& FormatText() const;
 
-    static MpegHeader Decode(std::array<std::uint8_t, 4> bytes);
+    // The tables of bit rates, sample rates and coefficients are this program's own and differ from the
+    // standards on purpose: collections hold values that were read with them.
+    static MpegHeader DecodeClassic(std::array<std::uint8_t, 4> bytes);
+    // The same with the standard's bit rates and frame lengths for MPEG 2 and 2.5. A header that the standard
+    // does not know is read as above.
+    static MpegHeader DecodeModern(std::array<std::uint8_t, 4> bytes);
 };
+
+// How a frame is understood.
+struct MpegRules {
+    MpegHeader (*DecodeHeader)(std::array<std::uint8_t, 4> bytes);
+    VbrFinder FindVbrHeader;
+};
+
+inline constexpr MpegRules kClassicMpegRules{MpegHeader::DecodeClassic, FindVbrHeaderClassic};
+inline constexpr MpegRules kModernMpegRules{MpegHeader::DecodeModern, FindVbrHeaderModern};
 
 constexpr bool IsFrameSync(std::uint8_t first, std::uint8_t second) {
     return first == 0xFF && (second & 0xE0) == 0xE0;
@@ -50,5 +63,4 @@ constexpr bool IsFrameSync(std::uint8_t first, std::uint8_t second) {
 // Analyses the frame at `position`: fills the technical fields of `tag` and returns what is kept beside the
 // record. Values that do not fit a field of the record are saturated. Damaged contents give zeros; throws
 // only when the medium fails.
-MpegResults AnalyseMpegFrame(ByteSource& stream, std::int64_t position, VbrFinder findVbrHeader,
-                             TID3Tag& tag);
+MpegResults AnalyseMpegFrame(ByteSource& stream, std::int64_t position, const MpegRules& rules, TID3Tag& tag);

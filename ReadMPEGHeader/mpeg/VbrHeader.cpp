@@ -82,6 +82,8 @@ std::optional<VbrHeader> FindVbrHeaderClassic(ByteSpan frame, const MpegHeader& 
 std::optional<VbrHeader> FindVbrHeaderModern(ByteSpan frame, const MpegHeader& header) {
     if (!MayHoldVbrHeader(frame)) return std::nullopt;
     const auto tag = frame.subspan(XingOffsetModern(header));
-    if (StartsWith(tag, "Xing") || StartsWith(tag, "Info")) return ParseXingModern(tag);
-    return ParseVbri(frame);
+    const bool isXing = StartsWith(tag, "Xing") || StartsWith(tag, "Info");
+    std::optional<VbrHeader> found = isXing ? ParseXingModern(tag) : ParseVbri(frame);
+    if (found && found->StreamBytes == 0u) found->StreamBytes.reset();
+    return found;
 }

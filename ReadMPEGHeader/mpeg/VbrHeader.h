@@ -16,7 +16,7 @@ struct VbrHeader {
     };
     Kind Type = Kind::Xing;
     quint32 FrameCount = 0;              // 0 when the header does not tell
-    std::optional<quint32> StreamBytes;  // nothing when the header has no such field
+    std::optional<quint32> StreamBytes;  // nothing: as many as the file holds
     quint8 Marker = 0;                   // the byte that is kept in MpegResults
 };
 
@@ -30,5 +30,5 @@ using VbrFinder = std::optional<VbrHeader> (*)(ByteSpan frame, const MpegHeader&
 std::optional<VbrHeader> FindVbrHeaderClassic(ByteSpan frame, const MpegHeader& header);
 
 // "Xing", "Info" and "VBRI" as encoders write them: behind the side information of each version, with only
-// the fields that the flags announce.
+// the fields that the flags announce; a size of 0 tells nothing.
 std::optional<VbrHeader> FindVbrHeaderModern(ByteSpan frame, const MpegHeader& header);

@@ -3,6 +3,8 @@
 #include <QFileInfo>
 #include <algorithm>
 
+#include "ReadMPEGHeader/SongFileKinds.h"
+
 namespace {
 
 // data/tunestead-mime.xml says the same to the desktop.
@@ -10,7 +12,7 @@ constexpr FileType kOwnTypes[] = {
     {u"application/x-tunestead-playlist", u"RUK PlayList", {u".rukpl", u".rpl"}, FileKind::PlayList},
     {u"application/x-tunestead-extended-playlist",
      u"Erweiterte PlayList",
-     {u".extpl", u".m3u"},
+     {u".extpl", u".m3u", u".m3u8"},
      FileKind::PlayList},
     {u"application/x-tunestead-ascii-playlist",
      u"PlayList (ASCII-Format)",
@@ -22,9 +24,6 @@ constexpr FileType kOwnTypes[] = {
      FileKind::PlayList},
     {u"application/x-tunestead-database", u"Tunestead Datenbank", {u".tsdb", {}}, FileKind::Database},
     {u"application/x-tunestead-desktop", u"Tunestead Desktop", {u".df", {}}, FileKind::Arrangement}};
-
-// What the player takes; the collection takes in fewer (Intake.h).
-constexpr QStringView kSongExtensions[] = {u".mp3", u".mp2", u".mpg", u".mpeg", u".wav", u".wma"};
 
 bool Holds(std::span<const QStringView> extensions, const QString& extension) {
     return !extension.isEmpty() && std::ranges::count(extensions, QStringView(extension)) > 0;
@@ -44,7 +43,8 @@ QString FileExtension(const QString& path) {
 
 FileKind KindOfFile(const QString& path) {
     const QString extension = FileExtension(path).toLower();
-    if (Holds(kSongExtensions, extension)) return FileKind::Song;
+    const SongFileKind* song = KindOfSongFile(path);
+    if (song != nullptr && song->IsOpened) return FileKind::Song;
     const auto type = std::ranges::find_if(
         kOwnTypes, [&](const FileType& candidate) { return Holds(candidate.Extensions, extension); });
     return type == std::end(kOwnTypes) ? FileKind::Unknown : type->Kind;

@@ -10,7 +10,7 @@ enum class FileKind { Unknown, PlayList, Song, Database, Arrangement };
 struct FileType {
     QStringView MimeType;
     QStringView Description;
-    QStringView Extensions[2];  // with the dot, lower case; the second may be empty
+    QStringView Extensions[3];  // with the dot, lower case; those behind the first may be empty
     FileKind Kind;
 };
 

@@ -46,7 +46,14 @@ Mpris::Mpris(TPlaySound& player, TPlayList& list, Hooks hooks)
     updateTimer_.setInterval(0);
     connect(&updateTimer_, &QTimer::timeout, this, [this] { RunCommand([this] { TellChanges(); }); });
     PlayerEvents& events = player_.Events();
-    subscriptions_ += events.Changed.Subscribe([this] { Update(); });
+    PlayListEvents& listEvents = list_.Events();
+    const auto update = [this] { Update(); };
+    subscriptions_ += events.Changed.Subscribe(update);
+    for (Listeners<int>* changed : {&listEvents.Inserted, &listEvents.Removed})
+        subscriptions_ += changed->Subscribe([this](int) { Update(); });
+    for (Listeners<>* changed :
+         {&listEvents.Cleared, &listEvents.Loaded, &listEvents.CurrentChanged, &listEvents.OptionsChanged})
+        subscriptions_ += changed->Subscribe(update);
     subscriptions_ += events.Seeked.Subscribe([this](quint32 position) { TellSeeked(position); });
 }
 

@@ -35,7 +35,7 @@ class Mpris : public QDBusVirtualObject {
     // The name that was taken; empty for none.
     const QString& ServiceName() const { return serviceName_; }
 
-    // Something that the bus shows has changed that neither player nor list tell, as the volume. Told to the
+    // Something that the bus shows has changed that neither player nor list tell: the volume. Told to the
     // bus as soon as the program comes to it.
     void Update() { updateTimer_.start(); }
     bool handleMessage(const QDBusMessage& message, const QDBusConnection& connection) override;

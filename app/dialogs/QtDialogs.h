@@ -4,6 +4,7 @@
 #include <QWidget>
 
 #include "CommonRUKTools/Dialogs.h"
+#include "app/dialogs/ReportDisplay.h"
 
 class QFileDialog;
 
@@ -14,6 +15,7 @@ class QtDialogs : public Dialogs {
 
     void ShowMessage(MessageKind kind, const QString& text) override;
     int Ask(const Question& question) override;
+    void ShowReport(const Report& report) override { reports_.Show(report, mainWindow_); }
     std::optional<QString> Input(const QString& caption, const QString& prompt, const QStringList& choices,
                                  const QString& preset) override;
     std::optional<QString> OpenFile(const FileDialogOptions& options) override;
@@ -28,5 +30,6 @@ class QtDialogs : public Dialogs {
     QStringList Choose(QFileDialog& dialog);
 
     QPointer<QWidget> mainWindow_;
+    ReportDisplay reports_;
     QString folder_;  // where the last choice was made
 };

@@ -55,9 +55,8 @@ FileDetails ReadFileDetails(const QString& path, ReadOptions options) {
     options.OnFrame = [&details](const FrameReport& frame) {
         if (details.Frames.size() < kMostFrames) details.Frames.push_back({frame.Id, FrameText(frame)});
     };
-    TID3Tag unused;
     try {
-        details.Error = ReadAudioFile(path, options, unused);
+        details.Error = ReadSong(path, options).Failure();
         if (details.Error.isEmpty()) details.Cover = CoverOf(path);
     } catch (const EStreamError& error) {
         details.Error = error.Message();

@@ -4,7 +4,7 @@
 #include <QString>
 #include <vector>
 
-#include "ReadMPEGHeader/AudioFile.h"
+#include "ReadMPEGHeader/SongReading.h"
 #include "app/models/SongProperties.h"
 
 // What only a look at the song's file tells.

@@ -5,6 +5,7 @@
 #include <functional>
 #include <numeric>
 
+#include "app/models/ColumnRanks.h"
 #include "app/models/PassingSongs.h"
 
 using namespace Qt::StringLiterals;
@@ -52,6 +53,12 @@ void FilteredSongs::SetRestriction(Restriction restriction) {
     ApplyFilter(narrower);
 }
 
+void FilteredSongs::SetOrder(std::optional<ShownOrder> order) {
+    if (!order && !order_) return;
+    order_ = order;
+    Show(Wanted() ? AllPassing() : Rows());
+}
+
 bool FilteredSongs::Passes(const TID3Tag& song) const {
     return (!restriction_ || restriction_(song)) && filter_.Matches(song);
 }
@@ -81,7 +88,29 @@ FilteredSongs::Rows FilteredSongs::Passing(int first, int last) const {
 }
 
 FilteredSongs::Rows FilteredSongs::AllPassing() const {
-    return Passing(0, songs_.rowCount() - 1);
+    Rows rows = Passing(0, songs_.rowCount() - 1);
+    return order_ ? Sorted(rows) : rows;
+}
+
+FilteredSongs::Rows FilteredSongs::Sorted(const Rows& rows) const {
+    std::vector<const TID3Tag*> songs;
+    songs.reserve(rows.size());
+    for (const int row : rows)
+        songs.push_back(songs_.SongAt(row));
+    const std::vector<int> ranks =
+        ColumnRanks(SongColumns()[static_cast<std::size_t>(order_->Column)], songs);
+    std::vector<std::size_t> order(rows.size());
+    std::iota(order.begin(), order.end(), std::size_t{0});
+    const auto rankOf = [&ranks](std::size_t place) { return ranks[place]; };
+    if (order_->Backwards)
+        std::ranges::stable_sort(order, std::greater(), rankOf);
+    else
+        std::ranges::stable_sort(order, std::less(), rankOf);
+    Rows sorted;
+    sorted.reserve(rows.size());
+    for (const std::size_t place : order)
+        sorted.push_back(rows[place]);
+    return sorted;
 }
 
 void FilteredSongs::ApplyFilter(bool narrower) {
@@ -105,6 +134,9 @@ int FilteredSongs::SourceRow(int row) const {
 int FilteredSongs::RowOfSource(int sourceRow) const {
     if (sourceRow < 0) return -1;
     if (!filtering_) return sourceRow < rows_ ? sourceRow : -1;
+    if (!places_.empty())
+        return sourceRow < static_cast<int>(places_.size()) ? places_[static_cast<std::size_t>(sourceRow)]
+                                                            : -1;
     const auto found = std::ranges::lower_bound(shown_, sourceRow);
     return found != shown_.end() && *found == sourceRow ? static_cast<int>(found - shown_.begin()) : -1;
 }
@@ -171,7 +203,7 @@ void FilteredSongs::Show(Rows rows) {
     for (const QModelIndex& old : before)
         sourceRows.push_back(SourceRow(old.row()));
     filtering_ = Wanted();
-    shown_ = std::move(rows);
+    SetShown(std::move(rows));
     QModelIndexList after;
     after.reserve(before.size());
     for (qsizetype i = 0; i < before.size(); ++i)
@@ -179,6 +211,15 @@ void FilteredSongs::Show(Rows rows) {
     changePersistentIndexList(before, after);
     Q_EMIT layoutChanged({}, VerticalSortHint);
     ShrinkTo(WantedRows());
+}
+
+void FilteredSongs::SetShown(Rows rows) {
+    shown_ = std::move(rows);
+    places_.clear();
+    if (!order_) return;
+    places_.resize(static_cast<std::size_t>(songs_.rowCount()), -1);
+    for (std::size_t place = 0; place < shown_.size(); ++place)
+        places_[static_cast<std::size_t>(shown_[place])] = static_cast<int>(place);
 }
 
 void FilteredSongs::GrowTo(int rows) {
@@ -200,7 +241,7 @@ void FilteredSongs::ShrinkTo(int rows) {
 void FilteredSongs::FollowSongs() {
     connect(&songs_, &QAbstractItemModel::modelAboutToBeReset, this, [this] { beginResetModel(); });
     connect(&songs_, &QAbstractItemModel::modelReset, this, [this] {
-        shown_ = filtering_ ? AllPassing() : Rows();
+        SetShown(filtering_ ? AllPassing() : Rows());
         rows_ = WantedRows();
         endResetModel();
     });
@@ -226,6 +267,11 @@ void FilteredSongs::RowsInserted(int first, int last) {
         rows_ += count;
         return endInsertRows();
     }
+    if (order_) {
+        for (int& row : shown_)
+            if (row >= first) row += count;
+        return Show(AllPassing());
+    }
     const Rows added = Passing(first, last);
     const auto at = std::ranges::lower_bound(shown_, first);
     std::for_each(at, shown_.end(), [count](int& row) { row += count; });
@@ -238,6 +284,13 @@ void FilteredSongs::RowsInserted(int first, int last) {
 }
 
 void FilteredSongs::RowsAboutToBeRemoved(int first, int last) {
+    if (order_) {
+        Rows rest = shown_;
+        std::erase_if(rest, [first, last](int row) { return row >= first && row <= last; });
+        Show(std::move(rest));
+        removing_ = false;
+        return;
+    }
     if (filtering_) {
         first = static_cast<int>(std::ranges::lower_bound(shown_, first) - shown_.begin());
         last = static_cast<int>(std::ranges::upper_bound(shown_, last) - shown_.begin()) - 1;
@@ -248,6 +301,12 @@ void FilteredSongs::RowsAboutToBeRemoved(int first, int last) {
 
 void FilteredSongs::RowsRemoved(int first, int last) {
     const int count = last - first + 1;
+    if (order_) {
+        Rows rows = shown_;
+        for (int& row : rows)
+            if (row > last) row -= count;
+        return SetShown(std::move(rows));
+    }
     const auto from =
         shown_.erase(std::ranges::lower_bound(shown_, first), std::ranges::upper_bound(shown_, last));
     std::for_each(from, shown_.end(), [count](int& row) { row -= count; });
@@ -267,7 +326,7 @@ void FilteredSongs::LayoutAboutToBeChanged() {
 }
 
 void FilteredSongs::LayoutChanged() {
-    if (filtering_) shown_ = AllPassing();
+    if (filtering_) SetShown(AllPassing());
     QModelIndexList after;
     after.reserve(held_.size());
     for (const QPersistentModelIndex& song : heldSongs_)
@@ -280,7 +339,9 @@ void FilteredSongs::LayoutChanged() {
 }
 
 void FilteredSongs::DataChanged(const QModelIndex& topLeft, const QModelIndex& bottomRight) {
-    if (filtering_) {
+    if (order_) {
+        if (Rows rows = AllPassing(); rows != shown_) Show(std::move(rows));
+    } else if (filtering_) {
         const auto first = std::ranges::lower_bound(shown_, topLeft.row());
         const auto behind = std::ranges::upper_bound(shown_, bottomRight.row());
         Rows rows(shown_.begin(), first);

@@ -33,9 +33,9 @@ EmptyState::EmptyState(QWidget* parent) : QWidget(parent) {
     auto* picture = new QLabel(this);
     picture->setPixmap(ProgramIcon().pixmap(kPictureSize));
     picture->setAlignment(Qt::AlignCenter);
-    addFolder_ = MakeButton(u"Ordner zur Datenbank hinzufügen..."_s,
+    addFolder_ = MakeButton(u"&Ordner zur Datenbank hinzufügen..."_s,
                             ThemeIcon(u"folder-music"_s, QStyle::SP_DirIcon), &EmptyState::OnAddFolder);
-    addSongs_ = MakeButton(u"Songs zur Datenbank hinzufügen..."_s,
+    addSongs_ = MakeButton(u"Songs &zur Datenbank hinzufügen..."_s,
                            ThemeIcon(u"audio-x-generic"_s, QStyle::SP_FileIcon), &EmptyState::OnAddSongs);
     setFocusProxy(addFolder_);
 

@@ -1,12 +1,13 @@
 #include "app/views/FilterField.h"
 
-#include <QHBoxLayout>
+#include <QGridLayout>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QLocale>
 
 #include "app/models/FilteredSongs.h"
+#include "app/views/FilterNotes.h"
 
 using namespace Qt::StringLiterals;
 
@@ -34,13 +35,23 @@ QString CountText(int shown, int all) {
 }  // namespace
 
 FilterField::FilterField(FilteredSongs& songs, QWidget* parent)
-    : QWidget(parent), songs_(songs), edit_(new QLineEdit(this)), count_(new QLabel(this)) {
+    : QWidget(parent),
+      songs_(songs),
+      edit_(new QLineEdit(this)),
+      count_(new QLabel(this)),
+      warning_(new QLabel(this)) {
     SetUpEdit();
     count_->setObjectName(u"filterCount"_s);
-    auto* layout = new QHBoxLayout(this);
+    warning_->setObjectName(u"filterWarning"_s);
+    warning_->setTextFormat(Qt::PlainText);
+    warning_->setWordWrap(true);
+    warning_->hide();
+    auto* layout = new QGridLayout(this);
     layout->setContentsMargins(4, 4, 8, 4);
-    layout->addWidget(edit_, 1);
-    layout->addWidget(count_);
+    layout->setColumnStretch(0, 1);
+    layout->addWidget(edit_, 0, 0);
+    layout->addWidget(count_, 0, 1);
+    layout->addWidget(warning_, 1, 0, 1, 2);
     setFocusProxy(edit_);
     FollowSongs();
     ShowCount();
@@ -98,6 +109,13 @@ void FilterField::Apply() {
     ShowCount();
 }
 
+// An empty list says it itself.
+void FilterField::ShowWarning() {
+    const QString warning = songs_.rowCount() > 0 ? FilterWarning(edit_->text()) : QString();
+    warning_->setText(warning);
+    warning_->setVisible(!warning.isEmpty());
+}
+
 void FilterField::Remember() {
     const QString text = edit_->text().trimmed();
     if (!text.isEmpty()) lastText_ = text;
@@ -129,4 +147,5 @@ bool FilterField::eventFilter(QObject* watched, QEvent* event) {
 
 void FilterField::ShowCount() {
     count_->setText(CountText(songs_.rowCount(), songs_.Songs().rowCount()));
+    ShowWarning();
 }

@@ -8,7 +8,8 @@ class FilteredSongs;
 class QLabel;
 class QLineEdit;
 
-// The line above the song list that narrows it while the user types, and says how many songs are left.
+// The line above the song list that narrows it while the user types, and says how many songs are left and
+// what of it is not understood.
 class FilterField : public QWidget {
  public:
     explicit FilterField(FilteredSongs& songs, QWidget* parent = nullptr);
@@ -33,10 +34,12 @@ class FilterField : public QWidget {
     void Remember();
     void Leave();
     void ShowCount();
+    void ShowWarning();
 
     FilteredSongs& songs_;
     QLineEdit* edit_;
     QLabel* count_;
+    QLabel* warning_;
     QTimer pause_;
     QString lastText_;
 };

@@ -11,7 +11,6 @@ using namespace Qt::StringLiterals;
 namespace {
 
 constexpr int kReadDelay = 150;  // milliseconds after the last change
-constexpr int kBusyDelay = 500;  // until the next try while a long operation reads files itself
 
 }  // namespace
 
@@ -59,11 +58,6 @@ void TPropertyForm::Refresh() {
 void TPropertyForm::ReadFile() {
     readTimer_.stop();
     if (!song_) return;
-    // The results of a reading are process-wide, and the operation is not done with those of its own.
-    if (database_.ProgressRunning()) {
-        cover_->SetImage({});
-        return readTimer_.start(kBusyDelay);
-    }
     details_ = ReadFileDetails(song_->FileName, database_.AudioReadOptions());
     ShowRows();
 }

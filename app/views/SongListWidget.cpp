@@ -2,6 +2,7 @@
 
 #include <QContextMenuEvent>
 #include <QHeaderView>
+#include <QPainter>
 #include <QScopedValueRollback>
 #include <QScrollBar>
 #include <QSet>
@@ -15,6 +16,7 @@
 #include "app/models/SongMime.h"
 #include "app/views/ColumnLayout.h"
 #include "app/views/ColumnMenu.h"
+#include "app/views/FilterNotes.h"
 #include "app/views/RowList.h"
 #include "app/views/SongDrag.h"
 #include "app/views/SongMarks.h"
@@ -23,7 +25,7 @@
 using namespace Qt::StringLiterals;
 
 SongListWidget::SongListWidget(FilteredSongs& songs, TMusicDatabase& database, QWidget* parent)
-    : QTableView(parent), songs_(songs), database_(database) {
+    : QTableView(parent), songs_(songs), database_(database), order_(database.Order()) {
     setObjectName(u"songList"_s);
     setAccessibleName(u"Songs"_s);
     setModel(&songs);
@@ -56,12 +58,40 @@ void SongListWidget::changeEvent(QEvent* event) {
     if (event->type() == QEvent::FontChange || event->type() == QEvent::StyleChange) FitRowsToFont(*this);
 }
 
-// In a list of rows Home and End go to the first and the last row.
+// In a list of rows Home and End go to the first and the last row, Left and Right move the columns.
 QModelIndex SongListWidget::moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) {
     if (songs_.rowCount() == 0) return {};
-    if (action == MoveHome) return songs_.index(0, 0);
-    if (action == MoveEnd) return songs_.index(songs_.rowCount() - 1, 0);
-    return QTableView::moveCursor(action, modifiers);
+    switch (action) {
+        case MoveHome:
+            return songs_.index(0, 0);
+        case MoveEnd:
+            return songs_.index(songs_.rowCount() - 1, 0);
+        case MoveLeft:
+            horizontalScrollBar()->triggerAction(QScrollBar::SliderSingleStepSub);
+            return currentIndex();
+        case MoveRight:
+            horizontalScrollBar()->triggerAction(QScrollBar::SliderSingleStepAdd);
+            return currentIndex();
+        default:
+            return QTableView::moveCursor(action, modifiers);
+    }
+}
+
+// Which cell of its row was clicked or has the focus does not matter.
+void SongListWidget::scrollTo(const QModelIndex& index, ScrollHint hint) {
+    const int sideways = horizontalScrollBar()->value();
+    QTableView::scrollTo(index, hint);
+    horizontalScrollBar()->setValue(sideways);
+}
+
+void SongListWidget::paintEvent(QPaintEvent* event) {
+    QTableView::paintEvent(event);
+    if (songs_.rowCount() > 0) return;
+    QPainter painter(viewport());
+    painter.setPen(palette().color(QPalette::Disabled, QPalette::Text));
+    const int margin = fontMetrics().height();
+    painter.drawText(viewport()->rect().adjusted(margin, margin, -margin, -margin),
+                     static_cast<int>(Qt::AlignCenter) | Qt::TextWordWrap, NothingShownText(songs_));
 }
 
 // --- Order ---
@@ -71,11 +101,35 @@ void SongListWidget::SetOrder(const SongOrder& order) {
         const WaitCursor wait;
         const QScopedValueRollback sorting(sorting_, true);
         songs_.Songs().SetOrder(order);
+        songs_.SetOrder(std::nullopt);
     }
     ShowSortIndicator();
+    KeepFocusInSight();
+}
+
+void SongListWidget::SortShown(int section) {
+    {
+        const WaitCursor wait;
+        const QScopedValueRollback sorting(sorting_, true);
+        const auto& order = songs_.Order();
+        songs_.SetOrder(ShownOrder{section, order && order->Column == section && !order->Backwards});
+    }
+    KeepFocusInSight();
+}
+
+void SongListWidget::KeepFocusInSight() {
     if (!database_.FollowFocus() || !currentIndex().isValid()) return;
     executeDelayedItemsLayout();
     scrollTo(currentIndex(), PositionAtCenter);
+}
+
+// Who sorts the database wants to see that order; songs also change their places within one.
+void SongListWidget::FollowOrder() {
+    if (database_.Order() == order_) return;
+    order_ = database_.Order();
+    songs_.SetOrder(std::nullopt);
+    ShowSortIndicator();
+    KeepFocusInSight();
 }
 
 void SongListWidget::SetSortingAllowed(bool allowed) {
@@ -86,17 +140,24 @@ void SongListWidget::HeaderClicked(int section) {
     const auto type = SongColumns()[static_cast<std::size_t>(section)].Field().Sort;
     if (type) {
         SongOrder order = database_.Order();
-        order.Backwards = order.SortType == *type && !order.Backwards;
+        order.Backwards = SortedColumn() == section && !order.Backwards;
         order.SortType = *type;
         RunCommand([&] { SetOrder(order); });
+    } else {
+        SortShown(section);
     }
-    ShowSortIndicator();  // the header has moved it already, also to a column that has no order
+    ShowSortIndicator();  // the header has moved it already, also where the order was refused
 }
 
 void SongListWidget::ShowSortIndicator() {
-    const SongOrder& order = database_.Order();
-    horizontalHeader()->setSortIndicator(ColumnOfSortType(order.SortType),
-                                         order.Backwards ? Qt::DescendingOrder : Qt::AscendingOrder);
+    const bool backwards = songs_.Order() ? songs_.Order()->Backwards : database_.SortBackwards();
+    horizontalHeader()->setSortIndicator(SortedColumn(),
+                                         backwards ? Qt::DescendingOrder : Qt::AscendingOrder);
+}
+
+// -1 when no column shows what the songs are sorted by.
+int SongListWidget::SortedColumn() const {
+    return songs_.Order() ? songs_.Order()->Column : ColumnOfSortType(database_.SortType());
 }
 
 // --- Columns ---
@@ -162,8 +223,10 @@ SongIndex SongListWidget::FocusedSong() const {
 
 std::vector<SongRef> SongListWidget::DraggedSongs() const {
     std::vector<SongRef> songs;
-    for (const SongIndex index : MarkedSongs())
-        songs.push_back({database_.Song(index).FileName, index});
+    for (const auto& [first, last] : MarkedRows(*selectionModel()))
+        for (int row = first; row <= last; ++row)
+            if (const SongIndex index = songs_.IndexAt(row); index >= 0)
+                songs.push_back({database_.Song(index).FileName, index});
     return songs;
 }
 
@@ -268,17 +331,12 @@ void SongListWidget::Enter() {
     if (!currentIndex().isValid() && songs_.rowCount() > 0) FocusRow(0);
 }
 
-// In a column that is in sight, so that the list does not move sideways.
-QModelIndex SongListWidget::InSight(int row) const {
-    return songs_.index(row, std::max(0, horizontalHeader()->logicalIndexAt(viewport()->width() / 2)));
-}
-
 void SongListWidget::FocusRow(int row) {
-    setCurrentIndex(InSight(row));
+    setCurrentIndex(songs_.index(row, 0));
 }
 
 void SongListWidget::keyboardSearch(const QString& letters) {
-    const int section = std::max(0, ColumnOfSortType(database_.SortType()));
+    const int section = std::max(0, SortedColumn());
     const int row = typeAhead_.Next(songs_, SongColumns()[static_cast<std::size_t>(section)],
                                     currentIndex().row(), letters);
     if (row >= 0) FocusRow(row);
@@ -306,6 +364,7 @@ void SongListWidget::FollowModel() {
     connect(&songs_, &QAbstractItemModel::layoutChanged, this, &SongListWidget::RestoreTopRow);
     connect(&songs_, &QAbstractItemModel::modelReset, this, &SongListWidget::RestoreFocus);
     songs_.OnFilterChange = [this] { FilterChanged(); };
+    subscriptions_ += database_.Events().Reordered.Subscribe([this] { FollowOrder(); });
 }
 
 // Songs that come in above the visible ones do not push them out of sight; a list at its top stays there.
@@ -331,9 +390,7 @@ void SongListWidget::RestoreFocus() {
     const int row = songs_.RowOfSource(index);
     if (row < 0) return;
     FocusRow(row);
-    if (!database_.FollowFocus()) return;
-    executeDelayedItemsLayout();
-    scrollTo(currentIndex(), PositionAtCenter);
+    KeepFocusInSight();
 }
 
 // A song that the filter has hidden gets the focus back when it is shown again, unless another one has it.
@@ -341,9 +398,10 @@ void SongListWidget::FilterChanged() {
     if (!currentIndex().isValid() && !focusedPath_.isEmpty()) {
         songs_.Songs().SyncViews();
         const int row = songs_.RowOfSource(database_.IndexOf(focusedPath_));
-        selectionModel()->setCurrentIndex(InSight(row), QItemSelectionModel::NoUpdate);
+        selectionModel()->setCurrentIndex(songs_.index(row, 0), QItemSelectionModel::NoUpdate);
     }
     executeDelayedItemsLayout();
+    if (songs_.rowCount() == 0) viewport()->update();  // it says why it is empty
     if (currentIndex().isValid())
         scrollTo(currentIndex(), PositionAtCenter);
     else

@@ -5,6 +5,7 @@
 #include <functional>
 #include <vector>
 
+#include "CommonRUKTools/Listeners.h"
 #include "MusicManagment/database/SongList.h"
 #include "MusicManagment/database/search/SongFilter.h"
 #include "MusicManagment/database/sorting/Sorting.h"
@@ -14,14 +15,15 @@ class FilteredSongs;
 class TMusicDatabase;
 struct SongRef;
 
-// The list of songs. A click on a column's header sorts by it, a second one backwards. The song that has the
-// focus and the marked (selected) songs are two things; of both only shown songs count.
+// The list of songs. A click on a column's header sorts by it, a second one backwards: the database, or where
+// that has no such order, only this list. The song that has the focus and the marked (selected) songs are two
+// things; of both only shown songs count. The list moves sideways only when the user moves it.
 class SongListWidget : public QTableView {
  public:
     SongListWidget(FilteredSongs& songs, TMusicDatabase& database, QWidget* parent = nullptr);
 
-    // Sorts the database; the focused song stays in sight when the database wants that. Throws
-    // EMusicDatabaseException while a long operation runs.
+    // Sorts the database, and the list like it; the focused song stays in sight when the database wants that.
+    // Throws EMusicDatabaseException while a long operation runs.
     void SetOrder(const SongOrder& order);
     // Whether a click on a header sorts.
     void SetSortingAllowed(bool allowed);
@@ -33,7 +35,7 @@ class SongListWidget : public QTableView {
     std::vector<SongHandle> ChosenHandles() const;
     // -1 when no song has the focus.
     SongIndex FocusedSong() const;
-    // The marked songs as a drag takes them along.
+    // The marked songs as a drag takes them along, in the order of the list.
     std::vector<SongRef> DraggedSongs() const;
     void MarkAll();
     void InvertMarks();
@@ -66,19 +68,24 @@ class SongListWidget : public QTableView {
     std::function<void(const QPoint&)> OnContextMenu;
 
     void keyboardSearch(const QString& letters) override;
+    void scrollTo(const QModelIndex& index, ScrollHint hint = EnsureVisible) override;
 
  protected:
     QModelIndex moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) override;
     void changeEvent(QEvent* event) override;
+    void paintEvent(QPaintEvent* event) override;
     void contextMenuEvent(QContextMenuEvent* event) override;
     void startDrag(Qt::DropActions actions) override;
 
  private:
     void SetUpHeader();
     void HeaderClicked(int section);
+    void SortShown(int section);
+    void FollowOrder();
+    int SortedColumn() const;
+    void KeepFocusInSight();
     void ShowColumnMenu(const QPoint& position);
     void ShowSortIndicator();
-    QModelIndex InSight(int row) const;
     void FocusRow(int row);
     void FollowModel();
     void KeepTopRow();
@@ -93,4 +100,6 @@ class SongListWidget : public QTableView {
     QString focusedPath_;
     QPersistentModelIndex topRow_;
     bool sorting_ = false;
+    SongOrder order_;  // of the database, as the list knows it
+    Subscriptions subscriptions_;
 };

@@ -17,6 +17,11 @@ inline constexpr Setting<bool> kFirstTime{u"FirstTime", true};
 
 inline constexpr Setting<int> kOVType{u"OVType", ovArtist, ovArtist, kOverviewTypeCount - 1};
 inline constexpr Setting<int> kVolume{u"Volume", 100, 0, 100};  // per cent
+// What a double click in the song list plays: false is also what follows there.
+inline constexpr Setting<bool> kPlayOnlyThisSong{u"PlayOnlyThisSong"};
 inline constexpr Setting<int> kSpectrumStyle{u"SpectrumStyle", ssBars, ssBars, ssCircle};
+
+// A double click plays this song and not what follows it in the shown list.
+inline constexpr Setting<bool> kPlayOnlyThisSong{u"PlayOnlyThisSong"};
 
 }  // namespace WindowSettings

@@ -7,6 +7,7 @@
 
 #include "CommonRUKTools/ByteWriter.h"
 #include "ReadMPEGHeader/AudioFile.h"
+#include "ReadMPEGHeader/mpeg/MpegFrame.h"
 #include "tests/ReadMPEGHeader/Id3v2Builder.h"
 
 using Bytes = std::vector<std::uint8_t>;
@@ -25,6 +26,19 @@ inline constexpr FrameKind kLsfMono64 = {{0xFF, 0xF3, 0x80, 0xC4}, 208};
 // A tag with the two texts without which it does not count.
 inline Id3v2Builder TitledTag(std::string_view title, std::string_view artist, std::uint8_t version = 3) {
     return Id3v2Builder(version).Text("TIT2", title).Text("TPE1", artist);
+}
+
+inline Bytes Id3v1Bytes(std::string_view title, std::string_view artist, std::string_view album,
+                        std::string_view year, std::string_view comment, std::uint8_t genre) {
+    ByteWriter bytes;
+    bytes.Raw("TAG");
+    bytes.Block(title, 30);
+    bytes.Block(artist, 30);
+    bytes.Block(album, 30);
+    bytes.Block(year, 4);
+    bytes.Block(comment, 30);
+    bytes.U8(genre);
+    return bytes.Bytes();
 }
 
 // Builds a sound file piece by piece.
@@ -66,14 +80,7 @@ class Mp3Builder {
         return ZerosUpTo(end);
     }
     Mp3Builder& Id3v1(std::string_view title, std::string_view artist, std::uint8_t genre = 255) {
-        file_.Raw("TAG");
-        file_.Block(title, 30);
-        file_.Block(artist, 30);
-        file_.Block("", 30);
-        file_.Block("1999", 4);
-        file_.Zeros(30);
-        file_.U8(genre);
-        return *this;
+        return Raw(Id3v1Bytes(title, artist, "", "1999", "", genre));
     }
     // A tag behind the audio and the mark that leads to it.
     Mp3Builder& TrailingTag(ByteSpan tag) {
@@ -90,6 +97,50 @@ class Mp3Builder {
     ByteWriter file_;
 };
 
+// Builds a WAV file chunk by chunk.
+class WaveBuilder {
+ public:
+    WaveBuilder() { Chunk("RIFF", 0).file_.Raw("WAVE"); }
+
+    WaveBuilder& Chunk(std::string_view id, std::uint32_t size) {
+        file_.Raw(id);
+        file_.U32Le(size);
+        return *this;
+    }
+    WaveBuilder& Format(std::uint16_t channels = 2, std::uint32_t rate = 44100, std::uint16_t extra = 0) {
+        Chunk("fmt ", 16u + extra);
+        file_.U16Le(extra > 0 ? 0xFFFE : 1);
+        file_.U16Le(channels);
+        file_.U32Le(rate);
+        file_.U32Le(rate * channels * 2);
+        file_.U16Le(static_cast<std::uint16_t>(channels * 2));
+        file_.U16Le(16);
+        file_.Zeros(extra);
+        return *this;
+    }
+    WaveBuilder& Zeros(std::size_t count) {
+        file_.Zeros(count);
+        return *this;
+    }
+    const Bytes& Data() const { return file_.Bytes(); }
+
+ private:
+    ByteWriter file_;
+};
+
+// What the first frame of a file tells.
+struct FrameAnalysis {
+    TID3Tag Tag;
+    MpegResults Results;
+};
+
+inline FrameAnalysis AnalyseFirstFrame(const Mp3Builder& file, const MpegRules& rules = kClassicMpegRules) {
+    MemorySource source(file.Data());
+    FrameAnalysis analysis;
+    analysis.Results = AnalyseMpegFrame(source, 0, rules, analysis.Tag);
+    return analysis;
+}
+
 inline ReadOptions InProfile(ReadProfile profile) {
     ReadOptions options;
     options.Profile = profile;
@@ -97,12 +148,16 @@ inline ReadOptions InProfile(ReadProfile profile) {
     return options;
 }
 
+inline SongReading ReadingOf(ByteSpan bytes, ReadProfile profile = ReadProfile::Classic,
+                             const QString& path = QStringLiteral("/music/Folder/name.mp3")) {
+    MemorySource source(bytes);
+    return ReadSong(source, path, InProfile(profile));
+}
+
 inline TID3Tag Read(ByteSpan bytes, const ReadOptions& options = InProfile(ReadProfile::Classic),
                     const QString& path = QStringLiteral("/music/Folder/name.mp3")) {
     MemorySource source(bytes);
-    TID3Tag tag;
-    ReadAudioStream(source, path, options, tag);
-    return tag;
+    return ReadSong(source, path, options).Tag;
 }
 
 inline TID3Tag ReadModern(ByteSpan bytes) {

@@ -93,5 +93,7 @@ struct Id3v2Outcome {
 
 Id3v2Outcome ReadWith(Id3v2ReadFunction& read, ByteSpan bytes, std::int64_t position = 0);
 
-// The body of the program's own frame: an empty banner, the format text and numbers that are all zero.
-std::string XrukBody(std::string_view format);
+// The body of the program's own frame, for what it keeps of a record.
+std::string XrukBody(const TID3Tag& tag);
+// Nothing but the format text "Wave".
+TID3Tag WaveRecord();

@@ -12,9 +12,6 @@ namespace {
 TEST(CollectionTotals, FollowInsertionsChangesAndRemovals) {
     TMusicDatabase database;
     CollectionTotals totals(database);
-    database.OnChange = [&](TMusicDatabase&, SongIndex index, TChangeType change) {
-        totals.SongChanged(index, change);
-    };
     EXPECT_EQ(totals.Text(), u"0 Songs, Spielzeit 0:00"_s);
     AddSong(database, u"A"_s, 65);
     EXPECT_EQ(totals.Text(), u"1 Song, Spielzeit 1:05"_s);

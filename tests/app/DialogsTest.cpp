@@ -3,16 +3,22 @@
 #include <QAbstractButton>
 #include <QApplication>
 #include <QFileDialog>
+#include <QMainWindow>
 #include <QMessageBox>
+#include <QPushButton>
+#include <QStatusBar>
+#include <QTabWidget>
 #include <QTemporaryDir>
 #include <QTest>
 #include <QTimer>
+#include <QToolButton>
 #include <new>
 
 #include "CommonRUKTools/Errors.h"
 #include "app/CommandRunner.h"
 #include "app/dialogs/FileFilters.h"
 #include "app/dialogs/QtDialogs.h"
+#include "app/dialogs/ReportDisplay.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
 
@@ -38,7 +44,7 @@ QStringList Captions(const QWidget& window) {
     return captions;
 }
 
-TEST(QtDialogs, AQuestionShowsPlainTextAndItsOwnButtons) {
+TEST(QtDialogs, AQuestionShowsPlainTextAndButtonsWithLetters) {
     QtDialogs dialogs;
     QStringList captions;
     WithNextDialog<QMessageBox>([&](QMessageBox& box) {
@@ -61,7 +67,7 @@ TEST(QtDialogs, EachButtonAnswersWithItsPlaceReturnWithTheDefaultAndEscapeCancel
         WithNextDialog<QMessageBox>(action);
         return dialogs.Ask(question);
     };
-    const auto key = [](Qt::Key key) {
+    const auto press = [](Qt::Key key) {
         return [key](QMessageBox& box) { QTest::keyClick(box.focusWidget(), key); };
     };
     for (int i = 0; i < question.Buttons.size(); ++i)
@@ -70,10 +76,10 @@ TEST(QtDialogs, EachButtonAnswersWithItsPlaceReturnWithTheDefaultAndEscapeCancel
                           if (button->text().remove(u'&') == question.Buttons[i]) return button->click();
                   }),
                   i);
-    EXPECT_EQ(answerTo(key(Qt::Key_Return)), 2) << "without a default Return destroys nothing";
+    EXPECT_EQ(answerTo(press(Qt::Key_Return)), 2) << "without a default Return destroys nothing";
     question.Default = 1;
-    EXPECT_EQ(answerTo(key(Qt::Key_Return)), 1);
-    EXPECT_EQ(answerTo(key(Qt::Key_Escape)), 2);
+    EXPECT_EQ(answerTo(press(Qt::Key_Return)), 1);
+    EXPECT_EQ(answerTo(press(Qt::Key_Escape)), 2);
 }
 
 TEST(QtDialogs, FileDialogsSpeakGerman) {
@@ -97,16 +103,35 @@ TEST(QtDialogs, FileDialogsSpeakGerman) {
         EXPECT_FALSE(seen.contains(english)) << english.toStdString();
 }
 
-TEST(QtDialogs, AFolderIsChosenFromWhereTheCommandSays) {
-    const QTemporaryDir folder;
-    QtDialogs dialogs;
-    QString shown;
-    WithNextDialog<QFileDialog>([&](QFileDialog& dialog) {
-        shown = dialog.directory().absolutePath();
-        dialog.reject();
-    });
-    EXPECT_FALSE(dialogs.ChooseFolder(u"Ordner"_s, folder.path()));
-    EXPECT_EQ(shown, folder.path());
+TEST(ReportDisplay, OnlyComplaintsOpenAWindow) {
+    QMainWindow window;
+    ReportDisplay display;
+    Report report;
+    report.Message = u"2 neue\nSongs"_s;
+    report.Sections = {{u"Neu & gut"_s, {u"a"_s, u"b"_s}}};
+    const auto pages = [&] {
+        QStringList captions;
+        for (const auto* tabs : window.findChildren<QTabWidget*>())
+            for (int page = 0; page < tabs->count(); ++page)
+                captions << tabs->tabText(page) + (page == tabs->currentIndex() ? u"*"_s : QString());
+        return captions;
+    };
+    window.show();
+    display.Show(report, &window);
+    EXPECT_EQ(window.statusBar()->currentMessage(), u"2 neue Songs"_s);
+    EXPECT_EQ(pages(), QStringList());
+    auto* details = window.findChild<QToolButton*>(u"reportDetails"_s);
+    details->click();
+    EXPECT_EQ(pages(), QStringList{u"Neu && gut (2)*"_s});
+
+    bool opened = false;
+    report.Sections.push_back({u"Beschädigt"_s, {u"c"_s}, true});
+    report.OpenAsText = [&] { opened = true; };
+    display.Show(report, &window);
+    EXPECT_EQ(pages(), QStringList({u"Neu && gut (2)"_s, u"Beschädigt (1)*"_s}));
+    for (auto* button : window.findChildren<QPushButton*>())
+        if (button->text() == u"Als &Text öffnen"_s) button->click();
+    EXPECT_TRUE(opened);
 }
 
 TEST(FileFilters, BecomeNameFilters) {

@@ -4,16 +4,16 @@
 
 #include <QDir>
 #include <QDirIterator>
+#include <QRegularExpression>
 #include <QTemporaryDir>
-#include <QXmlStreamReader>
 
 #include "CommonRUKTools/Errors.h"
-#include "CommonRUKTools/Trash.h"
 #include "app/desktop/DesktopEntry.h"
 #include "app/desktop/InstallationSteps.h"
 #include "app/desktop/MimeTypes.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
+#include "tests/database/RecordingTrash.h"
 
 using namespace Qt::StringLiterals;
 
@@ -143,23 +143,21 @@ TEST(DesktopEntryTest, TheProgramsPathIsQuoted) {
 
 // Which extensions a type has is said in code, for the program's start, and in the file for the desktop.
 TEST(MimeTypesTest, TheDesktopIsToldWhatTheProgramKnows) {
-    QFile file(u":/desktop/tunestead-mime.xml"_s);
-    ASSERT_TRUE(file.open(QIODevice::ReadOnly));
-    QXmlStreamReader xml(&file);
+    const auto text = [](const QString& name) {
+        QFile file(u":/desktop/"_s + name);
+        return file.open(QIODevice::ReadOnly) ? QString::fromUtf8(file.readAll()) : QString();
+    };
+    const QRegularExpression words(
+        uR"re(mime-type type="([^"]*)"|<comment[^>]*>([^<]*)<|pattern="[*]([^"]*)")re"_s);
     QStringList said;
     QString type;
-    while (!xml.atEnd()) {
-        if (xml.readNext() != QXmlStreamReader::StartElement) continue;
-        if (xml.name() == "mime-type"_L1) type = xml.attributes().value("type"_L1).toString();
-        if (xml.name() == "comment"_L1) said << type + u": "_s + xml.readElementText();
-        if (xml.name() == "glob"_L1)
-            said << type + u" *"_s + xml.attributes().value("pattern"_L1).mid(1).toString();
+    for (const auto& word : words.globalMatch(text(u"tunestead-mime.xml"_s))) {
+        if (word.hasCaptured(1))
+            type = word.captured(1);
+        else
+            said << type + (word.hasCaptured(2) ? u": "_s + word.captured(2) : u" *"_s + word.captured(3));
     }
-    EXPECT_FALSE(xml.hasError()) << xml.errorString().toStdString();
-
-    QFile entry(u":/desktop/tunestead.desktop"_s);
-    ASSERT_TRUE(entry.open(QIODevice::ReadOnly));
-    const QString menu = QString::fromUtf8(entry.readAll());
+    const QString menu = text(u"tunestead.desktop"_s);
     QStringList known;
     for (const FileType& each : OwnFileTypes()) {
         const QString name = each.MimeType.toString();
@@ -173,23 +171,13 @@ TEST(MimeTypesTest, TheDesktopIsToldWhatTheProgramKnows) {
     EXPECT_EQ(said, known);
 }
 
-class RefusingTrash : public Trash {
- public:
-    RefusingTrash() { SetTrash(this); }
-    ~RefusingTrash() override { SetTrash(nullptr); }
-    QStringList Taken;
-    bool Take(const QString& path) override {
-        if (path.endsWith(u".conf"_s)) return false;
-        Taken << path;
-        return QFile::remove(path);
-    }
-};
-
 TEST_F(InstallationTest, TheUserSaysWhatGoesWithTheProgram) {
     const StandardFiles files{In(u"data/tunestead"_s)};
     const QString settings = In(u"config/tunestead.conf"_s);
     ScriptedDialogs dialogs;
-    RefusingTrash trash;
+    RecordingTrash trash;
+    trash.Removes = true;
+    trash.Refused = u".conf"_s;
     InstallationSteps steps(&installation_, files, settings);
     complaint_ = u"xdg-mime: kaputt"_s;
     steps.Install({});

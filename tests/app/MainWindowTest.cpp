@@ -13,7 +13,6 @@
 #include <QMimeData>
 #include <QPushButton>
 #include <QTableView>
-#include <QTemporaryDir>
 #include <QTest>
 #include <QTimer>
 #include <QUrl>
@@ -24,9 +23,9 @@
 #include "app/desktop/SingleInstance.h"
 #include "app/dialogs/ProgressWindow.h"
 #include "tests/PrintQt.h"
-#include "tests/ReadMPEGHeader/Builders.h"
 #include "tests/ScriptedDialogs.h"
 #include "tests/app/ScriptedBackend.h"
+#include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
 
@@ -47,24 +46,19 @@ struct BusyDialogs : ScriptedDialogs {
 // A main window over a data folder of its own, and songs to take in.
 class MainWindowTest : public testing::Test {
  protected:
-    QString InData(const QString& name) const { return folder_.filePath(u"data/"_s + name); }
+    QString InData(const QString& name) const { return folder_.Path(u"data/"_s + name); }
     QString StandardDatabase() const { return InData(u"Tunestead3_Database.tsdb"_s); }
-    QString Music() const { return folder_.filePath(u"Musik"_s); }
+    QString Music() const { return folder_.Path(u"Musik"_s); }
 
     void MakeSongs(int count, const QString& artist = u"Band"_s) const {
-        const QDir music(Music() + u'/' + artist);
-        music.mkpath(u"."_s);
-        for (int i = 0; i < count; ++i) {
-            const QByteArray title = "Lied " + QByteArray::number(100 + i);
-            Write(music.filePath(QString::fromLatin1(title) + u".mp3"_s),
-                  Mp3Builder().Frames(80).Id3v1(title.toStdString(), artist.toStdString()).Data());
-        }
+        for (int i = 0; i < count; ++i)
+            folder_.Add(u"Musik/%1/%1 - Lied %2.wav"_s.arg(artist).arg(100 + i), 2);
     }
-    static void Write(const QString& path, const Bytes& bytes) {
+    static void Write(const QString& path, const QByteArray& bytes) {
         QDir().mkpath(QFileInfo(path).path());
         QFile file(path);
         ASSERT_TRUE(file.open(QIODevice::WriteOnly));
-        file.write(reinterpret_cast<const char*>(bytes.data()), static_cast<qint64>(bytes.size()));
+        file.write(bytes);
     }
     static QByteArray Read(const QString& path) {
         QFile file(path);
@@ -74,8 +68,8 @@ class MainWindowTest : public testing::Test {
     void Start(const QStringList& arguments = {}, Installation* setup = nullptr) {
         window_.reset();  // only one at a time owns the data folder
         window_ = std::make_unique<TTunesteadMainWnd>(
-            MainWindowOptions{.Files = {folder_.filePath(u"data"_s)},
-                              .SettingsFile = folder_.filePath(u"settings.ini"_s),
+            MainWindowOptions{.Files = {folder_.Path(u"data"_s)},
+                              .SettingsFile = folder_.Path(u"settings.ini"_s),
                               .Arguments = arguments,
                               .Setup = setup,
                               .Engines = ScriptedEngines(song_)});
@@ -132,7 +126,7 @@ class MainWindowTest : public testing::Test {
         return nullptr;
     }
 
-    QTemporaryDir folder_;
+    SongFolder folder_;
     BusyDialogs dialogs_;
     ScriptedSong song_;
     std::unique_ptr<TTunesteadMainWnd> window_;
@@ -167,7 +161,7 @@ TEST_F(MainWindowTest, ADroppedFolderIsTakenInAndThereAtTheNextStart) {
 
 TEST_F(MainWindowTest, ADatabaseOnTheCommandLineIsLoadedWhenTheUserAgrees) {
     MakeSongs(2);
-    const QString other = folder_.filePath(u"andere.TSDB"_s);
+    const QString other = folder_.Path(u"andere.TSDB"_s);
     Start({Music()});
     ASSERT_TRUE(Database().SaveDatabase(other, true));
     Database().SetModified(false);
@@ -232,7 +226,7 @@ TEST_F(MainWindowTest, TheSystemEndsTheProgramAlsoDuringARunAndNothingIsLost) {
 }
 
 TEST_F(MainWindowTest, ADamagedStandardDatabaseIsOnlyGivenUpWhenTheUserAgrees) {
-    Write(StandardDatabase(), {'T', 'S', 'D', 'B', ' ', 'B', 'y'});
+    Write(StandardDatabase(), "TSDB By");
     const QByteArray before = Read(StandardDatabase());
     dialogs_.Answers = {kNo};
     Start();
@@ -262,7 +256,7 @@ TEST_F(MainWindowTest, AnotherDatabasesChangesAreOnlyLostWhenTheUserSaysSo) {
     EXPECT_FALSE(window_->close());
     EXPECT_EQ(Database().Count(), 3);
 
-    const QString file = folder_.filePath(u"neu.tsdb"_s);
+    const QString file = folder_.Path(u"neu.tsdb"_s);
     dialogs_.Files = {{file}, {file}};
     dialogs_.Answers = {kYes};
     Command(u"Neue Datenbank"_s)->trigger();
@@ -363,33 +357,26 @@ TEST_F(MainWindowTest, WhatACommandOrAnEventHandlerThrowsIsTold) {
 
 TEST_F(MainWindowTest, AnArrangementOfTheWindowsIsSavedAndComesBack) {
     Start();
-    const auto choose = [this](const QString& caption) {
-        for (QAction* action : window_->findChildren<QAction*>())
-            if (action->text().remove(u'&') == caption) return action->trigger();
-        ADD_FAILURE() << caption.toStdString();
-    };
     auto* overview = window_->findChildren<QDockWidget*>().first();
     const QSize arranged = SmallestSize();
     const QSize larger = arranged + QSize(20, 30);
     ASSERT_TRUE(overview->isVisible());
-    const QString file = folder_.filePath(u"meine.DF"_s);
+    const QString file = folder_.Path(u"meine.DF"_s);
     dialogs_.Files = {{file}, {file}};
-    choose(u"Anordnung speichern unter..."_s);
+    Command(u"Anordnung speichern unter..."_s)->trigger();
     overview->hide();
     window_->resize(larger);
-    choose(u"Anordnung laden..."_s);
+    Command(u"Anordnung laden..."_s)->trigger();
     EXPECT_EQ(window_->size(), arranged);
     EXPECT_TRUE(overview->isVisible());
     EXPECT_TRUE(dialogs_.Messages.isEmpty());
 
     // What the file says of the docks is damaged: nothing changes.
-    QFile damaged(folder_.filePath(u"kaputt.df"_s));
-    ASSERT_TRUE(damaged.open(QIODevice::WriteOnly));
-    damaged.write(
-        "[Tunestead Desktop]\nVersion=1\nMainForm=AAAA\nMainFormState=AAAA\nSongListColumns=AAAA\n");
-    damaged.close();
+    const QString damaged = folder_.Path(u"kaputt.df"_s);
+    Write(damaged,
+          "[Tunestead Desktop]\nVersion=1\nMainForm=AAAA\nMainFormState=AAAA\nSongListColumns=AAAA\n");
     window_->resize(larger);
-    window_->TakeOver({{damaged.fileName()}, {}});
+    window_->TakeOver({{damaged}, {}});
     EXPECT_TRUE(QTest::qWaitFor([this] { return !dialogs_.Messages.isEmpty(); }));
     EXPECT_EQ(window_->size(), larger);
     EXPECT_TRUE(overview->isVisible());
@@ -409,7 +396,7 @@ TEST_F(MainWindowTest, ALaterStartBringsItsFilesAndIsNotTakenByAClosedWindow) {
 
 TEST_F(MainWindowTest, WhatWasRemovedWithTheProgramDoesNotComeBack) {
     MakeSongs(2);
-    Installation installation({u"/opt/tunestead"_s, folder_.filePath(u"xdg"_s), folder_.filePath(u"xdg"_s)},
+    Installation installation({u"/opt/tunestead"_s, folder_.Path(u"xdg"_s), folder_.Path(u"xdg"_s)},
                               [](const QString&, const QStringList&) { return QString(); });
     struct : Trash {
         bool Take(const QString& path) override { return QFile::remove(path); }
@@ -418,14 +405,14 @@ TEST_F(MainWindowTest, WhatWasRemovedWithTheProgramDoesNotComeBack) {
     Start({Music()});
     Database().BannList().Insert(u"A - 1"_s);
     window_->close();
-    ASSERT_TRUE(QFile::exists(StandardDatabase()) && QFile::exists(folder_.filePath(u"settings.ini"_s)));
+    ASSERT_TRUE(QFile::exists(StandardDatabase()) && QFile::exists(folder_.Path(u"settings.ini"_s)));
 
     dialogs_.Answers = {kYes, kYes, kYes, kYes};
     Start({u"-uninstall"_s}, &installation);
     EXPECT_FALSE(window_->isVisible());
     EXPECT_EQ(dialogs_.Questions.size(), 4);
     EXPECT_FALSE(QFile::exists(StandardDatabase()) || QFile::exists(InData(u"Tunestead3_BannList.str"_s)) ||
-                 QFile::exists(folder_.filePath(u"settings.ini"_s)));
+                 QFile::exists(folder_.Path(u"settings.ini"_s)));
     SetTrash(nullptr);
 }
 

@@ -5,11 +5,9 @@
 #include <QComboBox>
 #include <QHeaderView>
 #include <QLineEdit>
-#include <QTemporaryDir>
 #include <QTest>
 #include <QTreeView>
 
-#include "CommonRUKTools/RWReg.h"
 #include "app/views/OverviewForm.h"
 #include "tests/PrintQt.h"
 #include "tests/app/Songs.h"
@@ -94,30 +92,6 @@ TEST_F(MusicOverviewTest, AnotherListStartsWithNothingChosen) {
     Click(9);
     EXPECT_TRUE(told_.last().Genres.test(8));
     EXPECT_EQ(told_.last().Genres.count(), 1U);
-}
-
-TEST_F(MusicOverviewTest, TypedLettersFindAGroup) {
-    form_.activateWindow();
-    List().setFocus();
-    QTest::keyClicks(&List(), u"ga"_s);
-    EXPECT_EQ(List().currentIndex().data().toString(), u"Gamma"_s);
-    EXPECT_EQ(LastCaptions(), QSet<QString>({u"Gamma"_s}));
-}
-
-TEST_F(MusicOverviewTest, TheListIsKeptInTheSettings) {
-    const QTemporaryDir folder;
-    const QString file = folder.filePath(u"settings.ini"_s);
-    TRWReg settings(u"\\Software\\Test"_s, file);
-    Overview().SetOVType(ovLength);
-    SaveDatabaseSettings(database_, settings);
-    EXPECT_EQ(settings.ReadInteger(u"OVType"_s), static_cast<int>(ovLength));
-    settings.WriteInteger(u"OVType"_s, kOverviewTypeCount);
-    LoadDatabaseSettings(database_, settings);
-    EXPECT_EQ(Overview().OVType(), ovLength);
-    settings.WriteInteger(u"OVType"_s, ovAlbum);
-    LoadDatabaseSettings(database_, settings);
-    EXPECT_EQ(Overview().OVType(), ovAlbum);
-    EXPECT_EQ(form_.findChild<QComboBox*>()->currentText(), u"Alben"_s);
 }
 
 // As a child of the main window it lives a little longer than the database there.

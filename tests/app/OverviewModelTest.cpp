@@ -3,7 +3,6 @@
 #include <gtest/gtest.h>
 
 #include <QAbstractItemModelTester>
-#include <QItemSelectionModel>
 #include <QSignalSpy>
 
 #include "MusicManagment/database/GroupLists.h"
@@ -74,46 +73,6 @@ TEST_F(OverviewModelTest, ManyChangesAreToldInOneStep) {
     EXPECT_EQ(laidOut.count(), 1);
 }
 
-TEST_F(OverviewModelTest, OnlyChangesOfTheShownListCount) {
-    Add({u"A"_s});
-    model_.SetType(ovYear);
-    EXPECT_FALSE(model_.SyncPending());
-    model_.OverviewUpdated(ovArtist, 0, 7);
-    EXPECT_FALSE(model_.SyncPending());
-    model_.OverviewUpdated(ovYear, 0, 7);
-    EXPECT_TRUE(model_.SyncPending());
-}
-
-TEST_F(OverviewModelTest, RowsThatViewsHoldFollowTheirGroups) {
-    Add({u"B"_s, u"C"_s, u"D"_s, u"D"_s});
-    model_.SyncViews();
-    QItemSelectionModel selection(&model_);
-    const auto rows = QItemSelectionModel::Select | QItemSelectionModel::Rows;
-    selection.select(model_.index(1, 0), rows);
-    selection.select(model_.index(3, 0), rows);
-    const QPersistentModelIndex all = model_.index(OverviewModel::kAllRow, 0);
-    const QPersistentModelIndex gone = model_.index(2, 0);
-
-    Add({u"A"_s});
-    ASSERT_TRUE(database_.RemoveEntry(database_.IndexOf(SongOf(u"C"_s, u"2"_s).FileName)));
-    ASSERT_TRUE(database_.RemoveEntry(database_.IndexOf(SongOf(u"D"_s, u"4"_s).FileName)));
-    model_.SyncViews();
-    EXPECT_EQ(Captions(model_), QStringList({u"Alle (3)"_s, u"A"_s, u"B"_s, u"D"_s}));
-    QStringList selected;
-    for (const QModelIndex& index : selection.selectedRows())
-        selected << index.data().toString();
-    selected.sort();
-    EXPECT_EQ(selected, QStringList({u"B"_s, u"D"_s}));
-    EXPECT_EQ(CountOf(model_, 3), u"1"_s);
-    EXPECT_EQ(all.row(), OverviewModel::kAllRow);
-    EXPECT_FALSE(gone.isValid());
-
-    database_.Clear();
-    model_.SyncViews();
-    EXPECT_EQ(Captions(model_), QStringList{u"Alle (0)"_s});
-    EXPECT_FALSE(selection.hasSelection());
-}
-
 TEST_F(OverviewModelTest, TheFilterFindsFoldedTextAndKeepsTheTotals) {
     Add({u"Mötley"_s, u"Straße"_s, u"Abba"_s, QString()});
     model_.SetFilter(u"MOTL"_s);
@@ -126,18 +85,6 @@ TEST_F(OverviewModelTest, TheFilterFindsFoldedTextAndKeepsTheTotals) {
     EXPECT_EQ(CountOf(model_, 0), u"5"_s);
     model_.SetFilter(QString());
     EXPECT_EQ(model_.rowCount(), 6);
-}
-
-TEST_F(OverviewModelTest, GenresAreAlwaysTwentyRows) {
-    TID3Tag song = CdSong(u"Lied"_s);
-    song.MainGenre = 8;
-    database_.AddEntry(QString(), song);
-    model_.SetType(ovGenre);
-    EXPECT_EQ(model_.rowCount(), 1 + kMainGenreCount);
-    EXPECT_EQ(model_.index(0, 0).data().toString(), u"Alle (1)"_s);
-    EXPECT_EQ(model_.index(9, 0).data().toString(), u"Rock/Pop"_s);
-    EXPECT_EQ(model_.ListRowOf(9), 8);
-    EXPECT_EQ(CountOf(model_, 9), u"1"_s);
 }
 
 // The songs that a group matches must be those that its list counts.
@@ -155,7 +102,7 @@ TEST(GroupSelection, MatchesTheSongsThatTheListsCount) {
     }
     GroupLists lists;
     for (const TID3Tag& song : songs)
-        lists.Add(song, nullptr);
+        lists.Add(song);
     for (int type = 0; type < kOverviewTypeCount; ++type) {
         for (int row = 0; row < lists.RowCount(static_cast<TOVType>(type)); ++row) {
             GroupSelection selection;
@@ -169,15 +116,6 @@ TEST(GroupSelection, MatchesTheSongsThatTheListsCount) {
             EXPECT_EQ(std::ranges::count_if(songs, matches), lists.RowSongCount(selection.Type, row))
                 << lists.RowCaption(selection.Type, row).toStdString();
         }
-    }
-}
-
-TEST(GroupSelection, NothingChosenNarrowsNothing) {
-    GroupSelection selection;
-    for (const TOVType type : {ovArtist, ovGenre}) {
-        selection.Type = type;
-        EXPECT_TRUE(selection.IsEmpty());
-        EXPECT_TRUE(selection.Matches(TID3Tag()));
     }
 }
 

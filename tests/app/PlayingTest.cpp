@@ -159,12 +159,9 @@ TEST_F(PlayingTest, DelWorksInTheListThatHasTheFocus) {
     EXPECT_TRUE(dialogs_.Questions.isEmpty());
 
     songs_->setFocus();
-    database_.OnMenuItemClicked = {};
     int removals = 0;
-    database_.OnMenuItemClicked = [&](TMusicDatabase&, const TMenuExItem&, void*, qint64 id, bool& proceed) {
-        removals += id == mcRemoveFromDatabase;
-        proceed = false;
-    };
+    const Subscription shell =
+        database_.Commands().Handle(mcRemoveFromDatabase, {.Run = [&removals] { ++removals; }});
     QTest::keyClick(songs_, Qt::Key_Delete);
     EXPECT_EQ(removals, 1);
     EXPECT_EQ(Listed(), u"02"_s);

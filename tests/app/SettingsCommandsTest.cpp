@@ -57,6 +57,7 @@ void ForEveryRow(const Action& action) {
     action(WindowSettings::kVolume);
     action(WindowSettings::kSpectrumStyle);
     action(WindowSettings::kLinkPath);
+    action(WindowSettings::kPlayOnlyThisSong);
 }
 
 // A way to a player program that is not there.
@@ -144,7 +145,7 @@ TEST_F(SettingsCommandsTest, OkWithoutATouchKeepsEveryAcceptedValue) {
         }
         Start(false);
         Work();
-        WithNext<TOptionsForm>([](TOptionsForm& form) { form.accept(); });
+        WithNext<QDialog>([](QDialog& form) { form.accept(); });
         ExtrasItem(u"Einstellungen..."_s)->trigger();
         EXPECT_EQ(dialogs_.Messages + dialogs_.Questions, QStringList());
         window_->close();

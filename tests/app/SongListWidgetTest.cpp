@@ -2,7 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <QContextMenuEvent>
 #include <QHeaderView>
 #include <QMenu>
 #include <QScrollBar>
@@ -11,6 +10,7 @@
 #include "app/models/FilteredSongs.h"
 #include "app/models/SongColumns.h"
 #include "app/models/SongListModel.h"
+#include "app/models/SongMime.h"
 #include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
@@ -59,48 +59,80 @@ class SongListWidgetTest : public testing::Test {
 };
 
 TEST_F(SongListWidgetTest, ClicksOnAHeaderSortForwardsThenBackwards) {
-    QHeaderView* header = list_.horizontalHeader();
-    ClickHeader(SongColumnId::Length);
-    EXPECT_EQ(FirstTitle(), u"Lied 399"_s);
-    EXPECT_EQ(header->sortIndicatorSection(), static_cast<int>(SongColumnId::Length));
-    EXPECT_EQ(header->sortIndicatorOrder(), Qt::AscendingOrder);
-
-    ClickHeader(SongColumnId::Length);
-    EXPECT_EQ(FirstTitle(), u"Lied 100"_s);
-    EXPECT_TRUE(database_.SortBackwards());
-    EXPECT_EQ(header->sortIndicatorOrder(), Qt::DescendingOrder);
-
+    for (const auto& [first, order] :
+         {std::pair(u"Lied 399"_s, Qt::AscendingOrder), std::pair(u"Lied 100"_s, Qt::DescendingOrder)}) {
+        ClickHeader(SongColumnId::Length);
+        EXPECT_EQ(FirstTitle(), first);
+        EXPECT_EQ(list_.horizontalHeader()->sortIndicatorSection(), static_cast<int>(SongColumnId::Length));
+        EXPECT_EQ(list_.horizontalHeader()->sortIndicatorOrder(), order);
+    }
     ClickHeader(SongColumnId::Title);
     EXPECT_EQ(database_.SortType(), stTitle);
     EXPECT_FALSE(database_.SortBackwards());
 }
 
-TEST_F(SongListWidgetTest, AColumnWithoutAnOrderDoesNotTakeTheArrow) {
+TEST_F(SongListWidgetTest, AColumnThatTheDatabaseDoesNotSortByIsSortedInTheList) {
+    for (const int row : {7, 9, 40}) {
+        TID3Tag song = database_.Song(row);
+        song.BitRate = static_cast<quint16>(row * 10);
+        database_.UpdateEntry(row, song);
+    }
+    model_.SyncViews();
+    Focus(9);
+    ClickHeader(SongColumnId::BitRate);
     ClickHeader(SongColumnId::BitRate);
     EXPECT_EQ(database_.SortType(), stTitle);
-    EXPECT_EQ(list_.horizontalHeader()->sortIndicatorSection(), static_cast<int>(SongColumnId::Title));
+    EXPECT_EQ(list_.horizontalHeader()->sortIndicatorSection(), static_cast<int>(SongColumnId::BitRate));
+    EXPECT_EQ(list_.horizontalHeader()->sortIndicatorOrder(), Qt::DescendingOrder);
+    QStringList first;
+    for (int row = 0; row < 4; ++row)
+        first << shown_.SongAt(row)->Title;
+    EXPECT_EQ(first, (QStringList{u"Lied 140"_s, u"Lied 109"_s, u"Lied 107"_s, u"Lied 100"_s}));
+    EXPECT_EQ(FocusedTitle(), u"Lied 109"_s);
+    list_.MarkAll();
+    EXPECT_EQ(list_.DraggedSongs().front().Hint, 40) << "a drag takes the songs as the list shows them";
+
+    ClickHeader(SongColumnId::Title);
+    EXPECT_EQ(FirstTitle(), u"Lied 100"_s);
+    EXPECT_FALSE(database_.SortBackwards());
+}
+
+TEST_F(SongListWidgetTest, TheListMovesSidewaysOnlyWhenTheUserMovesIt) {
+    QScrollBar& bar = *list_.horizontalScrollBar();
+    list_.resize(300, 400);
+    QApplication::processEvents();
+    bar.setValue(150);
+    for (const auto& move : std::initializer_list<std::function<void()>>{
+             [&] { Focus(200); }, [&] { QTest::keyClick(&list_, Qt::Key_End); }, [&] { list_.FocusSong(3); },
+             [&] {
+                 list_.SetOrder({stLength, sstGATL, false, 0});
+             },
+             [&] { QTest::mouseClick(list_.viewport(), Qt::LeftButton, {}, QPoint(295, 50)); }}) {
+        move();
+        EXPECT_EQ(bar.value(), 150);
+    }
+    QTest::keyClick(&list_, Qt::Key_Right);
+    EXPECT_GT(bar.value(), 150);
 }
 
 TEST_F(SongListWidgetTest, TheFocusedSongStaysInSightOnlyWhenWanted) {
-    Focus(2);
-    ClickHeader(SongColumnId::Length);
-    EXPECT_EQ(FocusedTitle(), u"Lied 102"_s);
-    EXPECT_TRUE(FocusVisible());
-
-    database_.SetFollowFocus(false);
-    ClickHeader(SongColumnId::Length);
-    ClickHeader(SongColumnId::Length);
-    list_.scrollToTop();
-    ClickHeader(SongColumnId::Title);
-    ClickHeader(SongColumnId::Title);
-    EXPECT_EQ(FocusedTitle(), u"Lied 102"_s);
-    EXPECT_FALSE(FocusVisible());
+    for (const bool wanted : {true, false}) {
+        database_.SetFollowFocus(wanted);
+        list_.SetOrder({stTitle, sstGATL, false, 0});
+        Focus(2);
+        ClickHeader(SongColumnId::Length);
+        EXPECT_EQ(FocusedTitle(), u"Lied 102"_s);
+        EXPECT_EQ(FocusVisible(), wanted);
+    }
 }
 
-TEST_F(SongListWidgetTest, TheFocusOutlivesASortFromElsewhere) {
+TEST_F(SongListWidgetTest, FocusAndMarksOutliveASortFromElsewhere) {
     Focus(5);
+    list_.selectionModel()->select(shown_.index(8, 0),
+                                   QItemSelectionModel::Select | QItemSelectionModel::Rows);
     database_.SetSortBackwards(true);
     EXPECT_EQ(FocusedTitle(), u"Lied 105"_s);
+    EXPECT_EQ(MarkedTitles(), QStringList({u"Lied 108"_s, u"Lied 105"_s}));
     EXPECT_TRUE(FocusVisible());
     EXPECT_EQ(list_.horizontalHeader()->sortIndicatorOrder(), Qt::DescendingOrder);
 }
@@ -119,14 +151,6 @@ TEST_F(SongListWidgetTest, SongsThatComeInAboveDoNotPushTheVisibleOnesAway) {
     EXPECT_EQ(TopTitle(), u"Aa"_s);
 }
 
-TEST_F(SongListWidgetTest, HomeAndEndGoThroughTheRows) {
-    Focus(20);
-    QTest::keyClick(&list_, Qt::Key_End);
-    EXPECT_EQ(list_.currentIndex().row(), 299);
-    QTest::keyClick(&list_, Qt::Key_Home);
-    EXPECT_EQ(list_.currentIndex().row(), 0);
-}
-
 TEST_F(SongListWidgetTest, ARefusedSortIsToldAndLeavesTheArrow) {
     ScriptedDialogs dialogs;
     database_.BeginBusy();
@@ -137,18 +161,6 @@ TEST_F(SongListWidgetTest, ARefusedSortIsToldAndLeavesTheArrow) {
 }
 
 // --- Focus and marks ---
-
-TEST_F(SongListWidgetTest, MarksAndFocusAreTwoThings) {
-    EXPECT_TRUE(list_.MarkedSongs().empty());
-    Focus(7);
-    list_.MarkAll();
-    EXPECT_EQ(list_.MarkedSongs().size(), 300U);
-    EXPECT_EQ(list_.MarkedSongs().front(), 0);
-    EXPECT_EQ(list_.MarkedSongs().back(), 299);
-    list_.InvertMarks();
-    EXPECT_TRUE(list_.MarkedSongs().empty());
-    EXPECT_EQ(list_.FocusedSong(), 7);
-}
 
 TEST_F(SongListWidgetTest, OnlyShownSongsAreMarked) {
     ScriptedDialogs dialogs;
@@ -165,6 +177,11 @@ TEST_F(SongListWidgetTest, OnlyShownSongsAreMarked) {
     EXPECT_EQ(MarkedTitles(), QStringList{u"Lied 115"_s});
     shown_.SetText(QString());
     EXPECT_EQ(MarkedTitles(), QStringList{u"Lied 115"_s});
+    Focus(7);
+    list_.MarkAll();
+    list_.InvertMarks();
+    EXPECT_TRUE(list_.MarkedSongs().empty());
+    EXPECT_EQ(list_.FocusedSong(), 7) << "the focus is no mark";
     list_.MarkAll();
     shown_.SetText(u"399"_s);
     EXPECT_EQ(list_.MarkedSongs(), std::vector<SongIndex>{299});
@@ -265,37 +282,21 @@ TEST_F(SongListWidgetTest, TheMenuOfTheHeaderChoosesColumns) {
     QHeaderView* header = list_.horizontalHeader();
     const auto choose = [&](const QString& caption) {
         Q_EMIT header->customContextMenuRequested(QPoint(5, 5));
-        auto* menu = list_.findChild<QMenu*>(u"columnMenu"_s);
-        for (QAction* action : menu->actions()) {
-            if (action->text().remove(u'&') != caption) continue;
-            action->trigger();
-            delete menu;
-            return true;
-        }
-        return false;
+        const std::unique_ptr<QMenu> menu(list_.findChild<QMenu*>(u"columnMenu"_s));
+        for (QAction* action : menu->actions())
+            if (action->text().remove(u'&') == caption) return action->trigger();
+        ADD_FAILURE() << caption.toStdString();
     };
-    const int channels = static_cast<int>(SongColumnId::Channels);
-    EXPECT_TRUE(header->isSectionHidden(channels));
-    EXPECT_TRUE(choose(u"Kanäle"_s));
-    EXPECT_FALSE(header->isSectionHidden(channels));
-    EXPECT_TRUE(choose(u"Titel"_s));
+    const QByteArray before = list_.SaveColumns();
+    choose(u"Kanäle"_s);
+    EXPECT_FALSE(header->isSectionHidden(static_cast<int>(SongColumnId::Channels)));
+    choose(u"Titel"_s);
     EXPECT_FALSE(header->isSectionHidden(0));
-
-    const int before = header->sectionSize(0);
-    EXPECT_TRUE(choose(u"Spaltenbreite anpassen"_s));
-    EXPECT_LT(header->sectionSize(0), before);
-    EXPECT_TRUE(choose(u"Alle Spalten zurücksetzen"_s));
-    EXPECT_EQ(header->sectionSize(0), before);
-    EXPECT_TRUE(header->isSectionHidden(channels));
-}
-
-TEST_F(SongListWidgetTest, TheMenuKeyAsksForTheMenuAtTheFocusedSong) {
-    QPoint asked;
-    list_.OnContextMenu = [&](const QPoint& position) { asked = position; };
-    Focus(200);
-    QContextMenuEvent event(QContextMenuEvent::Keyboard, QPoint(0, 0), QPoint(0, 0));
-    QApplication::sendEvent(list_.viewport(), &event);
-    EXPECT_EQ(list_.rowAt(list_.viewport()->mapFromGlobal(asked).y()), 200);
+    const int width = header->sectionSize(0);
+    choose(u"Spaltenbreite anpassen"_s);
+    EXPECT_LT(header->sectionSize(0), width);
+    choose(u"Alle Spalten zurücksetzen"_s);
+    EXPECT_EQ(list_.SaveColumns(), before);
 }
 
 }  // namespace

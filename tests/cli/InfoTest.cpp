@@ -3,6 +3,7 @@
 #include <QJsonArray>
 
 #include "tests/PrintQt.h"
+#include "tests/ReadMPEGHeader/Builders.h"
 #include "tests/cli/CommandRunner.h"
 
 using namespace Qt::StringLiterals;
@@ -13,19 +14,7 @@ class InfoTest : public CommandTest {};
 
 // A leading ID3v2.3 tag with one text frame; no audio behind it.
 std::vector<std::uint8_t> TaggedFile(std::string_view title) {
-    ByteWriter file;
-    const auto size = static_cast<std::uint32_t>(title.size()) + 1;
-    file.Raw("ID3");
-    file.U16Le(3);
-    file.U8(0);
-    file.U32Be(size + 10);
-    file.Raw("TIT2");
-    file.U32Be(size);
-    file.U16Be(0);
-    file.U8(0);
-    file.Raw(title);
-    file.Zeros(200);
-    return file.Bytes();
+    return Mp3Builder().Raw(Id3v2Builder().Text("TIT2", title).Build()).Zeros(200).Data();
 }
 
 }  // namespace

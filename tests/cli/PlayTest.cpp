@@ -1,4 +1,5 @@
 #include <QtEndian>
+#include <algorithm>
 #include <cmath>
 
 #include "tests/PrintQt.h"
@@ -8,38 +9,25 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr int kRate = 44100;  // of the mix
+constexpr int kRate = 44100;           // of the mix
+constexpr qsizetype kWaveHeader = 44;  // bytes
 
 class PlayTest : public CommandTest {
  protected:
     // A song that is one level (-1 to 1) from its beginning to its end, so that the mix tells who sounds how
     // loud.
     QString AddLevel(const QString& name, double level, quint32 seconds) {
-        constexpr quint32 kSongRate = 8000;
-        ByteWriter file;
-        file.Raw("RIFF");
-        file.U32Le(36 + seconds * kSongRate * 2);
-        file.Raw("WAVEfmt ");
-        file.U32Le(16);
-        file.U16Le(1);
-        file.U16Le(1);
-        file.U32Le(kSongRate);
-        file.U32Le(kSongRate * 2);
-        file.U16Le(2);
-        file.U16Le(16);
-        file.Raw("data");
-        file.U32Le(seconds * kSongRate * 2);
-        for (quint32 i = 0; i < seconds * kSongRate; ++i)
-            file.U16Le(static_cast<quint16>(std::lround(level * 32767)));
-        Put(Path(name), file.Bytes());
-        return Path(name);
+        folder_.Add(name, seconds);
+        QByteArray song = folder_.Get(name);
+        std::fill(song.begin() + kWaveHeader, song.end(), static_cast<char>(std::lround(128 + level * 128)));
+        return folder_.Put(name, song);
     }
     // Writes the mix, and keeps it.
     CommandResult WriteMix(const QStringList& words) {
         const CommandResult result = RunWords(
             QStringList{u"play"_s, u"--fast"_s, u"--output"_s, u"file:"_s + Path(u"mix.wav"_s)} + words);
         QFile file(Path(u"mix.wav"_s));
-        if (file.open(QIODevice::ReadOnly)) mix_ = file.readAll().mid(44);
+        if (file.open(QIODevice::ReadOnly)) mix_ = file.readAll().mid(kWaveHeader);
         return result;
     }
     double Seconds() const { return static_cast<double>(mix_.size()) / (4 * kRate); }

@@ -350,23 +350,3 @@ TEST_F(DatabaseFileTest, ViewsReserveNoMoreThanTheFileCanHold) {
     Load(database, OneSong().File());
     EXPECT_EQ(reserved, 1);
 }
-
-TEST_F(DatabaseFileTest, ListsThatDisagreeWithTheSongsDoNoHarm) {
-    DatabaseBuilder builder;
-    builder.SongCount(1).NoFolders().Number(3);
-    builder.Block("A", 512).Number(0x7FFFFFFF).Block("A", 512).Number(0x7FFFFFFF).Block("B", 512).Number(-5);
-    builder.Number(0).Number(1).Block("Kein Jahr", 128).Number(3).Number(0).Number(1).Number(0x7FFFFFFF);
-    TMusicDatabase database;
-    Load(database, builder.Song({"a", "", "A"}).Song({"b", "", "B"}).SongCount(2).File());
-    ASSERT_EQ(database.Count(), 2);
-    for (int i = 0; i < 3; ++i) {
-        TID3Tag song = database.Song(0);
-        song.Album += u'x';
-        database.UpdateEntry(0, song);
-        Add(database, song);
-    }
-    while (database.Count() > 0)
-        EXPECT_TRUE(database.RemoveEntry(0));
-    for (const auto& row : database.Artists())
-        EXPECT_GE(row.Number, 0);
-}

@@ -127,21 +127,4 @@ TEST(FolderWalkTest, NamesThatAreNoTextAreShownWithTheirBytes) {
                                               u"Ungültiger Ordnername: "_s + songs.Path(u"M\\xFCsik"_s)}));
 }
 
-TEST(FolderWalkTest, ATreeDeeperThanThePathsOfTheSystemEndsInAReason) {
-    const SongFolder songs;
-    songs.Add(u"z/1.wav"_s);
-    const std::string name(100, 'd');
-    int folder = ::open(QFile::encodeName(songs.Path()).constData(), O_RDONLY | O_DIRECTORY);
-    for (int depth = 0; depth < 60; ++depth) {
-        ASSERT_EQ(::mkdirat(folder, name.c_str(), 0700), 0);
-        const int next = ::openat(folder, name.c_str(), O_RDONLY | O_DIRECTORY);
-        ::close(folder);
-        folder = next;
-    }
-    ::close(folder);
-    const Walked walked = WalkAll(songs.Path());
-    EXPECT_EQ(walked.Files, songs.Paths({u"z/1.wav"_s}));
-    EXPECT_EQ(walked.Unreadable.size(), 1);
-}
-
 #endif

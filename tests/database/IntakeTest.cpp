@@ -60,13 +60,11 @@ class RecordingShell : public Shell {
         QFile file(path);
         EXPECT_TRUE(file.open(QIODevice::ReadOnly));
         Opened << path;
-        if (OnOpen) OnOpen();
         Text = QString::fromUtf8(file.readAll());
         return true;
     }
     QStringList Opened;
     QString Text;
-    std::function<void()> OnOpen;
 };
 
 }  // namespace
@@ -88,8 +86,9 @@ TEST_F(IntakeTest, PickedFilesAreReadPlacedAndReported) {
 
     ASSERT_EQ(dialogs_.FileDialogs.size(), 1u);
     EXPECT_EQ(dialogs_.FileDialogs[0].Filter, u"Musik|*.mp3;*.mp2;*.wma;*.wav;|Alle Dateien|*.*"_s);
-    EXPECT_EQ(dialogs_.Questions,
-              QStringList{u"Es wurde(n) 2 neue(r) Song(s) in die Datenbank aufgenommen."_s});
+    ASSERT_EQ(dialogs_.Reports.size(), 1u);
+    EXPECT_EQ(dialogs_.Reports[0].Message, u"Es wurde(n) 2 neue(r) Song(s) in die Datenbank aufgenommen."_s);
+    EXPECT_TRUE(dialogs_.Reports[0].HasComplaints());
     EXPECT_TRUE(dialogs_.Messages.isEmpty()) << "a file that cannot be read is passed over without a word";
 }
 
@@ -99,7 +98,7 @@ TEST_F(IntakeTest, ACancelledDialogEndsTheCommand) {
     EXPECT_EQ(dialogs_.FolderCaptions,
               QStringList{u"Ordner zum Durchsuchen nach Songs auswählen (inkl. Unterordner):"_s});
     EXPECT_TRUE(runs_.isEmpty());
-    EXPECT_TRUE(dialogs_.Questions.isEmpty());
+    EXPECT_TRUE(dialogs_.Reports.empty());
 }
 
 TEST_F(IntakeTest, AFolderIsSearchedWithOrWithoutItsSubfolders) {
@@ -111,7 +110,7 @@ TEST_F(IntakeTest, AFolderIsSearchedWithOrWithoutItsSubfolders) {
     EXPECT_EQ(result.Known, 1);
     EXPECT_EQ(result.Unreadable, 0);
     EXPECT_EQ(runs_.last(), u"MusicDatabase v6.0 - Dursuche Ordner nach neuen Songs"_s);
-    EXPECT_EQ(dialogs_.Questions.size(), 2);
+    EXPECT_EQ(dialogs_.Reports.size(), 2u);
 
     QStringList descriptions;
     for (const ProgressPoint& point : points_)
@@ -138,6 +137,35 @@ TEST_F(IntakeTest, EveryFifthFileIsAProgressPointWhereStoppingKeepsWhatWasTakenI
     EXPECT_EQ(names, QStringList{u"before"_s} + files.first(5));
     EXPECT_TRUE(result.Stopped);
     EXPECT_EQ(database_.Count(), 5);
+}
+
+TEST_F(IntakeTest, ReadingAheadChangesNothing) {
+    const HandClock clock;
+    QStringList files;
+    for (int i = 0; i < 300; ++i) {
+        const QString name = u"Band %1 - Title.%2"_s.arg(i % 7).arg(i);
+        // Whole, damaged in its head, empty, not there, a folder, offered a second time.
+        const QString path = i % 6 == 3 ? songs_.Path(name + u".mp3"_s) : songs_.Add(name + u".wav"_s, 1);
+        if (i % 6 == 1) QFile::resize(path, 20);
+        if (i % 6 == 2) QFile::resize(path, 0);
+        if (i % 6 == 4) QDir().mkpath(songs_.Path(name + u".mp2"_s));
+        files << (i % 6 == 4 ? songs_.Path(name + u".mp2"_s) : i % 6 == 5 ? files[i - 5] : path);
+    }
+    TMusicDatabase oneByOne;
+    QStringList expected;
+    for (const QString& path : files)
+        if (!oneByOne.Contains(path) && AddSongFile(oneByOne, path) >= 0) expected << path;
+    IntakeResult result;
+    QStringList list = files;
+    EXPECT_EQ(AddFileList(database_, list, true, nullptr, &result), 150);
+    EXPECT_EQ(list, expected);
+    EXPECT_EQ(result.NewFiles, expected);
+    EXPECT_EQ(result.Known, 50);
+    EXPECT_EQ(result.UnreadableNames.size(), 100);
+    EXPECT_EQ(result.UnreadableNames[0], u"Datei nicht gefunden: "_s + files[3]);
+    ASSERT_EQ(database_.Count(), oneByOne.Count());
+    for (int i = 0; i < oneByOne.Count(); ++i)
+        EXPECT_TRUE(database_.Song(i) == oneByOne.Song(i)) << i;
 }
 
 TEST_F(IntakeTest, StoppingTheWalkReadsNoSong) {
@@ -218,7 +246,7 @@ TEST_F(IntakeTest, FilesAndFoldersTogetherAreOneRunWithoutReport) {
                            u"Datei nicht gefunden: "_s + songs_.Path(u"gone.mp3"_s)}));
     EXPECT_EQ(result.Unreadable, 3);
     EXPECT_EQ(runs_.size(), 1);
-    EXPECT_TRUE(dialogs_.Questions.empty());
+    EXPECT_TRUE(dialogs_.Reports.empty());
 }
 
 TEST_F(IntakeTest, NothingBeginsWhileTheDatabaseCannotChange) {
@@ -268,9 +296,9 @@ TEST_F(IntakeTest, BannedSongsAreCountedAndThrownAwayWhenWanted) {
 
 TEST_F(IntakeTest, DetailsNameTheSongsAndWhatWasUnreadable) {
     RecordingShell shell;
-    dialogs_.Answers.push_back(1);
     const QStringList files = AddSongs(2) + songs_.Paths({u"gone.mp3"_s});
     AddSongsFromDialog(database_, files);
+    dialogs_.Reports.at(0).OpenAsText();
     ASSERT_EQ(shell.Opened.size(), 1);
     EXPECT_TRUE(shell.Opened[0].endsWith(u"/Tunestead - Änderungen in der Datenbank.txt"_s));
     EXPECT_NE(QFileInfo(shell.Opened[0]).path(), QDir::tempPath()) << "where everybody may put links";
@@ -297,11 +325,10 @@ TEST_F(IntakeTest, EachCommandSavesWithItsFoldersWhenAskedToAndBeforeItReports) 
     EXPECT_EQ(saved(), std::pair(1, songs_.Paths({u"1"_s})));
     AddPaths(database_, songs_.Paths({u"2"_s, u"1/A - 1.wav"_s}), true, GivenFolders::Remembered);
     EXPECT_EQ(saved(), std::pair(2, songs_.Paths({u"1"_s, u"2"_s})));
-    RecordingShell shell;
-    shell.OnOpen = [&] { EXPECT_EQ(saved().first, 3); };
-    dialogs_.Answers.push_back(1);
+    dialogs_.Reports.clear();
+    dialogs_.OnReport = [&] { EXPECT_EQ(saved().first, 3); };
     AddSongsFromDialog(database_, songs_.Paths({u"3/A - 3.wav"_s}));
-    EXPECT_EQ(shell.Opened.size(), 1);
+    EXPECT_EQ(dialogs_.Reports.size(), 1u);
 }
 
 TEST_F(IntakeTest, OneFileIsAddedWithWhatIsKnownBetter) {

@@ -87,7 +87,9 @@ TEST(PlayListFiles, TheModernRulesReadWhatOtherProgramsWrite) {
     EXPECT_EQ(Joined(Modern("a.mp3\n#b.mp3\n", u"/l/x.txt"_s)), u"/l/a.mp3|/l/#b.mp3"_s);
     EXPECT_EQ(Joined(Modern("#EXTINF:1,x\na.mp3\n", u"/l/x.txt"_s)), u"/l/a.mp3"_s);
     EXPECT_EQ(Joined(Modern("RUKPLYLST://radio\r\n/b.mp3\r\n", u"/l/x.pl"_s)), u"RUKPLYLST://radio|/b.mp3"_s);
-    EXPECT_THROW(Modern(std::string_view("RUKPLYLST\x01\x01", 11)), EUnknownPlayListVersion);
+    for (const auto& [file, name] :
+         {std::pair("RUKPLYLST\x01\x01", u"/l/x.pl"_s), {"RUKPLYLST??", u"/l/x.rpl"_s}})
+        EXPECT_THROW(Modern(file, name), EUnknownPlayListVersion);
 }
 
 TEST(PlayListFiles, TitlesAndLengthsAreThoseOfTheListUntilTheCollectionKnowsBetter) {
@@ -118,17 +120,13 @@ TEST(PlayListFiles, NamesAreMadeAbsolute) {
         {"a", u"a"_s},
         {"./x/../a, b & c.mp3", InCurrentFolder(u"a, b & c.mp3"_s)},
         {"/musik//a.mp3", u"/musik/a.mp3"_s},
-        {"C:\\Musik\\a.mp3", u"C:\\Musik\\a.mp3"_s},
         {":0a1B2C3d:\\a.mp3", u":0a1B2C3d:\\a.mp3"_s},
         {":0a1B2C3x:\\a.mp3", InCurrentFolder(u":0a1B2C3x:\\a.mp3"_s)},
         {"file:///musik/a%20b%C3%A4.mp3", u"/musik/a bä.mp3"_s},
         {"file:///musik/%E4.mp3", u"/musik/ä.mp3"_s},  // legacy bytes
-        {"FILE://localhost/a.mp3", u"/a.mp3"_s},
         {"file:/a#1?.mp3", u"/a#1?.mp3"_s},
-        {"file:///100%.mp3", u"/100%.mp3"_s},
         {"file:///a%00b.mp3", u"file:///a%00b.mp3"_s},
         {"file://server/a.mp3", u"file://server/a.mp3"_s},
-        {"http://radio.example/a b", u"http://radio.example/a b"_s},
         {"/musik/\xE4\xC3.mp3", u"/musik/äÃ.mp3"_s},
         {" x ", InCurrentFolder(u" x "_s)},
         {"#EXTGRP:Rock", InCurrentFolder(u"#EXTGRP:Rock"_s)},

@@ -48,7 +48,11 @@ inline constexpr PropertySetting kKeepLostSongs{Setting<bool>{u"KeepLostSongs", 
                                                 &TMusicDatabase::KeepLostSongs,
                                                 &TMusicDatabase::SetKeepLostSongs};
 
-inline constexpr std::tuple kRules{kModernTags, kKeepLostSongs};
+inline constexpr PropertySetting kDerivedGenres{Setting<bool>{u"DerivedGenres", false, true},
+                                                &TMusicDatabase::DerivedGenres,
+                                                &TMusicDatabase::SetDerivedGenres};
+
+inline constexpr std::tuple kRules{kModernTags, kKeepLostSongs, kDerivedGenres};
 
 inline constexpr std::tuple kOwn{kAutoSave,
                                  kCompression,

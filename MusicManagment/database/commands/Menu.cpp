@@ -122,15 +122,14 @@ DatabaseMenu::DatabaseMenu(TMusicDatabase& database) : database_(database) {
 Subscription DatabaseMenu::Handle(int id, CommandHandler handler) {
     auto kept = std::make_shared<CommandHandler>(std::move(handler));
     handlers_[id] = kept;
+    Changed.Tell();
     return Subscription(kept);
 }
 
 Subscription DatabaseMenu::Add(const ShellCommand& command, CommandHandler handler) {
     shellCommands_.push_back(command);
     menu_.reset();
-    Subscription subscription = Handle(command.Id, std::move(handler));
-    Changed.Tell();
-    return subscription;
+    return Handle(command.Id, std::move(handler));
 }
 
 std::shared_ptr<CommandHandler> DatabaseMenu::HandlerOf(int id) const {

@@ -2,7 +2,6 @@
 
 #include <QFileInfo>
 #include <algorithm>
-#include <array>
 #include <utility>
 
 #include "CommonRUKTools/AbsolutePath.h"
@@ -12,13 +11,13 @@
 #include "MusicManagment/database/intake/FolderWalk.h"
 #include "MusicManagment/database/intake/IntakeReport.h"
 #include "MusicManagment/database/intake/KnownSongs.h"
+#include "MusicManagment/database/intake/ReadAhead.h"
 #include "MusicManagment/database/intake/UpdateFolders.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr std::array kExtensions = {".mp3"_L1, ".mp2"_L1, ".wma"_L1, ".wav"_L1};
 constexpr int kFilesPerProgressPoint = 5;
 
 QString FileRunText() {
@@ -59,30 +58,18 @@ void NoteUnreadable(const QStringList& reasons, IntakeResult& result) {
     result.UnreadableNames << reasons;
 }
 
-// Empty when the file was read, else why not.
-QString ReadSong(const QString& path, const ReadOptions& options, TID3Tag& record) {
-    try {
-        const QString refusal = ReadAudioFile(path, options, record);
-        return refusal.isEmpty() ? refusal : refusal + u": "_s + path;
-    } catch (const EStreamError& error) {
-        return error.Message();
-    }
-}
-
-bool TakeIn(TMusicDatabase& database, const QString& path, const ReadOptions& options, IntakeResult& result) {
-    TID3Tag record;
-    const QString reason = ReadSong(path, options, record);
-    if (!reason.isEmpty()) {
-        NoteUnreadable(reason, result);
+bool TakeIn(TMusicDatabase& database, const QString& path, const SongReading& reading, IntakeResult& result) {
+    if (!reading.Succeeded()) {
+        NoteUnreadable(reading.Refusal.isEmpty() ? reading.Error : reading.Refusal + u": "_s + path, result);
         return false;
     }
-    if (database.AddEntry(path, record) >= 0) {
+    if (database.AddEntry(path, reading.Tag) >= 0) {
         ++result.Added;
         result.NewFiles << path;
-        if (record.BitRate == 0) result.DamagedFiles << path;
+        if (reading.Tag.BitRate == 0) result.DamagedFiles << path;
         return true;
     }
-    if (database.IsBanned(record)) {
+    if (database.IsBanned(reading.Tag)) {
         ++result.Banned;
         result.BannedFiles << path;
     } else {
@@ -214,19 +201,6 @@ QString AskForFolder(bool withSubfolders) {
 
 }  // namespace
 
-QString AcceptedExtensions() {
-    QString text;
-    for (const QLatin1StringView extension : kExtensions)
-        text += extension + u';';
-    return text;
-}
-
-bool IsSongFile(const QString& path) {
-    return std::any_of(kExtensions.begin(), kExtensions.end(), [&path](QLatin1StringView extension) {
-        return path.endsWith(extension, Qt::CaseInsensitive);
-    });
-}
-
 IntakeResult AddSongsFromDialog(TMusicDatabase& database, const QStringList& files) {
     RefuseWhenLocked(database);
     const QStringList chosen = files.isEmpty() ? AskForFiles() : files;
@@ -258,10 +232,16 @@ int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
     RefuseUnless(TakesSongs(database));
     IntakeResult unasked;
     IntakeResult& outcome = result != nullptr ? *result : unasked;
-    const QStringList candidates = std::exchange(list, {});
+    QStringList candidates = std::exchange(list, {});
+    for (QString& path : candidates)
+        path = StoredPath(path);
     KnownSongs known(database);
+    const auto isKnown = [&](const QString& path) { return checkExisting && known.Contains(path); };
+    // A progress point that nobody hears of, for the time in which nothing goes on.
+    const auto goOn = [&database] { return !database.Progress(database.LastProgress(), false, false); };
     ReadOptions options = database.AudioReadOptions();
-    for (qsizetype i = 0; i < candidates.size(); ++i) {
+    ReadAhead files(candidates, isKnown);
+    for (qsizetype i = 0; i < candidates.size() && !outcome.Stopped; ++i) {
         if (i % kFilesPerProgressPoint == 0) {
             outcome.Stopped = database.Progress(
                 {.Cur = i, .Max = candidates.size(), .Type = ptAddSongs, .Description = candidates[i]});
@@ -269,12 +249,15 @@ int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
             // The local time costs several system calls, so it is asked for only here.
             options.FileTime = CurrentClock().Now();
         }
-        const QString path = StoredPath(candidates[i]);
-        if (checkExisting && known.Contains(path)) {
+        const QString& path = files.Next(options);
+        if (isKnown(path)) {
             ++outcome.Known;
-        } else if (TakeIn(database, path, options, outcome)) {
+        } else if (const auto reading = files.Take(options, goOn)) {
+            if (!TakeIn(database, path, *reading, outcome)) continue;
             known.Add(path);
             list << path;
+        } else {
+            outcome.Stopped = true;
         }
     }
     if (newNames != nullptr) *newNames << list;

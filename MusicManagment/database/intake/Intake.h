@@ -4,6 +4,7 @@
 #include <QStringList>
 
 #include "MusicManagment/database/MusicManagment.h"
+#include "ReadMPEGHeader/SongFileKinds.h"
 
 // How songs enter the collection.
 
@@ -19,10 +20,6 @@ struct IntakeResult {
     QStringList DamagedFiles;     // taken in, but nothing was found in them that could be played
     QStringList UnreadableNames;  // each with the reason
 };
-
-// ".mp3;.mp2;.wma;.wav;": the extensions that make a file a song.
-QString AcceptedExtensions();
-bool IsSongFile(const QString& path);
 
 // What becomes of the folders that an intake was given.
 enum class GivenFolders {
@@ -47,7 +44,7 @@ IntakeResult AddPaths(TMusicDatabase& database, const QStringList& paths, bool w
 
 // Adds every file of `list` inside a run that is already going; afterwards `list` holds only those taken in.
 // With `checkExisting` files that are in the collection are passed over. Every 5th file is a progress point,
-// where the user can stop. Returns how many were taken in.
+// where the user can stop; while a slow disk is waited for, too. Returns how many were taken in.
 int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
                 QStringList* newNames = nullptr, IntakeResult* result = nullptr);
 // Adds one file; -1 when it does not exist or could not be taken in.

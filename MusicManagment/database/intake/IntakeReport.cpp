@@ -15,10 +15,11 @@ void AppendLines(const QStringList& lines, QString& text) {
         text += line + u'\n';
 }
 
-std::vector<ReportSection> Complaints(const IntakeResult& result) {
+// A ban is what the user wished, and so no complaint.
+std::vector<ReportSection> NotTaken(const IntakeResult& result) {
     return {{u"Nicht gelesen werden konnte(n)"_s, result.UnreadableNames, true},
             {u"Aufgenommen, aber ohne erkennbaren Ton"_s, result.DamagedFiles, true},
-            {u"Nicht aufgenommen, weil in der Bann-Liste"_s, result.BannedFiles, true}};
+            {u"Nicht aufgenommen, weil in der Bann-Liste"_s, result.BannedFiles}};
 }
 
 // Returns its path. In a folder of the user's own: in the common one others could put a link under the name.
@@ -53,7 +54,7 @@ QString IntakeDetails(const IntakeResult& result) {
     QString text =
         u"Folgende(r) Song(s) ("_s + QString::number(result.Added) + u") wurde(n) neu aufgenommen:\n"_s;
     AppendLines(result.NewFiles, text);
-    for (const ReportSection& section : Complaints(result)) {
+    for (const ReportSection& section : NotTaken(result)) {
         if (section.Lines.isEmpty()) continue;
         text += u'\n' + section.Caption + u" ("_s + QString::number(section.Lines.size()) + u"):\n"_s;
         AppendLines(section.Lines, text);
@@ -62,7 +63,7 @@ QString IntakeDetails(const IntakeResult& result) {
 }
 
 std::vector<ReportSection> IntakeSections(const IntakeResult& result) {
-    std::vector<ReportSection> sections = Complaints(result);
+    std::vector<ReportSection> sections = NotTaken(result);
     sections.insert(sections.begin(), {u"Neu aufgenommen"_s, result.NewFiles});
     return sections;
 }

@@ -14,10 +14,6 @@ bool HasEntries(const QString& folder) {
     return !QDir(folder).isEmpty(QDir::AllEntries | QDir::NoDotAndDotDot | QDir::Hidden | QDir::System);
 }
 
-QString FolderOf(const QString& path) {
-    return QFileInfo(path).path();
-}
-
 }  // namespace
 
 MissingFiles::MissingFiles(const QStringList& updateFolders) {

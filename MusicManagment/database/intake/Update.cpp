@@ -22,9 +22,10 @@ TID3Tag WithCollectionFields(TID3Tag read, const TID3Tag& known) {
     read.PlayCount = known.PlayCount;
     read.Reserved = known.Reserved;
     read.Flags = known.Flags;
-    read.MainGenre = known.MainGenre;
+    if ((known.Flags & sfLengthCorrect) != 0) read.Length = known.Length;
+    if (known.MainGenre != 0) read.MainGenre = known.MainGenre;
     read.AddTime = known.AddTime;
-    if (read.Genre == kNoGenre || read.Genre == MainGenreGenre(read.MainGenre)) read.Genre = known.Genre;
+    if (read.Genre == kNoGenre || read.Genre == MainGenreGenre(known.MainGenre)) read.Genre = known.Genre;
     return read;
 }
 
@@ -50,17 +51,14 @@ QStringList AllPaths(const TMusicDatabase& database) {
 }
 
 void RereadSong(TMusicDatabase& database, const QString& path, UpdateResult& result) {
-    TID3Tag read;
-    try {
-        if (!ReadAudioFile(path, database.AudioReadOptions(), read).isEmpty()) return;
-    } catch (const EStreamError& error) {
-        result.Intake.UnreadableNames << path + u": "_s + error.Message();
+    SongReading reading = ReadSong(path, database.AudioReadOptions());
+    if (!reading.Error.isEmpty()) {
+        result.Intake.UnreadableNames << path + u": "_s + reading.Error;
         ++result.Intake.Unreadable;
-        return;
     }
     const TID3Tag* known = database.Songs().Find(path);
-    if (known == nullptr) return;
-    read = WithCollectionFields(std::move(read), *known);
+    if (!reading.Succeeded() || known == nullptr) return;
+    TID3Tag read = WithCollectionFields(std::move(reading.Tag), *known);
     if (SameSong(read, *known)) return;
     if (database.UpdateEntry(database.IndexOf(path), std::move(read)) >= 0) result.Changed << path;
 }

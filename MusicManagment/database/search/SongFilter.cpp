@@ -119,6 +119,11 @@ QStringList SplitWords(QStringView text) {
     return words;
 }
 
+// "3:30" and "c:/" are no attempts at a field.
+bool LooksLikeField(QStringView name) {
+    return name.size() > 1 && std::all_of(name.begin(), name.end(), [](QChar c) { return c.isLetter(); });
+}
+
 // "artist:" or "bitrate:>=" on the way to something: the list is not emptied meanwhile.
 bool IsStillBeingTyped(QStringView value) {
     return std::all_of(value.begin(), value.end(), [](QChar c) { return QStringView(u"<>=.").contains(c); });
@@ -149,6 +154,17 @@ SongFilter SongFilter::Parse(QStringView text) {
 bool SongFilter::Matches(const TID3Tag& song) const {
     return std::all_of(terms_.begin(), terms_.end(),
                        [&song](const Term& term) { return term.Test(song) != term.Excludes; });
+}
+
+QStringList SongFilter::UnknownFields(QStringView text) {
+    QStringList unknown;
+    for (const QString& word : SplitWords(text)) {
+        const QStringView term = QStringView(word).mid(word.startsWith(u'-') ? 1 : 0);
+        const QStringView name = term.left(std::max<qsizetype>(term.indexOf(u':'), 0));
+        if (LooksLikeField(name) && FieldNamed(name) == nullptr && !unknown.contains(name))
+            unknown << name.toString();
+    }
+    return unknown;
 }
 
 QStringList SongFilter::FieldNames() {

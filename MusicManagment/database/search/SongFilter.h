@@ -19,6 +19,9 @@ class SongFilter {
     bool IsEmpty() const { return terms_.empty(); }
     bool Matches(const TID3Tag& song) const;
 
+    // What stands before a colon in `text` like a field's name and is none: such a word is looked for as it
+    // is.
+    static QStringList UnknownFields(QStringView text);
     // The names of the fields, for help and completion.
     static QStringList FieldNames();
 

@@ -13,8 +13,9 @@ namespace {
 
 // In the order of TSortType.
 QStringList SortTypes() {
-    return {u"Titel"_s, u"Artist"_s, u"Album"_s,       u"Kommentar"_s, u"Jahr"_s,  u"Länge"_s,
-            u"Genre"_s, u"Pfad"_s,   u"Beliebtheit"_s, u"Datum"_s,     u"Flags"_s, u"Cache-Typ"_s};
+    return {u"Titel"_s,           u"Artist"_s, u"Album"_s,       u"Kommentar"_s, u"Jahr"_s,  u"Länge"_s,
+            u"Genre"_s,           u"Pfad"_s,   u"Beliebtheit"_s, u"Datum"_s,     u"Flags"_s, u"Cache-Typ"_s,
+            u"Albumreihenfolge"_s};
 }
 
 // In the order of TSubSortType.

@@ -13,6 +13,7 @@
 #include "app/desktop/Icons.h"
 #include "app/dialogs/options/DurationBox.h"
 #include "app/models/SoundOutputs.h"
+#include "app/views/WindowSettings.h"
 
 using namespace Qt::StringLiterals;
 
@@ -85,11 +86,18 @@ void PlaybackPage::AddPlayList() {
     playListGroup_ = &list;
     fields_.Bind(AddCheck(list, u"RepeatAll"_s, u"Am Ende von &vorn beginnen"_s),
                  PlayListSettings::kRepeatAll.Row);
+    fields_.Bind(
+        AddCheck(list, u"PlayOnlyThisSong"_s, u"Doppelkli&ck spielt nur diesen Song"_s,
+                 u"Sonst werden danach die Songs gespielt, die ihm in der gezeigten Liste folgen."_s),
+        WindowSettings::kPlayOnlyThisSong);
     auto* copy =
         AddCheck(list, u"CopyMp3sBeforePlay"_s, u"Songs vor dem Abspielen &zwischenspeichern"_s,
                  u"Kopiert jeden Song vorher in den Ordner für temporäre Dateien, etwa von einer CD."_s);
     fields_.Bind(copy, PlayListSettings::kCopyMp3sBeforePlay.Row);
     AddTime(list, PlayListSettings::kScanTime.Row, u"Spielzeit beim Ans&pielen"_s);
+    auto* onlyThis = AddCheck(list, u"PlayOnlyThisSong"_s, u"Doppelklick spielt &nur diesen Song"_s,
+                              u"Sonst folgt, was in der gezeigten Liste unter ihm steht."_s);
+    fields_.Bind(onlyThis, WindowSettings::kPlayOnlyThisSong);
 }
 
 void PlaybackPage::AddEngines() {

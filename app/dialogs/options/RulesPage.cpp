@@ -6,11 +6,13 @@
 #include <algorithm>
 
 #include "MusicManagment/database/commands/DatabaseSettings.h"
+#include "MusicManagment/playback/PlayerSettings.h"
+#include "MusicManagment/playlist/PlayListSettings.h"
 #include "app/desktop/Icons.h"
 
 using namespace Qt::StringLiterals;
 
-RulesPage::RulesPage(const TMusicDatabase&)
+RulesPage::RulesPage(const TMusicDatabase& database)
     : OptionsPage(u"Regeln"_s, ThemeIcon(u"view-list-details"_s, QStyle::SP_FileDialogInfoView)),
       modern_(new QRadioButton(u"&Modern"_s)),
       classic_(new QRadioButton(u"&Klassisch"_s)),
@@ -27,9 +29,34 @@ RulesPage::RulesPage(const TMusicDatabase&)
                 u"Beim Öffnen einer Datenbank der Versionen 1.0 bis 1.2 bleiben auch Songs erhalten, "
                 "deren Datenträger nicht angeschlossen ist. Klassisch gehen sie verloren."_s),
         DatabaseSettings::kKeepLostSongs);
+    fields_.Bind(
+        AddRule(reading, DatabaseSettings::kDerivedGenres.Row.Name,
+                u"&Hauptgenre aus dem Genre des Tags ableiten"_s,
+                u"Neue Songs kommen gleich in die Gruppe, zu der ihr Genre gehört. Klassisch ist das "
+                "Hauptgenre unbekannt, bis Sie es wählen."_s),
+        DatabaseSettings::kDerivedGenres);
     AddText(reading,
             u"Gilt für Dateien, die von nun an gelesen werden. Songs, die schon in der Datenbank sind, "
             "liest „Datenbank updaten (Auch ID3-Tags auf Änderungen prüfen)...“ neu."_s);
+    QFormLayout& lists = AddGroup(u"PlayLists lesen"_s);
+    fields_.Bind(
+        AddRule(lists, PlayListSettings::kModernLists.Row.Name, u"&PlayLists anderer Programme"_s,
+                u"Versteht M3U, PLS und einfache Listen, wie sie heute geschrieben werden. Klassisch "
+                "wird erkannt, was die früheren Versionen erkannten."_s),
+        PlayListSettings::kModernLists.Row);
+    SetAvailable(lists, database.PlayList() != nullptr, u"Wird mit der PlayList wirksam."_s);
+    QFormLayout& playing = AddGroup(u"Abspielen"_s);
+    fields_.Bind(AddRule(playing, PlayerSettings::kKeepAlbums.Row.Name,
+                         u"Kein Ü&berblenden zwischen Songs eines Albums"_s,
+                         u"Songs, die auf einem Album aufeinander folgen, gehen am Ende ohne Überblendung "
+                         "ineinander über. Klassisch wird auch zwischen ihnen übergeblendet."_s),
+                 PlayerSettings::kKeepAlbums.Row);
+    fields_.Bind(AddRule(playing, PlayerSettings::kQuietFailures.Row.Name,
+                         u"&Nicht spielbare Songs in der Statuszeile melden"_s,
+                         u"Eine Meldung erscheint nur für den Song, den Sie selbst gewählt haben. Klassisch "
+                         "erscheint für jeden Versuch eine."_s),
+                 PlayerSettings::kQuietFailures.Row);
+    SetAvailable(playing, database.PlaySound() != nullptr, u"Wird mit dem Player wirksam."_s);
 }
 
 void RulesPage::AddChoice() {
@@ -72,10 +99,13 @@ void RulesPage::SetAll(bool modern) {
 }
 
 void RulesPage::ShowChoice() {
-    const auto modern = std::ranges::count_if(rules_, &QCheckBox::isChecked);
+    // A rule of a component that is not there says nothing.
+    const auto counts = [](const QCheckBox* rule) { return rule->parentWidget()->isEnabled(); };
+    const auto isModern = [&](const QCheckBox* rule) { return !counts(rule) || rule->isChecked(); };
+    const auto isClassic = [&](const QCheckBox* rule) { return !counts(rule) || !rule->isChecked(); };
     QRadioButton* choice = single_;
-    if (modern == std::ssize(rules_)) choice = modern_;
-    if (modern == 0) choice = classic_;
+    if (std::ranges::all_of(rules_, isModern)) choice = modern_;
+    if (std::ranges::all_of(rules_, isClassic)) choice = classic_;
     choice->setChecked(true);
     EnableRules();
 }
