@@ -16,6 +16,8 @@ inline constexpr Setting<QString> kLinkPath{u"LinkPath"};
 inline constexpr Setting<bool> kFirstTime{u"FirstTime", true};
 
 inline constexpr Setting<int> kOVType{u"OVType", ovArtist, ovArtist, kOverviewTypeCount - 1};
+// What a double click in the song list plays: false is also what follows there.
+inline constexpr Setting<bool> kPlayOnlyThisSong{u"PlayOnlyThisSong"};
 inline constexpr Setting<int> kVolume{u"Volume", 100, 0, 100};  // per cent
 inline constexpr Setting<int> kSpectrumStyle{u"SpectrumStyle", ssBars, ssBars, ssCircle};
 
