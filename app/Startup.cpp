@@ -67,6 +67,8 @@ bool Startup::OpenStandardDatabase() {
             return false;
         }
     }
+    // Each command saves into it when the user wants that.
+    RunCommand([this] { commands_.Files().MakeFolder(); });
     database_.SetFileName(path);
     if (!database_.Lock().IsElsewhere()) database_.Lock().Claim(path);  // there may be no file yet
     return true;

@@ -133,6 +133,8 @@ class Session {
         player_.SetEngines(options.Engines);
         const Rules rules = options.Classic ? Rules::Classic : Rules::Modern;
         player_.UseRules(rules);
+        // The terminal is no row of boxes, and a script wants to know of every song.
+        player_.SetQuietFailures(false);
         // The end of the list needs no message here.
         list_.OnAllFilesPlayed = [](TPlayList&, bool&) {};
         player_.OnPlayingStarted = [this](TPlaySound&) {

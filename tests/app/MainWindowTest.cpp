@@ -164,7 +164,8 @@ TEST_F(MainWindowTest, ADatabaseOnTheCommandLineIsLoadedWhenTheUserAgrees) {
     const QString other = folder_.Path(u"andere.TSDB"_s);
     Start({Music()});
     ASSERT_TRUE(Database().SaveDatabase(other, true));
-    Database().SetModified(false);
+    Database().Clear(true, true);
+    ASSERT_TRUE(Database().SaveDatabase());
 
     Start({other});
     EXPECT_EQ(dialogs_.Questions, QStringList{u"Soll diese Datenbank nun geladen werden:\r\n"_s + other});
@@ -200,6 +201,7 @@ TEST_F(MainWindowTest, ClosingDuringARunAsksAndNeverCloses) {
     MakeSongs(60);
     for (const int answer : {kNo, kYes}) {
         Start();
+        Database().Clear(true, true);
         dialogs_.Questions.clear();
         dialogs_.Answers = {answer};
         Drop({Music()});

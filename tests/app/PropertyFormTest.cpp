@@ -162,7 +162,7 @@ TEST(ToolWindows, TheSheetsFollowTheirSong) {
     database.AddEntry(QString(), song);
     QMainWindow window;
     ToolWindows tools(window, database);
-    const auto* tag = window.findChild<TID3TagForm*>();
+    const auto* tag = window.findChild<QDockWidget*>(u"ID3TagForm"_s);
     const auto text = [&](const QString& name) { return tag->findChild<QLineEdit*>(name)->text(); };
     tools.ShowSong(&database.Song(0));
     EXPECT_EQ(text(u"title"_s), u"Lied"_s);

@@ -120,6 +120,7 @@ TEST_F(SongListWidgetTest, TheFocusedSongStaysInSightOnlyWhenWanted) {
         database_.SetFollowFocus(wanted);
         list_.SetOrder({stTitle, sstGATL, false, 0});
         Focus(2);
+        list_.scrollToTop();
         ClickHeader(SongColumnId::Length);
         EXPECT_EQ(FocusedTitle(), u"Lied 102"_s);
         EXPECT_EQ(FocusVisible(), wanted);

@@ -52,7 +52,7 @@ RulesPage::RulesPage(const TMusicDatabase& database)
                          "ineinander über. Klassisch wird auch zwischen ihnen übergeblendet."_s),
                  PlayerSettings::kKeepAlbums.Row);
     fields_.Bind(AddRule(playing, PlayerSettings::kQuietFailures.Row.Name,
-                         u"&Nicht spielbare Songs in der Statuszeile melden"_s,
+                         u"Nicht &spielbare Songs in der Statuszeile melden"_s,
                          u"Eine Meldung erscheint nur für den Song, den Sie selbst gewählt haben. Klassisch "
                          "erscheint für jeden Versuch eine."_s),
                  PlayerSettings::kQuietFailures.Row);
