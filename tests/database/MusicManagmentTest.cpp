@@ -93,20 +93,6 @@ QString MessageOf(Command command) {
 
 }  // namespace
 
-TEST_F(MusicManagmentTest, ANewDatabaseHasTheDefaults) {
-    EXPECT_EQ(database_.Caption(), u"MusicDatabase v6.0"_s);
-    EXPECT_EQ(database_.AutoSave(), 0);
-    EXPECT_EQ(database_.Compression(), 1);
-    EXPECT_EQ(database_.SortType(), stGenre);
-    EXPECT_EQ(database_.SubSortType(), sstGATL);
-    EXPECT_FALSE(database_.SortBackwards() || database_.ReadOnly() || database_.Modified() ||
-                 database_.AutoDelBannedFiles() || database_.MoveMP3sAfterGenreChange());
-    EXPECT_TRUE(database_.FollowFocus() && database_.RenameAndMoveMP3s() && TMusicDatabase().Asynchronous());
-    EXPECT_EQ(database_.MP3NamePattern(), u"%ARTIST% - %TITLE%"_s);
-    EXPECT_EQ(database_.MP3MoveSubDirs().size(), 20);
-    EXPECT_EQ(database_.Groups().RowCount(ovGenre), 20);
-}
-
 TEST_F(MusicManagmentTest, AnAddedSongIsCountedThenTold) {
     EXPECT_EQ(database_.AddEntry(QString(), Song(u"B"_s, u"Band"_s, 3)), 0);
     EXPECT_EQ(log_.Take(), (QStringList{u"modified 1"_s, u"insert 0 0 Band 1"_s, u"insert 1 0 Album 1"_s,
@@ -142,15 +128,6 @@ TEST_F(MusicManagmentTest, WhatIsRefusedChangesNothing) {
 
     banned.Title = u"ohrwurm"_s;
     EXPECT_EQ(database_.AddEntry(QString(), banned), 0) << "the ban list tells cases apart";
-}
-
-TEST_F(MusicManagmentTest, OnlyCountingStoresNoSong) {
-    for (const QString& title : {u"A"_s, u"B"_s})
-        EXPECT_EQ(database_.AddEntry(QString(), Song(title), AddAs::CountedOnly), -1);
-    EXPECT_TRUE(database_.Modified());
-    EXPECT_EQ(database_.Count(), 0);
-    EXPECT_EQ(database_.Groups().RowSongCount(ovArtist, 0), 2);
-    EXPECT_EQ(database_.Groups().RowSongCount(ovGenre, 0), 2);
 }
 
 TEST_F(MusicManagmentTest, WithoutChecksASongIsOnlyPlaced) {
@@ -301,15 +278,6 @@ TEST_F(MusicManagmentTest, ProgressCountsUnknownsAndPercentages) {
     EXPECT_TRUE(database_.Progress({}));
     EXPECT_TRUE(database_.Progress({}, true));
     EXPECT_FALSE(database_.Progress({}));
-}
-
-TEST_F(MusicManagmentTest, CompressionTakesItsLevelsOnly) {
-    EXPECT_EQ(database_.Compression(), clFastest);
-    database_.SetCompression(clMax);
-    for (const int level : {-1, 4, 9})
-        EXPECT_EQ(MessageOf([&] { database_.SetCompression(level); }),
-                  QString::number(level) + u" ist keine gültige Kompressionsstufe."_s);
-    EXPECT_EQ(database_.Compression(), clMax);
 }
 
 TEST_F(MusicManagmentTest, AutoSaveTakesIntervalsAndTheTwoStops) {
