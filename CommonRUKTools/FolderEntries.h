@@ -1,10 +1,10 @@
 #pragma once
 
 #include <QString>
-#include <compare>
 #include <cstdint>
 #include <memory>
 #include <optional>
+#include <tuple>
 
 enum class EntryKind {
     File,
@@ -26,7 +26,11 @@ struct FolderIdentity {
     std::uint64_t Volume = 0;
     std::uint64_t Number = 0;
 
-    auto operator<=>(const FolderIdentity&) const = default;
+    bool operator==(const FolderIdentity&) const = default;
+    // Any order; for sets.
+    bool operator<(const FolderIdentity& other) const {
+        return std::tie(Volume, Number) < std::tie(other.Volume, other.Number);
+    }
 };
 
 // Nothing when there is no such folder.

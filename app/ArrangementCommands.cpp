@@ -3,9 +3,9 @@
 #include <QMainWindow>
 #include <QMenu>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/Errors.h"
-#include "app/CommandRunner.h"
 #include "app/views/SongListWidget.h"
 
 using namespace Qt::StringLiterals;

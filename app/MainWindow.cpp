@@ -14,6 +14,7 @@
 #include <QUrl>
 #include <QVBoxLayout>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/database/commands/Menu.h"
@@ -21,7 +22,6 @@
 #include "MusicManagment/database/intake/IntakeReport.h"
 #include "app/ArrangementCommands.h"
 #include "app/CommandMenu.h"
-#include "app/CommandRunner.h"
 #include "app/HelpMenu.h"
 #include "app/MainMenu.h"
 #include "app/Playing.h"

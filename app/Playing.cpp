@@ -7,10 +7,10 @@
 #include <QSet>
 #include <algorithm>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "MusicManagment/playlist/PlayListMenu.h"
-#include "app/CommandRunner.h"
 #include "app/MenuIcons.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/RaiseWindow.h"

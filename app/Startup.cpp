@@ -2,11 +2,11 @@
 
 #include <QFileInfo>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/intake/Intake.h"
 #include "app/CollectionCommands.h"
-#include "app/CommandRunner.h"
 #include "app/desktop/InstallationSteps.h"
 
 using namespace Qt::StringLiterals;

@@ -8,9 +8,9 @@
 #include <QUrl>
 #include <algorithm>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "MusicManagment/playback/PlaySound.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
-#include "app/CommandRunner.h"
 #include "app/desktop/MprisInterfaces.h"
 
 using namespace Qt::StringLiterals;

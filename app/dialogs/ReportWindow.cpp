@@ -14,7 +14,7 @@
 #include <QVBoxLayout>
 #include <algorithm>
 
-#include "app/CommandRunner.h"
+#include "CommonRUKTools/CommandRunner.h"
 
 using namespace Qt::StringLiterals;
 

@@ -6,8 +6,6 @@
 
 #include "MusicManagment/database/SongFields.h"
 
-using SongColumnId = SongFieldId;
-
 // A column of the song list: how a field of the songs is shown there.
 struct SongColumn {
     SongFieldId Id;

@@ -72,7 +72,7 @@ bool RestoreColumnLayout(QHeaderView& header, const QByteArray& saved) {
     if (columns.empty()) return false;
     int visual = 0;
     for (const auto& [id, width, hidden] : columns) {
-        const bool isTitle = id == static_cast<int>(SongColumnId::Title);
+        const bool isTitle = id == static_cast<int>(SongFieldId::Title);
         header.showSection(id);
         header.moveSection(header.visualIndex(id), visual++);
         header.resizeSection(id, width);

@@ -26,7 +26,7 @@ void ColumnMenu::AddColumns(QHeaderView& header) {
         QAction* action = addAction(column.Caption());
         action->setCheckable(true);
         action->setChecked(!header.isSectionHidden(section));
-        action->setEnabled(column.Id != SongColumnId::Title);  // a list of songs without names helps nobody
+        action->setEnabled(column.Id != SongFieldId::Title);  // a list of songs without names helps nobody
         connect(action, &QAction::toggled, &header,
                 [&header, section](bool shown) { header.setSectionHidden(section, !shown); });
     }

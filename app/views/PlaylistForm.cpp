@@ -12,8 +12,8 @@
 #include <QVBoxLayout>
 #include <algorithm>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "MusicManagment/playlist/PlayList.h"
-#include "app/CommandRunner.h"
 #include "app/desktop/Icons.h"
 #include "app/models/CollectionTotals.h"
 #include "app/models/SongMime.h"

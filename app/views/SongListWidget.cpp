@@ -8,9 +8,9 @@
 #include <QSet>
 #include <algorithm>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/MusicManagment.h"
-#include "app/CommandRunner.h"
 #include "app/models/FilteredSongs.h"
 #include "app/models/SongColumns.h"
 #include "app/models/SongMime.h"

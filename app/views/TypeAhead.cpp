@@ -12,7 +12,7 @@ namespace {
 
 // The title is looked for without the mark of a CD, as it is sorted.
 QString SearchedText(const SongColumn& column, const TID3Tag& song) {
-    return column.Id == SongColumnId::Title ? song.Title : column.Text(song);
+    return column.Id == SongFieldId::Title ? song.Title : column.Text(song);
 }
 
 bool IsOneLetter(const QString& text) {

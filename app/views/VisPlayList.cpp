@@ -9,8 +9,8 @@
 #include <algorithm>
 #include <optional>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "MusicManagment/playlist/PlayListMenu.h"
-#include "app/CommandRunner.h"
 #include "app/views/PlayListDelegate.h"
 #include "app/views/SongDrag.h"
 #include "app/views/SongMarks.h"

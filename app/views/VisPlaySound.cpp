@@ -8,9 +8,9 @@
 #include <algorithm>
 #include <limits>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "ReadMPEGHeader/DisplayTexts.h"
-#include "app/CommandRunner.h"
 #include "app/MenuIcons.h"
 #include "app/models/SoundOutputs.h"
 #include "app/views/ElidedLabel.h"

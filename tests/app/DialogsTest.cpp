@@ -14,8 +14,8 @@
 #include <QToolButton>
 #include <new>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/Errors.h"
-#include "app/CommandRunner.h"
 #include "app/dialogs/FileFilters.h"
 #include "app/dialogs/QtDialogs.h"
 #include "app/dialogs/ReportDisplay.h"

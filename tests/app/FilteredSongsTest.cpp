@@ -118,7 +118,7 @@ class RandomFilteringTest : public FilteredSongsTest, public testing::WithParamI
                 if (Pick(3) == 0)
                     shown_.SetOrder(std::nullopt);
                 else
-                    shown_.SetOrder(ShownOrder{static_cast<int>(SongColumnId::Track), Pick(2) == 0});
+                    shown_.SetOrder(ShownOrder{static_cast<int>(SongFieldId::Track), Pick(2) == 0});
                 break;
             default:
                 if (Pick(8) == 0) database_.Clear();

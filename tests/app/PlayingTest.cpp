@@ -8,9 +8,9 @@
 #include <QTemporaryDir>
 #include <QTest>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
-#include "app/CommandRunner.h"
 #include "app/MainMenu.h"
 #include "app/models/FilteredSongs.h"
 #include "app/views/PlaylistForm.h"

@@ -14,7 +14,7 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-QString Shown(const QAbstractItemModel& model, int row, SongColumnId column = SongColumnId::Title) {
+QString Shown(const QAbstractItemModel& model, int row, SongFieldId column = SongFieldId::Title) {
     return model.index(row, static_cast<int>(column)).data().toString();
 }
 
@@ -110,8 +110,8 @@ TEST_F(SongListModelTest, WhatIsNotKnownIsShownAsNothing) {
     database_.AddEntry(QString(), song);
     model_.SyncViews();
     EXPECT_EQ(Shown(model_, 0), u"Z"_s) << "no mark of a CD";
-    for (const SongColumnId column : {SongColumnId::Year, SongColumnId::Track, SongColumnId::Genre,
-                                      SongColumnId::Channels, SongColumnId::Flags})
+    for (const SongFieldId column : {SongFieldId::Year, SongFieldId::Track, SongFieldId::Genre,
+                                     SongFieldId::Channels, SongFieldId::Flags})
         EXPECT_EQ(Shown(model_, 0, column), QString());
 }
 

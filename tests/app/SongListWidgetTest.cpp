@@ -32,7 +32,7 @@ class SongListWidgetTest : public testing::Test {
         QApplication::processEvents();
     }
 
-    void ClickHeader(SongColumnId column) {
+    void ClickHeader(SongFieldId column) {
         QHeaderView* header = list_.horizontalHeader();
         const int x = header->sectionViewportPosition(static_cast<int>(column)) + 10;
         QTest::mouseClick(header->viewport(), Qt::LeftButton, {}, QPoint(x, header->height() / 2));
@@ -61,12 +61,12 @@ class SongListWidgetTest : public testing::Test {
 TEST_F(SongListWidgetTest, ClicksOnAHeaderSortForwardsThenBackwards) {
     for (const auto& [first, order] :
          {std::pair(u"Lied 399"_s, Qt::AscendingOrder), std::pair(u"Lied 100"_s, Qt::DescendingOrder)}) {
-        ClickHeader(SongColumnId::Length);
+        ClickHeader(SongFieldId::Length);
         EXPECT_EQ(FirstTitle(), first);
-        EXPECT_EQ(list_.horizontalHeader()->sortIndicatorSection(), static_cast<int>(SongColumnId::Length));
+        EXPECT_EQ(list_.horizontalHeader()->sortIndicatorSection(), static_cast<int>(SongFieldId::Length));
         EXPECT_EQ(list_.horizontalHeader()->sortIndicatorOrder(), order);
     }
-    ClickHeader(SongColumnId::Title);
+    ClickHeader(SongFieldId::Title);
     EXPECT_EQ(database_.SortType(), stTitle);
     EXPECT_FALSE(database_.SortBackwards());
 }
@@ -79,10 +79,10 @@ TEST_F(SongListWidgetTest, AColumnThatTheDatabaseDoesNotSortByIsSortedInTheList)
     }
     model_.SyncViews();
     Focus(9);
-    ClickHeader(SongColumnId::BitRate);
-    ClickHeader(SongColumnId::BitRate);
+    ClickHeader(SongFieldId::BitRate);
+    ClickHeader(SongFieldId::BitRate);
     EXPECT_EQ(database_.SortType(), stTitle);
-    EXPECT_EQ(list_.horizontalHeader()->sortIndicatorSection(), static_cast<int>(SongColumnId::BitRate));
+    EXPECT_EQ(list_.horizontalHeader()->sortIndicatorSection(), static_cast<int>(SongFieldId::BitRate));
     EXPECT_EQ(list_.horizontalHeader()->sortIndicatorOrder(), Qt::DescendingOrder);
     QStringList first;
     for (int row = 0; row < 4; ++row)
@@ -92,7 +92,7 @@ TEST_F(SongListWidgetTest, AColumnThatTheDatabaseDoesNotSortByIsSortedInTheList)
     list_.MarkAll();
     EXPECT_EQ(list_.DraggedSongs().front().Hint, 40) << "a drag takes the songs as the list shows them";
 
-    ClickHeader(SongColumnId::Title);
+    ClickHeader(SongFieldId::Title);
     EXPECT_EQ(FirstTitle(), u"Lied 100"_s);
     EXPECT_FALSE(database_.SortBackwards());
 }
@@ -121,7 +121,7 @@ TEST_F(SongListWidgetTest, TheFocusedSongStaysInSightOnlyWhenWanted) {
         list_.SetOrder({stTitle, sstGATL, false, 0});
         Focus(2);
         list_.scrollToTop();
-        ClickHeader(SongColumnId::Length);
+        ClickHeader(SongFieldId::Length);
         EXPECT_EQ(FocusedTitle(), u"Lied 102"_s);
         EXPECT_EQ(FocusVisible(), wanted);
     }
@@ -155,10 +155,10 @@ TEST_F(SongListWidgetTest, SongsThatComeInAboveDoNotPushTheVisibleOnesAway) {
 TEST_F(SongListWidgetTest, ARefusedSortIsToldAndLeavesTheArrow) {
     ScriptedDialogs dialogs;
     database_.BeginBusy();
-    ClickHeader(SongColumnId::Length);
+    ClickHeader(SongFieldId::Length);
     database_.EndBusy();
     EXPECT_EQ(dialogs.Messages, QStringList{u"Umsortieren der Datenbank ist momentan nicht möglich."_s});
-    EXPECT_EQ(list_.horizontalHeader()->sortIndicatorSection(), static_cast<int>(SongColumnId::Title));
+    EXPECT_EQ(list_.horizontalHeader()->sortIndicatorSection(), static_cast<int>(SongFieldId::Title));
 }
 
 // --- Focus and marks ---
@@ -251,11 +251,11 @@ TEST_F(SongListWidgetTest, LettersFindTheTextOfTheSortColumn) {
 TEST_F(SongListWidgetTest, ColumnsAreKeptAndRefused) {
     QHeaderView* header = list_.horizontalHeader();
     const QByteArray atFirst = list_.SaveColumns();
-    const int album = static_cast<int>(SongColumnId::Album);
-    const int title = static_cast<int>(SongColumnId::Title);
+    const int album = static_cast<int>(SongFieldId::Album);
+    const int title = static_cast<int>(SongFieldId::Title);
     header->moveSection(header->visualIndex(album), 0);
     header->resizeSection(album, 333);
-    header->hideSection(static_cast<int>(SongColumnId::Year));
+    header->hideSection(static_cast<int>(SongFieldId::Year));
     const QByteArray changed = list_.SaveColumns();
 
     list_.ResetColumns();
@@ -264,7 +264,7 @@ TEST_F(SongListWidgetTest, ColumnsAreKeptAndRefused) {
     EXPECT_EQ(list_.SaveColumns(), changed);
     EXPECT_EQ(header->visualIndex(album), 0);
     EXPECT_EQ(header->sectionSize(album), 333);
-    EXPECT_TRUE(header->isSectionHidden(static_cast<int>(SongColumnId::Year)));
+    EXPECT_TRUE(header->isSectionHidden(static_cast<int>(SongFieldId::Year)));
 
     for (qsizetype length = 0; length < changed.size(); ++length)
         EXPECT_EQ(list_.RestoreColumns(changed.left(length)), length > 4 && (length - 4) % 9 == 0) << length;
@@ -290,7 +290,7 @@ TEST_F(SongListWidgetTest, TheMenuOfTheHeaderChoosesColumns) {
     };
     const QByteArray before = list_.SaveColumns();
     choose(u"Kanäle"_s);
-    EXPECT_FALSE(header->isSectionHidden(static_cast<int>(SongColumnId::Channels)));
+    EXPECT_FALSE(header->isSectionHidden(static_cast<int>(SongFieldId::Channels)));
     choose(u"Titel"_s);
     EXPECT_FALSE(header->isSectionHidden(0));
     const int width = header->sectionSize(0);

@@ -10,11 +10,11 @@
 #include <QStyledItemDelegate>
 #include <QVBoxLayout>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/commands/Settings.h"
-#include "app/CommandRunner.h"
 #include "app/dialogs/PageScroller.h"
 #include "app/dialogs/options/CdsPage.h"
 #include "app/dialogs/options/DatabasePage.h"
