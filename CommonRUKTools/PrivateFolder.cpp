@@ -10,7 +10,7 @@ QString PrivateTemporaryFolder(const QString& name) {
     constexpr int kMostUsers = 100;
     const QString first = QDir::temp().filePath(name);
     for (int number = 1; number <= kMostUsers; ++number) {
-        const QString folder = number == 1 ? first : first + u' ' + QString::number(number);
+        QString folder = number == 1 ? first : first + u' ' + QString::number(number);
         if (MakePrivateFolder(folder)) return folder;
     }
     throw EStreamError(u"Kann den Ordner nicht anlegen: "_s + first);

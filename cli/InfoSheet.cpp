@@ -1,14 +1,13 @@
 #include "cli/InfoSheet.h"
 
-#include "CommonRUKTools/Clock.h"
-#include "MusicManagment/database/SongTypes.h"
-#include "ReadMPEGHeader/DisplayTexts.h"
-#include "ReadMPEGHeader/Genres.h"
+#include "MusicManagment/database/SongFields.h"
 #include "cli/Console.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
+
+using Id = SongFieldId;
 
 constexpr qsizetype kLabelWidth = 16;
 
@@ -25,35 +24,30 @@ void AddNumber(QString& sheet, const QString& label, qint64 number) {
     if (number > 0) AddRow(sheet, label, QString::number(number));
 }
 
+void AddFields(QString& sheet, const TID3Tag& tag, std::initializer_list<SongFieldId> ids) {
+    for (const SongFieldId id : ids)
+        AddText(sheet, QString::fromUtf16(FieldOf(id).Caption), FieldOf(id).Text(tag));
+}
+
 void AddTags(QString& sheet, const TID3Tag& tag) {
-    AddRow(sheet, u"Titel"_s, tag.Title);
-    AddRow(sheet, u"Interpret"_s, tag.Artist);
-    AddText(sheet, u"Album"_s, tag.Album);
-    AddText(sheet, u"Jahr"_s, tag.Year == u"0000"_s ? QString() : tag.Year);
-    AddNumber(sheet, u"Track"_s, tag.Track);
-    AddRow(sheet, u"Genre"_s, GenreName(tag.Genre) + (tag.Remix ? u" (Remix)"_s : QString()));
-    if (tag.MainGenre != 0) AddRow(sheet, u"Hauptgenre"_s, MainGenreLongName(tag.MainGenre));
-    AddText(sheet, u"Kommentar"_s, tag.Comment);
+    AddFields(sheet, tag, {Id::Title, Id::Artist, Id::Album, Id::Year, Id::Track, Id::Genre});
+    if (tag.MainGenre != 0) AddFields(sheet, tag, {Id::MainGenre});
+    AddFields(sheet, tag, {Id::Comment});
 }
 
 void AddTechnicalData(QString& sheet, const SongReading& reading) {
     const TID3Tag& tag = reading.Tag;
-    AddRow(sheet, u"Länge"_s, FormatLength(tag.Length, true));
-    AddRow(sheet, u"Format"_s, tag.MPEGLayer);
-    AddRow(sheet, u"Bitrate"_s,
-           FormatBitRate(tag.BitRate) +
-               (reading.Mpeg.VbrName.isEmpty() ? QString() : u" (VBR, "_s + reading.Mpeg.VbrName + u')'));
-    AddRow(sheet, u"Abtastrate"_s, FormatSampleRate(tag.SampleRate));
-    AddRow(sheet, u"Kanäle"_s, FormatChannelMode(tag.ChannelMode));
-    AddRow(sheet, u"Emphasis"_s, FormatEmphasis(tag.Emphasis));
-    AddText(sheet, u"Kennzeichen"_s, FormatHeaderFlags(tag));
-    AddNumber(sheet, u"Framegröße"_s, tag.FrameSize);
+    AddFields(sheet, tag, {Id::Length, Id::Format});
+    AddText(sheet, QString::fromUtf16(FieldOf(Id::BitRate).Caption),
+            FieldOf(Id::BitRate).Text(tag) +
+                (reading.Mpeg.VbrName.isEmpty() ? QString() : u" (VBR, "_s + reading.Mpeg.VbrName + u')'));
+    AddFields(sheet, tag, {Id::SampleRate, Id::Channels, Id::Emphasis, Id::HeaderFlags, Id::FrameSize});
     AddNumber(sheet, u"Frames"_s, reading.Mpeg.FrameCount);
 }
 
 void AddCollectionData(QString& sheet, const TID3Tag& tag) {
-    AddNumber(sheet, u"Gespielt"_s, tag.PlayCount);
-    if (tag.Flags != 0) AddRow(sheet, u"Songflags"_s, FormatSongFlags(tag.Flags));
+    if (tag.PlayCount > 0) AddFields(sheet, tag, {Id::PlayCount});
+    AddFields(sheet, tag, {Id::Flags});
 }
 
 void AddFrames(QString& sheet, const std::vector<FrameReport>& frames) {
