@@ -24,8 +24,7 @@ std::vector<ReportSection> NotTaken(const IntakeResult& result) {
 
 // Returns its path. In a folder of the user's own: in the common one others could put a link under the name.
 QString WriteDetails(const QString& details) {
-    const QString path =
-        PrivateTemporaryFolder(u"Tunestead"_s) + u"/Tunestead - Änderungen in der Datenbank.txt"_s;
+    QString path = PrivateTemporaryFolder(u"Tunestead"_s) + u"/Tunestead - Änderungen in der Datenbank.txt"_s;
     const QByteArray bytes = CodePage::ToSystem(details);
     SafeFile file(path);
     file.Write(AsBytes({bytes.constData(), static_cast<std::size_t>(bytes.size())}));
