@@ -13,7 +13,7 @@ void UndoList::Add(UndoStep step) {
 
 QStringList UndoList::TakeBack() {
     if (steps_.empty()) return {};
-    const QStringList songs = steps_.back().TakeBack();
+    QStringList songs = steps_.back().TakeBack();
     steps_.pop_back();
     Changed.Tell();
     return songs;
