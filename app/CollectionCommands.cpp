@@ -34,7 +34,7 @@ CollectionCommands::CollectionCommands(TMusicDatabase& database, StandardFiles f
         {mcSave, &CollectionCommands::Save},         {mcSaveAs, &CollectionCommands::SaveAs},
         {mcAddSongs, &CollectionCommands::AddSongs}, {mcAddFolder, &CollectionCommands::AddFolder}};
     for (const auto& [id, command] : commands)
-        handlers_ += database_.Commands().Handle(id, {.Run = [this, command] { (this->*command)(); }});
+        handlers_ += database_.Commands().Handle(id, {.Run = [this, run = command] { (this->*run)(); }});
 }
 
 void CollectionCommands::New() {
