@@ -2,9 +2,10 @@
 
 #include <QDir>
 
+#include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/Dialogs.h"
+#include "MusicManagment/database/Command.h"
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/database/intake/Intake.h"
 
 using namespace Qt::StringLiterals;

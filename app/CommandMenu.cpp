@@ -4,8 +4,8 @@
 #include <QActionGroup>
 #include <QMenu>
 
+#include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/CommandRunner.h"
-#include "CommonRUKTools/MenuItem.h"
 #include "app/MenuIcons.h"
 
 using namespace Qt::StringLiterals;
@@ -55,6 +55,10 @@ QString CaptionOf(const TMenuExItem& item, QString& taken) {
 
 }  // namespace
 
+CommandMenu::CommandMenu(CommandDispatcher& commands) : commands_(commands) {
+    changes_ = commands.Changed.Subscribe([this] { Update(); });
+}
+
 void CommandMenu::Fill(QMenu& menu, const TMenuExItem& parent) {
     menu.setToolTipsVisible(true);
     auto* group = new QActionGroup(&menu);
@@ -81,7 +85,8 @@ void CommandMenu::AddCommand(QMenu& menu, const TMenuExItem& item, QString& take
     action->setShortcuts(ShortcutsOf(item));
     action->setCheckable(item.Checkable());
     if (item.IsDefault()) menu.setDefaultAction(action);
-    QObject::connect(action, &QAction::triggered, &menu, Guarded([this, id = item.Id()] { run_(id); }));
+    QObject::connect(action, &QAction::triggered, &menu,
+                     Guarded([this, action, id = item.Id()] { commands_.Run(id, action); }));
     actions_.insert(item.Id(), action);
     BindAction(*action, item.Id());
 }
@@ -105,7 +110,8 @@ void CommandMenu::BindAction(QAction& action, int id) {
     view->addAction(&action);
 }
 
-void CommandMenu::Update(const TMenuExItem& root) {
+void CommandMenu::Update() {
+    const TMenuExItem& root = commands_.Menu();
     for (auto action = actions_.cbegin(); action != actions_.cend(); ++action) {
         const TMenuExItem* item = root.Find(action.key());
         if (item == nullptr) continue;

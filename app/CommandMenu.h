@@ -3,8 +3,10 @@
 #include <QHash>
 #include <QPointer>
 #include <QWidget>
-#include <functional>
 
+#include "CommonRUKTools/Listeners.h"
+
+class CommandDispatcher;
 class QAction;
 class QMenu;
 class TMenuExItem;
@@ -15,13 +17,13 @@ QString WithAccessKey(const QString& caption, QString& taken);
 // Marks those items of a menu that have no such letter yet.
 void AddAccessKeys(const QMenu& menu);
 
-// The command menu of a component as the toolkit shows it.
+// The command menu of a component as the toolkit shows it, always as it is now.
 class CommandMenu {
  public:
-    // `run` is given the number of the chosen command. What it throws is shown to the user.
-    explicit CommandMenu(std::function<void(int id)> run) : run_(std::move(run)) {}
+    // What a chosen command throws is shown to the user.
+    explicit CommandMenu(CommandDispatcher& commands);
 
-    // Adds the items below `parent` to a menu.
+    // Adds the items below `parent`, a part of the component's menu, to a menu.
     void Fill(QMenu& menu, const TMenuExItem& parent);
     // Forgets what was filled in. The caller deletes the menus.
     void Clear();
@@ -29,13 +31,14 @@ class CommandMenu {
     // them. Holds also for menus that are filled later.
     void Bind(int id, QWidget& view);
     // Enables, disables, marks and names the items as the component's menu says now.
-    void Update(const TMenuExItem& root);
+    void Update();
 
  private:
     void AddCommand(QMenu& menu, const TMenuExItem& item, QString& taken);
     void BindAction(QAction& action, int id);
 
-    std::function<void(int)> run_;
+    CommandDispatcher& commands_;
     QHash<int, QAction*> actions_;  // by number
     QHash<int, QPointer<QWidget>> views_;
+    Subscription changes_;
 };

@@ -3,8 +3,8 @@
 #include <QMenu>
 #include <QMenuBar>
 
-#include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/commands/Menu.h"
+#include "CommonRUKTools/CommandDispatcher.h"
+#include "MusicManagment/database/Command.h"
 
 using namespace Qt::StringLiterals;
 
@@ -15,38 +15,39 @@ constexpr int kOfTheList[] = {mcPlay, mcMarkAll, mcRemoveFromDatabase, mcRemoveF
 
 }  // namespace
 
-MainMenu::MainMenu(QMenuBar& bar, TMusicDatabase& database)
-    : bar_(bar), database_(database), commands_([&database](int id) { database.ClickMenuItem(id); }) {
-    changes_ = database.Commands().Changed.Subscribe([this] { Update(); });
-    Update();
+MainMenu::MainMenu(QMenuBar& bar, CommandDispatcher& commands)
+    : bar_(bar), commands_(commands), shown_(commands) {
+    changes_ = commands.Changed.Subscribe([this] { BuildWhenOther(); });
+    BuildWhenOther();
 }
 
 // Before the menus of others, which stay when these are built anew. One of the old menus may just be running
 // the command that is the reason.
 void MainMenu::Build() {
-    commands_.Clear();
+    shown_.Clear();
     for (QMenu* old : std::exchange(menus_, {})) {
         bar_.removeAction(old->menuAction());
         old->deleteLater();
     }
     QAction* next = bar_.actions().value(0);
     QString letters;
-    for (const auto& item : database_.Menu().Items()) {
+    for (const auto& item : commands_.Menu().Items()) {
         auto* menu = new QMenu(WithAccessKey(item->Caption(), letters), &bar_);
         bar_.insertMenu(next, menu);
         menus_ << menu;
-        commands_.Fill(*menu, *item);
+        shown_.Fill(*menu, *item);
         if (item->Find(mcPlay) != nullptr) songMenu_ = menu;
     }
 }
 
 void MainMenu::BindTo(QWidget& songList) {
     for (const int id : kOfTheList)
-        commands_.Bind(id, songList);
+        shown_.Bind(id, songList);
 }
 
-void MainMenu::Update() {
-    const TMenuExItem& menu = database_.Menu();
-    if (std::exchange(revision_, database_.Commands().Revision()) != database_.Commands().Revision()) Build();
-    commands_.Update(menu);
+void MainMenu::BuildWhenOther() {
+    commands_.Menu();
+    if (std::exchange(revision_, commands_.Revision()) == commands_.Revision()) return;
+    Build();
+    shown_.Update();
 }

@@ -6,12 +6,11 @@
 #include "app/CommandMenu.h"
 
 class QMenuBar;
-class TMusicDatabase;
 
-// The main window's menu: the commands of the database as the toolkit shows them, always as they are now.
+// The main window's menu: the commands of the database as the toolkit shows them.
 class MainMenu {
  public:
-    MainMenu(QMenuBar& bar, TMusicDatabase& database);
+    MainMenu(QMenuBar& bar, CommandDispatcher& commands);
 
     // The keys of commands that are about single songs then work only in their list.
     void BindTo(QWidget& songList);
@@ -20,13 +19,13 @@ class MainMenu {
 
  private:
     void Build();
-    void Update();
+    void BuildWhenOther();
 
     QMenuBar& bar_;
-    TMusicDatabase& database_;
+    CommandDispatcher& commands_;
     QList<QMenu*> menus_;
-    CommandMenu commands_;
-    int revision_ = 0;  // of the database's menu that is shown
+    CommandMenu shown_;
+    int revision_ = 0;  // of the menu that is shown
     QMenu* songMenu_ = nullptr;
     Subscription changes_;
 };

@@ -14,10 +14,11 @@
 #include <QUrl>
 #include <QVBoxLayout>
 
+#include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/RWReg.h"
-#include "MusicManagment/database/commands/Menu.h"
+#include "MusicManagment/database/Command.h"
 #include "MusicManagment/database/commands/Settings.h"
 #include "MusicManagment/database/intake/IntakeReport.h"
 #include "app/ArrangementCommands.h"
@@ -131,7 +132,7 @@ void TTunesteadMainWnd::SetUpMenu() {
         std::make_unique<SettingsCommands>(*this, database_, kSettingsKey.toString(), options_.SettingsFile);
     settingsCommands_->OnApplied = [this] { database_.Commands().Changed.Tell(); };
     HandleCommands();
-    menu_ = std::make_unique<MainMenu>(*menuBar(), database_);
+    menu_ = std::make_unique<MainMenu>(*menuBar(), database_.Commands());
     menu_->BindTo(*list_);
     playing_->AddMenusTo(*menuBar());
     QMenu& windows = *menuBar()->addMenu(u"Fe&nster"_s);
@@ -160,7 +161,7 @@ void TTunesteadMainWnd::SetUpToolWindows() {
 
 // Those that need the window itself; its parts handle theirs.
 void TTunesteadMainWnd::HandleCommands() {
-    DatabaseMenu& commands = database_.Commands();
+    CommandDispatcher& commands = database_.Commands();
     handlers_ += commands.Handle(mcFind, {.Run = [this] { filter_->Activate(); }});
     handlers_ += commands.Handle(mcFindNext, {.Run = [this] { FindNext(); }});
     handlers_ += commands.Add({.Id = scExit,

@@ -7,11 +7,13 @@
 #include <QSet>
 #include <algorithm>
 
+#include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/CommandRunner.h"
-#include "MusicManagment/database/commands/Menu.h"
+#include "MusicManagment/database/Command.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "MusicManagment/playlist/PlayListMenu.h"
 #include "app/MenuIcons.h"
+#include "app/ShellCommands.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/RaiseWindow.h"
 #include "app/models/CollectionTotals.h"
@@ -63,6 +65,7 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
     database.JoinSettings(followers_);
     handlers_ += database.Commands().Handle(mcPlay, {.Run = [this] { PlayChosen(); }});
     handlers_ += database.Commands().Handle(mcAddToPlayList, {.Run = [this] { AddChosen(); }});
+    handlers_ += player_.Commands().Handle(plPlay, {.Run = [this] { Play(); }});
     database.OnMarkSong = [this](TMusicDatabase&, SongIndex song) {
         if (!songs_.FocusSong(song) && OnDone) OnDone(u"Der Filter zeigt dieses Lied nicht."_s);
     };
@@ -90,7 +93,6 @@ void Playing::SetUpWindows(QMainWindow& window) {
     view.OnPlay = [this](int index) { RunCommand([&] { PlayChosenEntry(index); }); };
     view.OnContextMenu = [this](const QPoint& place) { contextMenu_->popup(place); };
     TVisPlaySound& panel = playerForm_->Panel();
-    panel.OnCommand = [this](int id) { RunPlayerCommand(id); };
     panel.Volume().Follow([this](float gain) {
         player_.SetGain(gain);
         if (mpris_) mpris_->Update();
@@ -119,10 +121,9 @@ void Playing::SetUpSpectrum(QMainWindow& window, SpectrumSource source) {
 void Playing::JoinDesktop(QMainWindow& window) {
     mpris_ = std::make_unique<Mpris>(
         player_, list_,
-        Mpris::Hooks{.Run = [this](int id) { RunPlayerCommand(id); },
-                     .OpenSong = [this](const QString& path) { OpenSong(path); },
+        Mpris::Hooks{.OpenSong = [this](const QString& path) { OpenSong(path); },
                      .Raise = [&window] { RaiseWindow(window, QString()); },
-                     .Quit = [&window] { window.close(); },
+                     .Quit = [this] { database_.ClickMenuItem(scExit); },
                      .Volume = [this] { return playerForm_->Panel().Volume().Part(); },
                      .SetVolume = [this](double volume) { playerForm_->Panel().Volume().SetPart(volume); }});
     mpris_->Register(QDBusConnection::sessionBus());
@@ -178,23 +179,14 @@ void Playing::AddTo(QMenu& menu) {
     AddDockAction(menu, *spectrumForm_);
 }
 
-void Playing::RunPlayListCommand(int id) {
-    RunCommand([&] { list_.ClickMenuItem(id); });
-}
-
-// Without a song "Play" begins with the list.
-void Playing::RunPlayerCommand(int id) {
-    RunCommand([&] {
-        if (id != plPlay || player_.GetStatus() != psClosed) {
-            player_.ClickMenuItem(id);
-            return;
-        }
-        const int entry = listForm_->View().CurrentEntry();
-        if (entry >= 0)
-            PlayChosenEntry(entry);
-        else
-            list_.PlayNext();
-    });
+// Without a song it begins with the list.
+void Playing::Play() {
+    if (player_.GetStatus() != psClosed) return player_.Play();
+    const int entry = listForm_->View().CurrentEntry();
+    if (entry >= 0)
+        PlayChosenEntry(entry);
+    else
+        list_.PlayNext();
 }
 
 // --- Songs of the collection ---

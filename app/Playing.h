@@ -67,8 +67,7 @@ class Playing {
     void AddChosen();
     void PlayChosenEntry(int index, SongIndex hint = -1);
     void PlayEntry(int index, SongIndex hint);
-    void RunPlayerCommand(int id);
-    void RunPlayListCommand(int id);
+    void Play();
 
     TMusicDatabase& database_;
     SongListWidget& songs_;
@@ -77,8 +76,8 @@ class Playing {
     TPlayList list_;
     TPlaySound player_;
     ShownFollowers followers_{list_};
-    CommandMenu listMenu_{[this](int id) { RunPlayListCommand(id); }};
-    CommandMenu playerMenu_{[this](int id) { RunPlayerCommand(id); }};
+    CommandMenu listMenu_{list_.Commands()};
+    CommandMenu playerMenu_{player_.Commands()};
     TPlaylistForm* listForm_;
     TPlayerForm* playerForm_;
     TSpectrumForm* spectrumForm_;

@@ -1,8 +1,8 @@
 #include "app/SettingsCommands.h"
 
+#include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/database/commands/Settings.h"
 #include "MusicManagment/database/intake/Update.h"
 #include "app/ShellCommands.h"

@@ -1,9 +1,10 @@
 #include "app/SongCommands.h"
 
+#include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/Shell.h"
+#include "MusicManagment/database/Command.h"
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/commands/Menu.h"
 #include "MusicManagment/database/songfiles/CopySongs.h"
 #include "MusicManagment/database/songfiles/Removal.h"
 #include "app/ShellCommands.h"

@@ -3,8 +3,9 @@
 #include <QMainWindow>
 #include <QMenu>
 
+#include "CommonRUKTools/CommandDispatcher.h"
+#include "MusicManagment/database/Command.h"
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/commands/Menu.h"
 #include "app/views/DockAction.h"
 #include "app/views/MusicOverview.h"
 #include "app/views/OverviewForm.h"

@@ -1,7 +1,8 @@
 #pragma once
 
-#include <QStringView>
 #include <span>
+
+#include "CommonRUKTools/Command.h"
 
 class TMusicDatabase;
 
@@ -55,24 +56,7 @@ enum MenuCommand : int {
     mcRenameCds = 514,
 };
 
-// A command of the database: what its menu says of it and what it does. Each belongs to the capability that
-// it starts, which lists it in a source of its own.
-struct DatabaseCommand {
-    enum class Mark { None, Switch, Radio };
-    enum class Needs { Nothing, Writing };
-
-    int Id = 0;
-    QStringView Caption{};
-    QStringView Keys{};  // as "Ctrl+Alt+N"
-    QStringView Icon{};  // its name in the freedesktop icon themes
-    // What the engine does, unless the shell has a handler of its own. None: it takes a window, or is still
-    // to be built. May throw.
-    void (*Run)(TMusicDatabase& database, int id) = nullptr;
-    Needs For = Needs::Nothing;
-    Mark Kind = Mark::None;
-    bool (*IsOn)(const TMusicDatabase& database, int id) = nullptr;  // whether its mark is set
-};
-
+using DatabaseCommand = ComponentCommand<TMusicDatabase>;
 using DatabaseCommands = std::span<const DatabaseCommand>;
 
 // One list a capability.

@@ -5,6 +5,7 @@
 
 #include "CommonRUKTools/Clock.h"
 #include "CommonRUKTools/Collation.h"
+#include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/FileSource.h"
 #include "CommonRUKTools/MusicFolder.h"

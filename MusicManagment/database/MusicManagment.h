@@ -22,7 +22,7 @@
 #include "ReadMPEGHeader/AudioFile.h"
 
 class CollectionEdit;
-class DatabaseMenu;
+class CommandDispatcher;
 class SettingsClient;
 class TMenuExItem;
 class TMusicDatabase;
@@ -255,8 +255,8 @@ class TMusicDatabase : public QObject {
     // Saves at once when AutoSave is -1; called at the end of every command that changes songs.
     void SaveAfterCommand();
 
-    // --- Command menu (commands/Menu.h, which knows the commands of all capabilities) ---
-    DatabaseMenu& Commands();
+    // --- Command menu (commands/Menu.cpp, which knows the commands of all capabilities) ---
+    CommandDispatcher& Commands();
     // Built at the first call and kept until ReadOnly changes.
     TMenuExItem& Menu();
     // Raises OnMenuItemClicked and then, unless the handler stops it, runs the command behind the item. False
@@ -324,8 +324,7 @@ class TMusicDatabase : public QObject {
     QStringList updateFolders_;
     SortedTextList bannList_;
     std::vector<CdName> cdNames_;
-    // Shared for the sake of its deleter: what it is need not be known here.
-    std::shared_ptr<DatabaseMenu> commands_;
+    std::unique_ptr<CommandDispatcher> commands_;
     ConversionSettings conversion_;
     std::vector<SettingsClient*> settingsClients_;
     QString mp3MoveRootDir_;

@@ -8,6 +8,7 @@
 #include <utility>
 
 #include "CommonRUKTools/Clock.h"
+#include "CommonRUKTools/CommandDispatcher.h"
 #include "MusicManagment/playback/ExternalTarget.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 
@@ -251,53 +252,7 @@ void TPlaySound::RedrawPanel() {
     events_.Changed.Tell();
 }
 
-// --- Menu ---
-
-TMenuExItem& TPlaySound::Menu() {
-    if (!menu_) menu_ = BuildPlaySoundMenu();
-    return *menu_;
-}
-
-// How the user's wish for another song is carried out.
-SongChange TPlaySound::ChangeOnDemand() const {
-    return Crossover() >= coAllChanges ? SongChange::CrossFade : SongChange::Hard;
-}
-
-// How the user's wish to stop is carried out.
-StopMode TPlaySound::StopOnDemand() const {
-    return Crossover() == coAlways ? StopMode::Fade : StopMode::AtOnce;
-}
-
-bool TPlaySound::ClickMenuItem(int id) {
-    switch (id) {
-        case plPlay:
-            Play();
-            return true;
-        case plPause:
-            PauseResume();
-            return true;
-        case plStop:
-            Stop(StopOnDemand());
-            return true;
-        case plPrevious:
-            if (playList_) playList_->PlayPrevious(ChangeOnDemand());
-            return true;
-        case plNext:
-            if (playList_) playList_->PlayNext(ChangeOnDemand());
-            return true;
-        case plBack:
-            MoveBy(-kStep);
-            return true;
-        case plForward:
-            MoveBy(kStep);
-            return true;
-        case plMarkSong:
-            MarkSong();
-            return true;
-        default:
-            return false;
-    }
-}
+// --- Commands ---
 
 void TPlaySound::MoveBy(qint64 milliseconds) {
     const qint64 end = GetLength() > 0 ? GetLength() : std::numeric_limits<quint32>::max();
@@ -315,3 +270,41 @@ SongIndex TPlaySound::SongInDatabase() const {
     if (song >= 0 || !playList_ || playList_->CurrentFile() != fileName_) return song;
     return database_->IndexOf(playList_->CurrentSong());
 }
+
+namespace {
+
+constexpr ComponentCommand<TPlaySound> kRows[] = {
+    {.Id = plPlay,
+     .Caption = u"Play",
+     .Keys = u"F5",
+     .Icon = u"media-playback-start",
+     .Run = [](TPlaySound& player, int) { player.Play(); },
+     .Image = 69},
+    {.Id = plPause,
+     .Caption = u"Pause",
+     .Keys = u"F6",
+     .Icon = u"media-playback-pause",
+     .Run = [](TPlaySound& player, int) { player.PauseResume(); },
+     .Image = 70},
+    {.Id = plBack,
+     .Caption = u"10 Sek zurück",
+     .Keys = u"Alt+Left",
+     .Icon = u"media-seek-backward",
+     .Run = [](TPlaySound& player, int) { player.MoveBy(-kStep); },
+     .Image = 74},
+    {.Id = plForward,
+     .Caption = u"10 Sek vor",
+     .Keys = u"Alt+Right",
+     .Icon = u"media-seek-forward",
+     .Run = [](TPlaySound& player, int) { player.MoveBy(kStep); },
+     .Image = 75},
+    {.Id = plMarkSong,
+     .Caption = u"Aktuelles Lied markieren",
+     .Icon = u"go-jump",
+     .Run = [](TPlaySound& player, int) { player.MarkSong(); },
+     .Image = 76},
+};
+
+}  // namespace
+
+constinit const PlayerCommands kSongCommands = kRows;

@@ -6,7 +6,6 @@
 #include <optional>
 
 #include "CommonRUKTools/Dialogs.h"
-#include "CommonRUKTools/MenuItem.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/commands/Settings.h"
 #include "MusicManagment/playback/ExternalPlayer.h"
@@ -22,7 +21,9 @@
 #include "MusicManagment/playlist/PlayList.h"
 #include "MusicManagment/playlist/SongPlayer.h"
 
+class CommandDispatcher;
 class ExternalTarget;
+class TMenuExItem;
 
 // Through this one component the whole program plays a song. It chooses an engine for the file, falls back to
 // others, fades from song to song, notices the end of a song, counts songs as played. Single-threaded.
@@ -60,10 +61,14 @@ class TPlaySound : public TPlaySoundContainer,
     void PauseResume() override;
     quint32 GetPosition() override;
     void SetPosition(quint32 milliseconds) override;
+    // Forwards or, below 0, backwards within the song.
+    void MoveBy(qint64 milliseconds);
     quint32 GetLength() override;
     TPSStatus GetStatus() override;
     // Does what leads to this status; psOpening and psSeeking are ignored.
     void SetStatus(TPSStatus status);
+    // Has the database mark the song that plays.
+    void MarkSong();
     // Returns when the song has ended or was stopped.
     enum class WaitMode { Block, KeepInterfaceAlive };
     void WaitForEnd(WaitMode mode);
@@ -139,9 +144,10 @@ class TPlaySound : public TPlaySoundContainer,
     const PlayTimers& Timers() const { return timers_; }
 
     // --- Command menu (PlaySoundMenu.h) ---
+    CommandDispatcher& Commands();
     // Built at the first call.
     TMenuExItem& Menu();
-    // Runs the operation behind an item; false when nobody knows the command. Throws what it throws.
+    // Runs the operation behind an item; false when it can do nothing. Throws what it throws.
     bool ClickMenuItem(int id);
 
     // --- Settings ---
@@ -185,9 +191,7 @@ class TPlaySound : public TPlaySoundContainer,
     void StartTimers();
     void StopTimers();
     void RestartAutoStop();
-    void MarkSong();
     SongIndex SongInDatabase() const;
-    void MoveBy(qint64 milliseconds);
 
     // PlaySoundFades.cpp
     bool FadesWanted() const;
@@ -253,5 +257,5 @@ class TPlaySound : public TPlaySoundContainer,
     QPointer<QObject> dspDraw_;
     PlayerPanel* panel_ = nullptr;
     PlayController* controller_ = nullptr;
-    std::unique_ptr<TMenuExItem> menu_;
+    std::unique_ptr<CommandDispatcher> commands_;
 };

@@ -2,6 +2,7 @@
 
 #include "MusicManagment/playback/ExternalTarget.h"
 #include "MusicManagment/playback/PlaySound.h"
+#include "MusicManagment/playback/PlaySoundMenu.h"
 
 // Two songs at once.
 
@@ -64,3 +65,48 @@ void TPlaySound::SetCOFileName(const QString& path) {
     if (path.isEmpty() || !FadesWanted()) return Chosen().CloseBeside();
     Reached(fileName_).PlayBeside(path);
 }
+
+// --- What the user wishes ---
+
+// How the user's wish for another song is carried out.
+SongChange TPlaySound::ChangeOnDemand() const {
+    return Crossover() >= coAllChanges ? SongChange::CrossFade : SongChange::Hard;
+}
+
+// How the user's wish to stop is carried out.
+StopMode TPlaySound::StopOnDemand() const {
+    return Crossover() == coAlways ? StopMode::Fade : StopMode::AtOnce;
+}
+
+namespace {
+
+constexpr ComponentCommand<TPlaySound> kRows[] = {
+    {.Id = plStop,
+     .Caption = u"Stop",
+     .Keys = u"F7",
+     .Icon = u"media-playback-stop",
+     .Run = [](TPlaySound& player, int) { player.Stop(player.StopOnDemand()); },
+     .Image = 71},
+    {.Id = plPrevious,
+     .Caption = u"Vorheriges",
+     .Keys = u"F9",
+     .Icon = u"media-skip-backward",
+     .Run =
+         [](TPlaySound& player, int) {
+             if (TPlayList* list = player.PlayList()) list->PlayPrevious(player.ChangeOnDemand());
+         },
+     .Image = 72},
+    {.Id = plNext,
+     .Caption = u"Nächstes",
+     .Keys = u"F10",
+     .Icon = u"media-skip-forward",
+     .Run =
+         [](TPlaySound& player, int) {
+             if (TPlayList* list = player.PlayList()) list->PlayNext(player.ChangeOnDemand());
+         },
+     .Image = 73},
+};
+
+}  // namespace
+
+constinit const PlayerCommands kFadeCommands = kRows;

@@ -1,8 +1,10 @@
 #pragma once
 
-#include <memory>
+#include <span>
 
-#include "CommonRUKTools/MenuItem.h"
+#include "CommonRUKTools/Command.h"
+
+class TPlaySound;
 
 // Numbers of the commands of the player's menu.
 enum PlayerCommand : int {
@@ -16,4 +18,8 @@ enum PlayerCommand : int {
     plMarkSong = 131,
 };
 
-std::unique_ptr<TMenuExItem> BuildPlaySoundMenu();
+using PlayerCommands = std::span<const ComponentCommand<TPlaySound>>;
+
+// One list a capability.
+extern const PlayerCommands kSongCommands;
+extern const PlayerCommands kFadeCommands;

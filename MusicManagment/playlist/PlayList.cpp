@@ -3,6 +3,8 @@
 #include <QFileInfo>
 #include <algorithm>
 
+#include "CommonRUKTools/CommandDispatcher.h"
+#include "MusicManagment/playlist/PlayListMenu.h"
 #include "MusicManagment/playlist/PlayListView.h"
 #include "MusicManagment/playlist/SongPlayer.h"
 
@@ -247,3 +249,35 @@ void TPlayList::ForwardChanges() {
     forwarding_ +=
         events_.Moved.Subscribe([forward = raise(ctChanged)](const std::vector<int>&) { forward(-1); });
 }
+
+// --- Commands ---
+
+namespace {
+
+constexpr ComponentCommand<TPlayList> kRows[] = {
+    {.Id = pcRemoveSelected,
+     .Caption = u"Markierte Einträge entfernen",
+     .Keys = u"Del",
+     .Icon = u"list-remove",
+     .Run =
+         [](TPlayList& list, int) {
+             if (const PlayListView* view = list.View()) list.Remove(view->SelectedEntries());
+         },
+     .Image = 65},
+    {.Id = pcMarkCurrent,
+     .Caption = u"Dieses Lied markieren",
+     .Keys = u"Ctrl+Shift+F",
+     .Icon = u"go-jump",
+     .Run = [](TPlayList& list, int) { list.MarkSong(); },
+     .Image = 66},
+    {.Id = pcRemoveUnavailable,
+     .Caption = u"Nicht verfügbare Lieder entfernen",
+     .Keys = u"Ctrl+Shift+Del",
+     .Icon = u"edit-clear-list",
+     .Run = [](TPlayList& list, int) { list.RemoveUnavailable(); },
+     .Image = 67},
+};
+
+}  // namespace
+
+constinit const PlayListCommands kEntryCommands = kRows;

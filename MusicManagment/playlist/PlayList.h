@@ -13,7 +13,6 @@
 #include <random>
 #include <vector>
 
-#include "CommonRUKTools/MenuItem.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/commands/Settings.h"
 #include "MusicManagment/playlist/EntryList.h"
@@ -21,9 +20,11 @@
 #include "MusicManagment/playlist/PlayListEvents.h"
 #include "MusicManagment/playlist/PlayListTypes.h"
 
+class CommandDispatcher;
 class PlayListView;
 struct EntryToSave;
 class SongPlayer;
+class TMenuExItem;
 
 // How one entry is played.
 struct PlayOptions {
@@ -127,6 +128,9 @@ class TPlayList : public QObject, public SettingsClient {
     void SetStandardFileName(const QString& fileName) { standardFileName_ = fileName; }
     // Makes the folder, and in it a link to each song. Throws EStreamError.
     void ExportAsLinks(const QString& folder);
+    // Each asks which, and does nothing when the user cancels.
+    void OpenFromDialog();
+    void ExportFromDialog();
 
     // --- Properties ---
     TPlayOrder PlayOrder() const { return playOrder_; }
@@ -164,9 +168,10 @@ class TPlayList : public QObject, public SettingsClient {
     void SetRandom(const std::mt19937& random) { random_ = random; }
 
     // --- Command menu (PlayListMenu.h) ---
+    CommandDispatcher& Commands();
     // Built at the first call.
     TMenuExItem& Menu();
-    // Runs the operation behind an item; false when nobody knows the command. Throws what it throws.
+    // Runs the operation behind an item; false when it can do nothing. Throws what it throws.
     bool ClickMenuItem(int id);
 
     // --- Settings ---
@@ -220,8 +225,6 @@ class TPlayList : public QObject, public SettingsClient {
     std::vector<PlayListEntry> ReadList(const QString& fileName) const;
     void Replace(std::vector<PlayListEntry> entries, const QString& fileName);
     std::vector<EntryToSave> EntriesForSaving() const;
-    void OpenFromDialog();
-    void ExportFromDialog();
 
     PlayListEvents events_;
     Subscriptions forwarding_;  // to OnChange
@@ -250,5 +253,5 @@ class TPlayList : public QObject, public SettingsClient {
     QPointer<QObject> remoteControl_;
     SongPlayer* player_ = nullptr;
     PlayListView* view_ = nullptr;
-    std::unique_ptr<TMenuExItem> menu_;
+    std::unique_ptr<CommandDispatcher> commands_;
 };

@@ -8,7 +8,7 @@
 #include "MusicManagment/playlist/PlayListMenu.h"
 #include "MusicManagment/playlist/PlayListView.h"
 
-// Loading and saving, and the commands of the menu.
+// Loading and saving, and the commands for that.
 
 using namespace Qt::StringLiterals;
 
@@ -103,13 +103,6 @@ void TPlayList::ExportAsLinks(const QString& folder) {
     WriteLinkFolder(folder, paths);
 }
 
-// --- Menu ---
-
-TMenuExItem& TPlayList::Menu() {
-    if (!menu_) menu_ = BuildPlayListMenu();
-    return *menu_;
-}
-
 void TPlayList::OpenFromDialog() {
     if (!MayBeReplaced()) return;
     const auto chosen = UserDialogs().OpenFile(
@@ -123,33 +116,45 @@ void TPlayList::ExportFromDialog() {
     if (folder && !folder->isEmpty()) ExportAsLinks(*folder);
 }
 
-bool TPlayList::ClickMenuItem(int id) {
-    switch (id) {
-        case pcNew:
-            if (MayBeReplaced()) SetPlayListFileName(QString());
-            return true;
-        case pcOpen:
-            OpenFromDialog();
-            return true;
-        case pcSave:
-            SaveOrAsk();
-            return true;
-        case pcSaveAs:
-            SaveOrAsk(true);
-            return true;
-        case pcExportAsLinks:
-            ExportFromDialog();
-            return true;
-        case pcRemoveSelected:
-            if (view_ != nullptr) Remove(view_->SelectedEntries());
-            return true;
-        case pcMarkCurrent:
-            MarkSong();
-            return true;
-        case pcRemoveUnavailable:
-            RemoveUnavailable();
-            return true;
-        default:
-            return false;
-    }
-}
+// --- Commands ---
+
+namespace {
+
+constexpr ComponentCommand<TPlayList> kRows[] = {
+    {.Id = pcNew,
+     .Caption = u"Neue PlayList",
+     .Keys = u"Ctrl+Shift+N",
+     .Icon = u"document-new",
+     .Run =
+         [](TPlayList& list, int) {
+             if (list.MayBeReplaced()) list.SetPlayListFileName(QString());
+         },
+     .Image = 60},
+    {.Id = pcOpen,
+     .Caption = u"PlayList öffnen...",
+     .Keys = u"Ctrl+Shift+O",
+     .Icon = u"document-open",
+     .Run = [](TPlayList& list, int) { list.OpenFromDialog(); },
+     .Image = 61},
+    {.Id = pcSave,
+     .Caption = u"PlayList speichern",
+     .Keys = u"Ctrl+Shift+S",
+     .Icon = u"document-save",
+     .Run = [](TPlayList& list, int) { list.SaveOrAsk(); },
+     .Image = 62},
+    {.Id = pcSaveAs,
+     .Caption = u"PlayList speichern unter...",
+     .Keys = u"Ctrl+Alt+Shift+S",
+     .Icon = u"document-save-as",
+     .Run = [](TPlayList& list, int) { list.SaveOrAsk(true); },
+     .Image = 63},
+    {.Id = pcExportAsLinks,
+     .Caption = u"PlayList als Link-Liste speichern...",
+     .Icon = u"folder-music",
+     .Run = [](TPlayList& list, int) { list.ExportFromDialog(); },
+     .Image = 64},
+};
+
+}  // namespace
+
+constinit const PlayListCommands kListFileCommands = kRows;

@@ -1,23 +1,29 @@
 #include "MusicManagment/playlist/PlayListMenu.h"
 
-#include "CommonRUKTools/MenuRows.h"
+#include "CommonRUKTools/CommandDispatcher.h"
+#include "MusicManagment/playlist/PlayList.h"
 
 namespace {
 
-constexpr MenuRow kRows[] = {
-    {u"Neue PlayList", pcNew, u"Ctrl+Shift+N", 60, u"document-new"},
-    {u"PlayList öffnen...", pcOpen, u"Ctrl+Shift+O", 61, u"document-open"},
-    {u"PlayList speichern", pcSave, u"Ctrl+Shift+S", 62, u"document-save"},
-    {u"PlayList speichern unter...", pcSaveAs, u"Ctrl+Alt+Shift+S", 63, u"document-save-as"},
-    {u"PlayList als Link-Liste speichern...", pcExportAsLinks, {}, 64, u"folder-music"},
-    {},
-    {u"Markierte Einträge entfernen", pcRemoveSelected, u"Del", 65, u"list-remove"},
-    {u"Dieses Lied markieren", pcMarkCurrent, u"Ctrl+Shift+F", 66, u"go-jump"},
-    {u"Nicht verfügbare Lieder entfernen", pcRemoveUnavailable, u"Ctrl+Shift+Del", 67, u"edit-clear-list"},
-};
+constexpr MenuLine kLines[] = {
+    pcNew,      pcOpen,           pcSave,        pcSaveAs,           pcExportAsLinks,
+    kSeparator, pcRemoveSelected, pcMarkCurrent, pcRemoveUnavailable};
+constexpr MenuOutline kMenu{u"PlayList", kLines};
 
 }  // namespace
 
-std::unique_ptr<TMenuExItem> BuildPlayListMenu() {
-    return BuildMenu(u"PlayList", kRows);
+CommandDispatcher& TPlayList::Commands() {
+    if (commands_) return *commands_;
+    commands_ = std::make_unique<CommandDispatcher>(kMenu);
+    for (const PlayListCommands& capability : {kListFileCommands, kEntryCommands})
+        commands_->Register(*this, capability);
+    return *commands_;
+}
+
+TMenuExItem& TPlayList::Menu() {
+    return Commands().Menu();
+}
+
+bool TPlayList::ClickMenuItem(int id) {
+    return Commands().Run(id);
 }

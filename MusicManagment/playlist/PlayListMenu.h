@@ -1,8 +1,10 @@
 #pragma once
 
-#include <memory>
+#include <span>
 
-#include "CommonRUKTools/MenuItem.h"
+#include "CommonRUKTools/Command.h"
+
+class TPlayList;
 
 // Numbers of the commands of the playlist's menu.
 enum PlayListCommand : int {
@@ -16,4 +18,8 @@ enum PlayListCommand : int {
     pcRemoveUnavailable = 203,
 };
 
-std::unique_ptr<TMenuExItem> BuildPlayListMenu();
+using PlayListCommands = std::span<const ComponentCommand<TPlayList>>;
+
+// One list a capability.
+extern const PlayListCommands kListFileCommands;
+extern const PlayListCommands kEntryCommands;

@@ -138,11 +138,12 @@ bool Mpris::CallPlayer(const QString& method, const QVariantList& arguments) {
     const auto* call = std::ranges::find(kCalls, QStringView(method), &PlayerCall::Method);
     const TPSStatus status = player_.GetStatus();
     if (call != std::end(kCalls))
-        hooks_.Run(call->Command == plPlay && status == psPaused ? static_cast<int>(plPause) : call->Command);
+        player_.ClickMenuItem(call->Command == plPlay && status == psPaused ? static_cast<int>(plPause)
+                                                                            : call->Command);
     else if (method == u"PlayPause"_s)
-        hooks_.Run(status == psPlaying || status == psPaused ? plPause : plPlay);
+        player_.ClickMenuItem(status == psPlaying || status == psPaused ? plPause : plPlay);
     else if (method == u"Pause"_s) {
-        if (status == psPlaying) hooks_.Run(plPause);
+        if (status == psPlaying) player_.ClickMenuItem(plPause);
     } else if (method == u"Seek"_s)
         Seek(player_.GetPosition() * kMicroseconds + arguments.value(0).toLongLong());
     else if (method == u"SetPosition"_s) {
@@ -160,8 +161,10 @@ bool Mpris::CallPlayer(const QString& method, const QVariantList& arguments) {
 void Mpris::Seek(qint64 microseconds) {
     if (player_.GetStatus() == psClosed) return;
     const qint64 position = std::max(microseconds, qint64{0}) / kMicroseconds;
-    if (position > player_.GetLength()) return hooks_.Run(plNext);
-    player_.SetPosition(static_cast<quint32>(position));
+    if (position > player_.GetLength())
+        player_.ClickMenuItem(plNext);
+    else
+        player_.SetPosition(static_cast<quint32>(position));
 }
 
 // --- Properties ---

@@ -18,7 +18,6 @@ class Mpris : public QDBusVirtualObject {
  public:
     // What other parts of the program do for the desktop.
     struct Hooks {
-        std::function<void(int command)> Run;  // of the player's menu (PlaySoundMenu.h)
         std::function<void(const QString& path)> OpenSong;
         std::function<void()> Raise;
         std::function<void()> Quit;

@@ -9,6 +9,7 @@
 #include <limits>
 
 #include "CommonRUKTools/CommandRunner.h"
+#include "CommonRUKTools/MenuItem.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "ReadMPEGHeader/DisplayTexts.h"
 #include "app/MenuIcons.h"
@@ -102,16 +103,14 @@ QWidget* TVisPlaySound::MakeButtons() {
     next_ = AddButton(*row, plNext, u"Nächstes (F10)"_s);
     row->addStretch(1);
     const auto press = [this](QToolButton* button, int command) {
-        connect(button, &QToolButton::clicked, this, [this, command] {
-            if (OnCommand) OnCommand(command);
-        });
+        connect(button, &QToolButton::clicked, this,
+                Guarded([this, command] { player_.ClickMenuItem(command); }));
     };
     press(previous_, plPrevious);
     press(stop_, plStop);
     press(next_, plNext);
-    connect(play_, &QToolButton::clicked, this, [this] {
-        if (OnCommand) OnCommand(player_.GetStatus() == psPlaying ? plPause : plPlay);
-    });
+    connect(play_, &QToolButton::clicked, this,
+            Guarded([this] { player_.ClickMenuItem(player_.GetStatus() == psPlaying ? plPause : plPlay); }));
     return buttons;
 }
 

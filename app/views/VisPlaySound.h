@@ -1,7 +1,6 @@
 #pragma once
 
 #include <QWidget>
-#include <functional>
 
 #include "MusicManagment/playback/PlaySound.h"
 #include "app/models/PlayingSong.h"
@@ -20,9 +19,6 @@ class TVisPlaySound : public QWidget, public PlayerPanel {
  public:
     TVisPlaySound(TPlaySound& player, const TPlayList& list, QWidget* parent = nullptr);
     ~TVisPlaySound() override;
-
-    // A button was pressed; `command` is of the player's menu (PlaySoundMenu.h).
-    std::function<void(int command)> OnCommand;
 
     const PlayingSong& Song() const { return song_; }
     VolumeSlider& Volume() { return *volume_; }

@@ -17,8 +17,9 @@
 #include <QTimer>
 #include <QUrl>
 
+#include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/Trash.h"
-#include "MusicManagment/database/commands/Menu.h"
+#include "MusicManagment/database/Command.h"
 #include "app/desktop/Installation.h"
 #include "app/desktop/SingleInstance.h"
 #include "app/dialogs/ProgressWindow.h"

@@ -10,6 +10,7 @@
 #include <QTemporaryDir>
 #include <QTest>
 
+#include "CommonRUKTools/CommandDispatcher.h"
 #include "MusicManagment/playback/PlaySound.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "tests/PrintQt.h"
@@ -29,6 +30,8 @@ class MprisTest : public testing::Test {
     void SetUp() override {
         ASSERT_TRUE(mpris_.Register(bus_.Connect(u"player"_s)));
         player_.SetPlayList(&list_);
+        for (const int id : {plPlay, plPause, plStop, plPrevious, plNext})
+            handlers_ += player_.Commands().Handle(id, {.Run = [this, id] { commands_ << id; }});
         for (const QString& name : {u"a"_s, u"b"_s}) {
             QFile file(folder_.filePath(name + u".mp3"_s));
             EXPECT_TRUE(file.open(QIODevice::WriteOnly));
@@ -66,13 +69,13 @@ class MprisTest : public testing::Test {
     TPlayList list_;
     TPlaySound player_{ScriptedEngines(song_)};
     QList<int> commands_;
+    Subscriptions handlers_;
     QString opened_;
     int raised_ = 0;
     double volume_ = 0.75;
     Mpris mpris_{player_,
                  list_,
-                 {.Run = [this](int command) { commands_ << command; },
-                  .OpenSong = [this](const QString& path) { opened_ = path; },
+                 {.OpenSong = [this](const QString& path) { opened_ = path; },
                   .Raise = [this] { ++raised_; },
                   .Quit = [] {},
                   .Volume = [this] { return volume_; },

@@ -8,8 +8,9 @@
 #include <QTemporaryDir>
 #include <QTest>
 
+#include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/CommandRunner.h"
-#include "MusicManagment/database/commands/Menu.h"
+#include "MusicManagment/database/Command.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "app/MainMenu.h"
 #include "app/models/FilteredSongs.h"
@@ -49,7 +50,7 @@ class PlayingTest : public testing::Test {
         database_.AddEntry(QString(), song);
     }
     void Start() {
-        menu_ = std::make_unique<MainMenu>(*window_.menuBar(), database_);
+        menu_ = std::make_unique<MainMenu>(*window_.menuBar(), database_.Commands());
         menu_->BindTo(*songs_);
         playing_ = std::make_unique<Playing>(window_, database_, *songs_,
                                              PlayingOptions{StandardList(), ScriptedEngines(song_), {}});

@@ -31,7 +31,6 @@ class VisPlaySoundTest : public testing::Test {
         }
         panel_.resize(900, 60);
         panel_.show();
-        panel_.OnCommand = [this](int command) { commands_ << command; };
     }
 
     QString Text(const QString& name) const { return panel_.findChild<QLabel*>(name)->text(); }
@@ -49,7 +48,6 @@ class VisPlaySoundTest : public testing::Test {
     TPlayList list_;
     TPlaySound player_{ScriptedEngines(song_)};
     TVisPlaySound panel_{player_, list_};
-    QList<int> commands_;
 };
 
 TEST_F(VisPlaySoundTest, TheVolumeIsToldAndKept) {
@@ -86,16 +84,15 @@ TEST_F(VisPlaySoundTest, ShowsTheSongAndItsTimes) {
 }
 
 TEST_F(VisPlaySoundTest, OneButtonPlaysAndPauses) {
-    Button(plPlay)->click();
     ASSERT_TRUE(list_.PlayEntry(0));
     EXPECT_EQ(Button(plPlay)->accessibleName(), u"Pause"_s);
     EXPECT_TRUE(Button(plStop)->isEnabled());
     Button(plPlay)->click();
-    player_.PauseResume();
+    EXPECT_EQ(song_.Status, psPaused);
     EXPECT_EQ(Button(plPlay)->accessibleName(), u"Play"_s);
     Button(plPlay)->click();
-    EXPECT_EQ(commands_, QList<int>({plPlay, plPause, plPlay}));
-    player_.Stop();
+    EXPECT_EQ(song_.Status, psPlaying);
+    Button(plStop)->click();
     EXPECT_FALSE(Button(plStop)->isEnabled());
 }
 

@@ -1,4 +1,4 @@
-#include "MusicManagment/database/commands/Menu.h"
+#include "CommonRUKTools/CommandDispatcher.h"
 
 #include <gtest/gtest.h>
 
@@ -18,10 +18,8 @@ int CountOf(const TMenuExItem& menu) {
 TEST(Menu, AReadOnlyDatabaseHasOnlyWhatDoesNotWrite) {
     TMusicDatabase database;
     EXPECT_EQ(CountOf(database.Menu()), 5);
-    EXPECT_EQ(CountOf(*database.Menu().Items()[1]), 12);
     database.SetReadOnly(true);
     EXPECT_EQ(CountOf(database.Menu()), 3);
-    EXPECT_EQ(database.Menu().Items()[0]->Caption(), u"Bearbeiten"_s);
     for (const int id : {221, 222, 223, 224, 311, 403, 404, 501})
         EXPECT_EQ(database.Menu().Find(id), nullptr) << id;
     EXPECT_EQ(CountOf(*database.Menu().Items()[2]), 5);

@@ -5,7 +5,11 @@
 namespace {
 
 constexpr DatabaseCommand kRows[] = {
-    {.Id = mcPlay, .Caption = u"Abspielen", .Keys = u"Return", .Icon = u"media-playback-start"},
+    {.Id = mcPlay,
+     .Caption = u"Abspielen",
+     .Keys = u"Return",
+     .Icon = u"media-playback-start",
+     .IsDefault = true},
     {.Id = mcAddToPlayList, .Caption = u"Zur PlayList hinzufügen", .Icon = u"media-playlist-append"},
 };
 
