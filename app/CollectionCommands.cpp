@@ -31,9 +31,10 @@ CollectionCommands::CollectionCommands(TMusicDatabase& database, StandardFiles f
     : database_(database), files_(std::move(files)), bannList_(database.BannList(), files_) {
     database_.Lock().SetWanted(true);
     const std::pair<int, void (CollectionCommands::*)()> commands[] = {
-        {mcNew, &CollectionCommands::New},           {mcOpen, &CollectionCommands::Open},
-        {mcSave, &CollectionCommands::Save},         {mcSaveAs, &CollectionCommands::SaveAs},
-        {mcAddSongs, &CollectionCommands::AddSongs}, {mcAddFolder, &CollectionCommands::AddFolder}};
+        {mcNew, &CollectionCommands::New},
+        {mcOpen, &CollectionCommands::Open},
+        {mcSave, &CollectionCommands::Save},
+        {mcAddFolder, &CollectionCommands::AddFolder}};
     for (const auto& [id, command] : commands)
         handlers_ += database_.Commands().Handle(id, {.Run = [this, run = command] { (this->*run)(); }});
 }
@@ -52,14 +53,6 @@ void CollectionCommands::OpenFile(const QString& path) {
 
 void CollectionCommands::Save() {
     SaveCurrent();
-}
-
-void CollectionCommands::SaveAs() {
-    database_.SaveDatabase(QString(), false, true);
-}
-
-void CollectionCommands::AddSongs() {
-    AddSongsFromDialog(database_);
 }
 
 void CollectionCommands::AddFolder() {

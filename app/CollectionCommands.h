@@ -10,8 +10,8 @@
 class TMusicDatabase;
 struct IntakeResult;
 
-// What the user can do with the collection as a whole: handles the commands that are about its file and its
-// intake. Each may throw what the database throws.
+// What the user can do with the collection as a whole: handles those commands about its file and its intake
+// where the program does more than the engine. Each may throw what the database throws.
 class CollectionCommands {
  public:
     CollectionCommands(TMusicDatabase& database, StandardFiles files);
@@ -23,8 +23,6 @@ class CollectionCommands {
     void Open();
     void OpenFile(const QString& path);
     void Save();
-    void SaveAs();
-    void AddSongs();
     void AddFolder();  // with its sub-folders
     void AddPaths(const QStringList& paths);
 

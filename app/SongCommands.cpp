@@ -7,6 +7,7 @@
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/songfiles/CopySongs.h"
 #include "MusicManagment/database/songfiles/Removal.h"
+#include "MusicManagment/database/sorting/OrderCommands.h"
 #include "app/ShellCommands.h"
 #include "app/models/CollectionTotals.h"
 #include "app/views/SongListWidget.h"
@@ -35,11 +36,15 @@ void SongCommands::HandleCommands() {
     const auto handle = [this](int id, std::function<void()> run) {
         handlers_ += database_.Commands().Handle(id, {.Run = std::move(run)});
     };
+    // Through the list, which keeps the focused song in sight.
+    const auto handleOrder = [&](int id) {
+        handle(id, [this, id] { list_.SetOrder(OrderAfter(database_.Order(), id)); });
+    };
     for (int id = mcSortFirst; id <= mcSortLast; ++id)
-        handle(id, [this, id] { SetOrder(id); });
+        handleOrder(id);
     for (int id = mcSubSortFirst; id <= mcSubSortLast; ++id)
-        handle(id, [this, id] { SetOrder(id); });
-    handle(mcReverse, [this] { SetOrder(mcReverse); });
+        handleOrder(id);
+    handleOrder(mcReverse);
     handle(mcMarkAll, [this] { list_.MarkAll(); });
     handle(mcInvertMarks, [this] { list_.InvertMarks(); });
     handle(mcMarkByFilter, [this] { list_.MarkByFilter(); });
@@ -78,18 +83,6 @@ void SongCommands::Undo() {
 }
 
 // --- The songs of the list ---
-
-// Through the list, which keeps the focused song in sight.
-void SongCommands::SetOrder(int id) {
-    SongOrder order = database_.Order();
-    if (id == mcReverse)
-        order.Backwards = !order.Backwards;
-    else if (id >= mcSubSortFirst)
-        order.SubSortType = static_cast<TSubSortType>(id - mcSubSortFirst);
-    else
-        order.SortType = static_cast<TSortType>(id - mcSortFirst);
-    list_.SetOrder(order);
-}
 
 QString SongCommands::RemovalQuestion(const std::vector<SongHandle>& songs) const {
     if (songs.size() > 1)

@@ -24,7 +24,6 @@ class SongCommands {
  private:
     void HandleCommands();
     void AddUndo();
-    void SetOrder(int id);
     void RemoveChosen();
     void CopyChosen();
     void OpenExternally();

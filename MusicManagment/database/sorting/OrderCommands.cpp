@@ -1,27 +1,33 @@
+#include "MusicManagment/database/sorting/OrderCommands.h"
+
 #include "MusicManagment/database/Command.h"
 #include "MusicManagment/database/MusicManagment.h"
 
 namespace {
 
+void ChangeOrder(TMusicDatabase& database, int command) {
+    database.SetOrder(OrderAfter(database.Order(), command));
+}
+
 constexpr DatabaseCommand SortBy(int type, QStringView caption, QStringView keys = {}) {
     return {.Id = mcSortFirst + type,
             .Caption = caption,
             .Keys = keys,
-            .Run = [](TMusicDatabase& database,
-                      int id) { database.SetSortType(static_cast<TSortType>(id - mcSortFirst)); },
+            .Run = &ChangeOrder,
             .Kind = DatabaseCommand::Mark::Radio,
-            .IsOn = [](const TMusicDatabase& database,
-                       int id) { return database.SortType() == id - mcSortFirst; }};
+            .IsOn = [](const TMusicDatabase& database, int id) {
+                return database.SortType() == id - mcSortFirst;
+            }};
 }
 
 constexpr DatabaseCommand SubSortBy(int type, QStringView caption) {
     return {.Id = mcSubSortFirst + type,
             .Caption = caption,
-            .Run = [](TMusicDatabase& database,
-                      int id) { database.SetSubSortType(static_cast<TSubSortType>(id - mcSubSortFirst)); },
+            .Run = &ChangeOrder,
             .Kind = DatabaseCommand::Mark::Radio,
-            .IsOn = [](const TMusicDatabase& database,
-                       int id) { return database.SubSortType() == id - mcSubSortFirst; }};
+            .IsOn = [](const TMusicDatabase& database, int id) {
+                return database.SubSortType() == id - mcSubSortFirst;
+            }};
 }
 
 constexpr DatabaseCommand kRows[] = {
@@ -44,7 +50,7 @@ constexpr DatabaseCommand kRows[] = {
     SubSortBy(sstPath, u"Pfad"),
     {.Id = mcReverse,
      .Caption = u"Reihenfolge umkehren",
-     .Run = [](TMusicDatabase& database, int) { database.SetSortBackwards(!database.SortBackwards()); },
+     .Run = &ChangeOrder,
      .Kind = DatabaseCommand::Mark::Switch,
      .IsOn = [](const TMusicDatabase& database, int) { return database.SortBackwards(); }},
     {.Id = mcFollowFocus,
@@ -58,3 +64,13 @@ constexpr DatabaseCommand kRows[] = {
 }  // namespace
 
 constinit const DatabaseCommands kOrderCommands = kRows;
+
+SongOrder OrderAfter(SongOrder order, int command) {
+    if (command == mcReverse)
+        order.Backwards = !order.Backwards;
+    else if (command >= mcSubSortFirst)
+        order.SubSortType = static_cast<TSubSortType>(command - mcSubSortFirst);
+    else
+        order.SortType = static_cast<TSortType>(command - mcSortFirst);
+    return order;
+}
