@@ -96,7 +96,7 @@ class MainWindowTest : public testing::Test {
     }
     // Runs as soon as the next long operation lets the interface work.
     void DuringRun(std::function<void()> action) {
-        QTimer::singleShot(0, window_.get(), [this, action] {
+        QTimer::singleShot(0, window_.get(), [this, action = std::move(action)] {
             EXPECT_TRUE(Database().ProgressRunning());
             action();
         });
