@@ -254,3 +254,14 @@ double AmplitudeOf(double frequency, const Samples& heard, std::size_t from, std
     }
     return 2 * std::hypot(sine, cosine) / static_cast<double>(frames);
 }
+
+double LargestStep(const Samples& heard, std::size_t from, int side) {
+    double largest = 0;
+    for (std::size_t i = 2 * from + static_cast<std::size_t>(side) + 2; i < heard.size(); i += 2)
+        largest = std::max(largest, std::abs(static_cast<double>(heard[i]) - heard[i - 2]));
+    return largest;
+}
+
+double SteepestStep(Tone tone, int rate) {
+    return tone.amplitude * 2 * std::numbers::pi * tone.frequency / rate;
+}

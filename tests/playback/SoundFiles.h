@@ -39,3 +39,7 @@ void WriteSound(const QString& path, const Samples& samples);
 // Amplitude of a tone within one side of a piece of sound.
 double AmplitudeOf(double frequency, const Samples& heard, std::size_t from, std::size_t frames, int side = 0,
                    int rate = 44100);
+// The largest difference between two neighbours of one side. A tone of `frequency` that gets no louder has at
+// most SteepestStep; whatever is cut off has more.
+double LargestStep(const Samples& heard, std::size_t from = 0, int side = 0);
+double SteepestStep(Tone tone, int rate = 44100);

@@ -8,7 +8,8 @@
 #include <span>
 
 // An output that is given its samples in advance and plays them at its own pace, 16-bit, the channels of a
-// frame one after the other. It begins paused.
+// frame one after the other. It begins paused. What is cut off, paused or goes on glides (Glide.h): the
+// listener hears no click. So does what still sounds when the output is destroyed.
 class PushOutput {
  public:
     virtual ~PushOutput() = default;

@@ -2,12 +2,17 @@
 
 #include <SDL.h>
 
-#include <algorithm>
-#include <cmath>
+#include <bit>
 
 namespace {
 
-constexpr Uint16 kDeviceFrames = 2048;
+// What the device asks for at once: as much as the glides are long, or a little more.
+Uint16 DeviceFrames(int rate) {
+    return static_cast<Uint16>(std::bit_floor(GlideFrames(rate) * 5 / 4));
+}
+
+// A device asks some fifty times a second; one that has hung is not waited for.
+constexpr Uint32 kLongestTail = 60;  // ms
 
 // While it lives the device asks for no samples.
 class DeviceLock {
@@ -25,80 +30,80 @@ class DeviceLock {
 
 bool SdlPush::Open(int rate, int channels) {
     Close();
+    queue_.Reset(rate, channels);
     // SDL converts when the device wants another format.
     SDL_AudioSpec wanted = {};
     wanted.freq = rate;
     wanted.format = AUDIO_S16SYS;
     wanted.channels = static_cast<Uint8>(channels);
-    wanted.samples = kDeviceFrames;
+    wanted.samples = DeviceFrames(rate);
     wanted.callback = &SdlPush::Fill;
     wanted.userdata = this;
     for (const QString& driver : drivers_) {
         if (!audio_.Acquire(driver)) continue;
         device_ = SDL_OpenAudioDevice(nullptr, 0, &wanted, nullptr, 0);
-        if (device_ != 0) return true;
+        if (device_ != 0) break;
         audio_.Release();
     }
-    return false;
+    // From now on it asks, in a pause as well: only the queue can glide there.
+    if (device_ != 0) SDL_PauseAudioDevice(device_, 0);
+    return device_ != 0;
 }
 
 void SdlPush::Fill(void* self, unsigned char* target, int bytes) {
     const std::size_t samples = static_cast<std::size_t>(bytes) / sizeof(std::int16_t);
-    static_cast<SdlPush*>(self)->Give({reinterpret_cast<std::int16_t*>(target), samples});
-}
-
-// Silence follows what is queued. The gain glides, a jump would click.
-void SdlPush::Give(std::span<std::int16_t> target) {
-    const std::size_t count = std::min(target.size(), queue_.size() - given_);
-    const float step = (gain_ - gainNow_) / static_cast<float>(std::max<std::size_t>(count, 1));
-    for (std::size_t i = 0; i < count; ++i) {
-        const float gain = gainNow_ + step * static_cast<float>(i + 1);
-        target[i] = static_cast<std::int16_t>(std::lrint(static_cast<float>(queue_[given_ + i]) * gain));
-    }
-    std::ranges::fill(target.subspan(count), std::int16_t{0});
-    given_ += count;
-    gainNow_ = gain_;
+    static_cast<SdlPush*>(self)->queue_.Give({reinterpret_cast<std::int16_t*>(target), samples});
 }
 
 bool SdlPush::Queue(std::span<const std::int16_t> samples) {
     const DeviceLock lock(device_);
-    queue_.erase(queue_.begin(), queue_.begin() + static_cast<std::ptrdiff_t>(given_));
-    given_ = 0;
-    queue_.insert(queue_.end(), samples.begin(), samples.end());
+    queue_.Queue(samples);
     return true;
 }
 
 std::size_t SdlPush::Queued() {
     const DeviceLock lock(device_);
-    return (queue_.size() - given_) * sizeof(std::int16_t);
+    return queue_.Queued() * sizeof(std::int16_t);
 }
 
 void SdlPush::Clear() {
     const DeviceLock lock(device_);
-    queue_.clear();
-    given_ = 0;
+    queue_.Clear();
 }
 
 void SdlPush::SetGain(float gain) {
     const DeviceLock lock(device_);
-    gain_ = gain;
+    queue_.SetGain(gain);
 }
 
 void SdlPush::SetPaused(bool paused) {
-    paused_ = paused;
-    SDL_PauseAudioDevice(device_, paused ? 1 : 0);
+    const DeviceLock lock(device_);
+    queue_.SetPaused(paused);
 }
 
-// When its server ends SDL goes on taking samples, and only the device's status tells.
+// When its server ends SDL goes on asking for samples, and only the device's status tells.
 bool SdlPush::Failed() const {
-    return device_ == 0 || (!paused_ && SDL_GetAudioDeviceStatus(device_) != SDL_AUDIO_PLAYING);
+    return device_ == 0 || SDL_GetAudioDeviceStatus(device_) != SDL_AUDIO_PLAYING;
 }
 
+bool SdlPush::LeavesTail() {
+    const DeviceLock lock(device_);
+    return queue_.LeavesTail();
+}
+
+void SdlPush::AwaitSilence() {
+    const Uint64 until = SDL_GetTicks64() + kLongestTail;
+    while (LeavesTail() && !Failed() && SDL_GetTicks64() < until)
+        SDL_Delay(1);
+}
+
+// SDL lets the device play what it has got.
 void SdlPush::Close() {
-    if (device_ != 0) SDL_CloseAudioDevice(device_);
+    if (device_ != 0) {
+        Clear();
+        AwaitSilence();
+        SDL_CloseAudioDevice(device_);
+    }
     device_ = 0;
-    paused_ = true;
-    queue_.clear();
-    given_ = 0;
     audio_.Release();
 }

@@ -1,9 +1,9 @@
 #pragma once
 
 #include <QStringList>
-#include <vector>
 
 #include "MusicManagment/playback/eldos/PushOutput.h"
+#include "MusicManagment/playback/eldos/PushQueue.h"
 #include "MusicManagment/playback/fmod/SdlAudio.h"
 
 // A sound card or sound server, through the first of some SDL drivers that can really open a device.
@@ -22,16 +22,12 @@ class SdlPush : public PushOutput {
 
  private:
     static void Fill(void* self, unsigned char* target, int bytes);
-    void Give(std::span<std::int16_t> target);
+    bool LeavesTail();
+    void AwaitSilence();
     void Close();
 
     const QStringList drivers_;
     SdlAudio audio_;
     unsigned device_ = 0;  // 0 = none
-    bool paused_ = true;
-    // Under the lock of the device.
-    std::vector<std::int16_t> queue_;
-    std::size_t given_ = 0;  // samples at the front of the queue that the device has
-    float gain_ = 1;
-    float gainNow_ = 1;  // glides to gain_
+    PushQueue queue_;      // under the lock of the device
 };

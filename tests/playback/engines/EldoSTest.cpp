@@ -4,8 +4,11 @@
 
 #include <QFile>
 #include <QTemporaryDir>
+#include <algorithm>
+#include <functional>
 
 #include "MusicManagment/playback/eldos/NullPush.h"
+#include "MusicManagment/playback/eldos/PushQueue.h"
 #include "MusicManagment/playback/eldos/SdlPush.h"
 #include "tests/HandClock.h"
 #include "tests/PrintQt.h"
@@ -58,6 +61,29 @@ class RecordingOutput : public PushOutput {
 
  private:
     Record& record_;
+};
+
+// What a device would be given.
+class PulledOutput : public PushOutput {
+ public:
+    explicit PulledOutput(PushQueue& queue) : queue_(queue) {}
+
+    bool Open(int rate, int channels) override {
+        queue_.Reset(rate, channels);
+        return true;
+    }
+    bool Queue(std::span<const std::int16_t> samples) override {
+        queue_.Queue(samples);
+        return true;
+    }
+    std::size_t Queued() override { return queue_.Queued() * sizeof(std::int16_t); }
+    void Clear() override { queue_.Clear(); }
+    void SetPaused(bool paused) override { queue_.SetPaused(paused); }
+    void SetGain(float gain) override { queue_.SetGain(gain); }
+    bool Failed() const override { return false; }
+
+ private:
+    PushQueue& queue_;
 };
 
 class EldoSTest : public testing::Test {
@@ -168,6 +194,43 @@ TEST_F(EldoSTest, PositionStandsInPauseAndGoesNoFurtherThanWhatIsQueued) {
     sound.Play();
     clock.Milliseconds += 5000;
     EXPECT_EQ(sound.GetPosition(), 743U);
+}
+
+TEST_F(EldoSTest, WhateverIsDoneToASongNothingJumps) {
+    constexpr Tone kLoud = {.frequency = 100, .amplitude = 0.999};
+    const QString path = folder_.filePath(u"a.wav"_s);
+    WriteWav(path, Sine(kLoud, 5));
+    PushQueue queue;
+    settings_.MakeOutput = [&] { return std::make_unique<PulledOutput>(queue); };
+    TEldoSPlaySound sound(settings_);
+    sound.SetBackendFile(path);
+    sound.Open();
+    Samples heard;
+    using Act = std::function<void()>;
+    const Act play = [&] { sound.Play(); };
+    const Act stop = [&] { sound.Stop(); };
+    const Act pauseOrResume = [&] { sound.PauseResume(); };
+    const Act seek = [&] {
+        sound.SetPosition(1717);
+        sound.SetPosition(2345);
+    };
+    const Act quieter = [&] { sound.SetGain(0.5F); };
+    for (const Act& act : {play, seek, pauseOrResume, pauseOrResume, stop, play, quieter, pauseOrResume, seek,
+                           pauseOrResume, stop}) {
+        act();
+        // From zero to a crest, five periods later.
+        for (int block = 0; block < 4; ++block) {
+            std::vector<std::int16_t> given(std::size_t{2 * 579});
+            queue.Give(given);
+            sound.TopUp();
+            for (const std::int16_t sample : given)
+                heard.push_back(static_cast<float>(sample) / 32768);
+        }
+        const bool silent = sound.GetStatus() != psPlaying;
+        EXPECT_EQ(*std::max_element(heard.end() - 200, heard.end()) == 0, silent);
+    }
+    // Two sounds at once, each glides.
+    EXPECT_LT(LargestStep(heard), SteepestStep(kLoud) + 2.0 / static_cast<double>(GlideFrames(kRate)));
 }
 
 TEST_F(EldoSTest, ModulesAreLookedForInTheirFolders) {
