@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <limits>
+#include <utility>
 
 #include "MusicManagment/playback/backend/SoundLimits.h"
 #include "MusicManagment/playback/mci/MediaAddress.h"
@@ -15,6 +16,9 @@ namespace {
 
 constexpr GstClockTime kOpenTimeout = 5 * GST_SECOND;
 constexpr GstClockTime kSeekTimeout = GST_SECOND;
+constexpr gint64 kDeviceBuffer = 100'000;  // us
+constexpr int kLookAtFadeEvery = 10;       // ms
+constexpr int kLongestFade = 1000;         // ms
 
 quint32 ToMilliseconds(gint64 nanoseconds) {
     const gint64 milliseconds = std::max<gint64>(nanoseconds, 0) / static_cast<gint64>(GST_MSECOND);
@@ -29,16 +33,19 @@ QString ErrorText(GstMessage* message) {
     return text;
 }
 
-// A sink that keeps time and lets nothing be heard or seen.
+}  // namespace
+
 GstElement* MakeSilentSink() {
     GstElement* sink = gst_element_factory_make("fakesink", nullptr);
     if (sink != nullptr) g_object_set(sink, "sync", TRUE, nullptr);
     return sink;
 }
 
-GstElement* MakeAudioSink(MciSound sound) {
-    return sound == MciSound::Silent ? MakeSilentSink() : gst_element_factory_make("autoaudiosink", nullptr);
+GstElement* MakeAudibleSink() {
+    return gst_element_factory_make("autoaudiosink", nullptr);
 }
+
+namespace {
 
 // Stands in front of the resampler, which would work for seconds on a rate that no sound has.
 GstElement* MakeLimits() {
@@ -50,6 +57,13 @@ GstElement* MakeLimits() {
     g_object_set(filter, "caps", caps, nullptr);
     gst_caps_unref(caps);
     return filter;
+}
+
+// What waits in a device is heard before anything that is changed; GStreamer would let 200 ms wait.
+void ShortenBuffer(GstElement*, GstElement* element, gpointer) {
+    const bool isSink = GST_OBJECT_FLAG_IS_SET(element, GST_ELEMENT_FLAG_SINK);
+    if (isSink && g_object_class_find_property(G_OBJECT_GET_CLASS(element), "buffer-time") != nullptr)
+        g_object_set(element, "buffer-time", kDeviceBuffer, nullptr);
 }
 
 // Without a sound server the automatic choice quietly becomes a sink that it calls so.
@@ -75,12 +89,22 @@ void GstPlayer::Unref::operator()(GstMessage* message) const {
     gst_message_unref(message);
 }
 
+GstPlayer::GstPlayer(QString path, MciSinkMaker makeSink)
+    : path_(std::move(path)), makeSink_(std::move(makeSink)) {
+    timer_.setInterval(kLookAtFadeEvery);
+    QObject::connect(&timer_, &QTimer::timeout, &timer_, [this] { LookAtFade(); });
+}
+
 GstPlayer::~GstPlayer() = default;
 
 QString GstPlayer::Open() {
     failure_.clear();
     atEnd_ = false;
     outputLost_ = false;
+    runs_ = false;
+    fades_ = false;
+    timer_.stop();
+    goTo_.reset();
     const QString error = MakePlayer();
     return error.isEmpty() ? Preroll() : error;
 }
@@ -90,15 +114,16 @@ QString GstPlayer::MakePlayer() {
     if (player == nullptr) return u"GStreamer hat kein \"playbin\"."_s;
     player_.reset(GST_ELEMENT(gst_object_ref_sink(player)));
     bus_.reset(gst_element_get_bus(player));
-    sink_ = MakeAudioSink(sound_);
+    sink_ = makeSink_();
     GstElement* video = MakeSilentSink();
+    filter_ = std::make_unique<GlideFilter>(volume_);
+    GstElement* audio = filter_->Make(sink_);
     GstElement* limits = MakeLimits();
-    if (sink_ == nullptr || video == nullptr || limits == nullptr) return u"GStreamer hat keine Ausgabe."_s;
+    if (audio == nullptr || video == nullptr || limits == nullptr) return u"GStreamer hat keine Ausgabe."_s;
     const QByteArray uri = MediaAddress(path_);
-    g_object_set(player, "uri", uri.constData(), "audio-sink", sink_, "video-sink", video, "audio-filter",
+    g_object_set(player, "uri", uri.constData(), "audio-sink", audio, "video-sink", video, "audio-filter",
                  limits, nullptr);
-    // Full volume is left alone: sound servers remember another one for the program.
-    if (volume_ < 1) g_object_set(player, "volume", volume_, nullptr);
+    g_signal_connect(player, "element-setup", G_CALLBACK(ShortenBuffer), nullptr);
     KeepToTrustedElements(player);
     return {};
 }
@@ -128,19 +153,16 @@ QString GstPlayer::Play() {
     if (outputLost_) {
         const quint32 position = position_;
         QString error = Open();
-        if (error.isEmpty() && position > 0) error = Seek(position);
+        if (error.isEmpty() && position > 0) error = Go(position);
         if (!error.isEmpty()) {
             position_ = position;
             return error;
         }
     }
-    if (atEnd_) {
-        QString error = Seek(0);
-        if (!error.isEmpty()) return error;
-    }
+    if (atEnd_ && !goTo_) goTo_ = 0;
     stopped_ = false;
     playing_ = true;
-    return SetState(GST_STATE_PLAYING);
+    return fades_ ? QString() : GoOn();
 }
 
 QString GstPlayer::Stop() {
@@ -150,16 +172,78 @@ QString GstPlayer::Stop() {
 
 QString GstPlayer::Pause() {
     playing_ = false;
-    return outputLost_ ? QString() : SetState(GST_STATE_PAUSED);
+    return AfterFade();
 }
 
-// Exact: without the flag a file of variable bit rate is missed by seconds.
 QString GstPlayer::Seek(quint32 milliseconds) {
-    const auto flags = static_cast<GstSeekFlags>(GST_SEEK_FLAG_FLUSH | GST_SEEK_FLAG_ACCURATE);
-    const auto target = static_cast<gint64>(milliseconds * GST_MSECOND);
     ReadMessages();
     position_ = milliseconds;
     if (outputLost_) return {};
+    goTo_ = milliseconds;
+    return AfterFade();
+}
+
+void GstPlayer::Leave() {
+    playing_ = false;
+    AfterFade();
+    timer_.stop();
+}
+
+bool GstPlayer::IsSilent() {
+    return !fades_ || FadeIsOver();
+}
+
+// Does what has been asked for, when nothing sounds any more.
+QString GstPlayer::AfterFade() {
+    if (fades_ || outputLost_) return {};
+    if (!runs_ || atEnd_) return GoOn();
+    fades_ = true;
+    filter_->FadeOut();
+    latest_.setRemainingTime(kLongestFade, Qt::PreciseTimer);
+    timer_.start();
+    return {};
+}
+
+bool GstPlayer::FadeIsOver() {
+    ReadMessages();
+    return outputLost_ || atEnd_ || latest_.hasExpired() ||
+           filter_->IsSilentAt(gst_element_get_current_running_time(player_.get()));
+}
+
+void GstPlayer::LookAtFade() {
+    if (!fades_ || !FadeIsOver()) return;
+    fades_ = false;
+    timer_.stop();
+    const QString error = GoOn();
+    if (failure_.isEmpty() && !outputLost_) failure_ = error;
+}
+
+QString GstPlayer::GoOn() {
+    if (outputLost_) return {};
+    QString error;
+    if (!playing_ && runs_) error = Halt();
+    if (error.isEmpty() && goTo_) error = Go(*std::exchange(goTo_, std::nullopt));
+    if (!error.isEmpty() || !playing_) return error;
+    filter_->FadeIn();
+    runs_ = true;
+    return SetState(GST_STATE_PLAYING);
+}
+
+QString GstPlayer::Halt() {
+    QString error = SetState(GST_STATE_PAUSED);
+    if (!error.isEmpty()) return error;
+    runs_ = false;
+    // What has passed in silence is to be heard later. Of a file that cannot go back it is lost.
+    const std::optional<quint32> faded = filter_->FadedFrom();
+    if (!goTo_ && !atEnd_ && faded) Go(*faded);
+    return failure_;
+}
+
+// Exact: without the flag a file of variable bit rate is missed by seconds.
+QString GstPlayer::Go(quint32 milliseconds) {
+    const auto flags = static_cast<GstSeekFlags>(GST_SEEK_FLAG_FLUSH | GST_SEEK_FLAG_ACCURATE);
+    const auto target = static_cast<gint64>(milliseconds * GST_MSECOND);
+    position_ = milliseconds;
     atEnd_ = false;  // an end that comes from now on belongs to the new position
     if (!gst_element_seek_simple(player_.get(), GST_FORMAT_TIME, flags, target))
         return u"In der Datei kann nicht gesucht werden."_s;
@@ -170,6 +254,7 @@ QString GstPlayer::Seek(quint32 milliseconds) {
 
 QString GstPlayer::Status(quint32 item, quint32& value) {
     ReadMessages();
+    LookAtFade();  // an end that has come meanwhile is not that of a song that is to go on elsewhere
     if (item == kMciStatusLength)
         value = Length();
     else if (item == kMciStatusPosition)
@@ -181,8 +266,8 @@ QString GstPlayer::Status(quint32 item, quint32& value) {
 
 QString GstPlayer::SetAudio(quint32 item, quint32 value) {
     if (item != kMciAudioVolume || value > kMciFullVolume) return u"Unbekannte Einstellung."_s;
-    volume_ = static_cast<double>(value) / kMciFullVolume;
-    g_object_set(player_.get(), "volume", volume_, nullptr);
+    volume_ = static_cast<float>(value) / kMciFullVolume;
+    filter_->SetGain(volume_);
     return {};
 }
 
@@ -222,7 +307,7 @@ quint32 GstPlayer::Length() {
 
 quint32 GstPlayer::Position() {
     gint64 position = 0;
-    if (!outputLost_ && gst_element_query_position(player_.get(), GST_FORMAT_TIME, &position))
+    if (!outputLost_ && !goTo_ && gst_element_query_position(player_.get(), GST_FORMAT_TIME, &position))
         position_ = ToMilliseconds(position);
     return position_;
 }
