@@ -30,6 +30,8 @@ struct GlideFilter::State {
     std::atomic<GstClockTime> silentFrom{kUnknown};  // running time
     std::atomic<GstClockTime> fadedFrom{kUnknown};   // in the song
 
+    std::atomic<bool> empty{false};
+
     // The player's thread only.
     Glide level;
     bool fresh = true;  // nothing has sounded yet, so there is nothing to glide from
@@ -61,6 +63,7 @@ void GlideFilter::State::Note(GstEvent* event) {
     if (GST_EVENT_TYPE(event) == GST_EVENT_SEGMENT) gst_event_copy_segment(event, &segment);
     if (GST_EVENT_TYPE(event) == GST_EVENT_FLUSH_STOP) ComeOutOfSilence();
     if (GST_EVENT_TYPE(event) == GST_EVENT_CAPS) NoteFormat(event);
+    if (GST_EVENT_TYPE(event) == GST_EVENT_EOS && fresh) empty = true;
 }
 
 void GlideFilter::State::ComeOutOfSilence() {
@@ -143,6 +146,10 @@ void GlideFilter::FadeOut() {
 
 void GlideFilter::FadeIn() {
     state_->out = false;
+}
+
+bool GlideFilter::IsEmpty() const {
+    return state_->empty;
 }
 
 bool GlideFilter::IsSilentAt(quint64 runningTime) const {

@@ -25,6 +25,8 @@ class GlideFilter {
     void FadeOut();
     void FadeIn();
 
+    // The end has come and no sound before it.
+    bool IsEmpty() const;
     // Whether silence has come after FadeOut; `runningTime` is the player's, in nanoseconds.
     bool IsSilentAt(quint64 runningTime) const;
     // Where in the song FadeOut has begun to work, in milliseconds.

@@ -140,7 +140,9 @@ QString GstPlayer::Preroll() {
     ReadMessages();
     if (outputLost_ || PlaysToNobody(sink_)) return LoseOutput();
     if (!failure_.isEmpty()) return failure_;
-    return change == GST_STATE_CHANGE_FAILURE ? u"Die Datei kann nicht abgespielt werden."_s : QString();
+    // What fails while a decoder is being put in place GStreamer sometimes forgets to tell.
+    const bool fails = change == GST_STATE_CHANGE_FAILURE || filter_->IsEmpty();
+    return fails ? u"Die Datei kann nicht abgespielt werden."_s : QString();
 }
 
 QString GstPlayer::LoseOutput() {

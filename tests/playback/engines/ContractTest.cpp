@@ -284,6 +284,7 @@ TEST_P(EngineFailures, RatesAndChannelsThatNoSoundHasAreRefused) {
     const QString path = folder_.filePath(u"a.wav"_s);
     for (const auto& [rate, channels] :
          {std::pair(1'260'000'000, 2), std::pair(999, 2), std::pair(44100, 60)}) {
+        SCOPED_TRACE(testing::Message() << rate << " Hz, " << channels << " channels");
         WriteWav(path, Sine({}, 0.5), rate, channels);
         ExpectRefused(path);
     }
