@@ -72,6 +72,7 @@ void PushQueue::Give(std::span<std::int16_t> target) {
     for (std::size_t frame = 0; frame + channels_ <= target.size(); frame += channels_) {
         const bool held = paused_ && level_.Now() == 0;
         const bool sounds = !held && Queued() >= channels_;
+        silent_ = sounds || HasTail() ? 0 : silent_ + 1;
         const float gain = level_.Next();
         for (std::int16_t& sample : target.subspan(frame, channels_)) {
             const float song = sounds ? static_cast<float>(queue_[given_++]) * gain : 0;
@@ -79,8 +80,4 @@ void PushQueue::Give(std::span<std::int16_t> target) {
         }
         fresh_ = fresh_ && !sounds;
     }
-}
-
-float PushQueue::TailSample() {
-    return LeavesTail() ? tail_[tailGiven_++] : 0;
 }

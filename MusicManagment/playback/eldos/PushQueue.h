@@ -20,7 +20,8 @@ class PushQueue {
     void Clear();
     void SetPaused(bool paused);
     void SetGain(float gain);  // 0 to 1 of the amplitude
-    bool LeavesTail() const { return tailGiven_ < tail_.size(); }
+    // Whether nothing has sounded in so many frames that were given last.
+    bool WasSilent(std::size_t frames) const { return fresh_ || silent_ >= frames; }
 
     // Whole frames for the device; silence follows what is queued.
     void Give(std::span<std::int16_t> target);
@@ -28,12 +29,14 @@ class PushQueue {
  private:
     void Aim();
     void LeaveTail();
-    float TailSample();
+    bool HasTail() const { return tailGiven_ < tail_.size(); }
+    float TailSample() { return HasTail() ? tail_[tailGiven_++] : 0; }
 
     std::vector<std::int16_t> queue_;
     std::size_t given_ = 0;  // samples at the front of the queue that the device has
     std::vector<float> tail_;
     std::size_t tailGiven_ = 0;
+    std::size_t silent_ = 0;  // frames
     std::size_t channels_ = 1;
     std::size_t glideFrames_ = 1;
     Glide level_{0};  // on its way to the gain, or to silence in a pause

@@ -6,13 +6,16 @@
 
 namespace {
 
-// What the device asks for at once: as much as the glides are long, or a little more.
+// What the device asks for at once, a power of two: about two glides, 46 ms at 44,100 Hz.
 Uint16 DeviceFrames(int rate) {
-    return static_cast<Uint16>(std::bit_floor(GlideFrames(rate) * 5 / 4));
+    return static_cast<Uint16>(std::bit_floor(GlideFrames(rate) * 5 / 2));
 }
 
-// A device asks some fifty times a second; one that has hung is not waited for.
-constexpr Uint32 kLongestTail = 60;  // ms
+// A sound server drops what it has not played yet when the device is closed. SDL waits for two periods, which
+// is enough for what follows on so much silence.
+constexpr int kSilenceAtEnd = 20;  // ms
+// One that has hung is not waited for.
+constexpr Uint32 kLongestWait = 120;  // ms
 
 // While it lives the device asks for no samples.
 class DeviceLock {
@@ -31,6 +34,7 @@ class DeviceLock {
 bool SdlPush::Open(int rate, int channels) {
     Close();
     queue_.Reset(rate, channels);
+    silence_ = static_cast<std::size_t>(rate) * kSilenceAtEnd / 1000;
     // SDL converts when the device wants another format.
     SDL_AudioSpec wanted = {};
     wanted.freq = rate;
@@ -86,18 +90,17 @@ bool SdlPush::Failed() const {
     return device_ == 0 || SDL_GetAudioDeviceStatus(device_) != SDL_AUDIO_PLAYING;
 }
 
-bool SdlPush::LeavesTail() {
+bool SdlPush::IsSilent() {
     const DeviceLock lock(device_);
-    return queue_.LeavesTail();
+    return queue_.WasSilent(silence_);
 }
 
 void SdlPush::AwaitSilence() {
-    const Uint64 until = SDL_GetTicks64() + kLongestTail;
-    while (LeavesTail() && !Failed() && SDL_GetTicks64() < until)
+    const Uint64 until = SDL_GetTicks64() + kLongestWait;
+    while (!IsSilent() && !Failed() && SDL_GetTicks64() < until)
         SDL_Delay(1);
 }
 
-// SDL lets the device play what it has got.
 void SdlPush::Close() {
     if (device_ != 0) {
         Clear();

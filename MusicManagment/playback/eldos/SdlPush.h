@@ -22,12 +22,13 @@ class SdlPush : public PushOutput {
 
  private:
     static void Fill(void* self, unsigned char* target, int bytes);
-    bool LeavesTail();
+    bool IsSilent();
     void AwaitSilence();
     void Close();
 
     const QStringList drivers_;
     SdlAudio audio_;
-    unsigned device_ = 0;  // 0 = none
-    PushQueue queue_;      // under the lock of the device
+    unsigned device_ = 0;      // 0 = none
+    std::size_t silence_ = 0;  // frames that a device is given before it is closed
+    PushQueue queue_;          // under the lock of the device
 };
