@@ -11,11 +11,11 @@ Uint16 DeviceFrames(int rate) {
     return static_cast<Uint16>(std::bit_floor(GlideFrames(rate) * 5 / 2));
 }
 
-// A sound server drops what it has not played yet when the device is closed. SDL waits for two periods, which
-// is enough for what follows on so much silence.
-constexpr int kSilenceAtEnd = 20;  // ms
+// A sound server drops what it has not played when the device is closed, and SDL waits for two periods only.
+// The silence that is in the second of them is not missed.
+constexpr int kSilenceAtEnd = 50;  // ms
 // One that has hung is not waited for.
-constexpr Uint32 kLongestWait = 120;  // ms
+constexpr Uint32 kLongestWait = 150;  // ms
 
 // While it lives the device asks for no samples.
 class DeviceLock {

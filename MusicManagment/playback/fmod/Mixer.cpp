@@ -84,8 +84,8 @@ void Mixer::LeaveTail(const Channel& channel, DecodeAhead& source) {
 }
 
 void Mixer::ReleaseAll() {
-    for (Channel& channel : channels_)
-        Detach(channel);
+    for (const Channel& channel : channels_)
+        Release(channel.number);
 }
 
 bool Mixer::Playing(int channel) const {

@@ -29,7 +29,7 @@ class Mixer {
     // The source is not touched any more when it returns. A block of what it has ready is taken, so that the
     // sound glides into silence.
     void Release(int channel);
-    void ReleaseAll();
+    void ReleaseAll();  // each of them
     // How often channels have been started, here and in the mixers before; wraps.
     int Rounds() const { return rounds_; }
     // False for a channel that is over.

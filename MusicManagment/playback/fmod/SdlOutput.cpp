@@ -8,6 +8,8 @@ namespace {
 
 constexpr std::size_t kMostFrames = 32768;  // SDL counts them in 16 bits
 
+constexpr Uint64 kLongestWait = 400;  // ms; a device that has hung is not waited for
+
 }  // namespace
 
 // Without card and server SDL can still start a driver; only opening a device tells.
@@ -30,12 +32,25 @@ bool SdlOutput::OpenDevice(int rate, std::size_t frames) {
     wanted.samples = static_cast<Uint16>(std::min(frames, kMostFrames));
     wanted.userdata = this;
     wanted.callback = [](void* self, Uint8* bytes, int size) {
-        static_cast<SdlOutput*>(self)->pull_(reinterpret_cast<float*>(bytes),
-                                             static_cast<std::size_t>(size) / (2 * sizeof(float)));
+        static_cast<SdlOutput*>(self)->Give(
+            {reinterpret_cast<float*>(bytes), static_cast<std::size_t>(size) / sizeof(float)});
     };
     // No changes allowed: SDL converts when the device wants another format.
     device_ = SDL_OpenAudioDevice(nullptr, 0, &wanted, nullptr, 0);
     return device_ != 0;
+}
+
+void SdlOutput::Give(std::span<float> stereo) {
+    pull_(stereo.data(), stereo.size() / 2);
+    silent_ = std::ranges::all_of(stereo, [](float sample) { return sample == 0; });
+}
+
+// A sound server drops what it has not played when the device is closed; SDL waits for two blocks only.
+// Behind the glide a block of silence is to be among them.
+void SdlOutput::AwaitSilence() {
+    const Uint64 until = SDL_GetTicks64() + kLongestWait;
+    while (started_ && !silent_ && !Failed() && SDL_GetTicks64() < until)
+        SDL_Delay(1);
 }
 
 void SdlOutput::Start() {
@@ -54,6 +69,7 @@ void SdlOutput::Stop() {
 }
 
 void SdlOutput::Close() {
+    AwaitSilence();
     if (device_ != 0) SDL_CloseAudioDevice(device_);
     device_ = 0;
     started_ = false;

@@ -1,6 +1,8 @@
 #pragma once
 
 #include <QStringList>
+#include <atomic>
+#include <span>
 
 #include "MusicManagment/playback/fmod/AudioOutput.h"
 #include "MusicManagment/playback/fmod/SdlAudio.h"
@@ -14,16 +16,20 @@ class SdlOutput : public AudioOutput {
     bool Open(int rate, std::size_t frames, Pull pull) override;
     void Start() override;
     void Stop() override;
+    // Waits some tenths of a second for what is gliding into silence.
     void Close() override;
     bool Failed() const override;
     bool Replaceable() const override { return true; }
 
  private:
     bool OpenDevice(int rate, std::size_t frames);
+    void Give(std::span<float> stereo);
+    void AwaitSilence();
 
     const QStringList drivers_;
     SdlAudio audio_;
     Pull pull_;
     unsigned device_ = 0;  // 0 = none
     bool started_ = false;
+    std::atomic<bool> silent_{true};  // what was given last
 };

@@ -127,12 +127,12 @@ bool SoundLibrary::FSOUND_Init(int mixRate, int softChannels, [[maybe_unused]] u
 }
 
 void SoundLibrary::FSOUND_Close() {
-    if (output_ != nullptr) output_->Close();
-    output_.reset();
     if (mixer_ != nullptr) {
         mixer_->ReleaseAll();
         channelRounds_ = mixer_->Rounds();
     }
+    if (output_ != nullptr) output_->Close();
+    output_.reset();
     streams_.clear();
     songs_.clear();
     mixer_.reset();
