@@ -26,11 +26,10 @@ constexpr double kSofter = 0.03;
 class RecordingOutput : public PushOutput {
  public:
     struct Record {
-        Samples samples;
-        std::size_t queued = 0;  // bytes
+        Samples samples;  // that were queued
+        PushQueue queue;
         int rate = 0;
         int channels = 0;
-        int opened = 0;
         float gain = 1;
         bool paused = true;
         bool lost = false;
@@ -40,50 +39,30 @@ class RecordingOutput : public PushOutput {
     explicit RecordingOutput(Record& record) : record_(record) {}
 
     bool Open(int rate, int channels) override {
-        ++record_.opened;
+        record_.queue.Reset(rate, channels);
         record_.rate = rate;
         record_.channels = channels;
-        record_.queued = 0;
         record_.lost = !record_.canOpen;
         return record_.canOpen;
     }
     bool Queue(std::span<const std::int16_t> samples) override {
-        for (const std::int16_t sample : samples)
-            record_.samples.push_back(static_cast<float>(sample) / 32768);
-        record_.queued += samples.size_bytes();
+        Append(record_.samples, samples);
+        record_.queue.Queue(samples);
         return true;
     }
-    std::size_t Queued() override { return record_.queued; }
-    void Clear() override { record_.queued = 0; }
-    void SetPaused(bool paused) override { record_.paused = paused; }
-    void SetGain(float gain) override { record_.gain = gain; }
+    std::size_t Queued() override { return record_.queue.Queued() * sizeof(std::int16_t); }
+    void Clear() override { record_.queue.Clear(); }
+    void SetPaused(bool paused) override { record_.queue.SetPaused(record_.paused = paused); }
+    void SetGain(float gain) override { record_.queue.SetGain(record_.gain = gain); }
     bool Failed() const override { return record_.lost; }
+
+    static void Append(Samples& all, std::span<const std::int16_t> samples) {
+        for (const std::int16_t sample : samples)
+            all.push_back(static_cast<float>(sample) / 32768);
+    }
 
  private:
     Record& record_;
-};
-
-// What a device would be given.
-class PulledOutput : public PushOutput {
- public:
-    explicit PulledOutput(PushQueue& queue) : queue_(queue) {}
-
-    bool Open(int rate, int channels) override {
-        queue_.Reset(rate, channels);
-        return true;
-    }
-    bool Queue(std::span<const std::int16_t> samples) override {
-        queue_.Queue(samples);
-        return true;
-    }
-    std::size_t Queued() override { return queue_.Queued() * sizeof(std::int16_t); }
-    void Clear() override { queue_.Clear(); }
-    void SetPaused(bool paused) override { queue_.SetPaused(paused); }
-    void SetGain(float gain) override { queue_.SetGain(gain); }
-    bool Failed() const override { return false; }
-
- private:
-    PushQueue& queue_;
 };
 
 class EldoSTest : public testing::Test {
@@ -104,6 +83,13 @@ class EldoSTest : public testing::Test {
         WriteSound(path, tones);
         return path;
     }
+    std::size_t Queued() const { return record_.queue.Queued() * sizeof(std::int16_t); }
+    // So many bytes are played.
+    void Hear(std::size_t bytes) {
+        std::vector<std::int16_t> given(bytes / sizeof(std::int16_t));
+        record_.queue.Give(given);
+        RecordingOutput::Append(heard_, given);
+    }
     double Loudness(double frequency, double from, double seconds) const {
         return AmplitudeOf(frequency, record_.samples, static_cast<std::size_t>(from * kRate),
                            static_cast<std::size_t>(seconds * kRate));
@@ -112,6 +98,7 @@ class EldoSTest : public testing::Test {
     QTemporaryDir folder_;
     TEldoSSettings settings_;
     RecordingOutput::Record record_;
+    Samples heard_;
 };
 
 class EldoSTypes : public EldoSTest, public testing::WithParamInterface<const char*> {};
@@ -123,7 +110,7 @@ TEST_P(EldoSTypes, TheWholeSongIsQueuedAndASeekLandsWhereItShould) {
     EXPECT_EQ(record_.channels, 2);
     sound->Play();
     while (sound->GetStatus() == psPlaying) {
-        record_.queued = 0;
+        Hear(Queued());
         sound->TopUp();
     }
     ASSERT_NEAR(static_cast<double>(record_.samples.size()), 4.0 * kRate, 0.1 * 2 * kRate);
@@ -153,26 +140,26 @@ TEST_F(EldoSTest, SoManyBuffersAreKeptQueued) {
     sound->Open();
     sound->SetGain(0.5F);
     EXPECT_EQ(record_.gain, 0.5F);
-    EXPECT_EQ(record_.queued, 0U);
+    EXPECT_EQ(Queued(), 0U);
     sound->Play();
     EXPECT_FALSE(record_.paused);
-    EXPECT_EQ(record_.queued, std::size_t{3 * 32768});
+    EXPECT_EQ(Queued(), std::size_t{3 * 32768});
     EXPECT_EQ(sound->GetPosition(), 0U);
 
-    record_.queued -= 30000;  // less than a buffer
+    Hear(30000);  // less than a buffer
     sound->TopUp();
-    EXPECT_EQ(record_.queued, std::size_t{3 * 32768 - 30000});
+    EXPECT_EQ(Queued(), std::size_t{3 * 32768 - 30000});
     EXPECT_EQ(sound->GetPosition(), 30000U / 4 * 1000 / kRate);
-    record_.queued -= 10000;
+    Hear(10000);
     sound->TopUp();
-    EXPECT_EQ(record_.queued, std::size_t{4 * 32768 - 40000});
+    EXPECT_EQ(Queued(), std::size_t{4 * 32768 - 40000});
 
     // Absurd settings are bounded.
     settings_.BufferSize = -1;
     const auto absurd = Sound(sound->BackendFile(), 2000000000);
     absurd->Open();
     absurd->Play();
-    EXPECT_EQ(record_.queued, std::size_t{64 * 1024});
+    EXPECT_EQ(Queued(), std::size_t{64 * 1024});
 }
 
 TEST_F(EldoSTest, PositionStandsInPauseAndGoesNoFurtherThanWhatIsQueued) {
@@ -200,37 +187,30 @@ TEST_F(EldoSTest, WhateverIsDoneToASongNothingJumps) {
     constexpr Tone kLoud = {.frequency = 100, .amplitude = 0.999};
     const QString path = folder_.filePath(u"a.wav"_s);
     WriteWav(path, Sine(kLoud, 5));
-    PushQueue queue;
-    settings_.MakeOutput = [&] { return std::make_unique<PulledOutput>(queue); };
-    TEldoSPlaySound sound(settings_);
-    sound.SetBackendFile(path);
-    sound.Open();
-    Samples heard;
+    const auto sound = Sound(path);
+    sound->Open();
     using Act = std::function<void()>;
-    const Act play = [&] { sound.Play(); };
-    const Act stop = [&] { sound.Stop(); };
-    const Act pauseOrResume = [&] { sound.PauseResume(); };
+    const Act play = [&] { sound->Play(); };
+    const Act stop = [&] { sound->Stop(); };
+    const Act pauseOrResume = [&] { sound->PauseResume(); };
     const Act seek = [&] {
-        sound.SetPosition(1717);
-        sound.SetPosition(2345);
+        sound->SetPosition(1717);
+        sound->SetPosition(2345);
     };
-    const Act quieter = [&] { sound.SetGain(0.5F); };
+    const Act quieter = [&] { sound->SetGain(0.5F); };
     for (const Act& act : {play, seek, pauseOrResume, pauseOrResume, stop, play, quieter, pauseOrResume, seek,
                            pauseOrResume, stop}) {
         act();
         // From zero to a crest, five periods later.
         for (int block = 0; block < 4; ++block) {
-            std::vector<std::int16_t> given(std::size_t{2 * 579});
-            queue.Give(given);
-            sound.TopUp();
-            for (const std::int16_t sample : given)
-                heard.push_back(static_cast<float>(sample) / 32768);
+            Hear(std::size_t{4 * 579});
+            sound->TopUp();
         }
-        const bool silent = sound.GetStatus() != psPlaying;
-        EXPECT_EQ(*std::max_element(heard.end() - 200, heard.end()) == 0, silent);
+        const bool silent = sound->GetStatus() != psPlaying;
+        EXPECT_EQ(*std::max_element(heard_.end() - 200, heard_.end()) == 0, silent);
     }
     // Two sounds at once, each glides.
-    EXPECT_LT(LargestStep(heard), SteepestStep(kLoud) + 2.0 / static_cast<double>(GlideFrames(kRate)));
+    EXPECT_LT(LargestStep(heard_), SteepestStep(kLoud) + 2.0 / static_cast<double>(GlideFrames(kRate)));
 }
 
 TEST_F(EldoSTest, ModulesAreLookedForInTheirFolders) {
@@ -259,7 +239,7 @@ TEST_F(EldoSTest, ALostOutputKeepsThePlaceUntilItIsBack) {
     const auto sound = Sound(ToneFile(u"wav"_s));
     sound->Open();
     sound->Play();
-    record_.queued -= 44100;  // a quarter of a second was heard
+    Hear(44100);  // a quarter of a second was heard
     record_.lost = true;
     record_.canOpen = false;
     sound->TopUp();
