@@ -210,8 +210,13 @@ void TTunesteadMainWnd::SetUpPlacement() {
         const QSize wanted(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
         resize(wanted.boundedTo(screen()->availableSize() * 0.9));
     }
-    // After the window's size: the docks' are parts of it.
-    restoreState(ReadSetting(settings, WindowSettings::kMainFormState).value_or(QByteArray()));
+    dockState_ = ReadSetting(settings, WindowSettings::kMainFormState).value_or(QByteArray());
+}
+
+// The sizes of the docks are parts of the window's, and only a window that is shown keeps those it is given.
+void TTunesteadMainWnd::showEvent(QShowEvent* event) {
+    QMainWindow::showEvent(event);
+    if (!dockState_.isEmpty()) restoreState(std::exchange(dockState_, {}));
 }
 
 // --- Starting ---

@@ -58,6 +58,7 @@ class TTunesteadMainWnd : public QMainWindow {
     bool TakeOver(const StartRequest& request);
 
  protected:
+    void showEvent(QShowEvent* event) override;
     void closeEvent(QCloseEvent* event) override;
     void dragEnterEvent(QDragEnterEvent* event) override;
     void dragLeaveEvent(QDragLeaveEvent* event) override;
@@ -106,6 +107,7 @@ class TTunesteadMainWnd : public QMainWindow {
     QLabel* marked_ = nullptr;
     QTimer markedTimer_;
     bool ending_ = false;     // as soon as the long operation has stopped
+    QByteArray dockState_;    // of the last run, until the window is shown
     QString linkPath_;        // folder of the program's shortcuts
     bool firstTime_ = false;  // this is the program's first start
     bool started_ = false;    // the standard files are open and the command line is done

@@ -69,6 +69,7 @@ void TPlaySound::LookForOutput() {
     waiting_.reset();
     if (!engines_.IsOpen()) return ClearPanel();  // its file has gone
     StartTimers();
+    events_.Notice.Tell(u"Die Tonausgabe ist wieder da."_s);
     if (!song.Begun) return AnnounceSong();
     events_.Resumed.Tell();
     Feedback(fbResumed);
