@@ -120,8 +120,8 @@ class TPlayList : public QObject, public SettingsClient {
     void Save(const QString& fileName);
     // Saves under the known name, or asks for one. False when the user cancelled.
     bool SaveOrAsk(bool askForName = false);
-    // For whoever is about to begin or load another list: lets the user save what was changed in this one.
-    // False when the user wants to keep it.
+    // For whoever is about to begin or load another list: lets the user save what was changed in this one,
+    // or what only the standard file keeps. False when the user wants to keep it.
     bool MayBeReplaced();
     // The file that whichever list is open is kept in from one run of the program to the next. The next list
     // takes its place there, so a list that has no other file asks for a name when it is saved before that.

@@ -85,10 +85,13 @@ bool TPlayList::SaveOrAsk(bool askForName) {
 
 bool TPlayList::MayBeReplaced() {
     const bool isNothing = Count() == 0 && playListFileName_.isEmpty();
-    if (!modified_ || isNothing) return true;
+    // The next list takes the place of one that has come from the last run.
+    const bool isHomeless = Count() > 0 && playListFileName_ == standardFileName_;
+    if (isNothing || !(modified_ || isHomeless)) return true;
     enum { buSave, buDiscard, buCancel };
     const int answer = UserDialogs().Ask(
-        {.Text = u"Die PlayList wurde geändert. Sollen die Änderungen gespeichert werden?"_s,
+        {.Text = modified_ ? u"Die PlayList wurde geändert. Sollen die Änderungen gespeichert werden?"_s
+                           : u"Die PlayList hat noch keine eigene Datei. Soll sie gespeichert werden?"_s,
          .Buttons = {u"Speichern"_s, u"Nicht speichern"_s, u"Abbrechen"_s},
          .Cancel = buCancel,
          .Default = buSave});

@@ -51,6 +51,8 @@ TEST_F(PlayListCommandsTest, WhatWasChangedIsNotThrownAwayWithoutAQuestion) {
     list_.Save(standard);
     list_.PlayEntry(0);
     EXPECT_FALSE(list_.Modified());
+    list_.ClickMenuItem(pcNew);  // cancelled: it is in no file that stays
+    EXPECT_EQ(Listed(), u"a"_s);
     Add(u"b"_s);
     dialogs_.Answers = {0, 0};
     list_.ClickMenuItem(pcNew);  // the next list would take the place of this one: under which name?
