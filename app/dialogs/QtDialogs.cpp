@@ -137,6 +137,8 @@ std::optional<QString> QtDialogs::Input(const QString& caption, const QString& p
         dialog.setComboBoxEditable(false);
     }
     dialog.setTextValue(preset);
+    constexpr int kWidth = 60;  // average characters: room for the caption too
+    dialog.resize(kWidth * dialog.fontMetrics().averageCharWidth(), dialog.sizeHint().height());
     if (dialog.exec() != QDialog::Accepted) return std::nullopt;
     return dialog.textValue();
 }

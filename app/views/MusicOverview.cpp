@@ -43,7 +43,6 @@ TMusicOverview::TMusicOverview(TMusicDatabase& database, QWidget* parent)
     SetUpFilter();
     SetUpList();
     FitToFont();
-    setFocusProxy(list_);
     database.JoinSettings(*this);
 }
 

@@ -55,7 +55,6 @@ TOptionsForm::TOptionsForm(TMusicDatabase& database, TRWReg& settings, QWidget* 
     setWindowTitle(u"Einstellungen"_s);
     list_->setObjectName(u"pages"_s);
     list_->setAccessibleName(u"Seiten der Einstellungen"_s);
-    SetUpButtons();
     // In the order of OptionsTab.
     AddPage(new GeneralPage);
     AddPage(new DatabasePage);
@@ -64,6 +63,7 @@ TOptionsForm::TOptionsForm(TMusicDatabase& database, TRWReg& settings, QWidget* 
     AddPage(new PlaybackPage(database_));
     AddPage(new CdsPage);
     AddPage(new RemoteControlPage(database_));
+    SetUpButtons();  // after the pages, as the tab key goes
     SetUpLayout();
     connect(list_, &QListWidget::currentRowChanged, this, [this](int row) {
         stack_->setCurrentIndex(row);
