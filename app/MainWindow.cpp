@@ -116,6 +116,8 @@ void TTunesteadMainWnd::SetUpStatusBar() {
     marked_->setObjectName(u"marked"_s);
     statusBar()->addPermanentWidget(marked_);
     statusBar()->addPermanentWidget(summary_);
+    // What is too long for the bar can still be read.
+    connect(statusBar(), &QStatusBar::messageChanged, statusBar(), &QWidget::setToolTip);
     // Marking with the keyboard changes the marks many times a second.
     constexpr int kMarkedDelay = 80;  // milliseconds
     markedTimer_.setSingleShot(true);

@@ -38,6 +38,14 @@ QSet<QString> NamesIn(const TPlayList& list) {
     return names;
 }
 
+QString InOneLine(const QString& text) {
+    QStringList lines = text.split(u'\n', Qt::SkipEmptyParts);
+    for (QString& line : lines)
+        line = line.simplified();
+    lines.removeAll(QString());
+    return lines.join(u" – "_s);
+}
+
 }  // namespace
 
 Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& songs, PlayingOptions options)
@@ -135,7 +143,7 @@ void Playing::FollowPlayer() {
     subscriptions_ += events.Changed.Subscribe([this] { FollowSong(); });
     subscriptions_ += events.Started.Subscribe([this] { followers_.FollowSong(); });
     subscriptions_ += events.Notice.Subscribe([this](const QString& text) {
-        if (OnDone) OnDone(text.simplified());
+        if (OnDone) OnDone(InOneLine(text));
     });
 }
 
