@@ -289,8 +289,18 @@ TEST_F(MainWindowTest, TheMenuFollowsADatabaseThatBecomesReadOnly) {
     EXPECT_EQ(window_->menuBar()->actions().size(), menus);
 }
 
-TEST_F(MainWindowTest, TheWindowKeepsItsSizeBetweenTwoStarts) {
+TEST_F(MainWindowTest, TheWindowAndItsDocksKeepTheirSizesBetweenTwoStarts) {
     Start();
+    Child<QDockWidget>(u"PlaylistForm"_s)->hide();
+    auto* overview = Child<QDockWidget>(u"OverviewForm"_s);
+    const int usualWidth = overview->width();
+    window_->resizeDocks({overview}, {usualWidth + 30}, Qt::Horizontal);
+    const int width = overview->width();
+    EXPECT_GT(width, usualWidth);
+    window_->close();
+    Start();
+    EXPECT_EQ(Child<QDockWidget>(u"OverviewForm"_s)->width(), width);
+
     const int usualHeight = window_->height();
     SmallestSize();
     window_->close();
