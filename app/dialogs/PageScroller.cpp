@@ -1,5 +1,6 @@
 #include "app/dialogs/PageScroller.h"
 
+#include <QApplication>
 #include <QEvent>
 #include <QScrollBar>
 
@@ -15,6 +16,18 @@ PageScroller::PageScroller(QWidget* sheet, QWidget* parent) : QScrollArea(parent
     setFocusPolicy(Qt::NoFocus);
     setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
     setWidget(sheet);
+    connect(qApp, &QApplication::focusChanged, this, [this](QWidget*, QWidget* field) { ShowField(field); });
+}
+
+// Fields that go with it still move the focus.
+PageScroller::~PageScroller() {
+    disconnect(qApp, nullptr, this, nullptr);
+}
+
+// A letter may lead to a field that is out of sight. What the mouse is on stays where it is.
+void PageScroller::ShowField(QWidget* field) {
+    if (QApplication::mouseButtons() == Qt::NoButton && widget()->isAncestorOf(field))
+        ensureWidgetVisible(field);
 }
 
 int PageScroller::FrameWidth() const {

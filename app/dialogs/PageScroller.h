@@ -7,6 +7,7 @@
 class PageScroller : public QScrollArea {
  public:
     explicit PageScroller(QWidget* sheet, QWidget* parent = nullptr);
+    ~PageScroller() override;
 
     QSize sizeHint() const override;
     QSize minimumSizeHint() const override;
@@ -16,4 +17,5 @@ class PageScroller : public QScrollArea {
 
  private:
     int FrameWidth() const;
+    void ShowField(QWidget* field);
 };
