@@ -1,3 +1,5 @@
+#include <QScopeGuard>
+
 #include "tests/playback/control/PlayerRig.h"
 
 // The end of a song, the time limit, and counting.
@@ -177,6 +179,11 @@ TEST_F(TickTest, PauseBeginsTheThirtySecondsAnew) {
 }
 
 TEST_F(TickTest, CopyOfAListedSongCountsForTheSong) {
+    // The folder for copies belongs to this test, not to all that run.
+    const QByteArray former = qgetenv("TMPDIR");
+    const auto restore =
+        qScopeGuard([&] { former.isNull() ? qunsetenv("TMPDIR") : qputenv("TMPDIR", former); });
+    qputenv("TMPDIR", QFile::encodeName(QFileInfo(folder_.Path(u"a.wav"_s)).path()));
     database_.AddSong(Add(u"a.wav"_s));
     list_.Insert(0, {.Name = folder_.Path(u"a.wav"_s)});
     list_.SetCopyMp3sBeforePlay(true);
