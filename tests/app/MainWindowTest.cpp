@@ -295,6 +295,7 @@ TEST_F(MainWindowTest, TheWindowAndItsDocksKeepTheirSizesBetweenTwoStarts) {
     auto* overview = Child<QDockWidget>(u"OverviewForm"_s);
     const int usualWidth = overview->width();
     window_->resizeDocks({overview}, {usualWidth + 30}, Qt::Horizontal);
+    Work();
     const int width = overview->width();
     EXPECT_GT(width, usualWidth);
     window_->close();
