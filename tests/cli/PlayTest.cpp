@@ -26,8 +26,7 @@ class PlayTest : public CommandTest {
     CommandResult WriteMix(const QStringList& words) {
         const CommandResult result = RunWords(
             QStringList{u"play"_s, u"--fast"_s, u"--output"_s, u"file:"_s + Path(u"mix.wav"_s)} + words);
-        QFile file(Path(u"mix.wav"_s));
-        if (file.open(QIODevice::ReadOnly)) mix_ = file.readAll().mid(kWaveHeader);
+        mix_ = folder_.Get(u"mix.wav"_s).mid(kWaveHeader);
         return result;
     }
     double Seconds() const { return static_cast<double>(mix_.size()) / (4 * kRate); }

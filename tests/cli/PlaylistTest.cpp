@@ -10,10 +10,6 @@ namespace {
 class PlaylistCommandTest : public CommandTest {
  protected:
     CommandResult Run(const QStringList& words) const { return RunWords(QStringList{u"playlist"_s} + words); }
-    QByteArray BytesOf(const QString& name) const {
-        QFile file(Path(name));
-        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
-    }
     QString List() const {
         Put(Path(u"l.m3u"_s), AsBytes("#EXTM3U\n#EXTINF:227,Björk - Venus\tas a Boy\n/m/a.mp3\nb.mp3\n"));
         return Path(u"l.m3u"_s);
@@ -39,14 +35,14 @@ TEST_F(PlaylistCommandTest, AListIsConvertedToTheFormatOfTheExtension) {
     const QString native = Path(u"l.rukpl"_s);
     EXPECT_EQ(Run({List(), u"--out"_s, native}).Status, esDone);
     EXPECT_EQ(Run({native, u"--out"_s, Path(u"l.pls"_s)}).Status, esDone);
-    EXPECT_EQ(BytesOf(u"l.pls"_s),
+    EXPECT_EQ(folder_.Get(u"l.pls"_s),
               "[playlist]\r\nFile1=/m/a.mp3\r\nTitle1=Björk - Venus\tas a Boy\r\nLength1=227\r\nFile2=" +
                   Path(u"b.mp3"_s).toUtf8() + "\r\nNumberOfEntries=2\r\nVersion=2\r\n");
 }
 
 TEST_F(PlaylistCommandTest, WhatCannotBeReadOrMeantIsSaid) {
     Run({List(), u"--out"_s, Path(u"l.rukpl"_s)});
-    const QByteArray before = BytesOf(u"l.rukpl"_s);
+    const QByteArray before = folder_.Get(u"l.rukpl"_s);
     Put(Path(u"cut.rukpl"_s), AsBytes({before.constData(), 60}));
     struct Case {
         QStringList Words;
@@ -66,5 +62,5 @@ TEST_F(PlaylistCommandTest, WhatCannotBeReadOrMeantIsSaid) {
         EXPECT_TRUE(result.Err.contains(test.Message)) << result.Err.toStdString();
         EXPECT_EQ(result.Out, QString());
     }
-    EXPECT_EQ(BytesOf(u"l.rukpl"_s), before);
+    EXPECT_EQ(folder_.Get(u"l.rukpl"_s), before);
 }

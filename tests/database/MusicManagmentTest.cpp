@@ -172,6 +172,12 @@ TEST_F(MusicManagmentTest, AChangedSongIsCountedAnewAndMoved) {
     EXPECT_EQ(database_.Genres()[0], 2);
     EXPECT_EQ(database_.IndexOf(u":00000001:\\BandA"_s), -1);
     EXPECT_EQ(database_.IndexOf(u":00000001:\\BandD"_s), 2);
+    // Only what a change changes is told: the year stays in its decade.
+    TID3Tag live = Song(u"D"_s, u"Band"_s, 2);
+    live.Album = u"Live"_s;
+    live.Year = u"1989"_s;
+    EXPECT_EQ(database_.UpdateEntry(2, live), 2);
+    EXPECT_EQ(log_.Take(), (QStringList{u"update 1 0 2"_s, u"insert 1 1 Live 1"_s, u"change 2 0"_s}));
     EXPECT_EQ(database_.UpdateEntry(3, Song(u"X"_s)), -1);
     EXPECT_EQ(database_.UpdateEntry(-1, Song(u"X"_s)), -1);
     database_.SetReadOnly(true);
@@ -382,12 +388,6 @@ TEST_F(MusicManagmentTest, ASongOfAListNotYetSortedIsTheOneThatChanges) {
     ++played.PlayCount;
     EXPECT_EQ(database_.UpdateEntry(0, played), 2);
     EXPECT_EQ(Titles(), (QStringList{u"A"_s, u"B"_s, u"C"_s}));
-}
-
-TEST(SongTypesTest, FlagsAreNamedInBitOrder) {
-    EXPECT_EQ(FormatSongFlags(0), u"(keine)"_s);
-    EXPECT_EQ(FormatSongFlags(sfRemixed | sfBurned), u"Auf CD gebrannt, Remixed"_s);
-    EXPECT_EQ(FormatSongFlags(255), u"Auf CD gebrannt, Beschädigt, Länge korrekt, Remixed"_s);
 }
 
 // The index over the paths is held against a look at every song, through many changes.

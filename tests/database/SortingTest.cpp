@@ -11,8 +11,6 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-using Change = void (*)(TID3Tag&);
-
 TID3Tag PlainSong() {
     TID3Tag song;
     song.FileName = u"/m/song.mp3"_s;
@@ -23,12 +21,20 @@ TID3Tag PlainSong() {
     return song;
 }
 
+using Tag = TID3Tag;
+
+template <typename T>
+Tag With(T Tag::*field, std::type_identity_t<T> value, Tag song = {}) {
+    song.*field = std::move(value);
+    return song;
+}
+
 // Two songs that differ as told, and the order in which they stand.
 struct PairCase {
     const char* Name;
     SongOrder Order;
-    Change First;
-    Change Second;
+    TID3Tag First;
+    TID3Tag Second;
 };
 
 unsigned Below(std::mt19937& random, std::size_t limit) {
@@ -115,11 +121,7 @@ class SongPairTest : public testing::TestWithParam<PairCase> {};
 }  // namespace
 
 TEST_P(SongPairTest, StandsInTheOrderOfItsKey) {
-    TID3Tag first = PlainSong();
-    TID3Tag second = PlainSong();
-    GetParam().First(first);
-    GetParam().Second(second);
-    SongOrder order = GetParam().Order;
+    auto [name, order, first, second] = GetParam();
     EXPECT_LT(CompareSongs(order, first, second), 0);
     EXPECT_GT(CompareSongs(order, second, first), 0);
     EXPECT_EQ(CompareSongs(order, first, first), 0);
@@ -130,96 +132,55 @@ TEST_P(SongPairTest, StandsInTheOrderOfItsKey) {
 INSTANTIATE_TEST_SUITE_P(
     Keys, SongPairTest,
     testing::Values(
-        PairCase{"TitleIgnoresCase",
-                 {stTitle},
-                 [](TID3Tag& s) { s.Title = u"ANNA"_s; },
-                 [](TID3Tag& s) { s.Title = u"berta"_s; }},
+        PairCase{"TitleIgnoresCase", {stTitle}, With(&Tag::Title, u"ANNA"_s), With(&Tag::Title, u"berta"_s)},
         PairCase{"TitleUmlautStandsByItsLetter",
                  {stTitle},
-                 [](TID3Tag& s) { s.Title = u"Ärger"_s; },
-                 [](TID3Tag& s) { s.Title = u"Bach"_s; }},
-        PairCase{"Artist",
-                 {stArtist},
-                 [](TID3Tag& s) { s.Artist = u"a"_s; },
-                 [](TID3Tag& s) { s.Artist = u"B"_s; }},
-        PairCase{
-            "Album", {stAlbum}, [](TID3Tag& s) { s.Album = u"a"_s; }, [](TID3Tag& s) { s.Album = u"B"_s; }},
-        PairCase{"Comment",
-                 {stComment},
-                 [](TID3Tag& s) { s.Comment = u""_s; },
-                 [](TID3Tag& s) { s.Comment = u"B"_s; }},
-        PairCase{"YearIsANumber",
-                 {stYear},
-                 [](TID3Tag& s) { s.Year = u"900"_s; },
-                 [](TID3Tag& s) { s.Year = u"1000"_s; }},
-        PairCase{"YearWithoutNumberIsZero",
-                 {stYear},
-                 [](TID3Tag& s) { s.Year = u"zzzz"_s; },
-                 [](TID3Tag& s) { s.Year = u"1"_s; }},
-        PairCase{"YearMayBeNegative",
-                 {stYear},
-                 [](TID3Tag& s) { s.Year = u"-5"_s; },
-                 [](TID3Tag& s) { s.Year = u"0"_s; }},
-        PairCase{"Length", {stLength}, [](TID3Tag& s) { s.Length = 9; }, [](TID3Tag& s) { s.Length = 10; }},
-        PairCase{"GenreByItsNumber",
-                 {stGenre},
-                 [](TID3Tag& s) { s.MainGenre = 13; },
-                 [](TID3Tag& s) { s.MainGenre = 14; }},
+                 With(&Tag::Title, u"Ärger"_s),
+                 With(&Tag::Title, u"Bach"_s)},
+        PairCase{"Artist", {stArtist}, With(&Tag::Artist, u"a"_s), With(&Tag::Artist, u"B"_s)},
+        PairCase{"Album", {stAlbum}, With(&Tag::Album, u"a"_s), With(&Tag::Album, u"B"_s)},
+        PairCase{"Comment", {stComment}, With(&Tag::Comment, u""_s), With(&Tag::Comment, u"B"_s)},
+        PairCase{"YearIsANumber", {stYear}, With(&Tag::Year, u"900"_s), With(&Tag::Year, u"1000"_s)},
+        PairCase{"YearWithoutNumberIsZero", {stYear}, With(&Tag::Year, u"zzzz"_s), With(&Tag::Year, u"1"_s)},
+        PairCase{"YearMayBeNegative", {stYear}, With(&Tag::Year, u"-5"_s), With(&Tag::Year, u"0"_s)},
+        PairCase{"Length", {stLength}, With(&Tag::Length, 9), With(&Tag::Length, 10)},
+        PairCase{"GenreByItsNumber", {stGenre}, With(&Tag::MainGenre, 13), With(&Tag::MainGenre, 14)},
         PairCase{"LocalPathBeforeCdPath",
                  {stPath},
-                 [](TID3Tag& s) { s.FileName = u"/z"_s; },
-                 [](TID3Tag& s) { s.FileName = u":00000001:\\a"_s; }},
-        PairCase{"PathIgnoresCase",
-                 {stPath},
-                 [](TID3Tag& s) { s.FileName = u"/A/x"_s; },
-                 [](TID3Tag& s) { s.FileName = u"/a/y"_s; }},
+                 With(&Tag::FileName, u"/z"_s),
+                 With(&Tag::FileName, u":00000001:\\a"_s)},
+        PairCase{
+            "PathIgnoresCase", {stPath}, With(&Tag::FileName, u"/A/x"_s), With(&Tag::FileName, u"/a/y"_s)},
         PairCase{"PlayCountBeyondSignedRange",
                  {stPlayCnt},
-                 [](TID3Tag& s) { s.PlayCount = 1; },
-                 [](TID3Tag& s) { s.PlayCount = 4'000'000'000; }},
-        PairCase{"AddTimeByLessThanADay",
-                 {stAddTime},
-                 [](TID3Tag& s) { s.AddTime = -0.5; },
-                 [](TID3Tag& s) { s.AddTime = 0.25; }},
+                 With(&Tag::PlayCount, 1),
+                 With(&Tag::PlayCount, 4'000'000'000)},
+        PairCase{"AddTimeByLessThanADay", {stAddTime}, With(&Tag::AddTime, -0.5), With(&Tag::AddTime, 0.25)},
         PairCase{"FlagsAsAWhole",
                  {stFlags},
-                 [](TID3Tag& s) { s.Flags = sfBurned | sfDamaged; },
-                 [](TID3Tag& s) { s.Flags = sfLengthCorrect; }},
+                 With(&Tag::Flags, sfBurned | sfDamaged),
+                 With(&Tag::Flags, sfLengthCorrect)},
         PairCase{"OnlyTheShownFlagCounts",
                  {.SortType = stFlags, .ShownFlag = sfDamaged},
-                 [](TID3Tag& s) { s.Flags = sfRemixed; },
-                 [](TID3Tag& s) { s.Flags = sfDamaged; }},
+                 With(&Tag::Flags, sfRemixed),
+                 With(&Tag::Flags, sfDamaged)},
         PairCase{"FileBeforeSongOfAnAbsentCd",
                  {stCacheType},
-                 [](TID3Tag& s) { s.Title = u"z"_s; },
-                 [](TID3Tag& s) { s.FileName = u":00000001:\\a"_s; }},
-        PairCase{"TieGenreBeforeArtist",
-                 {stYear, sstGATL},
-                 [](TID3Tag& s) { s.Artist = u"z"_s; },
-                 [](TID3Tag& s) { s.MainGenre = 6; }},
+                 With(&Tag::FileName, u"/z"_s),
+                 With(&Tag::FileName, u":00000001:\\a"_s)},
+        PairCase{
+            "TieGenreBeforeArtist", {stYear, sstGATL}, With(&Tag::Artist, u"z"_s), With(&Tag::MainGenre, 6)},
         PairCase{"TieWithoutGenre",
                  {stYear, sstATL},
-                 [](TID3Tag& s) {
-                     s.Artist = u"a"_s;
-                     s.MainGenre = 6;
-                 },
-                 [](TID3Tag& s) { s.Artist = u"b"_s; }},
-        PairCase{"TieArtistBeforeTitle",
-                 {stYear, sstATL},
-                 [](TID3Tag& s) { s.Title = u"z"_s; },
-                 [](TID3Tag& s) { s.Artist = u"b"_s; }},
-        PairCase{"TieTitleBeforeLength",
-                 {stYear, sstATL},
-                 [](TID3Tag& s) { s.Length = 200; },
-                 [](TID3Tag& s) { s.Title = u"z"_s; }},
-        PairCase{"TieLengthLast",
-                 {stYear, sstGATL},
-                 [](TID3Tag& s) { s.FileName = u"/z"_s; },
-                 [](TID3Tag& s) { s.Length = 101; }},
-        PairCase{"TieByPathAlone",
-                 {stYear, sstPath},
-                 [](TID3Tag& s) { s.Title = u"z"_s; },
-                 [](TID3Tag& s) { s.FileName = u"/z"_s; }}),
+                 With(&Tag::MainGenre, 6, With(&Tag::Artist, u"a"_s)),
+                 With(&Tag::Artist, u"b"_s)},
+        PairCase{
+            "TieArtistBeforeTitle", {stYear, sstATL}, With(&Tag::Title, u"z"_s), With(&Tag::Artist, u"b"_s)},
+        PairCase{
+            "TieTitleBeforeLength", {stYear, sstATL}, With(&Tag::Length, 200), With(&Tag::Title, u"z"_s)},
+        PairCase{"TieLengthLast", {stYear, sstGATL}, With(&Tag::FileName, u"/z"_s), With(&Tag::Length, 101)},
+        PairCase{
+            "TieByPathAlone", {stYear, sstPath}, With(&Tag::Title, u"z"_s), With(&Tag::FileName, u"/z"_s)}),
     [](const auto& pair) { return pair.param.Name; });
 
 TEST(SortingTest, SongsThatDifferOnlyInCaseAreEqual) {
