@@ -2,28 +2,21 @@
 
 #include <gtest/gtest.h>
 
-#include <QFile>
-#include <QTemporaryDir>
-
 #include "CommonRUKTools/Errors.h"
 #include "tests/PrintQt.h"
+#include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
 
+const QString kName = u"fenster.df"_s;
+
 class ArrangementTest : public testing::Test {
  protected:
-    QString Path() const { return folder_.filePath(u"fenster.df"_s); }
-    QByteArray Written() const {
-        QFile file(Path());
-        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
-    }
+    QString Path() const { return folder_.Path(kName); }
     bool IsRefused(const QByteArray& text) const {
-        QFile file(Path());
-        if (!file.open(QIODevice::WriteOnly)) return false;
-        file.write(text);
-        file.close();
+        folder_.Put(kName, text);
         try {
             ReadArrangement(Path());
             return false;
@@ -33,7 +26,7 @@ class ArrangementTest : public testing::Test {
     }
 
     const Arrangement arrangement_{QByteArray("\0\n=a", 4), QByteArray("\xff\xfe"), "columns"};
-    QTemporaryDir folder_;
+    SongFolder folder_;
 };
 
 TEST_F(ArrangementTest, ComesBackAsItWasSavedAndDamagedIsRefused) {
@@ -42,7 +35,7 @@ TEST_F(ArrangementTest, ComesBackAsItWasSavedAndDamagedIsRefused) {
     EXPECT_EQ(read.Placement, arrangement_.Placement);
     EXPECT_EQ(read.Docks, arrangement_.Docks);
     EXPECT_EQ(read.Columns, arrangement_.Columns);
-    const QByteArray sound = Written();
+    const QByteArray sound = folder_.Get(kName);
     EXPECT_FALSE(IsRefused(QByteArray(sound).replace("\n", "\r\n")));
     EXPECT_TRUE(IsRefused("Filesystem 1K-blocks Used Available\n"));
     EXPECT_TRUE(IsRefused(QByteArray(sound).replace("Version=1", "Version=2")));

@@ -2,10 +2,8 @@
 
 #include <gtest/gtest.h>
 
-#include <QDir>
 #include <QDirIterator>
 #include <QRegularExpression>
-#include <QTemporaryDir>
 
 #include "CommonRUKTools/Errors.h"
 #include "app/desktop/DesktopEntry.h"
@@ -14,6 +12,7 @@
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
 #include "tests/database/RecordingTrash.h"
+#include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
 
@@ -26,23 +25,15 @@ class InstallationTest : public testing::Test {
  protected:
     InstallationTest() { Write(u"bin/tunestead"_s, "a program"); }
 
-    QString In(const QString& name) const { return folder_.filePath(name); }
-    void Write(const QString& name, const QByteArray& contents) const {
-        QDir().mkpath(QFileInfo(In(name)).path());
-        QFile file(In(name));
-        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
-        file.write(contents);
-    }
-    QByteArray Read(const QString& name) const {
-        QFile file(In(name));
-        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
-    }
+    QString In(const QString& name) const { return folder_.Path(name); }
+    void Write(const QString& name, const QByteArray& contents) const { folder_.Put(name, contents); }
+    QByteArray Read(const QString& name) const { return folder_.Get(name); }
     // Every file below the temporary folder but the program.
     QStringList Files() const {
         QStringList files;
-        QDirIterator each(folder_.path(), QDir::Files, QDirIterator::Subdirectories);
+        QDirIterator each(folder_.Path(), QDir::Files, QDirIterator::Subdirectories);
         while (each.hasNext())
-            files << QDir(folder_.path()).relativeFilePath(each.next());
+            files << QDir(folder_.Path()).relativeFilePath(each.next());
         files.removeAll(u"bin/tunestead"_s);
         files.sort();
         return files;
@@ -58,7 +49,7 @@ class InstallationTest : public testing::Test {
     const QString entry_ = u"data/applications/tunestead.desktop"_s;
     const QStringList installed_ = {entry_, u"data/icons/hicolor/scalable/apps/tunestead.svg"_s,
                                     u"data/mime/packages/tunestead.xml"_s};
-    QTemporaryDir folder_;
+    SongFolder folder_;
     QStringList runs_;
     QString complaint_;
     Installation installation_ = Of(u"bin/tunestead"_s);

@@ -3,7 +3,6 @@
 #include <gtest/gtest.h>
 
 #include <QAction>
-#include <QDir>
 #include <QDockWidget>
 #include <QDropEvent>
 #include <QFile>
@@ -35,6 +34,8 @@ namespace {
 constexpr int kYes = 0;
 constexpr int kNo = 1;
 
+const QString kStandardDatabase = u"data/Tunestead3_Database.tsdb"_s;
+
 // Something may happen while a question stands.
 struct BusyDialogs : ScriptedDialogs {
     std::function<void()> Meanwhile;
@@ -47,23 +48,12 @@ struct BusyDialogs : ScriptedDialogs {
 // A main window over a data folder of its own, and songs to take in.
 class MainWindowTest : public testing::Test {
  protected:
-    QString InData(const QString& name) const { return folder_.Path(u"data/"_s + name); }
-    QString StandardDatabase() const { return InData(u"Tunestead3_Database.tsdb"_s); }
+    QString StandardDatabase() const { return folder_.Path(kStandardDatabase); }
     QString Music() const { return folder_.Path(u"Musik"_s); }
 
     void MakeSongs(int count, const QString& artist = u"Band"_s) const {
         for (int i = 0; i < count; ++i)
             folder_.Add(u"Musik/%1/%1 - Lied %2.wav"_s.arg(artist).arg(100 + i), 2);
-    }
-    static void Write(const QString& path, const QByteArray& bytes) {
-        QDir().mkpath(QFileInfo(path).path());
-        QFile file(path);
-        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
-        file.write(bytes);
-    }
-    static QByteArray Read(const QString& path) {
-        QFile file(path);
-        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
     }
 
     void Start(const QStringList& arguments = {}, Installation* setup = nullptr) {
@@ -229,22 +219,22 @@ TEST_F(MainWindowTest, TheSystemEndsTheProgramAlsoDuringARunAndNothingIsLost) {
 }
 
 TEST_F(MainWindowTest, ADamagedStandardDatabaseIsOnlyGivenUpWhenTheUserAgrees) {
-    Write(StandardDatabase(), "TSDB By");
-    const QByteArray before = Read(StandardDatabase());
+    folder_.Put(kStandardDatabase, "TSDB By");
+    const QByteArray before = folder_.Get(kStandardDatabase);
     dialogs_.Answers = {kNo};
     Start();
     EXPECT_EQ(dialogs_.Messages, QStringList{u"Dies ist keine gültige Datenbank."_s});
     EXPECT_TRUE(
         dialogs_.Questions.value(0).startsWith(u"Die Standard-Datenbank wurde nicht komplett importiert."_s));
     EXPECT_FALSE(window_->isVisible());
-    EXPECT_EQ(Read(StandardDatabase()), before);
+    EXPECT_EQ(folder_.Get(kStandardDatabase), before);
 
     MakeSongs(1);
     dialogs_.Answers = {kYes};
     Start({Music()});
     EXPECT_TRUE(window_->isVisible());
     EXPECT_TRUE(window_->close());
-    EXPECT_NE(Read(StandardDatabase()), before);
+    EXPECT_NE(folder_.Get(kStandardDatabase), before);
 }
 
 TEST_F(MainWindowTest, AnotherDatabasesChangesAreOnlyLostWhenTheUserSaysSo) {
@@ -386,9 +376,9 @@ TEST_F(MainWindowTest, AnArrangementOfTheWindowsIsSavedAndComesBack) {
     EXPECT_TRUE(dialogs_.Messages.isEmpty());
 
     // What the file says of the docks is damaged: nothing changes.
-    const QString damaged = folder_.Path(u"kaputt.df"_s);
-    Write(damaged,
-          "[Tunestead Desktop]\nVersion=1\nMainForm=AAAA\nMainFormState=AAAA\nSongListColumns=AAAA\n");
+    const QString damaged = folder_.Put(
+        u"kaputt.df"_s,
+        "[Tunestead Desktop]\nVersion=1\nMainForm=AAAA\nMainFormState=AAAA\nSongListColumns=AAAA\n");
     window_->resize(larger);
     window_->TakeOver({{damaged}, {}});
     EXPECT_TRUE(QTest::qWaitFor([this] { return !dialogs_.Messages.isEmpty(); }));
@@ -425,7 +415,8 @@ TEST_F(MainWindowTest, WhatWasRemovedWithTheProgramDoesNotComeBack) {
     Start({u"-uninstall"_s}, &installation);
     EXPECT_FALSE(window_->isVisible());
     EXPECT_EQ(dialogs_.Questions.size(), 4);
-    EXPECT_FALSE(QFile::exists(StandardDatabase()) || QFile::exists(InData(u"Tunestead3_BannList.str"_s)) ||
+    EXPECT_FALSE(QFile::exists(StandardDatabase()) ||
+                 QFile::exists(folder_.Path(u"data/Tunestead3_BannList.str"_s)) ||
                  QFile::exists(folder_.Path(u"settings.ini"_s)));
     SetTrash(nullptr);
 }

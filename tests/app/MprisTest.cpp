@@ -6,8 +6,6 @@
 #include <QDBusObjectPath>
 #include <QDBusReply>
 #include <QDBusVariant>
-#include <QFile>
-#include <QTemporaryDir>
 #include <QTest>
 
 #include "CommonRUKTools/CommandDispatcher.h"
@@ -16,6 +14,7 @@
 #include "tests/PrintQt.h"
 #include "tests/PrivateBus.h"
 #include "tests/app/ScriptedBackend.h"
+#include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
 
@@ -33,13 +32,11 @@ class MprisTest : public testing::Test {
         for (const int id : {plPlay, plPause, plStop, plPrevious, plNext})
             handlers_ += player_.Commands().Handle(id, {.Run = [this, id] { commands_ << id; }});
         for (const QString& name : {u"a"_s, u"b"_s}) {
-            QFile file(folder_.filePath(name + u".mp3"_s));
-            EXPECT_TRUE(file.open(QIODevice::WriteOnly));
             TID3Tag record;
             record.Title = name.toUpper();
             record.Artist = u"Band"_s;
             record.Album = u"Platte"_s;
-            list_.Insert(list_.Count(), {.Name = file.fileName(), .Record = record});
+            list_.Insert(list_.Count(), {.Name = folder_.Add(name + u".mp3"_s), .Record = record});
         }
     }
     void TearDown() override {
@@ -62,7 +59,7 @@ class MprisTest : public testing::Test {
     }
     QVariantMap Metadata() { return qdbus_cast<QVariantMap>(Property(u"Metadata"_s)); }
 
-    QTemporaryDir folder_;
+    SongFolder folder_;
     PrivateBus bus_;
     QDBusConnection desktop_ = bus_.Connect(u"desktop"_s);
     ScriptedSong song_;

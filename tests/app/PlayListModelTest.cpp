@@ -2,15 +2,14 @@
 
 #include <gtest/gtest.h>
 
-#include <QFile>
 #include <QFont>
 #include <QMimeData>
-#include <QTemporaryDir>
 #include <QTest>
 #include <QUrl>
 
 #include "tests/PrintQt.h"
 #include "tests/app/Songs.h"
+#include "tests/database/SongFolder.h"
 #include "tests/playlist/ScriptedPlayer.h"
 
 using namespace Qt::StringLiterals;
@@ -28,11 +27,7 @@ class PlayListModelTest : public testing::Test {
     ~PlayListModelTest() override { list_.SetPlaySound(nullptr); }
 
     // A song that is there.
-    QString File(const QString& name) {
-        QFile file(folder_.filePath(name + u".mp3"_s));
-        EXPECT_TRUE(file.open(QIODevice::WriteOnly));
-        return file.fileName();
-    }
+    QString File(const QString& name) { return folder_.Put(name + u".mp3"_s, QByteArray()); }
     QVariant Data(int row, PlayListColumn column, int role = Qt::DisplayRole) const {
         return model_.data(model_.index(row, static_cast<int>(column)), role);
     }
@@ -47,7 +42,7 @@ class PlayListModelTest : public testing::Test {
     }
     bool IsGrey(int row) const { return Data(row, PlayListColumn::Title, Qt::ForegroundRole).isValid(); }
 
-    QTemporaryDir folder_;
+    SongFolder folder_;
     TMusicDatabase database_;
     TPlayList list_;
     ScriptedPlayer player_;
@@ -113,10 +108,10 @@ TEST_F(PlayListModelTest, QueuedEntriesCarryTheirPlace) {
 }
 
 TEST_F(PlayListModelTest, OnlyFilesThatWereLookedForAndNotFoundAreGrey) {
-    list_.Insert(1, {.Name = folder_.filePath(u"fehlt.mp3"_s)});
+    list_.Insert(1, {.Name = folder_.Path(u"fehlt.mp3"_s)});
     list_.Insert(2, {.Name = u":00000001:\\Lied.mp3"_s});
     list_.Insert(3, {.Name = u"http://radio.example/live.mp3"_s});
-    list_.Insert(list_.Count(), {.Name = folder_.filePath(u"fehlt auch.mp3"_s)});
+    list_.Insert(list_.Count(), {.Name = folder_.Path(u"fehlt auch.mp3"_s)});
     EXPECT_FALSE(IsGrey(1));
 
     model_.LookForFiles(0, 4);
@@ -132,7 +127,7 @@ TEST_F(PlayListModelTest, OnlyFilesThatWereLookedForAndNotFoundAreGrey) {
 TEST_F(PlayListModelTest, DraggedSongsAreFilesForOthersAndSongsForAPlayList) {
     const TID3Tag onCd = CdSong(u"Auf CD"_s);
     AddSong(database_, u"Auf CD"_s);
-    const QString file = folder_.filePath(u"a b#ü.mp3"_s);
+    const QString file = folder_.Path(u"a b#ü.mp3"_s);
     const SongMimeData data({{.Name = file}, {.Name = onCd.FileName, .Hint = 7}, {.Name = u"http://h/x"_s}});
     EXPECT_EQ(data.urls(), QList<QUrl>({QUrl::fromLocalFile(file), QUrl(u"http://h/x"_s)}));
 

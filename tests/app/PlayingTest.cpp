@@ -2,10 +2,8 @@
 
 #include <gtest/gtest.h>
 
-#include <QFile>
 #include <QMainWindow>
 #include <QMenuBar>
-#include <QTemporaryDir>
 #include <QTest>
 
 #include "CommonRUKTools/CommandDispatcher.h"
@@ -20,6 +18,7 @@
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
 #include "tests/app/ScriptedBackend.h"
+#include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
 
@@ -39,12 +38,10 @@ class PlayingTest : public testing::Test {
     }
     ~PlayingTest() override { playing_.reset(); }
 
-    QString Path(int number) const { return folder_.filePath(u"%1.mp3"_s.arg(number)); }
+    QString Path(int number) const { return folder_.Path(u"%1.mp3"_s.arg(number)); }
     void AddFile(int number) {
-        QFile file(Path(number));
-        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
         TID3Tag song;
-        song.FileName = file.fileName();
+        song.FileName = folder_.Add(u"%1.mp3"_s.arg(number));
         song.Title = QString::number(number);
         song.Length = 60;
         database_.AddEntry(QString(), song);
@@ -61,7 +58,7 @@ class PlayingTest : public testing::Test {
         window_.activateWindow();
         QApplication::processEvents();
     }
-    QString StandardList() const { return folder_.filePath(u"liste.rukpl"_s); }
+    QString StandardList() const { return folder_.Path(u"liste.rukpl"_s); }
     void Mark(const QList<int>& rows, int focus) {
         songs_->selectionModel()->clear();
         for (const int row : rows)
@@ -85,7 +82,7 @@ class PlayingTest : public testing::Test {
         ADD_FAILURE();
     }
 
-    QTemporaryDir folder_;
+    SongFolder folder_;
     ScriptedDialogs dialogs_;
     ScriptedSong song_;
     TMusicDatabase database_;
@@ -220,15 +217,11 @@ TEST_F(PlayingTest, TheListIsThereAgainAtTheNextStart) {
 }
 
 TEST_F(PlayingTest, AListThatCannotBeReadIsNotLost) {
-    QFile file(StandardList());
-    ASSERT_TRUE(file.open(QIODevice::WriteOnly));
-    file.write("RUKPLYLST??");
-    file.close();
+    folder_.Put(u"liste.rukpl"_s, "RUKPLYLST??");
     RunCommand([this] { playing_->OpenStandardList(); });
     EXPECT_EQ(dialogs_.Messages.size(), 1);
     playing_->Close(true);
-    ASSERT_TRUE(file.open(QIODevice::ReadOnly));
-    EXPECT_EQ(file.readAll(), "RUKPLYLST??");
+    EXPECT_EQ(folder_.Get(u"liste.rukpl"_s), "RUKPLYLST??");
 }
 
 TEST_F(PlayingTest, FilesFromTheCommandLinePlayOrBecomeTheList) {
@@ -237,7 +230,7 @@ TEST_F(PlayingTest, FilesFromTheCommandLinePlayOrBecomeTheList) {
     EXPECT_EQ(Listed(), QString());
     Mark({0, 2}, 0);
     database_.ClickMenuItem(mcAddToPlayList);
-    const QString other = folder_.filePath(u"andere.m3u"_s);
+    const QString other = folder_.Path(u"andere.m3u"_s);
     playing_->PlayList().Save(other);
     playing_->OpenPlayList(QString());
     playing_->OpenPlayList(other);

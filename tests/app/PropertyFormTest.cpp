@@ -4,11 +4,9 @@
 
 #include <QBuffer>
 #include <QClipboard>
-#include <QFile>
 #include <QLineEdit>
 #include <QMainWindow>
 #include <QPlainTextEdit>
-#include <QTemporaryDir>
 #include <QTest>
 
 #include "MusicManagment/database/MusicManagment.h"
@@ -19,6 +17,7 @@
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
 #include "tests/app/Songs.h"
+#include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
 
@@ -31,16 +30,14 @@ class PropertyFormTest : public testing::Test {
         form_.resize(400, 600);
     }
 
-    QString WriteSong(const QString& name, const Bytes& bytes) const {
-        QFile file(folder_.filePath(name));
-        EXPECT_TRUE(file.open(QIODevice::WriteOnly));
-        file.write(reinterpret_cast<const char*>(bytes.data()), static_cast<qint64>(bytes.size()));
-        return file.fileName();
+    // With a tag and some sound.
+    TID3Tag Song(const QString& name, const Bytes& tag) const {
+        const Bytes file = Mp3Builder().Raw(tag).Frames(80).Data();
+        return database_.GetEntry(-1, folder_.Put(name, ByteSpan(file)));
     }
     TID3Tag TaggedSong() const {
-        const auto tag = TitledTag("Lied", "Band").Text("TALB", "Das Album").Text("TYER", "1999").Build();
-        const QString path = WriteSong(u"lied.mp3"_s, Mp3Builder().Raw(tag).Frames(80).Data());
-        return database_.GetEntry(-1, path);
+        return Song(u"lied.mp3"_s,
+                    TitledTag("Lied", "Band").Text("TALB", "Das Album").Text("TYER", "1999").Build());
     }
     void Show(const TID3Tag& song) {
         form_.show();
@@ -48,7 +45,7 @@ class PropertyFormTest : public testing::Test {
     }
     QStringList Lines() const { return form_.Properties().AllText().split(u'\n'); }
 
-    QTemporaryDir folder_;
+    SongFolder folder_;
     TMusicDatabase database_;
     mutable TPropertyForm form_{database_};
 };
@@ -59,7 +56,7 @@ TEST_F(PropertyFormTest, ShowsWhatIsKnownAtOnceAndTheFileLater) {
     song.PlayCount = 12;
     Show(song);
     for (const QString& line :
-         {u"Name: lied.mp3"_s, u"Ordner: "_s + folder_.path(), u"Größe: …"_s, u"Album: Das Album"_s,
+         {u"Name: lied.mp3"_s, u"Ordner: "_s + folder_.Path(), u"Größe: …"_s, u"Album: Das Album"_s,
           u"Bitrate: 128 KBit/s"_s, u"Beliebtheit: 12"_s, u"Hinzugefügt am: 01.01.2024 12:00"_s})
         EXPECT_TRUE(Lines().contains(line)) << line.toStdString();
     EXPECT_FALSE(Lines().contains(u"ID3v2-Frames"_s));
@@ -81,7 +78,7 @@ TEST_F(PropertyFormTest, ShowsTheCoverReduced) {
     const auto withCover = [&](const QString& name, const QByteArray& bytes) {
         auto tag = TitledTag("Lied", "Band");
         tag.Frame("APIC", std::string("\0image/png\0\3\0", 13) + bytes.toStdString());
-        return database_.GetEntry(-1, WriteSong(name, Mp3Builder().Raw(tag.Build()).Frames(80).Data()));
+        return Song(name, tag.Build());
     };
     const auto& cover = *static_cast<CoverView*>(form_.findChild<QWidget*>(u"cover"_s));
     Show(withCover(u"a.mp3"_s, png));
@@ -124,7 +121,7 @@ TEST_F(PropertyFormTest, AnUnreadableFileIsToldInALine) {
     EXPECT_TRUE(Lines().filter(u"Größe"_s).isEmpty());
 
     TID3Tag song;
-    song.FileName = folder_.path();  // a folder can be opened by nobody as a song
+    song.FileName = folder_.Path();  // a folder can be opened by nobody as a song
     Show(song);
     form_.ReadFile();
     EXPECT_EQ(Lines().filter(u"Fehler: "_s).size(), 1);

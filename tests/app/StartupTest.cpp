@@ -4,7 +4,6 @@
 
 #include <QDir>
 #include <QFile>
-#include <QTemporaryDir>
 
 #include "MusicManagment/database/MusicManagment.h"
 #include "app/CollectionCommands.h"
@@ -12,6 +11,7 @@
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
 #include "tests/ScriptedDialogs.h"
+#include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
 
@@ -21,18 +21,10 @@ namespace {
 class StartupTest : public testing::Test {
  protected:
     QString Make(const QString& name, const Bytes& contents = {}) const {
-        const QString path = folder_.filePath(name);
-        QDir().mkpath(QFileInfo(path).path());
-        QFile file(path);
-        if (!file.open(QIODevice::WriteOnly)) return {};
-        file.write(reinterpret_cast<const char*>(contents.data()), static_cast<qint64>(contents.size()));
-        return path;
+        return folder_.Put(name, ByteSpan(contents));
     }
     QString MakeSong(const QString& name) const { return Make(name, Mp3Builder().Frames(80).Data()); }
-    QByteArray BannList() const {
-        QFile file(files_.BannList());
-        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
-    }
+    QByteArray BannList() const { return folder_.Get(u"data/Tunestead3_BannList.str"_s); }
     StartupTest() {
         startup_.OpenStandardPlayList = [] {};
         startup_.OpenPlayList = [this](const QString& path) { opened_ << u"playlist "_s + path; };
@@ -40,12 +32,12 @@ class StartupTest : public testing::Test {
         startup_.OpenArrangement = [this](const QString& path) { opened_ << u"windows "_s + path; };
     }
 
-    QTemporaryDir folder_;
-    StandardFiles files_{folder_.filePath(u"data"_s)};
+    SongFolder folder_;
+    StandardFiles files_{folder_.Path(u"data"_s)};
     ScriptedDialogs dialogs_;
     TMusicDatabase database_;
     CollectionCommands commands_{database_, files_};
-    InstallationSteps installation_{nullptr, files_, folder_.filePath(u"settings.ini"_s)};
+    InstallationSteps installation_{nullptr, files_, folder_.Path(u"settings.ini"_s)};
     Startup startup_{database_, commands_, installation_};
     QStringList opened_;
 };

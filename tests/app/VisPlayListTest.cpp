@@ -4,12 +4,10 @@
 
 #include <QComboBox>
 #include <QDropEvent>
-#include <QFile>
 #include <QHeaderView>
 #include <QLabel>
 #include <QMimeData>
 #include <QSpinBox>
-#include <QTemporaryDir>
 #include <QTest>
 #include <QToolButton>
 #include <QUrl>
@@ -18,6 +16,7 @@
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
 #include "tests/app/Songs.h"
+#include "tests/database/SongFolder.h"
 #include "tests/playlist/ScriptedPlayer.h"
 
 using namespace Qt::StringLiterals;
@@ -120,10 +119,10 @@ TEST_F(VisPlayListTest, ADropGoesBetweenTheEntriesOrToTheEnd) {
 }
 
 TEST_F(VisPlayListTest, AListThatShrinksWhileADropIsReadGetsItAtItsEnd) {
-    const QTemporaryDir folder;
-    ASSERT_TRUE(QFile(folder.filePath(u"7.mp3"_s)).open(QIODevice::WriteOnly));
+    const SongFolder folder;
+    folder.Add(u"7.mp3"_s);
     QMimeData data;
-    data.setUrls({QUrl::fromLocalFile(folder.path())});
+    data.setUrls({QUrl::fromLocalFile(folder.Path())});
     QTimer::singleShot(0, [this] { list_.Remove({0, 1, 2, 3}); });  // before the drop is looked at
     Drop(data, QPoint(20, view_.viewport()->height() - 2));
     EXPECT_EQ(Order(), u"457"_s);
@@ -132,13 +131,9 @@ TEST_F(VisPlayListTest, AListThatShrinksWhileADropIsReadGetsItAtItsEnd) {
 
 TEST_F(VisPlayListTest, ADamagedPlayListIsToldAndChangesNothing) {
     ScriptedDialogs dialogs;
-    const QTemporaryDir folder;
-    QFile file(folder.filePath(u"kaputt.rukpl"_s));
-    ASSERT_TRUE(file.open(QIODevice::WriteOnly));
-    file.write("RUKPLYLST??");  // a version that nobody knows
-    file.close();
-    QMimeData data;
-    data.setUrls({QUrl::fromLocalFile(file.fileName())});
+    const SongFolder folder;
+    QMimeData data;  // a version that nobody knows
+    data.setUrls({QUrl::fromLocalFile(folder.Put(u"kaputt.rukpl"_s, "RUKPLYLST??"))});
     Drop(data, Above(0));
     EXPECT_EQ(dialogs.Messages.size(), 1);
     EXPECT_EQ(Order(), u"012345"_s);

@@ -3,9 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <QComboBox>
-#include <QFile>
 #include <QLabel>
-#include <QTemporaryDir>
 #include <QTest>
 #include <QToolButton>
 
@@ -15,6 +13,7 @@
 #include "app/views/VolumeSlider.h"
 #include "tests/PrintQt.h"
 #include "tests/app/ScriptedBackend.h"
+#include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
 
@@ -24,11 +23,8 @@ class VisPlaySoundTest : public testing::Test {
  protected:
     VisPlaySoundTest() {
         player_.SetPlayList(&list_);
-        for (const QString& name : {u"a"_s, u"b"_s}) {
-            QFile file(folder_.filePath(name + u".mp3"_s));
-            EXPECT_TRUE(file.open(QIODevice::WriteOnly));
-            list_.Insert(list_.Count(), {.Name = file.fileName()});
-        }
+        for (const QString& name : {u"a.mp3"_s, u"b.mp3"_s})
+            list_.Insert(list_.Count(), {.Name = folder_.Put(name, QByteArray())});
         panel_.resize(900, 60);
         panel_.show();
     }
@@ -43,7 +39,7 @@ class VisPlaySoundTest : public testing::Test {
         player_.Tick();
     }
 
-    QTemporaryDir folder_;
+    SongFolder folder_;
     ScriptedSong song_;
     TPlayList list_;
     TPlaySound player_{ScriptedEngines(song_)};
@@ -57,7 +53,7 @@ TEST_F(VisPlaySoundTest, TheVolumeIsToldAndKept) {
     EXPECT_EQ(gain, 1);
     volume.setValue(50);
     EXPECT_EQ(gain, 0.25F);
-    TRWReg settings(u"Test"_s, folder_.filePath(u"settings"_s));
+    TRWReg settings(u"Test"_s, folder_.Path(u"settings"_s));
     volume.SaveSettings(settings);
     QTest::keyClick(&volume, Qt::Key_Home);
     EXPECT_EQ(gain, 0);
