@@ -75,16 +75,6 @@ TEST_F(SoundLibraryTest, ChannelsComeBackAndOpenFilesAreCounted) {
     EXPECT_EQ(library.FSOUND_GetError(), FMOD_ERR_MEMORY);
 }
 
-TEST(OutputChoiceTest, TextsNameOutputs) {
-    using Kind = OutputChoice::Kind;
-    EXPECT_EQ(ParseOutputChoice(u"null"_s)->kind, Kind::Null);
-    EXPECT_EQ(ParseOutputChoice(u"capture:/tmp/a:b.wav"_s)->name, u"/tmp/a:b.wav"_s);
-    EXPECT_EQ(ParseOutputChoice(u"file:a.wav"_s)->kind, Kind::WavFile);
-    EXPECT_EQ(ParseOutputChoice(u"sdl:pipewire"_s)->kind, Kind::Sdl);
-    for (const QString& text : {u""_s, u"nul"_s, u"sdl:"_s, u"file"_s, u":x"_s})
-        EXPECT_FALSE(ParseOutputChoice(text)) << text.toStdString();
-}
-
 TEST(OutputChoiceTest, OutputThatIsNotThereFailsAtInitialisation) {
     const auto restore = qScopeGuard([] { qunsetenv("TUNESTEAD_AUDIO"); });
     struct Case {

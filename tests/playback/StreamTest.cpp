@@ -192,19 +192,6 @@ INSTANTIATE_TEST_SUITE_P(
         return name;
     });
 
-TEST_F(StreamTest, JoinedFilesHaveNoGap) {
-    const Samples whole = Sine({.frequency = 441, .amplitude = 0.4}, 2);
-    const auto middle = whole.begin() + static_cast<std::ptrdiff_t>(whole.size() / 2);
-    Encode(Path("1.mp3"), {whole.begin(), middle}, {.codec = "libmp3lame", .format = "mp3"});
-    Encode(Path("2.mp3"), {middle, whole.end()}, {.codec = "libmp3lame", .format = "mp3"});
-    Samples joined = HearAll(Path("1.mp3"));
-    joined.resize(whole.size() / 2);
-    const Samples second = HearAll(Path("2.mp3"));
-    joined.insert(joined.end(), second.begin(),
-                  second.begin() + static_cast<std::ptrdiff_t>(whole.size() / 2));
-    EXPECT_LT(Difference(joined, 0, whole, 0, whole.size() / 2), 0.05);
-}
-
 TEST_F(StreamTest, DamageCostsOnlyItsPlaceAndACutOnlyTheRest) {
     Encode(Path("a.mp3"), Sweep(6), {.codec = "libmp3lame", .format = "mp3"});
     QByteArray bytes = ReadBytes(Path("a.mp3"));

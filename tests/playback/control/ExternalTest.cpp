@@ -83,26 +83,12 @@ TEST_F(ExternalTest, FirstMeetingTellsAllSettings) {
     ASSERT_EQ(greeting.size(), kGreeting + 1);
     EXPECT_EQ(greeting.first(), u"22 77"_s);
     EXPECT_EQ(greeting.last(), u"17 \"a.mp3\""_s);
+    script_.Answers[4] = 99;  // a status that there is not
+    EXPECT_EQ(player_.GetStatus(), psClosed);
+    EXPECT_EQ(script_.Take(), QStringList(u"4 0"_s));
     player_.SetFileName(Add(u"b.mp3"_s));
     EXPECT_EQ(script_.Take(), QStringList({u"13 0"_s, u"14 0"_s, u"17 \"b.mp3\""_s}));
     EXPECT_EQ(Open(), QString());
-}
-
-TEST_F(ExternalTest, OperationsAreCommands) {
-    OpenThere(u"a.mp3"_s);
-    script_.Answers = {{1, 1234}, {3, 180'000}, {4, psPlaying}};
-    player_.Play();
-    player_.SetPosition(5000);
-    EXPECT_EQ(player_.GetPosition(), 1234U);
-    EXPECT_EQ(player_.GetLength(), 180'000U);
-    EXPECT_EQ(player_.GetStatus(), psPlaying);
-    player_.PauseResume();
-    player_.Stop();
-    player_.Stop(StopMode::Fade);
-    EXPECT_EQ(script_.Take(), QStringList({u"15 0"_s, u"2 5000"_s, u"1 0"_s, u"3 0"_s, u"4 0"_s, u"20 0"_s,
-                                           u"19 0"_s, u"19 1"_s}));
-    script_.Answers[4] = 99;
-    EXPECT_EQ(player_.GetStatus(), psClosed);
 }
 
 TEST_F(ExternalTest, CrossFadesAreTheOtherProgramsBusiness) {

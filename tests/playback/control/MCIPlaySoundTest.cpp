@@ -16,24 +16,18 @@ namespace {
 class ScriptedMci : public MciInterface {
  public:
     QStringList Log;
-    MciParameters Last;
+    MciParameters Last, Opened;
     std::map<MciCommand, quint32> Errors;
-    std::map<quint32, quint32> Values;  // answers of Status by item
 
     quint32 SendCommand(quint32 device, MciCommand command, quint32 flags,
                         MciParameters& parameters) override {
         Log << u"%1 %2@%3"_s.arg(static_cast<quint32>(command)).arg(flags).arg(device);
-        if (command == MciCommand::Open) parameters.Device = 5;
-        if (command == MciCommand::Status) parameters.Value = Values[parameters.Item];
         Last = parameters;
-        if (command == MciCommand::Open) opened_ = parameters;
+        if (command == MciCommand::Open) Opened = parameters;
+        parameters.Device = 5;
         return Errors[command];
     }
     QString ErrorString(quint32 error) override { return u"Fehler %1 "_s.arg(error) + QString(200, u'x'); }
-    const MciParameters& Opened() const { return opened_; }
-
- private:
-    MciParameters opened_;
 };
 
 class MciTest : public testing::Test {
@@ -48,35 +42,16 @@ class MciTest : public testing::Test {
     TMCIPlaySound sound_{mci_, folder_.Path(u"settings.conf"_s)};
 };
 
-TEST_F(MciTest, OperationsAreCommandsToTheDeviceOfTheFile) {
-    sound_.Close();  // nothing is asked without one
-    EXPECT_EQ(sound_.GetPosition() + sound_.GetLength(), 0U);
+TEST_F(MciTest, ASeekPlaysWhateverItDidBeforeAndADeviceWithoutALoudnessPlaysOn) {
     Open(u"folder/a.mp3"_s);
-    EXPECT_EQ(std::exchange(mci_.Log, {}), QStringList({u"2051 8704@0"_s, u"2061 1024@5"_s}));
-    EXPECT_EQ(mci_.Opened().Element, u"a.mp3"_s);
+    EXPECT_EQ(mci_.Opened.Element, u"a.mp3"_s);
     EXPECT_EQ(QDir::currentPath(), folder_.Path(u"folder"_s));
-    sound_.Play();
-    sound_.Stop();
-    EXPECT_EQ(std::exchange(mci_.Log, {}), QStringList({u"2054 1@5"_s, u"2056 0@5"_s, u"2055 256@5"_s}));
-    mci_.Values = {{1, 180'000}, {2, 1234}};
-    EXPECT_EQ(sound_.GetLength(), 180'000U);
-    EXPECT_EQ(sound_.GetPosition(), 1234U);
-    mci_.Values[4] = 526;
-    sound_.PauseResume();
-    EXPECT_EQ(mci_.Log.last(), u"2057 0@5"_s);
-    mci_.Values[4] = 529;
-    sound_.PauseResume();
-    EXPECT_EQ(mci_.Log.last(), u"2054 1@5"_s);
     mci_.Log.clear();
-    sound_.SetPosition(5000);  // plays, whatever it did before
-    EXPECT_EQ(std::exchange(mci_.Log, {}), QStringList({u"2055 8@5"_s, u"2054 1@5"_s}));
-    mci_.Errors[MciCommand::SetAudio] = 1;  // a device without a loudness plays on
+    sound_.SetPosition(5000);
+    EXPECT_EQ(mci_.Log, QStringList({u"2055 8@5"_s, u"2054 1@5"_s}));
+    mci_.Errors[MciCommand::SetAudio] = 1;
     sound_.SetGain(0.5F);
     EXPECT_EQ(mci_.Last.Value, 500U);
-    mci_.Log.clear();
-    sound_.Close();
-    sound_.Close();
-    EXPECT_EQ(mci_.Log, QStringList({u"2052 0@5"_s}));
 }
 
 TEST_F(MciTest, DeviceTypeGoesByTheExtensionUnlessASettingNamesOne) {

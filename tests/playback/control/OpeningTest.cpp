@@ -32,17 +32,6 @@ TEST_F(OpeningTest, MissingFileOpensNothingAndClearsThePanel) {
     EXPECT_FALSE(player_.Timers().Ticking());
 }
 
-TEST_F(OpeningTest, WithoutAnAllowedEngineAnExceptionSaysSo) {
-    Change([](EngineSettings& s) { s.UseFMOD = s.UseWinAmp = false; });
-    try {
-        player_.SetFileName(Add(u"a.ogg"_s));
-        FAIL() << "opened " << Open().toStdString();
-    } catch (const EPlaySoundException& error) {
-        EXPECT_EQ(error.Message(),
-                  u"Keine Engine zum Verwenden freigegeben (UseFMOD, UseMCI, UseEldoS, UseWinAmp, ...)"_s);
-    }
-}
-
 TEST_F(OpeningTest, AfterTheFirstEngineTheLastAllowedOneStays) {
     onCreate_[TEngine::FMOD] = Refuse<EFMODException>(u"FMOD kaputt"_s);
     player_.SetFileName(Add(u"a.mp3"_s));
