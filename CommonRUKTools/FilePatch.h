@@ -1,9 +1,11 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 #include <vector>
 
 #include "CommonRUKTools/ByteReader.h"
+#include "CommonRUKTools/ByteWriter.h"
 #include "CommonRUKTools/FileSource.h"
 
 // How a new version of a file comes out of the old one: ranges of the old file and new bytes, in the order of
@@ -28,11 +30,19 @@ class FilePatch {
     std::int64_t InsertedBytes() const { return insertedBytes_; }
     // Whether the new file is the old one, of this size.
     bool ChangesNothing(std::int64_t oldSize) const;
+    // Whether a file of this size has every range that is kept.
+    bool IsFor(std::int64_t oldSize) const;
     // Whether every kept range lies where it lay, so that the file can be written over in its place.
     bool FitsInPlace() const;
     // What makes the old version out of the new one again. Reads the bytes that go from `old`. Throws
     // EStreamError when a range lies outside of it.
     FilePatch Inverse(ByteSource& old) const;
+    // The same change without kept ranges: all bytes of the new file. Throws like Inverse.
+    FilePatch Whole(ByteSource& old) const;
+
+    // As bytes of a file; docs/formats.md describes them. Nothing comes back from bytes that are no patch.
+    void Write(ByteWriter& writer) const;
+    static std::optional<FilePatch> Read(ByteReader& reader);
 
     bool operator==(const FilePatch&) const = default;
 

@@ -2,10 +2,10 @@
 
 #include <QFile>
 #include <QFileInfo>
-#include <QRandomGenerator>
 #include <cerrno>
 
 #include "CommonRUKTools/Errors.h"
+#include "CommonRUKTools/FileChange.h"
 #include "CommonRUKTools/FileSync.h"
 #include "CommonRUKTools/SystemError.h"
 
@@ -25,12 +25,6 @@ QString FollowLink(const QString& path) {
     if (!info.isSymLink()) return path;
     const QString real = info.canonicalFilePath();
     return real.isEmpty() ? path : real;
-}
-
-// A short name, because the target's may be as long as names can be.
-QString OtherName(const QString& target) {
-    return QFileInfo(target).absolutePath() + u"/.tunestead-"_s +
-           QString::number(QRandomGenerator::system()->generate64(), 36) + u".tmp"_s;
 }
 
 [[noreturn]] void Throw(const QString& what, const QString& path, int error) {
@@ -55,7 +49,7 @@ SafeFile::~SafeFile() {
 void SafeFile::Create() {
     file_ = CreateNewFile(temporary_);
     if (file_ >= 0) return;
-    temporary_ = OtherName(target_);
+    temporary_ = TemporaryBeside(target_);
     file_ = CreateNewFile(temporary_);
     if (file_ < 0) Throw(u"Kann die Datei nicht anlegen: "_s, target_, errno);
 }

@@ -1,13 +1,8 @@
 #include "CommonRUKTools/Trash.h"
 
-#include <QFile>
+#include "CommonRUKTools/platform/SystemTrash.h"
 
 namespace {
-
-class SystemTrash : public Trash {
- public:
-    bool Take(const QString& path) override { return QFile::moveToTrash(path); }
-};
 
 Trash*& Installed() {
     static Trash* trash = nullptr;
@@ -16,9 +11,25 @@ Trash*& Installed() {
 
 }  // namespace
 
+bool Trash::Take(const QString& path) {
+    const QString place = PlaceFor(path);
+    return !place.isEmpty() && TakeTo(path, place);
+}
+
+QString Trash::PlaceFor(const QString&) {
+    return {};
+}
+
+bool Trash::TakeTo(const QString&, const QString&) {
+    return false;
+}
+
+bool Trash::Restore(const QString&, const QString&) {
+    return false;
+}
+
 Trash& CurrentTrash() {
-    static SystemTrash system;
-    return Installed() != nullptr ? *Installed() : system;
+    return Installed() != nullptr ? *Installed() : SystemTrash();
 }
 
 void SetTrash(Trash* trash) {

@@ -1,0 +1,6 @@
+#pragma once
+
+#include "CommonRUKTools/Trash.h"
+
+// The bin of the desktop.
+Trash& SystemTrash();
