@@ -16,12 +16,6 @@ namespace {
 // A file that would be written over as a whole has its old bytes in memory and in the journal.
 constexpr std::int64_t kLargestWhole = std::int64_t{256} << 20;
 
-// Of the file system's clock, not the program's: a file that changes twice must have two times.
-std::int64_t NowNs() {
-    using namespace std::chrono;
-    return duration_cast<nanoseconds>(system_clock::now().time_since_epoch()).count();
-}
-
 [[noreturn]] void ThrowChanged(const QString& path) {
     throw EFileChanged(u"Die Datei "_s + path + u" wurde inzwischen von einem anderen Programm geändert."_s);
 }
@@ -122,6 +116,11 @@ bool MayBeHalfWritten(const FileState& now, const PatchPlan& plan) {
 
 }  // namespace
 
+std::int64_t FileTimeNow() {
+    using namespace std::chrono;
+    return duration_cast<nanoseconds>(system_clock::now().time_since_epoch()).count();
+}
+
 FileState StateOf(const QString& path) {
     FileCalls::Facts facts;
     return FileCalls::Look(path, facts) ? facts.State : FileState();
@@ -149,7 +148,7 @@ PatchPlan PlanPatch(const QString& path, FilePatch patch, const FileState& expec
         else
             plan.Temporary = TemporaryBeside(plan.Path);
     }
-    plan.After = {.Size = plan.Patch.NewSize(), .ModifiedNs = modifiedNs != 0 ? modifiedNs : NowNs()};
+    plan.After = {.Size = plan.Patch.NewSize(), .ModifiedNs = modifiedNs != 0 ? modifiedNs : FileTimeNow()};
     return plan;
 }
 

@@ -31,6 +31,10 @@ struct FileState {
     bool operator==(const FileState&) const = default;
 };
 
+// The time that a file gets which is written now. Of the file system's clock, not the program's: a file that
+// changes twice must have two times.
+std::int64_t FileTimeNow();
+
 // Of the file that the name leads to, links followed.
 FileState StateOf(const QString& path);
 

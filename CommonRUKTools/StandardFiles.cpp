@@ -34,6 +34,10 @@ QString StandardFiles::PlayList() const {
     return Folder + u"/Tunestead3_PlayList.rukpl"_s;
 }
 
+QString StandardFiles::Journal() const {
+    return Folder + u"/Tunestead3_Journal.tsj"_s;
+}
+
 void StandardFiles::MakeFolder() const {
     if (!QDir().mkpath(Folder)) throw EStreamError(u"Kann den Ordner "_s + Folder + u" nicht anlegen."_s);
 }

@@ -9,6 +9,7 @@ struct StandardFiles {
     QString Database() const;
     QString BannList() const;
     QString PlayList() const;
+    QString Journal() const;
 
     // Makes the folder where it is missing. Throws EStreamError when that is not possible.
     void MakeFolder() const;

@@ -8,6 +8,7 @@ cd "$(dirname "$(realpath "$0")")/.."
 
 # The rooms of the database, from the ground up. Rooms of one line may not see each other.
 floors="core sorting
+journal
 search songfiles tsdb
 intake
 commands"

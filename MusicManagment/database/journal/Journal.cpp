@@ -1,0 +1,151 @@
+#include "MusicManagment/database/journal/Journal.h"
+
+#include <QFileInfo>
+#include <QSet>
+#include <algorithm>
+
+#include "CommonRUKTools/AbsolutePath.h"
+#include "CommonRUKTools/FileSource.h"
+#include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/journal/JournalLists.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+// What a batch needs beside its old bytes: frames, names, and room for others on a disk that is nearly full.
+constexpr qint64 kRoomBeside = qint64{16} << 20;
+
+BatchInfo InfoOf(const RestOfBatch& rest) {
+    const BatchHeader& header = rest.Batch->Header;
+    BatchInfo info{
+        .Id = header.Id, .Time = header.Time, .Caption = header.Caption, .Database = header.Database};
+    QSet<quint32> items;
+    for (const quint32 number : rest.Steps) {
+        const JournalStep& step = rest.Batch->Steps[number].Head;
+        if (step.IsOfFile()) items.insert(step.Item);
+    }
+    info.Steps = static_cast<int>(rest.Steps.size());
+    info.Files = static_cast<int>(items.size());
+    return info;
+}
+
+std::optional<BatchInfo> LastOf(const std::vector<RestOfBatch>& list) {
+    return list.empty() ? std::nullopt : std::optional(InfoOf(list.back()));
+}
+
+}  // namespace
+
+EOtherDatabase::EOtherDatabase(const QString& database)
+    : ERukException(u"Der letzte Schritt gehört zu einer anderen Datenbank: "_s +
+                    (database.isEmpty() ? u"(noch nicht gespeichert)"_s : database)),
+      database_(database) {}
+
+Journal::Journal(QString path, JournalLimits limits) : path_(std::move(path)), limits_(limits) {}
+
+const JournalContents& Journal::Contents() const {
+    const FileState now = StateOf(path_);
+    if (now.Exists() ? now.IsStill(read_) : contents_.Batches.empty()) return contents_;
+    const auto file = FileSource::TryOpen(path_);
+    contents_ = file ? ReadJournal(*file) : JournalContents();
+    read_ = now;
+    return contents_;
+}
+
+std::vector<BatchInfo> Journal::Batches() const {
+    std::vector<BatchInfo> batches;
+    for (const RestOfBatch& rest : ListsOf(Contents()).ToUndo)
+        batches.insert(batches.begin(), InfoOf(rest));
+    return batches;
+}
+
+std::optional<BatchInfo> Journal::ToUndo() const {
+    return LastOf(ListsOf(Contents()).ToUndo);
+}
+
+std::optional<BatchInfo> Journal::ToRedo() const {
+    return LastOf(ListsOf(Contents()).ToRedo);
+}
+
+bool Journal::FitsBatch(qint64 bytes) const {
+    if (bytes > limits_.Bytes) return false;
+    const qint64 free = FreeBytes(QFileInfo(path_).absolutePath());
+    return free < 0 || bytes + kRoomBeside <= free;
+}
+
+std::unique_ptr<JournalFile> Journal::OpenForBatch() {
+    auto file = Open();
+    DropOldest(*file, limits_);
+    return file;
+}
+
+std::unique_ptr<JournalFile> Journal::Open() {
+    auto file = std::make_unique<JournalFile>(path_);
+    const RecoveryResult recovered = Recover(*file);
+    if (!recovered.IsEmpty() && OnTakenBack) OnTakenBack(recovered);
+    return file;
+}
+
+RecoveryResult Journal::TakeBackUnfinished() {
+    if (!HasUnfinished(Contents())) return {};
+    JournalFile file(path_);
+    RecoveryResult result = Recover(file);
+    Changed.Tell();
+    return result;
+}
+
+// --- What was found at the start ---
+
+QString RecoveryResult::Message() const {
+    QString message;
+    if (!TakenBack.isEmpty())
+        message = u"Das Ändern von Dateien ("_s + Caption +
+                  u") wurde unterbrochen. Diese Dateien sind wieder, wie sie vorher waren:\n"_s +
+                  TakenBack.join(u'\n');
+    if (Problems.isEmpty()) return message;
+    if (!message.isEmpty()) message += u"\n\n"_s;
+    return message + u"Diese Dateien konnten nicht wiederhergestellt werden:\n"_s + Problems.join(u'\n');
+}
+
+// --- A database that was not saved in time ---
+
+namespace {
+
+// Songs that come or go with their files do so; the others have only come or gone in the collection that was
+// not saved.
+bool AgreesWithDisk(const RecordChange& change) {
+    if (change.Before && change.After) return true;
+    return change.After ? FileSource::Exists(change.After->FileName)
+                        : !FileSource::Exists(change.Before->FileName);
+}
+
+}  // namespace
+
+int Journal::BringUpToDate(TMusicDatabase& database) const {
+    const QString path = AbsolutePath(database.FileName());
+    const FileState saved = StateOf(path);
+    if (!saved.Exists()) return 0;
+    std::vector<RecordChange> records;
+    std::vector<BanChange> bans;
+    for (const StoredBatch& batch : Contents().Batches) {
+        const bool wasSaved = batch.IsFinished && batch.FinishedNs <= saved.ModifiedNs;
+        if (wasSaved || batch.Header.Database != path) continue;
+        FileSource file(path_);
+        for (const StoredBatch::Step& step : batch.Steps) {
+            if (step.Outcome != StepOutcome::Done || step.Head.IsOfFile()) continue;
+            const auto loaded = LoadStep(file, step);
+            if (!loaded) continue;
+            if (loaded->Kind == StepKind::Ban)
+                bans.push_back(loaded->Ban);
+            else if (AgreesWithDisk(loaded->Record))
+                records.push_back(loaded->Record);
+        }
+    }
+    ApplyBans(database, bans);
+    return records.empty() ? 0
+                           : static_cast<int>(ApplyRecords(database, records, Applying::Again).Songs.size());
+}
+
+bool IsSameDatabase(const TMusicDatabase& database, const QString& path) {
+    return AbsolutePath(database.FileName()) == path;
+}
