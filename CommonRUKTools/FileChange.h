@@ -92,6 +92,7 @@ struct MovePlan {
     QString To{};
     FileState Before{};
     QStringList Folders{};  // that are missing, outermost first
+    QStringList Emptied{};  // that go afterwards where they are empty, likewise
     QString Temporary{};    // of a copy on another file system, until it is complete
 };
 

@@ -101,13 +101,14 @@ void RemoveSecond(const MovePlan& plan, const FileState& from, const FileState& 
 
 void BringBack(const MovePlan& plan, const FileState& to) {
     if (!to.Exists()) {
-        if (QFileInfo::exists(FolderOfFile(plan.From)) && QFileInfo::exists(FolderOfFile(plan.To)))
+        if (QFileInfo::exists(FolderOfFile(plan.To)))
             throw EFileChanged(u"Die Datei "_s + plan.To + u" gibt es nicht mehr."_s);
         ThrowNotMoved({.From = plan.To, .To = plan.From}, ENOENT);
     }
     if (!IsAbout(to, plan.Before))
         throw EFileChanged(u"Die Datei "_s + plan.To +
                            u" wurde inzwischen von einem anderen Programm geändert."_s);
+    MakeFolders(plan.Emptied);
     Rename(plan.To, plan.From, BackName(plan), {.From = plan.To, .To = plan.From});
 }
 
@@ -138,6 +139,7 @@ FileState CarryOutMove(const MovePlan& plan) {
         RemoveEmptyFolders(plan.Folders);
         throw;
     }
+    RemoveEmptyFolders(plan.Emptied);
     return StateOf(plan.To);
 }
 

@@ -11,7 +11,12 @@ PatchPlan JournalStep::AsPatch() const {
 }
 
 MovePlan JournalStep::AsMove() const {
-    return {.From = Path, .To = To, .Before = Before, .Folders = Folders, .Temporary = Temporary};
+    return {.From = Path,
+            .To = To,
+            .Before = Before,
+            .Folders = Folders,
+            .Emptied = Emptied,
+            .Temporary = Temporary};
 }
 
 // --- Small things ---

@@ -49,7 +49,6 @@ PlannedStep PlanUntrash(const JournalStep& done) {
 
 FileState FinishMove(const JournalStep& step) {
     FileState after = CarryOutMove(step.AsMove());
-    RemoveEmptyFolders(step.Emptied);
     if (step.After.ReadOnly && FileCalls::SetReadOnly(step.To, true)) after.ReadOnly = true;
     return after;
 }
