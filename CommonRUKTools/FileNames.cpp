@@ -1,6 +1,7 @@
 #include "CommonRUKTools/FileNames.h"
 
 #include <QStringList>
+#include <QTextBoundaryFinder>
 
 using namespace Qt::StringLiterals;
 
@@ -45,4 +46,25 @@ QString MakeValidFileName(const QString& text) {
         name.chop(1);
     if (name.isEmpty() || IsDeviceName(name)) name.prepend(u'_');
     return name;
+}
+
+qsizetype FileNameLength(QStringView name) {
+#ifdef Q_OS_WIN
+    return name.size();
+#else
+    return name.toUtf8().size();
+#endif
+}
+
+QString CutToFileNameLength(const QString& text, qsizetype longest) {
+    if (FileNameLength(text) <= longest) return text;
+    QTextBoundaryFinder characters(QTextBoundaryFinder::Grapheme, text);
+    qsizetype length = 0;
+    qsizetype end = 0;
+    for (qsizetype next = characters.toNextBoundary(); next > 0; next = characters.toNextBoundary()) {
+        length += FileNameLength(QStringView(text).mid(end, next - end));
+        if (length > longest) break;
+        end = next;
+    }
+    return text.left(end);
 }

@@ -198,6 +198,10 @@ class TMusicDatabase : public QObject {
     void SetReadOnly(bool value);
     bool RenameAndMoveMP3s() const { return renameAndMoveMP3s_; }
     void SetRenameAndMoveMP3s(bool value) { renameAndMoveMP3s_ = value; }
+    // Whether a renamed file stays in its folder where no genre folder is its target; off in a new component,
+    // where it goes below MP3MoveRootDir. Switched on by the programs.
+    bool RenameInPlace() const { return renameInPlace_; }
+    void SetRenameInPlace(bool value) { renameInPlace_ = value; }
     // Whether files are read with the modern profile; off in a new component, switched on by the programs.
     bool ModernTags() const { return modernTags_; }
     void SetModernTags(bool value) { modernTags_ = value; }
@@ -339,6 +343,7 @@ class TMusicDatabase : public QObject {
     bool useWinAmpForLenCheck_ = false;
     bool readOnly_ = false;
     bool renameAndMoveMP3s_ = true;
+    bool renameInPlace_ = false;
     bool modernTags_ = false;
     bool keepLostSongs_ = false;
     DatabaseLock fileLock_{*this};

@@ -18,15 +18,9 @@ constexpr std::array<BitRateRow, 3> kLowSampleRates = {{
     {0, 8, 16, 24, 32, 40, 48, 56, 64, 80, 96, 112, 128, 144, 160},
     {0, 8, 16, 24, 32, 40, 48, 56, 64, 80, 96, 112, 128, 144, 160},
 }};
-constexpr std::array<std::size_t, 3> kSampleRates = {44100, 48000, 32000};
+constexpr std::array<int, 3> kSampleRates = {44100, 48000, 32000};
 
 constexpr unsigned kMpeg1Code = 3;
-
-// Hz; MPEG 2 halves the rates of MPEG 1, MPEG 2.5 quarters them.
-std::size_t SampleRate(const IsoFrame& frame) {
-    const std::size_t divisor = frame.Version == kMpeg1Code ? 1 : frame.Version == 2 ? 2 : 4;
-    return kSampleRates[frame.SampleRateIndex] / divisor;
-}
 
 // Only Layer III has shorter frames at low sample rates.
 int CoefficientOf(const IsoFrame& frame) {
@@ -39,11 +33,18 @@ std::size_t FrameSize(const IsoFrame& frame, std::size_t padding) {
     // Layer I counts in slots of four bytes.
     const std::size_t slot = frame.Layer == 1 ? 4 : 1;
     const auto bits = static_cast<std::size_t>(frame.BitRate) * 1000;
-    const auto slots = static_cast<std::size_t>(frame.Coefficient) / slot * bits / SampleRate(frame);
+    const auto slots = static_cast<std::size_t>(frame.Coefficient) / slot * bits /
+                       static_cast<std::size_t>(frame.SampleRate());
     return (slots + padding) * slot;
 }
 
 }  // namespace
+
+// MPEG 2 halves the rates of MPEG 1, MPEG 2.5 quarters them.
+int IsoFrame::SampleRate() const {
+    const int divisor = Version == kMpeg1Code ? 1 : Version == 2 ? 2 : 4;
+    return kSampleRates[SampleRateIndex] / divisor;
+}
 
 std::optional<IsoFrame> IsoFrame::Parse(ByteSpan bytes) {
     if (bytes.size() < 4 || bytes[0] != 0xFF || (bytes[1] & 0xE0) != 0xE0) return std::nullopt;

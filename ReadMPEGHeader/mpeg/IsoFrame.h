@@ -18,6 +18,8 @@ struct IsoFrame {
     // Nothing when the bytes begin with no sync or with a code that the standards reserve.
     static std::optional<IsoFrame> Parse(ByteSpan bytes);
 
+    int SampleRate() const;  // Hz
+
     // True when both can belong to one stream.
     bool Matches(const IsoFrame& other) const {
         return Version == other.Version && Layer == other.Layer && SampleRateIndex == other.SampleRateIndex;

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include "ReadMPEGHeader/mpeg/FrameCount.h"
+
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/Builders.h"
 
@@ -83,4 +85,28 @@ TEST(MpegFrame, NothingIsCountedWhereNothingCanBe) {
             EXPECT_EQ(analysis.Tag.Length, 0);
         }
     }
+}
+
+TEST(FrameCount, EveryFrameIsCountedAndDamageIsTold) {
+    const auto count = [](const Mp3Builder& file) {
+        MemorySource source(file.Data());
+        return CountMpegFrames(source, 0);
+    };
+    // Two bit rates, a VBR header that counts one more, a cut frame, an ID3v1 tag.
+    Mp3Builder whole;
+    whole.FrameWith(kStereo128, 36, "Xing", {1, 201})
+        .Frames(100)
+        .Frames(100, {{0xFF, 0xFB, 0xB0, 0x64}, 626});
+    const FrameCount exact = count(Mp3Builder(whole).Id3v1("t", "a"));
+    EXPECT_EQ(exact.Frames, 200);
+    EXPECT_EQ(exact.Announced, 201);
+    EXPECT_EQ(exact.Skipped, 0);
+    EXPECT_EQ(exact.Seconds(), 5);  // 200 * 1152 / 44100
+    EXPECT_EQ(exact.BitRate(), 160);
+    EXPECT_EQ(count(Mp3Builder(whole).Raw(kStereo128.Header).Noise(20)).Frames, 200);
+    EXPECT_EQ(count(Mp3Builder(whole).Zeros(5000)).Skipped, 0);
+    const FrameCount damaged = count(Mp3Builder(whole).Noise(3001).Frames(50));
+    EXPECT_EQ(damaged.Frames, 250);
+    EXPECT_EQ(damaged.Skipped, 3001);
+    EXPECT_EQ(count(Mp3Builder().Noise(100)).Frames, 0);
 }

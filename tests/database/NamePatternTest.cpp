@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include "MusicManagment/database/songfiles/RenameTarget.h"
+
 #include "tests/PrintQt.h"
 
 using namespace Qt::StringLiterals;
@@ -36,6 +38,36 @@ TEST(NamePattern, ValuesAreExpandedOneAfterTheOther) {
     EXPECT_EQ(BuildNameFromPattern(u"%TITLE%"_s, u"x.mp3"_s, song), u"%TITLE%.mp3"_s);
     song.Artist.clear();
     EXPECT_EQ(BuildNameFromPattern(u"%ARTIST% - x"_s, u"x.mp3"_s, song), u" - x.mp3"_s);
+}
+
+TEST(NamePattern, ALongNameLosesTheEndOfItsTitle) {
+    TID3Tag song = Song();
+    song.Title = QString(300, u'ä');  // two bytes each
+    const QString name = BuildNameFromPattern(u"%TITLE% - %ARTIST%"_s, u"/m/x.mp3"_s, song).mid(3);
+    EXPECT_EQ(name.toUtf8().size(), 254);
+    EXPECT_TRUE(name.startsWith(u"ää"_s) && name.endsWith(u"ä - AC-DC.mp3"_s));
+    song.Album = u"👩‍👩‍👧"_s.repeated(30);  // one character of 18 bytes each
+    const QString album = BuildNameFromPattern(u"%ALBUM%"_s, u"x.mp3"_s, song);
+    EXPECT_EQ(album, u"👩‍👩‍👧"_s.repeated(13) + u".mp3"_s);
+}
+
+TEST(RenameTarget, FollowsTheSettings) {
+    TMusicDatabase database;
+    database.SetMP3MoveRootDir(u"/root"_s);
+    const TID3Tag song = Song();
+    const auto target = [&](const TID3Tag& info) { return RenameTarget(database, u"/old/x.mp3"_s, info); };
+    EXPECT_EQ(target(song), u"/root/old/AC-DC - Was ist_.mp3"_s);  // the old folder goes on below the root
+    database.SetRenameInPlace(true);
+    EXPECT_EQ(target(song), u"/old/AC-DC - Was ist_.mp3"_s);
+    database.SetMoveMP3sAfterGenreChange(true);
+    EXPECT_EQ(target(song), u"/root/Rock, Pop/AC-DC - Was ist_.mp3"_s);
+    TID3Tag unsorted = song;
+    unsorted.MainGenre = 0;
+    EXPECT_EQ(target(unsorted), u"/old/AC-DC - Was ist_.mp3"_s);
+    database.SetRenameAndMoveMP3s(false);
+    EXPECT_EQ(target(song), u"/old/x.mp3"_s);
+    EXPECT_EQ(RenameTargetByPattern(database, u"%ALBUM%"_s, u":00000000:\\x.mp3"_s, song),
+              u":00000000:\\x.mp3"_s);
 }
 
 TEST(NamePattern, TheNameIsValidEverywhere) {

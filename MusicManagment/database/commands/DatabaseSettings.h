@@ -52,7 +52,11 @@ inline constexpr PropertySetting kDerivedGenres{Setting<bool>{u"DerivedGenres", 
                                                 &TMusicDatabase::DerivedGenres,
                                                 &TMusicDatabase::SetDerivedGenres};
 
-inline constexpr std::tuple kRules{kModernTags, kKeepLostSongs, kDerivedGenres};
+inline constexpr PropertySetting kRenameInPlace{Setting<bool>{u"RenameInPlace", false, true},
+                                                &TMusicDatabase::RenameInPlace,
+                                                &TMusicDatabase::SetRenameInPlace};
+
+inline constexpr std::tuple kRules{kModernTags, kKeepLostSongs, kDerivedGenres, kRenameInPlace};
 
 inline constexpr std::tuple kOwn{kAutoSave,
                                  kCompression,

@@ -1,5 +1,6 @@
 #include "MusicManagment/database/songfiles/NamePattern.h"
 
+#include <algorithm>
 #include <utility>
 #include <vector>
 
@@ -33,16 +34,32 @@ std::vector<std::pair<QString, QString>> Values(const TID3Tag& info) {
     };
 }
 
-}  // namespace
-
-QString BuildNameFromPattern(const QString& pattern, const QString& path, const TID3Tag& info) {
+QString Expand(const QString& pattern, const TID3Tag& info) {
     QString name = pattern;
     for (const auto& [placeholder, value] : Values(info))
         name.replace(placeholder, value);
+    return MakeValidFileName(name);
+}
+
+QString FittingName(const QString& pattern, TID3Tag info, qsizetype longest) {
+    QString name = Expand(pattern, info);
+    if (FileNameLength(name) <= longest) return name;
+    info.Title = CutToFileNameLength(info.Title, longest);
+    while (FileNameLength(name) > longest && !info.Title.isEmpty()) {
+        info.Title = CutToFileNameLength(info.Title, FileNameLength(info.Title) - 1);
+        name = Expand(pattern, info);
+    }
+    return CutToFileNameLength(name, longest);
+}
+
+}  // namespace
+
+QString BuildNameFromPattern(const QString& pattern, const QString& path, const TID3Tag& info) {
     const qsizetype slash = path.lastIndexOf(u'/');
     const qsizetype dot = path.lastIndexOf(u'.');
     const QString extension = dot > slash ? path.mid(dot) : QString();
-    return path.left(slash + 1) + MakeValidFileName(name) + extension;
+    const qsizetype longest = std::max<qsizetype>(kLongestFileName - FileNameLength(extension), 0);
+    return path.left(slash + 1) + FittingName(pattern, info, longest) + extension;
 }
 
 QStringList NamePatternPlaceholders() {
