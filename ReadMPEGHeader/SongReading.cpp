@@ -13,6 +13,7 @@
 #include "ReadMPEGHeader/TitleCleaning.h"
 #include "ReadMPEGHeader/asf/Asf.h"
 #include "ReadMPEGHeader/id3v1/ID3v1.h"
+#include "ReadMPEGHeader/id3v2/ID3v2Position.h"
 #include "ReadMPEGHeader/mpeg/MpegFrame.h"
 #include "ReadMPEGHeader/wave/Wave.h"
 
@@ -20,9 +21,7 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr std::size_t kHeadSize = 16;     // holds the marks of RIFF and ASF
-constexpr std::int64_t kTrailerSize = 8;  // "ID32" and the position of a tag behind the audio
-constexpr std::int64_t kTrailerPosition = 4;
+constexpr std::size_t kHeadSize = 16;  // holds the marks of RIFF and ASF
 
 const ReadingProfile& ProfileOf(ReadProfile profile) {
     return profile == ReadProfile::Modern ? ModernProfile() : ClassicProfile();
@@ -111,14 +110,8 @@ class AudioFileReading {
     }
 
     void ReadTrailingTag() {
-        std::array<std::uint8_t, kTrailerSize> trailer{};
-        const std::int64_t start = stream_.Size() - kTrailerSize;
-        if (start < 0 || stream_.ReadAt(start, trailer) != trailer.size() || !StartsWith(trailer, "ID32"))
-            return;
-        ByteReader reader(trailer);
-        reader.Skip(kTrailerPosition);
-        const std::int64_t position = reader.U32Le();
-        if (position < stream_.Size() && StandsAt(stream_, position, "ID3")) ReadTag(position);
+        const auto position = TagOfTrailerBefore(stream_, stream_.Size());
+        if (position && *position < stream_.Size() && StandsAt(stream_, *position, "ID3")) ReadTag(*position);
     }
 
     // The first byte behind the tag.
