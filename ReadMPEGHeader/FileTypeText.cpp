@@ -29,3 +29,8 @@ QString FormatFromFileType(const QString& fileType) {
     const auto row = std::ranges::find(kFileTypes, type, &FileTypeRow::Type);
     return row == kFileTypes.end() ? fileType : row->Format.toString();
 }
+
+QString FileTypeFromFormat(const QString& format) {
+    const auto row = std::ranges::find(kFileTypes, QStringView(format), &FileTypeRow::Format);
+    return row == kFileTypes.end() ? format : row->Type.toString();
+}

@@ -18,6 +18,10 @@ struct CommentFields {
     // "Comment", "Private Angaben:" with its text on the next line, "URL:" lines; whatever is empty is left
     // out.
     QString Join() const;
+    // Takes a comment apart, wherever the captions stand: the rest of each line behind "URL:" is an address
+    // (a description in parentheses before it), what then stands behind "Private Angaben:" is the private
+    // text, what stands before it the comment. The line breaks that Join puts between them belong to none.
+    static CommentFields Split(const QString& text);
 };
 
 // "Private Angaben:", a line break and the text.

@@ -31,7 +31,10 @@ class FrameBody {
     std::uint32_t Number(std::size_t count);
     // The rest as one big-endian number; the largest 32-bit number when it does not fit.
     std::uint32_t Counter();
+    // Four bytes, least significant first.
+    std::uint32_t TurnedNumber() { return reader_.U32Le(); }
     ByteSpan Rest() { return reader_.Take(reader_.Remaining()); }
+    ByteSpan Take(std::size_t count) { return reader_.Take(count); }  // empty when fewer are left
     void Skip(std::size_t count) { reader_.Skip(count); }
 
     // The encoding of the texts that follow.

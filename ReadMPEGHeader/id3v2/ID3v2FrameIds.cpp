@@ -12,7 +12,7 @@ struct IdPair {
 
 // https://id3.org/id3v2-00, section 4, beside https://id3.org/id3v2.3.0
 // clang-format off
-constexpr std::array<IdPair, 60> kSuccessors = {{
+constexpr std::array<IdPair, 76> kSuccessors = {{
     {"BUF", "RBUF"}, {"CNT", "PCNT"}, {"COM", "COMM"}, {"CRA", "AENC"}, {"EQU", "EQUA"}, {"ETC", "ETCO"},
     {"GEO", "GEOB"}, {"IPL", "IPLS"}, {"LNK", "LINK"}, {"MCI", "MCDI"}, {"MLL", "MLLT"}, {"PIC", "APIC"},
     {"POP", "POPM"}, {"REV", "RVRB"}, {"RVA", "RVAD"}, {"SLT", "SYLT"}, {"STC", "SYTC"}, {"TAL", "TALB"},
@@ -23,6 +23,10 @@ constexpr std::array<IdPair, 60> kSuccessors = {{
     {"TRC", "TSRC"}, {"TRD", "TRDA"}, {"TRK", "TRCK"}, {"TSI", "TSIZ"}, {"TSS", "TSSE"}, {"TT1", "TIT1"},
     {"TT2", "TIT2"}, {"TT3", "TIT3"}, {"TXT", "TEXT"}, {"TXX", "TXXX"}, {"TYE", "TYER"}, {"UFI", "UFID"},
     {"ULT", "USLT"}, {"WAF", "WOAF"}, {"WAR", "WOAR"}, {"WAS", "WOAS"}, {"WCM", "WCOM"}, {"WXX", "WXXX"},
+    // Not in the standard, but written by a widespread program.
+    {"GP1", "GRP1"}, {"MVI", "MVIN"}, {"MVN", "MVNM"}, {"PCS", "PCST"}, {"TCP", "TCMP"}, {"TCT", "TCAT"},
+    {"TDR", "TDRL"}, {"TDS", "TDES"}, {"TID", "TGID"}, {"TKW", "TKWD"}, {"TS2", "TSO2"}, {"TSA", "TSOA"},
+    {"TSC", "TSOC"}, {"TSP", "TSOP"}, {"TST", "TSOT"}, {"WFD", "WFED"},
 }};
 // clang-format on
 

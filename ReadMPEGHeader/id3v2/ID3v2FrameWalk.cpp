@@ -25,6 +25,8 @@ struct FrameHeader {
     QString ShownId;  // as in the tag
     std::int64_t Size = 0;
     FrameCoding Coding;
+    std::uint8_t StatusFlags = 0;
+    std::uint8_t FormatFlags = 0;
 };
 
 // The frames between two positions of a stream, as one version lays them out. Ends at padding and at the
@@ -36,11 +38,13 @@ class FrameWalk {
 
     void Run(ID3v2FrameSink& sink) {
         if (tag_.Version > 2 && (tag_.Flags & kExtendedHeader) != 0) SkipExtendedHeader();
-        while (const auto header = NextHeader()) {
-            if (header->Size > end_ - position_) return;
+        std::int64_t frame = position_;
+        for (auto header = NextHeader(); header && header->Size <= end_ - position_; header = NextHeader()) {
             if (sink.NeedsBody(header->Id)) HandOver(*header, sink);
             position_ += header->Size;
+            frame = position_;
         }
+        sink.TakeRest(stream_, frame, end_);
     }
 
  private:
@@ -70,7 +74,8 @@ class FrameWalk {
         ByteReader reader(bytes);
         const std::string_view id = AsText(reader.Take(3));
         if (!IsFrameId(id)) return std::nullopt;
-        return FrameHeader{SuccessorOfFrameId(id), QString::fromLatin1(id.data(), 3), reader.U24Be(), {}};
+        return FrameHeader{
+            SuccessorOfFrameId(id), QString::fromLatin1(id.data(), 3), reader.U24Be(), {}, 0, 0};
     }
 
     std::optional<FrameHeader> ParseHeader(ByteSpan bytes) {
@@ -83,8 +88,10 @@ class FrameWalk {
         header.Id = id.size() == 3 ? SuccessorOfFrameId(id) : std::string(id);
         header.ShownId = QString::fromLatin1(id.data(), static_cast<qsizetype>(id.size()));
         header.Size = tag_.Version == 4 ? ChooseSize(reader.Take(4)) : reader.U32Be();
-        const std::uint8_t flags = bytes[9];
-        header.Coding = tag_.Version == 4 ? FrameCoding::FromFlags24(flags) : FrameCoding::FromFlags23(flags);
+        header.StatusFlags = bytes[8];
+        header.FormatFlags = bytes[9];
+        header.Coding = tag_.Version == 4 ? FrameCoding::FromFlags24(header.FormatFlags)
+                                          : FrameCoding::FromFlags23(header.FormatFlags);
         if (tag_.Version == 4 && (tag_.Flags & kUnsynchronised) != 0) header.Coding.Unsynchronised = true;
         return header;
     }
@@ -114,6 +121,9 @@ class FrameWalk {
 
     void HandOver(const FrameHeader& header, ID3v2FrameSink& sink) {
         const auto stored = stream_.ReadExactly(position_, static_cast<std::size_t>(header.Size));
+        if (sink.TakeStored(
+                {header.Id, header.ShownId, header.StatusFlags, header.FormatFlags, header.Coding, stored}))
+            return;
         if (header.Coding.IsPlain()) return sink.Take(header.Id, header.ShownId, stored);
         if (const auto body = decoder_.Decode(header.Coding, stored))
             return sink.Take(header.Id, header.ShownId, *body);

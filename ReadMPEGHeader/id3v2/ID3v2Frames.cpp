@@ -29,6 +29,10 @@ bool IsYear(QStringView text) {
     return text.size() == 4 && std::ranges::all_of(text, [](QChar c) { return c >= u'0' && c <= u'9'; });
 }
 
+// The classic rules write a count from the other end. Of the two ways to read four bytes at most one gives a
+// number up to this, which a song an hour for seven years does not reach.
+constexpr quint32 kMostPlays = 0xFFFF;
+
 // Foreign programs keep binary data in private frames and addresses; a comment takes only what can be read.
 bool IsReadable(const QString& text) {
     return std::ranges::all_of(text.toUcs4(), [](uint code) {
@@ -83,6 +87,8 @@ void ID3v2Frames::TakeUnreadable(const QString& shownId, std::int64_t size, cons
 void ID3v2Frames::Finish() {
     tag_.Comment = comment_.Join();
     if (!recordingYear_.isEmpty()) tag_.Year = recordingYear_;
+    if (hasOwnFrame_ && turnedPlayCount_ && tag_.PlayCount > kMostPlays && *turnedPlayCount_ <= kMostPlays)
+        tag_.PlayCount = *turnedPlayCount_;
 }
 
 void ID3v2Frames::TakeTitle(FrameBody& body) {
@@ -130,7 +136,9 @@ void ID3v2Frames::TakeGenre(FrameBody& body) {
 
 void ID3v2Frames::TakeComment(FrameBody& body) {
     const CommentFrame frame = ReadCommentFrame(body);
-    if (IsBetterComment(frame.Description, frame.Text)) comment_.Comment = frame.Text;
+    if (!IsBetterComment(frame.Description, frame.Text)) return;
+    comment_.Comment = frame.Text;
+    ++foldedFrames_;
 }
 
 // The classic rules take every comment, so that the last one stays. Otherwise the first without a description
@@ -150,6 +158,7 @@ void ID3v2Frames::TakeAddress(FrameBody& body) {
     const auto address = ReadAddressFrame(body);
     if (address.Url.isEmpty() || !IsReadable(address.Url) || !IsReadable(address.Description)) return;
     comment_.Addresses += address;
+    ++foldedFrames_;
 }
 
 // This program's private frame is a text and nothing else. Data behind the text make the frame another
@@ -159,13 +168,18 @@ void ID3v2Frames::TakePrivate(FrameBody& body) {
     if (body.Remaining() > 0 || !IsReadable(text)) return;
     if (!comment_.Private.isEmpty()) comment_.Private += u'\n';
     comment_.Private += text;
+    ++foldedFrames_;
 }
 
 void ID3v2Frames::TakePlayCount(FrameBody& body) {
+    FrameBody turned = body;
+    const bool canBeTurned = rules_ != TextRules::Classic && body.Remaining() == sizeof(quint32);
+    turnedPlayCount_ = canBeTurned ? std::optional(turned.TurnedNumber()) : std::nullopt;
     tag_.PlayCount = body.Counter();
 }
 
 void ID3v2Frames::TakeXruk(FrameBody& body) {
     const auto frame = XrukFrame::Parse(body.Rest());
+    if (frame) hasOwnFrame_ = true;
     if (xruk_ && frame) *xruk_ = frame;
 }

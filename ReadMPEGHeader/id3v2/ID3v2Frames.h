@@ -36,6 +36,9 @@ class ID3v2Frames : public ID3v2FrameSink {
 
     // False for a frame that is the listener's alone.
     static bool FillsRecord(std::string_view id) { return EffectOf(id) != nullptr; }
+    // The comment's parts so far, and how many frames went into it; of "COMM" the last that was taken counts.
+    const CommentFields& Comment() const { return comment_; }
+    int FoldedFrames() const { return foldedFrames_; }
     // False for a frame whose body changes nothing, so that it need not be read.
     bool NeedsBody(std::string_view id) const override;
     void Take(std::string_view id, const QString& shownId, ByteSpan body) override;
@@ -71,4 +74,7 @@ class ID3v2Frames : public ID3v2FrameSink {
     CommentFields comment_;
     bool hasPlainComment_ = false;
     QString recordingYear_;
+    int foldedFrames_ = 0;
+    bool hasOwnFrame_ = false;
+    std::optional<quint32> turnedPlayCount_{};  // the bytes of a count read from the other end
 };

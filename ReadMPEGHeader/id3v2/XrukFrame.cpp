@@ -2,6 +2,8 @@
 
 #include <algorithm>
 #include <cmath>
+#include <string>
+#include <string_view>
 
 #include "CommonRUKTools/CodePage.h"
 
@@ -37,7 +39,48 @@ void ReadNumbers(ByteReader& reader, TID3Tag& fields) {
     fields.AddTime = PlausibleTime(reader.F64Le());
 }
 
+void WriteNumbers(ByteWriter& body, const TID3Tag& record) {
+    body.U16Le(record.BitRate);
+    body.U16Le(record.SampleRate);
+    body.U8(record.ChannelMode);
+    body.U8(record.Emphasis);
+    for (const bool flag :
+         {record.Private, record.Protected, record.Copyrighted, record.Original, record.Padding})
+        body.U8(flag ? 1 : 0);
+    body.U16Le(record.FrameSize);
+    body.U16Le(record.Reserved);
+    body.U32Le(record.Flags);
+    body.U8(record.MainGenre);
+    body.U8(record.Remix ? 1 : 0);
+    body.F64Le(record.AddTime);
+}
+
+// For those who look into the file with other programs: four lines of 60 bytes behind an empty one.
+const std::string& Banner() {
+    static const std::string banner = [] {
+        constexpr std::size_t kWidth = 58;
+        const auto centred = [](std::string_view text) {
+            std::string line(kWidth, ' ');
+            return line.replace((kWidth - text.size()) / 2, text.size(), text);
+        };
+        const std::string rule(kWidth, '=');
+        std::string text = "\r\n";
+        for (const std::string& line : {rule, centred("Tunestead"), centred("by RUK"), rule})
+            text += line + "\r\n";
+        return text;
+    }();
+    return banner;
+}
+
 }  // namespace
+
+void XrukFrame::Write(ByteWriter& body, const TID3Tag& record, ByteSpan format) {
+    body.Block(Banner(), kBannerSize);
+    body.U8(0);
+    body.Raw(format);
+    body.U8(0);
+    WriteNumbers(body, record);
+}
 
 std::optional<XrukFrame> XrukFrame::Parse(ByteSpan body) {
     if (body.size() < kFixedSize) return std::nullopt;
