@@ -10,7 +10,7 @@ cd "$(dirname "$(realpath "$0")")/.."
 floors="core sorting
 journal
 search songfiles tsdb
-intake
+batches intake
 commands"
 
 links=$(mktemp)

@@ -214,6 +214,11 @@ class TMusicDatabase : public QObject {
     bool DerivedGenres() const { return derivedGenres_; }
     void SetDerivedGenres(bool value) { derivedGenres_ = value; }
 
+    // Whether a batch asks once an artist and tells at its end what did not go; off in a new component,
+    // switched on by the programs.
+    bool QuietBatches() const { return quietBatches_; }
+    void SetQuietBatches(bool value) { quietBatches_ = value; }
+
     // Linked components; each reference clears itself when the other goes.
     QObject* PlayList() const { return playList_; }
     void SetPlayList(QObject* component) { playList_ = component; }
@@ -302,6 +307,9 @@ class TMusicDatabase : public QObject {
     // Finds the file of a path on a CD; see ResolveSongPath.
     std::function<QString(const QString& path, const ResolveOptions& options)> OnResolveCdPath;
     std::function<void(TMusicDatabase&, SongIndex index)> OnMarkSong;
+    // A file is about to be moved or removed: whoever holds it open lets go of it, and returns what takes it
+    // up again under the path that it has then. Empty where nobody holds it.
+    std::function<std::function<void(const QString& path)>(const QString& path)> OnReleaseFile;
     // The playlist has played all its songs; `showException` is whether the user is told.
     std::function<void(TMusicDatabase&, bool& showException)> OnAllFilesPlayed;
 
@@ -344,6 +352,7 @@ class TMusicDatabase : public QObject {
     bool readOnly_ = false;
     bool renameAndMoveMP3s_ = true;
     bool renameInPlace_ = false;
+    bool quietBatches_ = false;
     bool modernTags_ = false;
     bool keepLostSongs_ = false;
     DatabaseLock fileLock_{*this};

@@ -17,6 +17,10 @@ QStringList SongFlagNames() {
     return {u"Gebrannt"_s, u"Beschädigt"_s, u"Korrekte Länge"_s, u"Remixed"_s};
 }
 
+QString SongCountText(std::size_t count) {
+    return count == 1 ? u"1 Song"_s : QString::number(count) + u" Songs"_s;
+}
+
 QStringList DefaultGenreFolderNames() {
     return {u"Unsorted"_s,
             u"Alternative, Psychedelic, Punk, Funk"_s,

@@ -56,6 +56,9 @@ QString FormatSongFlags(quint32 flags);
 // The names offered where flags are set or cleared, in bit order.
 QStringList SongFlagNames();
 
+// "1 Song", "2 Songs"
+QString SongCountText(std::size_t count);
+
 // Default names of the genre folders, one for each main genre.
 QStringList DefaultGenreFolderNames();
 

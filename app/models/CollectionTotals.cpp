@@ -20,10 +20,6 @@ QString PlayingTime(qint64 seconds) {
 
 }  // namespace
 
-QString SongCountText(std::size_t count) {
-    return count == 1 ? u"1 Song"_s : QString::number(count) + u" Songs"_s;
-}
-
 CollectionTotals::CollectionTotals(TMusicDatabase& database) : database_(database) {
     CollectionEvents& events = database.Events();
     subscriptions_ +=

@@ -3,11 +3,10 @@
 #include <QString>
 
 #include "CommonRUKTools/Listeners.h"
+#include "MusicManagment/database/SongTypes.h"
 
 class TMusicDatabase;
 
-// "1 Song", "2 Songs"
-QString SongCountText(std::size_t count);
 // "2 Songs, Spielzeit 7:05"
 QString TotalsText(qint64 songs, qint64 seconds);
 

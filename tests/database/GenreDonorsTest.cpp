@@ -1,4 +1,4 @@
-#include "MusicManagment/database/songfiles/GenreDonors.h"
+#include "MusicManagment/database/batches/GenreDonors.h"
 
 #include <gtest/gtest.h>
 

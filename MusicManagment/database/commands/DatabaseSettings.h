@@ -56,7 +56,12 @@ inline constexpr PropertySetting kRenameInPlace{Setting<bool>{u"RenameInPlace", 
                                                 &TMusicDatabase::RenameInPlace,
                                                 &TMusicDatabase::SetRenameInPlace};
 
-inline constexpr std::tuple kRules{kModernTags, kKeepLostSongs, kDerivedGenres, kRenameInPlace};
+inline constexpr PropertySetting kQuietBatches{Setting<bool>{u"QuietBatches", false, true},
+                                               &TMusicDatabase::QuietBatches,
+                                               &TMusicDatabase::SetQuietBatches};
+
+inline constexpr std::tuple kRules{kModernTags, kKeepLostSongs, kDerivedGenres, kRenameInPlace,
+                                   kQuietBatches};
 
 inline constexpr std::tuple kOwn{kAutoSave,
                                  kCompression,

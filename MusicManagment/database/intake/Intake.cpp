@@ -240,7 +240,7 @@ int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
     // A progress point that nobody hears of, for the time in which nothing goes on.
     const auto goOn = [&database] { return !database.Progress(database.LastProgress(), false, false); };
     ReadOptions options = database.AudioReadOptions();
-    ReadAhead files(candidates, isKnown);
+    ReadAhead files(candidates, options, isKnown);
     for (qsizetype i = 0; i < candidates.size() && !outcome.Stopped; ++i) {
         if (i % kFilesPerProgressPoint == 0) {
             outcome.Stopped = database.Progress(
@@ -249,10 +249,10 @@ int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
             // The local time costs several system calls, so it is asked for only here.
             options.FileTime = CurrentClock().Now();
         }
-        const QString& path = files.Next(options);
+        const QString& path = files.Next();
         if (isKnown(path)) {
             ++outcome.Known;
-        } else if (const auto reading = files.Take(options, goOn)) {
+        } else if (const auto reading = files.Take(goOn)) {
             if (!TakeIn(database, path, *reading, outcome)) continue;
             known.Add(path);
             list << path;

@@ -34,7 +34,17 @@ std::optional<BatchInfo> LastOf(const std::vector<RestOfBatch>& list) {
     return list.empty() ? std::nullopt : std::optional(InfoOf(list.back()));
 }
 
+Journal* journalInUse = nullptr;
+
 }  // namespace
+
+Journal* CurrentJournal() {
+    return journalInUse;
+}
+
+void SetJournal(Journal* journal) {
+    journalInUse = journal;
+}
 
 EOtherDatabase::EOtherDatabase(const QString& database)
     : ERukException(u"Der letzte Schritt gehört zu einer anderen Datenbank: "_s +

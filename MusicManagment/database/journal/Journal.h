@@ -103,3 +103,7 @@ class Journal {
     mutable JournalContents contents_;
     mutable FileState read_;  // of the file when it was read
 };
+
+// The journal in use; none unless one was set, and then nothing can be taken back. The caller keeps ownership.
+Journal* CurrentJournal();
+void SetJournal(Journal* journal);

@@ -1,0 +1,160 @@
+#include "MusicManagment/database/batches/LengthBatch.h"
+
+#include "CommonRUKTools/Dialogs.h"
+#include "CommonRUKTools/WorkAhead.h"
+#include "MusicManagment/database/Progress.h"
+#include "MusicManagment/database/batches/BatchFrame.h"
+#include "ReadMPEGHeader/DisplayTexts.h"
+#include "ReadMPEGHeader/LengthCheck.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+constexpr int kThreads = 4;
+constexpr int kLongestLength = 65535;  // seconds, as a record holds them
+
+constexpr BatchTexts kVerifying = {.All = u"Korrektheit von Länge und Format sicherstellen",
+                                   .Marked = u"Korrektheit von Länge und Format sicherstellen",
+                                   .One = u"Korrektheit von Länge und Format sicherstellen"};
+
+struct Checked {
+    std::optional<LengthCheck> Check;
+    QString Failure;
+};
+
+Checked CheckFile(const QString& path) {
+    try {
+        return {.Check = CheckLength(path), .Failure = {}};
+    } catch (const EStreamError& error) {
+        return {.Check = {}, .Failure = error.Message()};
+    }
+}
+
+// Takes what was measured over into the record.
+TID3Tag Verified(const TID3Tag& song, const LengthCheck& check) {
+    TID3Tag record = song;
+    ApplyLengthCheck(check, record);
+    record.Flags |= sfLengthCorrect;
+    record.Flags = check.Damage.isEmpty() ? record.Flags & ~quint32{sfDamaged} : record.Flags | sfDamaged;
+    return record;
+}
+
+TID3Tag WithLength(const TID3Tag& song, int seconds) {
+    TID3Tag record = song;
+    record.Length = static_cast<quint16>(seconds);
+    record.Flags |= sfLengthCorrect;
+    return record;
+}
+
+std::optional<SongUpdate> RecordOnly(const TID3Tag& song, TID3Tag record) {
+    if (record == song) return std::nullopt;
+    SongUpdate update;
+    update.Record = std::move(record);
+    update.Tags = TagAction::Leave;
+    return update;
+}
+
+// The files of a batch, looked through by threads ahead of their turn.
+class FileChecks {
+ public:
+    FileChecks(TMusicDatabase& database, const BatchSongs& songs)
+        : database_(database),
+          songs_(songs),
+          work_(songs.Songs.size(), kThreads, [this](std::size_t number, auto) { return WorkOf(number); }) {}
+
+    // The check of the next song that is still there. Nothing when the user stopped meanwhile.
+    std::optional<Checked> Next() {
+        do
+            work_.Next();
+        while (database_.Songs().Find(songs_.Songs[next_++]) == nullptr);
+        const auto goOn = [this] { return !database_.Progress(database_.LastProgress(), false, false); };
+        return work_.Take(goOn);
+    }
+
+ private:
+    std::function<Checked()> WorkOf(std::size_t number) const {
+        const TID3Tag* song = database_.Songs().Find(songs_.Songs[number]);
+        if (song == nullptr) return {};
+        return [path = database_.ResolveSongPath(song->FileName)] { return CheckFile(path); };
+    }
+
+    TMusicDatabase& database_;
+    const BatchSongs& songs_;
+    std::size_t next_ = 0;
+    WorkAhead<Checked> work_;
+};
+
+LengthBatchResult MeasureLengths(TMusicDatabase& database, const BatchSongs& songs,
+                                 const LengthMeasure& measure) {
+    LengthBatchResult result;
+    const auto maker = [&](const TID3Tag& song) -> std::optional<SongUpdate> {
+        const int seconds = measure(database.ResolveSongPath(song.FileName));
+        if (seconds > 0) return RecordOnly(song, WithLength(song, std::min(seconds, kLongestLength)));
+        result.Damaged << song.FileName + u": Die Länge konnte nicht gemessen werden"_s;
+        return std::nullopt;
+    };
+    result.Updates = RunUpdates(database, songs, kVerifying, u"Länge prüfen"_s, Renaming::Never, maker);
+    return result;
+}
+
+}  // namespace
+
+LengthBatchResult VerifyLengths(TMusicDatabase& database, const BatchSongs& songs,
+                                const LengthMeasure& measure) {
+    if (measure) return MeasureLengths(database, songs, measure);
+    LengthBatchResult result;
+    QStringList failed;
+    FileChecks checks(database, songs);
+    const auto maker = [&](const TID3Tag& song) -> std::optional<SongUpdate> {
+        const auto checked = checks.Next();
+        if (!checked) return std::nullopt;
+        if (!checked->Failure.isEmpty()) {
+            failed << song.FileName + u": "_s + checked->Failure;
+            return std::nullopt;
+        }
+        if (!checked->Check) {
+            failed << song.FileName + u": In der Datei ist kein Klang gefunden worden"_s;
+            return std::nullopt;
+        }
+        if (!checked->Check->Damage.isEmpty())
+            result.Damaged << song.FileName + u": "_s + checked->Check->Damage;
+        return RecordOnly(song, Verified(song, *checked->Check));
+    };
+    result.Updates = RunUpdates(database, songs, kVerifying, u"Länge prüfen"_s, Renaming::Never, maker);
+    result.Updates.Failed = failed + result.Updates.Failed;
+    return result;
+}
+
+std::optional<int> ParseLength(const QString& text) {
+    const QStringList parts = text.trimmed().split(u':');
+    if (parts.size() > 3) return std::nullopt;
+    qint64 seconds = 0;
+    for (qsizetype i = 0; i < parts.size(); ++i) {
+        bool isNumber = false;
+        const uint part = parts[i].toUInt(&isNumber);
+        if (!isNumber || (i > 0 && part > 59)) return std::nullopt;
+        seconds = seconds * 60 + part;
+        if (seconds > kLongestLength) return std::nullopt;
+    }
+    return static_cast<int>(seconds);
+}
+
+BatchResult EnterLength(TMusicDatabase& database, SongHandle song) {
+    const TID3Tag* record = database.Songs().Find(song);
+    if (record == nullptr) return {};
+    const QString name = record->Artist + u" - "_s + record->Title;
+    const auto text = UserDialogs().Input(u"Länge manuell eingeben"_s,
+                                          u"Länge von "_s + name + u" (Minuten:Sekunden oder Sekunden):"_s,
+                                          {}, FormatLength(record->Length, true));
+    if (!text) return {};
+    const auto seconds = ParseLength(*text);
+    if (!seconds) throw EMusicDatabaseException(*text + u" ist keine Länge."_s);
+    record = database.Songs().Find(song);
+    if (record == nullptr) return {};
+    SongUpdate update;
+    update.Song = song;
+    update.Record = WithLength(*record, *seconds);
+    if (update.Record == *record) return {};
+    return UpdateSongs(database, u"Länge eingeben"_s, {update}, Renaming::Never);
+}

@@ -1,0 +1,278 @@
+#include "MusicManagment/database/songfiles/SongUpdates.h"
+
+#include <QSet>
+
+#include "CommonRUKTools/BufferedSource.h"
+#include "CommonRUKTools/Dialogs.h"
+#include "MusicManagment/database/BannList.h"
+#include "MusicManagment/database/Progress.h"
+#include "MusicManagment/database/journal/FileBatch.h"
+#include "MusicManagment/database/songfiles/RenameTarget.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+// What a song takes in the journal as a rule: its old tag, and its record twice.
+constexpr qint64 kJournalBytesASong = 8192;
+
+enum class Collision { RemoveTarget = 0, RemoveSource = 1, Cancel = 2 };
+
+Collision AskAboutCollision(const QString& target) {
+    const QString name = target.mid(LastSeparator(target) + 1);
+    return static_cast<Collision>(
+        UserDialogs().Ask({.Text = u"Die Datei "_s + name + u" existiert bereits."_s,
+                           .Buttons = {u"Ziel löschen"_s, u"Quelle löschen"_s, u"Abbrechen"_s},
+                           .Cancel = static_cast<int>(Collision::Cancel)}));
+}
+
+// Where the journal cannot hold the batch it runs without one, if the user agrees.
+Journal* JournalFor(std::size_t songs) {
+    Journal* journal = CurrentJournal();
+    if (journal == nullptr || journal->FitsBatch(static_cast<qint64>(songs) * kJournalBytesASong))
+        return journal;
+    const int answer = UserDialogs().Ask(
+        {.Text = u"Der Platz reicht nicht, um diesen Vorgang später rückgängig zu machen ("_s +
+                 SongCountText(songs) + u")."_s,
+         .Buttons = {u"Trotzdem ausführen"_s, u"Abbrechen"_s},
+         .Cancel = 1});
+    if (answer != 0) throw EAbort();
+    return nullptr;
+}
+
+// One command that changes songs, from its first to its last.
+class SongChanges {
+ public:
+    SongChanges(TMusicDatabase& database, const QString& caption, const QString& progress, std::size_t count)
+        : database_(database),
+          run_(std::in_place, database, progress),
+          batch_(JournalFor(count), &database, caption),
+          count_(count) {}
+
+    // False when the user stopped.
+    bool Next() {
+        result_.Stopped = result_.Stopped || database_.Progress({.Cur = static_cast<qint64>(taken_),
+                                                                 .Max = static_cast<qint64>(count_)});
+        ++taken_;
+        return !result_.Stopped;
+    }
+
+    void Update(const SongUpdate& update, Renaming renaming) {
+        const TID3Tag* song = database_.Songs().Find(update.Song);
+        if (song == nullptr) return;
+        const TID3Tag before = *song;
+        SongItem item{.Song = update.Song, .Record = update.Record};
+        item.Record.FileName = before.FileName;
+        try {
+            AddTags(item, update);
+        } catch (const EStreamError& error) {
+            result_.Failed << before.FileName + u": "_s + error.Message();
+            return;
+        }
+        if (item.Record != before) item.ChangeFrom(before);
+        MoveTo(std::move(item), renaming == Renaming::BySettings
+                                    ? RenameTarget(database_, before.FileName, update.Record)
+                                    : before.FileName);
+    }
+
+    void Move(SongHandle song, const QString& target) {
+        if (const TID3Tag* record = database_.Songs().Find(song))
+            MoveTo({.Song = song, .Record = *record}, target);
+    }
+
+    void Discard(SongHandle song, bool banned) {
+        const TID3Tag* found = database_.Songs().Find(song);
+        if (found == nullptr) return;
+        const QString path = found->FileName;
+        SongItem item{.Song = song, .Record = *found};
+        if (banned) item.Steps.Ban(BanEntry(*found));
+        const auto released = Release(path);
+        if (!IsCdPath(path) && StateOf(path).Exists()) item.Steps.Trash(path, banned);
+        item.Steps.Record(*found, std::nullopt);
+        item.Count = 1;
+        Add(std::move(item));
+        if (released) batch_.Settle();
+    }
+
+    BatchResult Finish() {
+        batch_.Settle();
+        run_.reset();  // saving is a run of its own
+        database_.SaveAfterCommand();
+        batch_.Finish();
+        result_.Changed = static_cast<int>(changed_.size());
+        return std::move(result_);
+    }
+
+ private:
+    // What is to happen with one song.
+    struct SongItem {
+        SongHandle Song{};
+        TID3Tag Record{};  // as it is to be
+        FileItem Steps{};
+        int Count = 0;     // of the steps before a move
+        QString Target{};  // of the move; empty without one
+
+        void ChangeFrom(const TID3Tag& before) {
+            Steps.Record(before, Record);
+            ++Count;
+        }
+    };
+
+    void AddTags(SongItem& item, const SongUpdate& update) const {
+        const QString& path = item.Record.FileName;
+        if (update.Tags == TagAction::Leave || IsCdPath(path)) return;
+        const FileState state = StateOf(path);
+        FileSource file(path);
+        BufferedSource source(file);
+        const ReadProfile profile = database_.ModernTags() ? ReadProfile::Modern : ReadProfile::Classic;
+        FilePatch patch =
+            update.Tags == TagAction::Remove
+                ? PlanTagRemoval(source, path)
+                : PlanTag(source, path,
+                          {.Record = item.Record, .TrackTotal = update.TrackTotal, .Cover = update.Cover},
+                          {.Profile = profile});
+        if (patch.ChangesNothing(file.Size())) return;
+        item.Steps.Patch(path, std::move(patch), state);
+        ++item.Count;
+    }
+
+    void Add(SongItem item) {
+        if (item.Count == 0 && item.Target.isEmpty()) return;
+        item.Steps.Then([this, song = item.Song, path = item.Record.FileName, target = item.Target,
+                         count = item.Count](const ItemResult& done) {
+            if (done.StepsDone > 0) changed_.insert(song.Slot);
+            if (!target.isEmpty() && done.IsComplete()) ++result_.Renamed;
+            if (done.IsComplete()) return;
+            const bool failedToMove = !target.isEmpty() && done.StepsDone >= count;
+            result_.Failed << (failedToMove ? u"Kann die Datei "_s + path + u" nicht nach "_s + target +
+                                                  u" verschieben. "_s + done.Message
+                                            : path + u": "_s + done.Message);
+        });
+        batch_.Add(std::move(item.Steps));
+    }
+
+    // Adds the item and what takes the song to its target.
+    void MoveTo(SongItem item, const QString& target) {
+        const QString path = item.Record.FileName;
+        if (IsCdPath(path) || target.compare(path, Qt::CaseInsensitive) == 0) return Add(std::move(item));
+        const auto restore = Release(path);
+        if (!restore && !IsTaken(target)) return AddMove(std::move(item), target);
+        // The question comes when tag and record are written, which stay whatever the answer is.
+        SongItem move{.Song = item.Song, .Record = item.Record};
+        Add(std::move(item));
+        batch_.Settle();
+        if (!IsTaken(target) || ClearTarget(move, target)) {
+            const SongHandle song = move.Song;
+            AddMove(std::move(move), target);
+            batch_.Settle();
+            if (const TID3Tag* record = database_.Songs().Find(song); restore && record != nullptr)
+                return restore(record->FileName);
+        }
+        if (restore) restore(path);
+    }
+
+    void AddMove(SongItem item, const QString& target) {
+        TID3Tag moved = item.Record;
+        moved.FileName = target;
+        item.Steps.Move(item.Record.FileName, target).Record(item.Record, moved);
+        item.Target = target;
+        targets_.insert(target);
+        Add(std::move(item));
+    }
+
+    // An earlier song of this command may be on its way there.
+    bool IsTaken(const QString& target) {
+        if (targets_.contains(target)) batch_.Settle();
+        return StateOf(target).Exists();
+    }
+
+    // False when the song does not move.
+    bool ClearTarget(const SongItem& item, const QString& target) {
+        switch (AskAboutCollision(target)) {
+            case Collision::RemoveTarget:
+                return RemoveTarget(item, target);
+            case Collision::RemoveSource:
+                Discard(item.Song, false);
+                return false;
+            case Collision::Cancel:
+                break;
+        }
+        result_.Stopped = true;
+        return false;
+    }
+
+    bool RemoveTarget(const SongItem& item, const QString& target) {
+        const TID3Tag* there = database_.Songs().Find(target);
+        if (there == nullptr) {
+            result_.Failed << item.Record.FileName + u": Kann den Eintrag "_s + target +
+                                  u" nicht (mehr) finden."_s;
+            return false;
+        }
+        Discard(database_.Songs().HandleOf(*there), false);
+        batch_.Settle();
+        return !StateOf(target).Exists();
+    }
+
+    // Has the player let go of the file; the result gives it back, under the path that it has then. Empty
+    // where nobody holds it.
+    std::function<void(const QString& path)> Release(const QString& path) {
+        return database_.OnReleaseFile ? database_.OnReleaseFile(path) : nullptr;
+    }
+
+    TMusicDatabase& database_;
+    std::optional<ProgressRun> run_;
+    BatchResult result_;
+    FileBatch batch_;
+    QSet<QString> targets_;
+    QSet<quint32> changed_;  // songs, by slot
+    std::size_t count_;
+    std::size_t taken_ = 0;
+};
+
+QString ProgressText(const QString& progress, const QString& caption) {
+    return progress.isEmpty() ? caption : progress;
+}
+
+}  // namespace
+
+BatchResult UpdateSongs(TMusicDatabase& database, const QString& caption, std::vector<SongUpdate> updates,
+                        Renaming renaming, const QString& progress) {
+    SongChanges changes(database, caption, ProgressText(progress, caption), updates.size());
+    for (const SongUpdate& update : updates) {
+        if (!changes.Next()) break;
+        changes.Update(update, renaming);
+    }
+    return changes.Finish();
+}
+
+BatchResult MoveSongs(TMusicDatabase& database, const QString& caption, const std::vector<SongMove>& moves) {
+    SongChanges changes(database, caption, caption, moves.size());
+    for (const SongMove& move : moves) {
+        if (!changes.Next()) break;
+        changes.Move(move.Song, move.Target);
+    }
+    return changes.Finish();
+}
+
+BatchResult DiscardSongs(TMusicDatabase& database, const QString& caption,
+                         const std::vector<SongHandle>& songs, Banning banning) {
+    SongChanges changes(database, caption, caption, songs.size());
+    for (const SongHandle song : songs) {
+        if (!changes.Next()) break;
+        changes.Discard(song, banning == Banning::Banned);
+    }
+    return changes.Finish();
+}
+
+SongIndex UpdateSongEntry(TMusicDatabase& database, SongIndex index, const TID3Tag& info, bool rename) {
+    if (index < 0 || index >= database.Count()) return -1;
+    const SongHandle song = database.Songs().HandleOf(index);
+    SongUpdate update;
+    update.Song = song;
+    update.Record = info;
+    const BatchResult result =
+        UpdateSongs(database, u"1 Tag"_s, {update}, rename ? Renaming::BySettings : Renaming::Never);
+    if (!result.Failed.isEmpty()) UserDialogs().ShowMessage(MessageKind::Error, result.Failed.join(u'\n'));
+    if (result.Stopped) throw EAbort();
+    return database.Songs().PositionOf(song);
+}
