@@ -48,13 +48,13 @@ void Arguments::TakeOption(const QString& word, QStringList& rest, std::span<con
     if (option == nullptr) throw EUsageError(u"Unbekannte Option: "_s + name);
     if (!TakesValue(*option)) {
         if (equals >= 0) throw EUsageError(u"Die Option "_s + name + u" hat keinen Wert."_s);
-        values_.insert(name, QString());
+        values_[name];
         return;
     }
     if (equals < 0 && rest.isEmpty()) ThrowMissingValue(name);
     const QString value = equals >= 0 ? word.mid(equals + 1) : rest.takeFirst();
     if (value.isEmpty()) ThrowMissingValue(name);
-    values_.insert(name, value);
+    values_[name] << value;
 }
 
 void Arguments::Check(std::span<const OptionRow> options, const OperandRow& operands) const {
@@ -62,7 +62,7 @@ void Arguments::Check(std::span<const OptionRow> options, const OperandRow& oper
         if (option.Required && !Has(option.Name))
             throw EUsageError(u"Die Option "_s + QString::fromUtf16(option.Name) + u" fehlt."_s);
     const bool takesOperands = !QStringView(operands.Name).isEmpty();
-    if (takesOperands && operands_.isEmpty())
+    if (takesOperands && operands.Required && operands_.isEmpty())
         throw EUsageError(QString::fromUtf16(operands.Name) + u" fehlt."_s);
     const qsizetype most = !takesOperands ? 0 : operands.Several ? operands_.size() : 1;
     if (operands_.size() > most) throw EUsageError(u"Überzähliges Argument: "_s + operands_[most]);

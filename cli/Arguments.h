@@ -23,21 +23,24 @@ struct OptionRow {
 
 // What stands besides the options.
 struct OperandRow {
-    const char16_t* Name;  // empty: nothing may stand there; otherwise at least one must
+    const char16_t* Name;  // empty: nothing may stand there
     const char16_t* Help;
-    bool Several = true;  // whether more than one may stand there
+    bool Several = true;   // whether more than one may stand there
+    bool Required = true;  // whether at least one must
 };
 
 // The words behind the command, sorted out.
 class Arguments {
  public:
-    // "--name value", "--name=value" and operands in any order; behind "--" everything is an operand. Of an
-    // option that is given twice the last value counts. Throws EUsageError.
+    // "--name value", "--name=value" and operands in any order; behind "--" everything is an operand. Throws
+    // EUsageError.
     Arguments(const QStringList& words, std::span<const OptionRow> options, const OperandRow& operands);
 
     bool Has(QStringView option) const { return values_.contains(option.toString()); }
-    // Empty when the option is not given.
-    QString Value(QStringView option) const { return values_.value(option.toString()); }
+    // Empty when the option is not given; the last one where it is given more than once.
+    QString Value(QStringView option) const { return Values(option).value(Values(option).size() - 1); }
+    // All of them, in their order.
+    QStringList Values(QStringView option) const { return values_.value(option.toString()); }
     const QStringList& Operands() const { return operands_; }
     bool WantsHelp() const { return wantsHelp_; }
 
@@ -45,7 +48,7 @@ class Arguments {
     void TakeOption(const QString& word, QStringList& rest, std::span<const OptionRow> options);
     void Check(std::span<const OptionRow> options, const OperandRow& operands) const;
 
-    QHash<QString, QString> values_;
+    QHash<QString, QStringList> values_;
     QStringList operands_;
     bool wantsHelp_ = false;
 };

@@ -11,9 +11,10 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr std::array<const CommandRow*, 7> kCommands = {&kInfoCommand,   &kScanCommand, &kListCommand,
-                                                        &kGroupsCommand, &kSaveCommand, &kPlaylistCommand,
-                                                        &kPlayCommand};
+constexpr std::array kCommands = {&kInfoCommand, &kScanCommand,  &kListCommand,   &kGroupsCommand,
+                                  &kSaveCommand, &kTagCommand,   &kRenameCommand, &kBatchCommand,
+                                  &kBanCommand,  &kTrashCommand, &kUndoCommand,   &kPlaylistCommand,
+                                  &kPlayCommand};
 
 bool IsHelp(const QString& word) {
     return word == u"--help"_s || word == u"-h"_s;

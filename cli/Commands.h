@@ -24,6 +24,12 @@ extern const CommandRow kGroupsCommand;
 extern const CommandRow kSaveCommand;
 extern const CommandRow kPlaylistCommand;
 extern const CommandRow kPlayCommand;
+extern const CommandRow kTagCommand;
+extern const CommandRow kRenameCommand;
+extern const CommandRow kBatchCommand;
+extern const CommandRow kBanCommand;
+extern const CommandRow kTrashCommand;
+extern const CommandRow kUndoCommand;
 
 // All of them, in the order of the help.
 std::span<const CommandRow* const> AllCommands();

@@ -36,7 +36,8 @@ QString Synopsis(const CommandRow& command) {
         line += option.Required ? u' ' + Word(option) : u" ["_s + Word(option) + u']';
     const QString operands = QString::fromUtf16(command.Operands.Name);
     if (operands.isEmpty()) return line;
-    return line + u' ' + operands + (command.Operands.Several ? u"…"_s : QString());
+    const QString several = operands + (command.Operands.Several ? u"…"_s : QString());
+    return line + u' ' + (command.Operands.Required ? several : u'[' + several + u']');
 }
 
 }  // namespace

@@ -23,10 +23,32 @@ void ReadInto(TMusicDatabase& database, const QString& fileName, Console& consol
     if (!database.OpenDatabase(fileName, true)) throw EMusicDatabaseException(u"Abgebrochen."_s);
 }
 
-void LoadBannListFor(TMusicDatabase& database, const QString& fileName, const Arguments& arguments) {
-    QString list = arguments.Value(kBannListOption.Name);
+void OpenForChanges(TMusicDatabase& database, const QString& fileName, bool onlyReads, Console& console) {
+    if (onlyReads) return ReadInto(database, fileName, console, StopBy::Interrupt);
+    ClaimFile(database, fileName);
+    ReadInto(database, fileName, console, StopBy::Interrupt);
+    database.SetFileName(fileName);
+    database.SetAutoSave(-1);
+}
+
+bool ReportChanges(const BatchResult& result, Console& console) {
+    for (const QString& failure : result.Failed)
+        console.Message(Printable(failure));
+    if (result.Stopped) console.Message(u"Abgebrochen; was bis dahin geändert ist, bleibt."_s);
+    return result.Failed.isEmpty() && !result.Stopped;
+}
+
+QString BannListFor(const QString& fileName, const Arguments& arguments) {
+    if (const QString list = arguments.Value(kBannListOption.Name); !list.isEmpty()) return list;
     const StandardFiles standard = LocateStandardFiles();
-    const bool isStandard = AbsolutePath(fileName) == AbsolutePath(standard.Database());
-    if (list.isEmpty() && isStandard && FileSource::Exists(standard.BannList())) list = standard.BannList();
-    if (!list.isEmpty()) LoadBannList(database.BannList(), list);
+    const bool isStandard =
+        !fileName.isEmpty() && AbsolutePath(fileName) == AbsolutePath(standard.Database());
+    return isStandard ? standard.BannList() : QString();
+}
+
+void LoadBannListFor(TMusicDatabase& database, const QString& fileName, const Arguments& arguments) {
+    const QString list = BannListFor(fileName, arguments);
+    // One that was named must be there.
+    if (arguments.Has(kBannListOption.Name) || FileSource::Exists(list))
+        LoadBannList(database.BannList(), list);
 }

@@ -1,0 +1,20 @@
+#pragma once
+
+#include "MusicManagment/database/journal/Journal.h"
+#include "cli/Console.h"
+
+// What a command that changes files needs: the journal beside the standard files, in use as long as this
+// exists. What an earlier program has left half done is taken back, and told.
+class JournalSession {
+ public:
+    // Throws EJournalBusy while another program changes files, and EStreamError.
+    explicit JournalSession(Console& console);
+    ~JournalSession();
+    JournalSession(const JournalSession&) = delete;
+    JournalSession& operator=(const JournalSession&) = delete;
+
+    Journal& Get() { return journal_; }
+
+ private:
+    Journal journal_;
+};
