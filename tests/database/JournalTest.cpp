@@ -325,3 +325,89 @@ TEST_F(JournalTest, AFullDiskAtAnyWriteLeavesEachFileWhole) {
                 if (HasFailure()) return;
             }
 }
+
+TEST_F(JournalTest, ABatchIsTakenBackAndDoneAgainUntilAnotherIsDone) {
+    Songs songs(3, kRebuild | kRename);
+    TMusicDatabase database;
+    database.OpenDatabase(songs.DatabasePath());
+    Journal journal(songs.JournalPath());
+    StepGate gate;
+    songs.Change(gate, journal, database);
+    ASSERT_EQ(songs.CheckWhole(database), 0);
+    for (int i = 0; i < 2; ++i) {
+        ASSERT_TRUE(journal.ToUndo());
+        EXPECT_EQ(journal.ToUndo()->Caption, u"3 Songs"_s);
+        EXPECT_EQ(journal.ToUndo()->Files, 3);
+        EXPECT_EQ(journal.Undo(&database).Items, 3);
+        EXPECT_EQ(songs.CheckWhole(database), 3);
+        EXPECT_FALSE(journal.ToUndo());
+        EXPECT_EQ(Journal(songs.JournalPath()).Redo(&database).Items, 3);  // as after a restart
+        EXPECT_EQ(songs.CheckWhole(database), 0);
+        EXPECT_FALSE(journal.ToRedo());
+    }
+    journal.Undo(&database);
+    ASSERT_TRUE(journal.ToRedo());
+    FileBatch(&journal, &database, u"Bann"_s).Add(std::move(FileItem().Ban(u"A - B"_s)));
+    EXPECT_TRUE(database.BannList().Contains(u"A - B"));
+    EXPECT_FALSE(journal.ToRedo());
+    journal.Undo(&database);
+    EXPECT_FALSE(database.BannList().Contains(u"A - B"));
+}
+
+TEST_F(JournalTest, WhatHasChangedSinceIsLeftAloneAndNamed) {
+    Songs songs(3, kRebuild | kRename);
+    TMusicDatabase database;
+    database.OpenDatabase(songs.DatabasePath());
+    Journal journal(songs.JournalPath());
+    StepGate gate;
+    songs.Change(gate, journal, database);
+
+    const QString changed = songs.Folder().Put(songs.NewName(1), "of somebody else");
+    TID3Tag played = database.Song(database.IndexOf(songs.Folder().Path(songs.NewName(2))));
+    played.PlayCount = 7;
+    database.UpdateEntry(database.IndexOf(played.FileName), played);
+    const UndoResult result = journal.Undo(&database);
+    EXPECT_EQ(result.Items, 2);
+    ASSERT_EQ(result.Problems.size(), 1);
+    EXPECT_TRUE(result.Problems[0].contains(changed));
+    EXPECT_EQ(songs.Folder().Get(songs.NewName(1)), "of somebody else");
+    EXPECT_TRUE(database.Contains(changed));
+    EXPECT_EQ(database.Song(database.IndexOf(songs.Folder().Path(Songs::OldName(2)))).PlayCount, 7U);
+    EXPECT_FALSE(journal.ToUndo());
+}
+
+TEST_F(JournalTest, OneProgramChangesFilesAtATimeAndOnlyItsOwnDatabase) {
+    const Songs songs(1, kRename);
+    TMusicDatabase database;
+    database.OpenDatabase(songs.DatabasePath());
+    Journal journal(songs.JournalPath());
+    {
+        FileBatch batch(&journal, &database, u"Bann"_s);
+        batch.Add(std::move(FileItem().Ban(u"A - B"_s)));
+        EXPECT_THROW(FileBatch(&journal, nullptr, u"zweiter"_s), EJournalBusy);
+        EXPECT_THROW(Journal(songs.JournalPath()).Undo(&database), EJournalBusy);
+    }
+    TMusicDatabase other;
+    EXPECT_THROW(journal.Undo(&other), EOtherDatabase);
+    EXPECT_THROW(journal.Undo(nullptr), EOtherDatabase);
+    EXPECT_TRUE(journal.ToUndo());
+}
+
+TEST_F(JournalTest, TheOldestBatchesAreDroppedAndATornTailIsNothing) {
+    const Songs songs(1, kRename);
+    TMusicDatabase database;
+    database.OpenDatabase(songs.DatabasePath());
+    Journal journal(songs.JournalPath(), {.Bytes = 1 << 20, .Batches = 3});
+    for (int i = 0; i < 6; ++i)
+        FileBatch(&journal, &database, QString::number(i)).Add(std::move(FileItem().Ban(QString::number(i))));
+    QFile file(songs.JournalPath());
+    ASSERT_TRUE(file.open(QIODevice::ReadWrite));
+    file.resize(file.size() - 5);  // the end of the last batch is not whole
+    file.close();
+    FileBatch(&journal, &database, u"6"_s).Add(std::move(FileItem().Ban(u"6"_s)));
+    QStringList captions;
+    for (const BatchInfo& batch : journal.Batches())
+        captions << batch.Caption;
+    EXPECT_EQ(captions, (QStringList{u"6"_s, u"5"_s, u"4"_s, u"3"_s}));
+    EXPECT_FALSE(journal.FitsBatch(2 << 20));
+}
