@@ -215,20 +215,33 @@ FileState PatchFile(const QString& path, FilePatch patch, const FileState& expec
 
 namespace {
 
+// The folder of a file may have gone itself when it was emptied.
+QString FolderThatIsThere(const QString& path) {
+    QString folder = FolderOfFile(path);
+    while (!FileSource::Exists(folder) && FolderOfFile(folder) != folder)
+        folder = FolderOfFile(folder);
+    return folder;
+}
+
 void FlushOne(const QString& path) {
     if (FileSource::Exists(path)) WorkFile::Existing(path, FileCalls::Access::Read).Flush();
     PassGate(DiskStep::Flush, path, kCannotWrite);
-    if (!FileCalls::FlushFolder(FolderOfFile(path))) ThrowSystemError(kCannotWrite, path, errno);
+    if (!FileCalls::FlushFolder(FolderThatIsThere(path))) ThrowSystemError(kCannotWrite, path, errno);
 }
 
 }  // namespace
 
 void FlushFiles(const QStringList& paths) {
-    if (paths.size() == 1) return FlushOne(paths.front());
+    // A whole file system may have other programs' bytes to write as well.
+    constexpr qsizetype kFew = 4;
+    if (paths.size() <= kFew) {
+        std::ranges::for_each(paths, FlushOne);
+        return;
+    }
     QSet<quint64> flushed;
     QSet<QString> looked;
     for (const QString& path : paths) {
-        const QString folder = FolderOfFile(path);
+        const QString folder = FolderThatIsThere(path);
         if (looked.contains(folder)) continue;
         looked.insert(folder);
         FileCalls::Facts facts;

@@ -110,8 +110,8 @@ FileState MoveFile(const QString& from, const QString& to);
 
 // --- On the disk ---
 
-// Waits until the changes of these files, and of the folders that name them, are on the disk: for one file by
-// itself, for several in one step a file system. Throws.
+// Waits until the changes of these files, and of the folders that name them, are on the disk: few by
+// themselves, many in one step a file system. Throws.
 void FlushFiles(const QStringList& paths);
 // Bytes that can still be written into the folder; -1 when the system does not tell.
 std::int64_t FreeBytes(const QString& folder);

@@ -44,11 +44,16 @@ void CollectionCommands::New() {
 }
 
 void CollectionCommands::Open() {
-    if (KeepChanges() && database_.OpenDatabaseFromDialog()) database_.EnsureSorted();
+    if (KeepChanges() && database_.OpenDatabaseFromDialog()) Opened();
 }
 
 void CollectionCommands::OpenFile(const QString& path) {
-    if (KeepChanges() && database_.OpenDatabase(path)) database_.EnsureSorted();
+    if (KeepChanges() && database_.OpenDatabase(path)) Opened();
+}
+
+void CollectionCommands::Opened() {
+    database_.EnsureSorted();
+    if (OnOpened) OnOpened();
 }
 
 void CollectionCommands::Save() {

@@ -19,6 +19,9 @@ class CollectionCommands {
     // Told what came of files and folders that were taken in without a report of the engine's own.
     std::function<void(const IntakeResult&)> OnIntake;
 
+    // Told when another collection was opened from its file.
+    std::function<void()> OnOpened;
+
     void New();
     void Open();
     void OpenFile(const QString& path);
@@ -41,6 +44,7 @@ class CollectionCommands {
  private:
     bool StandardInUse() const;
     bool SaveCurrent();
+    void Opened();
 
     TMusicDatabase& database_;
     StandardFiles files_;

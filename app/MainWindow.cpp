@@ -43,6 +43,11 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
+// A batch of this program or another was ended in its middle.
+void TellTakenBack(const RecoveryResult& result) {
+    if (!result.IsEmpty()) UserDialogs().ShowMessage(MessageKind::Information, result.Message());
+}
+
 constexpr QStringView kSettingsKey = u"\\Software\\RUK\\Tunestead3";
 
 QStringList LocalFiles(const QMimeData& data) {
@@ -60,6 +65,7 @@ TTunesteadMainWnd::TTunesteadMainWnd(MainWindowOptions options)
       shown_(songs_),
       totals_(database_),
       commands_(database_, options_.Files),
+      journal_(options_.Files.Journal()),
       progress_(database_, *this),
       installation_(options_.Setup, options_.Files, options_.SettingsFile),
       startup_(database_, commands_, installation_) {
@@ -82,6 +88,8 @@ TTunesteadMainWnd::~TTunesteadMainWnd() = default;
 void TTunesteadMainWnd::SetUpDatabase() {
     progress_.OnRunning = [this](bool running) { RunningChanged(running); };
     commands_.OnIntake = &ReportIntake;
+    commands_.OnOpened = [this] { journal_.BringUpToDate(database_); };
+    journal_.OnTakenBack = &TellTakenBack;
     const auto follow = [this] { ListChanged(); };
     connect(&songs_, &QAbstractItemModel::modelReset, this, follow);
     connect(&songs_, &QAbstractItemModel::rowsInserted, this, follow);
@@ -128,7 +136,7 @@ void TTunesteadMainWnd::SetUpStatusBar() {
 }
 
 void TTunesteadMainWnd::SetUpMenu() {
-    songCommands_ = std::make_unique<SongCommands>(database_, *list_);
+    songCommands_ = std::make_unique<SongCommands>(database_, *list_, journal_);
     songCommands_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
     settingsCommands_ =
         std::make_unique<SettingsCommands>(*this, database_, kSettingsKey.toString(), options_.SettingsFile);
@@ -238,7 +246,9 @@ void TTunesteadMainWnd::SetUpStart() {
 }
 
 void TTunesteadMainWnd::StartOnce() {
+    RunCommand([this] { TellTakenBack(journal_.TakeBackUnfinished()); });
     const bool goesOn = startup_.Run(options_.Arguments);
+    RunCommand([this] { journal_.BringUpToDate(database_); });
     started_ = true;
     if (!goesOn) {
         close();

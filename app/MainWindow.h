@@ -5,6 +5,7 @@
 #include <QTimer>
 
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/journal/Journal.h"
 #include "MusicManagment/playback/EngineChoice.h"
 #include "MusicManagment/playback/ExternalPlayer.h"
 #include "MusicManagment/playback/spectrum/SpectrumFeed.h"
@@ -88,6 +89,7 @@ class TTunesteadMainWnd : public QMainWindow {
     FilteredSongs shown_;
     CollectionTotals totals_;
     CollectionCommands commands_;
+    Journal journal_;
     ProgressDisplay progress_;
     InstallationSteps installation_;
     Startup startup_;

@@ -26,8 +26,8 @@ QStringList PathsOf(const TMusicDatabase& database, const std::vector<SongHandle
 
 }  // namespace
 
-SongCommands::SongCommands(TMusicDatabase& database, SongListWidget& list)
-    : database_(database), list_(list), undo_(database) {
+SongCommands::SongCommands(TMusicDatabase& database, SongListWidget& list, Journal& journal)
+    : database_(database), list_(list), journal_(journal), undo_(database, journal) {
     HandleCommands();
     AddUndo();
 }
@@ -57,29 +57,33 @@ void SongCommands::HandleCommands() {
 
 void SongCommands::AddUndo() {
     const auto caption = [this] {
-        return undo_.IsEmpty() ? u"Rückgängig"_s : u"Rückgängig: "_s + undo_.Caption();
+        const QString what = undo_.Caption();
+        return what.isEmpty() ? u"Rückgängig"_s : u"Rückgängig: "_s + what;
     };
-    handlers_ +=
-        database_.Commands().Add({.Id = scUndo,
-                                  .Caption = caption(),
-                                  .Letter = u'r',
-                                  .Keys = u"Ctrl+Z"_s,
-                                  .Icon = u"edit-undo"_s,
-                                  .Menu = u"Bearbeiten",
-                                  .Where = ShellCommand::Place::First},
-                                 {.Run = [this] { Undo(); },
-                                  .IsEnabled = [this] { return !undo_.IsEmpty() && !database_.ReadOnly(); },
-                                  .Caption = caption});
+    handlers_ += database_.Commands().Add(
+        {.Id = scUndo,
+         .Caption = caption(),
+         .Letter = u'r',
+         .Keys = u"Ctrl+Z"_s,
+         .Icon = u"edit-undo"_s,
+         .Menu = u"Bearbeiten",
+         .Where = ShellCommand::Place::First},
+        {.Run = [this] { Undo(); },
+         .IsEnabled = [this] { return !undo_.Caption().isEmpty() && !database_.ReadOnly(); },
+         .Caption = caption});
     undoChanges_ = undo_.Changed.Subscribe([this] { database_.Commands().Changed.Tell(); });
 }
 
 void SongCommands::Undo() {
-    const QStringList songs = undo_.TakeBack();
-    const std::size_t shown = list_.MarkSongs(songs);
-    const auto count = static_cast<std::size_t>(songs.size());
-    Tell(SongCountText(count) + u" wieder in die Datenbank aufgenommen."_s +
-         (shown < count ? u" Der Filter zeigt nicht alle davon."_s : QString()));
+    const UndoResult result = undo_.TakeBack();
+    const std::size_t shown = list_.MarkSongs(result.Songs);
+    const bool showsAll = shown == static_cast<std::size_t>(result.Songs.size());
+    Tell(u"Rückgängig gemacht: "_s + result.Caption + u'.' +
+         (showsAll ? QString() : u" Der Filter zeigt nicht alle Songs davon."_s));
     database_.SaveAfterCommand();
+    if (!result.Problems.isEmpty())
+        UserDialogs().ShowMessage(MessageKind::Warning, u"Nicht alles konnte rückgängig gemacht werden:\n"_s +
+                                                            result.Problems.join(u'\n'));
 }
 
 // --- The songs of the list ---
@@ -100,18 +104,12 @@ void SongCommands::RemoveChosen() {
             {.Text = RemovalQuestion(songs), .Buttons = {u"Entfernen"_s, u"Abbrechen"_s}, .Cancel = 1}) != 0)
         return;
     const SongHandle next = list_.NextAfter(songs);
-    RemovedSongs removed = RemoveSongs(database_, songs);
-    if (removed.empty()) return;
+    const int removed =
+        RemoveSongs(journal_, database_, songs, SongCountText(songs.size()) + u" entfernen"_s);
+    if (removed == 0) return;
     list_.FocusSong(database_.Songs().PositionOf(next), QAbstractItemView::EnsureVisible);
-    const QString count = SongCountText(removed.size());
-    Tell(count + u" aus der Datenbank entfernt. Strg+Z macht das rückgängig."_s);
-    undo_.Add({count + u" entfernen"_s, [&database = database_, removed = std::move(removed)] {
-                   RestoreSongs(database, removed);
-                   QStringList restored;
-                   for (const TID3Tag& song : removed)
-                       restored << song.FileName;
-                   return restored;
-               }});
+    Tell(SongCountText(static_cast<std::size_t>(removed)) +
+         u" aus der Datenbank entfernt. Strg+Z macht das rückgängig."_s);
     database_.SaveAfterCommand();
 }
 

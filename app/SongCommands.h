@@ -16,7 +16,7 @@ class TMusicDatabase;
 // other ones when it is answered.
 class SongCommands {
  public:
-    SongCommands(TMusicDatabase& database, SongListWidget& list);
+    SongCommands(TMusicDatabase& database, SongListWidget& list, Journal& journal);
 
     // Told what came of a command, in a sentence for the status bar.
     std::function<void(const QString&)> OnDone;
@@ -33,6 +33,7 @@ class SongCommands {
 
     TMusicDatabase& database_;
     SongListWidget& list_;
+    Journal& journal_;
     UndoList undo_;
     Subscription undoChanges_;
     Subscriptions handlers_;

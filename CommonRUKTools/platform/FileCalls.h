@@ -14,7 +14,7 @@ namespace FileCalls {
 struct Facts {
     FileState State;
     bool IsFile = false;  // neither folder nor device nor pipe
-    bool IsOurs = true;   // a new file of ours would have the same owner
+    bool IsOurs = true;   // we can give a new file the same owner
     int Names = 1;        // hard links
 };
 

@@ -8,6 +8,7 @@
 
 #include <QFile>
 #include <QFileInfo>
+#include <algorithm>
 #include <cerrno>
 #include <cstdio>
 #include <string_view>
@@ -18,6 +19,14 @@ namespace {
 constexpr std::int64_t kNanosecondsPerSecond = 1'000'000'000;
 constexpr mode_t kPermissions = 07777;
 
+bool IsInGroup(gid_t group) {
+    if (group == ::getegid()) return true;
+    const int count = ::getgroups(0, nullptr);
+    std::vector<gid_t> groups(static_cast<std::size_t>(std::max(count, 0)));
+    const int got = ::getgroups(count, groups.data());
+    return got > 0 && std::find(groups.begin(), groups.begin() + got, group) != groups.begin() + got;
+}
+
 FileCalls::Facts FactsOf(const struct stat& status) {
     FileCalls::Facts facts;
     facts.State = {.Size = status.st_size,
@@ -26,7 +35,7 @@ FileCalls::Facts FactsOf(const struct stat& status) {
                    .Inode = status.st_ino,
                    .ReadOnly = (status.st_mode & (S_IWUSR | S_IWGRP | S_IWOTH)) == 0};
     facts.IsFile = S_ISREG(status.st_mode);
-    facts.IsOurs = status.st_uid == ::geteuid() || ::geteuid() == 0;
+    facts.IsOurs = ::geteuid() == 0 || (status.st_uid == ::geteuid() && IsInGroup(status.st_gid));
     facts.Names = static_cast<int>(status.st_nlink);
     return facts;
 }

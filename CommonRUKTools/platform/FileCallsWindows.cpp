@@ -5,6 +5,7 @@
 #include <windows.h>
 
 #include <QDir>
+#include <QFileInfo>
 #include <algorithm>
 #include <cerrno>
 

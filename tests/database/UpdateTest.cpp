@@ -5,6 +5,7 @@
 #include <QDir>
 #include <QFile>
 
+#include "MusicManagment/database/journal/Journal.h"
 #include "MusicManagment/database/songfiles/CopySongs.h"
 #include "MusicManagment/database/songfiles/Removal.h"
 #include "tests/PrintQt.h"
@@ -123,13 +124,14 @@ TEST_F(UpdateTest, StoppingKeepsEverything) {
 
 TEST_F(UpdateTest, RemovedSongsComeBackEvenWithoutTheirFiles) {
     TakeIn({u"music/A - one.wav"_s, u"music/B - two.wav"_s, u"music/B - three.wav"_s});
-    const RemovedSongs removed = RemoveSongs(database_, std::vector<SongIndex>{2, 0, 99});
-    EXPECT_EQ(removed.size(), 2u);
+    Journal journal(songs_.Path(u"journal"_s));
+    const SongList& songs = database_.Songs();
+    EXPECT_EQ(RemoveSongs(journal, database_, {songs.HandleOf(2), songs.HandleOf(0), SongHandle()}, u"x"_s),
+              2);
     EXPECT_EQ(Titles(), QStringList{u"three"_s});
     EXPECT_EQ(database_.Artists().Count(), 1);
     QFile::remove(songs_.Path(u"music/A - one.wav"_s));
-    EXPECT_EQ(RestoreSongs(database_, removed), 2);
-    EXPECT_EQ(RestoreSongs(database_, removed), 0);
+    EXPECT_EQ(journal.Undo(&database_).Songs.size(), 2);
     EXPECT_EQ(Titles(), (QStringList{u"one"_s, u"three"_s, u"two"_s}));
     EXPECT_EQ(database_.Artists().At(1).Number, 2);
 }

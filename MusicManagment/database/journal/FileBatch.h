@@ -35,7 +35,7 @@ class FileItem {
     FileItem& Record(std::optional<TID3Tag> before, std::optional<TID3Tag> after);
     FileItem& Ban(const QString& entry);
     FileItem& Unban(const QString& entry);
-    // Told once, when it is known: with this item's group, or at once when it cannot begin.
+    // Told once, when it is known: with this item's group, or at once when it cannot begin. Must not throw.
     FileItem& Then(std::function<void(const ItemResult&)> done);
 
  private:

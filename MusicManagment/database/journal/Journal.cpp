@@ -24,14 +24,22 @@ BatchInfo InfoOf(const RestOfBatch& rest) {
     for (const quint32 number : rest.Steps) {
         const JournalStep& step = rest.Batch->Steps[number].Head;
         if (step.IsOfFile()) items.insert(step.Item);
+        info.NeedsDatabase = info.NeedsDatabase || !step.IsOfFile();
     }
     info.Steps = static_cast<int>(rest.Steps.size());
     info.Files = static_cast<int>(items.size());
     return info;
 }
 
-std::optional<BatchInfo> LastOf(const std::vector<RestOfBatch>& list) {
-    return list.empty() ? std::nullopt : std::optional(InfoOf(list.back()));
+std::vector<BatchInfo> InfosOf(const std::vector<RestOfBatch>& list) {
+    std::vector<BatchInfo> infos;
+    for (const RestOfBatch& rest : list)
+        infos.push_back(InfoOf(rest));
+    return infos;
+}
+
+std::optional<BatchInfo> LastOf(const std::vector<BatchInfo>& list) {
+    return list.empty() ? std::nullopt : std::optional(list.back());
 }
 
 Journal* journalInUse = nullptr;
@@ -59,22 +67,29 @@ const JournalContents& Journal::Contents() const {
     const auto file = FileSource::TryOpen(path_);
     contents_ = file ? ReadJournal(*file) : JournalContents();
     read_ = now;
+    const JournalLists lists = ListsOf(contents_);
+    toUndo_ = InfosOf(lists.ToUndo);
+    toRedo_ = InfosOf(lists.ToRedo);
     return contents_;
 }
 
 std::vector<BatchInfo> Journal::Batches() const {
-    std::vector<BatchInfo> batches;
-    for (const RestOfBatch& rest : ListsOf(Contents()).ToUndo)
-        batches.insert(batches.begin(), InfoOf(rest));
-    return batches;
+    Contents();
+    return {toUndo_.rbegin(), toUndo_.rend()};
 }
 
 std::optional<BatchInfo> Journal::ToUndo() const {
-    return LastOf(ListsOf(Contents()).ToUndo);
+    Contents();
+    return LastOf(toUndo_);
 }
 
 std::optional<BatchInfo> Journal::ToRedo() const {
-    return LastOf(ListsOf(Contents()).ToRedo);
+    Contents();
+    return LastOf(toRedo_);
+}
+
+bool BatchInfo::IsFor(const TMusicDatabase& database) const {
+    return !NeedsDatabase || IsSameDatabase(database, Database);
 }
 
 bool Journal::FitsBatch(qint64 bytes) const {
@@ -98,10 +113,14 @@ std::unique_ptr<JournalFile> Journal::Open() {
 
 RecoveryResult Journal::TakeBackUnfinished() {
     if (!HasUnfinished(Contents())) return {};
-    JournalFile file(path_);
-    RecoveryResult result = Recover(file);
-    Changed.Tell();
-    return result;
+    try {
+        JournalFile file(path_);
+        RecoveryResult result = Recover(file);
+        Changed.Tell();
+        return result;
+    } catch (const EJournalBusy&) {
+        return {};  // it is being done
+    }
 }
 
 // --- What was found at the start ---

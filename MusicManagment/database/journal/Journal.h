@@ -26,6 +26,10 @@ struct BatchInfo {
     QString Database{};  // path of the one whose songs it is about; empty for files alone
     int Steps = 0;       // that are still to be taken back
     int Files = 0;
+    bool NeedsDatabase = false;  // songs or entries of the ban list are among them
+
+    // Whether it can be taken back while this one is open.
+    bool IsFor(const TMusicDatabase& database) const;
 };
 
 // What a program that was ended in the middle of a batch had left.
@@ -79,7 +83,8 @@ class Journal {
     // where the batch is about files alone. Throws EOtherDatabase, and nothing has happened.
     UndoResult Undo(TMusicDatabase* database);
     UndoResult Redo(TMusicDatabase* database);
-    // What a program has left half done: at the start of the program, and before each batch.
+    // What a program has left half done: at the start of the program, and before each batch. Nothing while
+    // another program changes files, which then is not done.
     RecoveryResult TakeBackUnfinished();
     // Brings a database that was just opened into agreement with the files: makes in it what was done with
     // its songs after its file was last saved. Returns how many songs have changed.
@@ -101,6 +106,8 @@ class Journal {
     QString path_;
     JournalLimits limits_;
     mutable JournalContents contents_;
+    mutable std::vector<BatchInfo> toUndo_;  // in the order in which they were done
+    mutable std::vector<BatchInfo> toRedo_;
     mutable FileState read_;  // of the file when it was read
 };
 

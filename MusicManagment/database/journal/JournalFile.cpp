@@ -2,7 +2,7 @@
 
 #include <zlib.h>
 
-#include <QFileInfo>
+#include <QDir>
 #include <algorithm>
 
 #include "CommonRUKTools/BufferedSource.h"
@@ -270,6 +270,7 @@ void JournalFile::Open() {
         file_ = std::make_unique<WorkFile>(WorkFile::Existing(path_, FileCalls::Access::Change));
         if (file_->Look().State.Size > contents_.End) file_->Resize(contents_.End);
     } else {
+        QDir().mkpath(FolderOfFile(path_));
         file_ = std::make_unique<WorkFile>(WorkFile::New(path_));
     }
     if (contents_.End == 0) {

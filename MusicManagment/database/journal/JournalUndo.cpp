@@ -169,13 +169,10 @@ class TakingBack {
     int failedNow_ = 0;
 };
 
-bool IsAboutSongs(const RestOfBatch& rest) {
-    return std::ranges::any_of(rest.Steps,
-                               [&rest](quint32 step) { return !rest.Batch->Steps[step].Head.IsOfFile(); });
-}
-
 void RefuseOtherDatabase(const RestOfBatch& rest, const TMusicDatabase* database) {
-    if (!IsAboutSongs(rest)) return;
+    const bool isAboutSongs = std::ranges::any_of(
+        rest.Steps, [&rest](quint32 step) { return !rest.Batch->Steps[step].Head.IsOfFile(); });
+    if (!isAboutSongs) return;
     const QString& needed = rest.Batch->Header.Database;
     if (database == nullptr || !IsSameDatabase(*database, needed)) throw EOtherDatabase(needed);
     if (!database->TakesChanges())

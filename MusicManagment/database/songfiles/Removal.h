@@ -4,19 +4,17 @@
 #include <QStringList>
 #include <vector>
 
-#include "MusicManagment/database/CollectionEdit.h"
+#include "MusicManagment/database/SongList.h"
 
-// Takes songs out of the collection; their files stay.
+class Journal;
+class TMusicDatabase;
 
-// The records as they were, for bringing them back.
-using RemovedSongs = std::vector<TID3Tag>;
+// Takes songs out of the collection; their files stay. Songs that are not there are passed over. Each returns
+// how many have gone.
 
-// By handle, by path or by position; positions may come in any order. Songs that are not there are passed
-// over; nothing is removed while the database takes no changes.
-RemovedSongs RemoveSongs(TMusicDatabase& database, const std::vector<SongHandle>& songs);
-RemovedSongs RemoveSongs(TMusicDatabase& database, const QStringList& paths);
-RemovedSongs RemoveSongs(TMusicDatabase& database, const std::vector<SongIndex>& positions);
-
-// Brings songs back, also those whose files are gone meanwhile. Returns how many; those that are in the
-// collection again already are passed over.
-int RestoreSongs(TMusicDatabase& database, const RemovedSongs& songs);
+// For good; none while the database takes no changes.
+int RemoveSongs(TMusicDatabase& database, const QStringList& paths);
+// So that it can be taken back, also when the files are gone by then; `caption` names it in the menu. Throws
+// what FileBatch throws, and EStreamError when the journal cannot be written; the songs are still there then.
+int RemoveSongs(Journal& journal, TMusicDatabase& database, const std::vector<SongHandle>& songs,
+                const QString& caption);

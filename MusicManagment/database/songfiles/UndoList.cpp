@@ -2,25 +2,13 @@
 
 #include "MusicManagment/database/MusicManagment.h"
 
-UndoList::UndoList(TMusicDatabase& database) {
-    ends_ = database.Events().Cleared.Subscribe([this] { Clear(); });
+UndoList::UndoList(TMusicDatabase& database, Journal& journal) : database_(database), journal_(journal) {
+    const auto tell = [this] { Changed.Tell(); };
+    subscriptions_ += journal.Changed.Subscribe(tell);
+    subscriptions_ += database.Events().Cleared.Subscribe(tell);
+    subscriptions_ += database.Events().Replaced.Subscribe(tell);
 }
 
-void UndoList::Add(UndoStep step) {
-    steps_.push_back(std::move(step));
-    Changed.Tell();
-}
-
-QStringList UndoList::TakeBack() {
-    if (steps_.empty()) return {};
-    QStringList songs = steps_.back().TakeBack();
-    steps_.pop_back();
-    Changed.Tell();
-    return songs;
-}
-
-void UndoList::Clear() {
-    if (steps_.empty()) return;
-    steps_.clear();
-    Changed.Tell();
+QString UndoList::CaptionOf(const std::optional<BatchInfo>& batch) const {
+    return batch && batch->IsFor(database_) ? batch->Caption : QString();
 }

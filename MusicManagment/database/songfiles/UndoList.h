@@ -1,38 +1,31 @@
 #pragma once
 
 #include <QString>
-#include <QStringList>
-#include <functional>
-#include <vector>
 
 #include "CommonRUKTools/Listeners.h"
+#include "MusicManagment/database/journal/Journal.h"
 
 class TMusicDatabase;
 
-// Something that was done with the songs of a collection and can be taken back.
-struct UndoStep {
-    QString Caption;  // what it was, as a menu names it
-    // Takes it back; returns the paths of the songs that it is about. May throw.
-    std::function<QStringList()> TakeBack;
-};
-
-// What can be taken back, the last step first. It belongs to one collection and is empty when another one
-// begins.
+// What the journal has to take back for the collection that is open: the last batch, where it is about songs
+// of this one or about files alone.
 class UndoList {
  public:
-    explicit UndoList(TMusicDatabase& database);
+    UndoList(TMusicDatabase& database, Journal& journal);
 
-    void Add(UndoStep step);
-    bool IsEmpty() const { return steps_.empty(); }
-    // Of the last step; empty when there is none.
-    QString Caption() const { return steps_.empty() ? QString() : steps_.back().Caption; }
-    // Takes the last step back and returns the paths of its songs. Throws what the step throws, which stays.
-    QStringList TakeBack();
-    void Clear();
+    // What would be taken back, and done again, as a menu names it; empty when there is nothing.
+    QString Caption() const { return CaptionOf(journal_.ToUndo()); }
+    QString RedoCaption() const { return CaptionOf(journal_.ToRedo()); }
+    // Throws what the journal throws.
+    UndoResult TakeBack() { return journal_.Undo(&database_); }
+    UndoResult DoAgain() { return journal_.Redo(&database_); }
 
     Listeners<> Changed;
 
  private:
-    std::vector<UndoStep> steps_;
-    Subscription ends_;
+    QString CaptionOf(const std::optional<BatchInfo>& batch) const;
+
+    TMusicDatabase& database_;
+    Journal& journal_;
+    Subscriptions subscriptions_;
 };
