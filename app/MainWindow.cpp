@@ -22,6 +22,7 @@
 #include "MusicManagment/database/commands/Settings.h"
 #include "MusicManagment/database/intake/IntakeReport.h"
 #include "app/ArrangementCommands.h"
+#include "app/BatchCommands.h"
 #include "app/CommandMenu.h"
 #include "app/HelpMenu.h"
 #include "app/MainMenu.h"
@@ -83,13 +84,16 @@ TTunesteadMainWnd::TTunesteadMainWnd(MainWindowOptions options)
     QTimer::singleShot(0, this, Guarded([this] { StartOnce(); }));
 }
 
-TTunesteadMainWnd::~TTunesteadMainWnd() = default;
+TTunesteadMainWnd::~TTunesteadMainWnd() {
+    SetJournal(nullptr);
+}
 
 void TTunesteadMainWnd::SetUpDatabase() {
     progress_.OnRunning = [this](bool running) { RunningChanged(running); };
     commands_.OnIntake = &ReportIntake;
     commands_.OnOpened = [this] { journal_.BringUpToDate(database_); };
     journal_.OnTakenBack = &TellTakenBack;
+    SetJournal(&journal_);
     const auto follow = [this] { ListChanged(); };
     connect(&songs_, &QAbstractItemModel::modelReset, this, follow);
     connect(&songs_, &QAbstractItemModel::rowsInserted, this, follow);
@@ -137,6 +141,7 @@ void TTunesteadMainWnd::SetUpStatusBar() {
 
 void TTunesteadMainWnd::SetUpMenu() {
     songCommands_ = std::make_unique<SongCommands>(database_, *list_, journal_);
+    batchCommands_ = std::make_unique<BatchCommands>(database_, *list_);
     songCommands_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
     settingsCommands_ =
         std::make_unique<SettingsCommands>(*this, database_, kSettingsKey.toString(), options_.SettingsFile);

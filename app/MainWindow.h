@@ -26,6 +26,7 @@ class Playing;
 class QLabel;
 class QStackedWidget;
 class SettingsCommands;
+class BatchCommands;
 class SongCommands;
 class SongListWidget;
 class ToolWindows;
@@ -96,6 +97,7 @@ class TTunesteadMainWnd : public QMainWindow {
     StartRequests requests_;
     std::unique_ptr<ArrangementCommands> arrangement_;
     std::unique_ptr<SongCommands> songCommands_;
+    std::unique_ptr<BatchCommands> batchCommands_;
     std::unique_ptr<SettingsCommands> settingsCommands_;
     std::unique_ptr<MainMenu> menu_;
     std::unique_ptr<ToolWindows> toolWindows_;

@@ -6,4 +6,5 @@ enum ShellCommandId : int {
     scOptions = 9002,
     scWizard = 9003,
     scUndo = 9004,
+    scRedo = 9005,
 };

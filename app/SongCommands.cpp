@@ -55,34 +55,39 @@ void SongCommands::HandleCommands() {
 
 // --- Undo ---
 
+// The later added one comes to stand first.
 void SongCommands::AddUndo() {
-    const auto caption = [this] {
-        const QString what = undo_.Caption();
-        return what.isEmpty() ? u"Rückgängig"_s : u"Rückgängig: "_s + what;
-    };
-    handlers_ += database_.Commands().Add(
-        {.Id = scUndo,
-         .Caption = caption(),
-         .Letter = u'r',
-         .Keys = u"Ctrl+Z"_s,
-         .Icon = u"edit-undo"_s,
-         .Menu = u"Bearbeiten",
-         .Where = ShellCommand::Place::First},
-        {.Run = [this] { Undo(); },
-         .IsEnabled = [this] { return !undo_.Caption().isEmpty() && !database_.ReadOnly(); },
-         .Caption = caption});
+    AddStep(
+        {.Id = scRedo, .Letter = u'w', .Keys = u"Ctrl+Shift+Z"_s, .Icon = u"edit-redo"_s},
+        u"Wiederherstellen"_s, [this] { return undo_.RedoCaption(); },
+        [this] { Show(undo_.DoAgain(), u"Wiederhergestellt: "_s); });
+    AddStep(
+        {.Id = scUndo, .Letter = u'r', .Keys = u"Ctrl+Z"_s, .Icon = u"edit-undo"_s, .BehindLine = false},
+        u"Rückgängig"_s, [this] { return undo_.Caption(); },
+        [this] { Show(undo_.TakeBack(), u"Rückgängig gemacht: "_s); });
     undoChanges_ = undo_.Changed.Subscribe([this] { database_.Commands().Changed.Tell(); });
 }
 
-void SongCommands::Undo() {
-    const UndoResult result = undo_.TakeBack();
+void SongCommands::AddStep(ShellCommand command, const QString& name, const std::function<QString()>& what,
+                           std::function<void()> run) {
+    const auto caption = [name, what] { return what().isEmpty() ? name : name + u": "_s + what(); };
+    command.Caption = caption();
+    command.Menu = u"Bearbeiten";
+    command.Where = ShellCommand::Place::First;
+    handlers_ += database_.Commands().Add(
+        command, {.Run = std::move(run),
+                  .IsEnabled = [this, what] { return !what().isEmpty() && !database_.ReadOnly(); },
+                  .Caption = caption});
+}
+
+void SongCommands::Show(const UndoResult& result, const QString& done) {
     const std::size_t shown = list_.MarkSongs(result.Songs);
     const bool showsAll = shown == static_cast<std::size_t>(result.Songs.size());
-    Tell(u"Rückgängig gemacht: "_s + result.Caption + u'.' +
+    Tell(done + result.Caption + u'.' +
          (showsAll ? QString() : u" Der Filter zeigt nicht alle Songs davon."_s));
     database_.SaveAfterCommand();
     if (!result.Problems.isEmpty())
-        UserDialogs().ShowMessage(MessageKind::Warning, u"Nicht alles konnte rückgängig gemacht werden:\n"_s +
+        UserDialogs().ShowMessage(MessageKind::Warning, u"Nicht alles konnte zurückgenommen werden:\n"_s +
                                                             result.Problems.join(u'\n'));
 }
 

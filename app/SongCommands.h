@@ -4,7 +4,7 @@
 #include <functional>
 #include <vector>
 
-#include "CommonRUKTools/Listeners.h"
+#include "CommonRUKTools/CommandDispatcher.h"
 #include "MusicManagment/database/SongList.h"
 #include "MusicManagment/database/songfiles/UndoList.h"
 
@@ -24,11 +24,14 @@ class SongCommands {
  private:
     void HandleCommands();
     void AddUndo();
+    // A command of the list of steps; `what` is its last step, empty for none.
+    void AddStep(ShellCommand command, const QString& name, const std::function<QString()>& what,
+                 std::function<void()> run);
+    void Show(const UndoResult& result, const QString& done);
     void RemoveChosen();
     void CopyChosen();
     void OpenExternally();
     QString RemovalQuestion(const std::vector<SongHandle>& songs) const;
-    void Undo();
     void Tell(const QString& sentence) const;
 
     TMusicDatabase& database_;

@@ -12,10 +12,12 @@ QString JournalPath() {
 
 }  // namespace
 
-JournalSession::JournalSession(Console& console) : journal_(JournalPath()) {
+JournalSession::JournalSession(Console& console, TMusicDatabase* database) : journal_(JournalPath()) {
     journal_.OnTakenBack = [&console](const RecoveryResult& recovered) {
-        if (const QString message = recovered.Message(); !message.isEmpty()) console.Message(message);
+        if (!recovered.IsEmpty()) console.Message(recovered.Message());
     };
+    journal_.OnTakenBack(journal_.TakeBackUnfinished());
+    if (database != nullptr) journal_.BringUpToDate(*database);
     SetJournal(&journal_);
 }
 

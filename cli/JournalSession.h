@@ -7,8 +7,8 @@
 // exists. What an earlier program has left half done is taken back, and told.
 class JournalSession {
  public:
-    // Throws EJournalBusy while another program changes files, and EStreamError.
-    explicit JournalSession(Console& console);
+    // Throws EStreamError when the journal cannot be read.
+    explicit JournalSession(Console& console, TMusicDatabase* database = nullptr);
     ~JournalSession();
     JournalSession(const JournalSession&) = delete;
     JournalSession& operator=(const JournalSession&) = delete;

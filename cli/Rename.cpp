@@ -55,7 +55,7 @@ void WritePlan(const Plan& plan, const QString& problem, bool asJson, Console& c
 
 // A song that is in the way of another is not asked about here: both stay.
 BatchResult CarryOut(TMusicDatabase& database, const std::vector<Plan>& plans, Console& console) {
-    const JournalSession journal(console);
+    const JournalSession journal(console, &database);
     const RunWatcher watcher(database, console, StopBy::Interrupt);
     std::vector<SongMove> moves;
     for (const Plan& plan : plans)

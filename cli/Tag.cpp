@@ -99,7 +99,7 @@ TID3Tag Expected(const TMusicDatabase& database, const Planned& plan, bool renam
 
 BatchResult CarryOut(TMusicDatabase& database, const std::vector<Planned>& plans, bool renames,
                      Console& console) {
-    const JournalSession journal(console);
+    const JournalSession journal(console, &database);
     const RunWatcher watcher(database, console, StopBy::Interrupt);
     std::vector<SongUpdate> updates;
     for (const Planned& plan : plans)

@@ -54,6 +54,17 @@ enum MenuCommand : int {
     mcCacheCdSongs = 512,
     mcDropCaches = 513,
     mcRenameCds = 514,
+    mcTagsSubmenu = 600,
+    mcSetFlag = 601,
+    mcRemoveFlag = 602,
+    mcRemoveTags = 603,
+    mcRereadTags = 604,
+    mcAllSongsSubmenu = 610,
+    mcAdaptAllGenres = 611,
+    mcSetFlagOfAll = 612,
+    mcRemoveFlagOfAll = 613,
+    mcRemoveAllTags = 614,
+    mcRereadAllTags = 615,
 };
 
 using DatabaseCommand = ComponentCommand<TMusicDatabase>;
@@ -66,5 +77,6 @@ extern const DatabaseCommands kFindCommands;
 extern const DatabaseCommands kSongFileCommands;
 extern const DatabaseCommands kOrderCommands;
 extern const DatabaseCommands kOverviewCommands;
+extern const DatabaseCommands kBatchCommands;
 extern const DatabaseCommands kPlayCommands;
 extern const DatabaseCommands kLaterCommands;  // still to be built

@@ -6,18 +6,12 @@ namespace {
 
 constexpr DatabaseCommand kRows[] = {
     {.Id = mcFindOnline, .Caption = u"Suchen im Internet...", .Keys = u"Ctrl+Alt+F"},
-    {.Id = mcTakeGenre,
-     .Caption = u"In passendes Genre aufnehmen",
-     .Keys = u"Alt+A",
-     .For = DatabaseCommand::Needs::Writing},
     {.Id = mcFindDuplicates, .Caption = u"Doppelte Einträge suchen (allgemein)"},
     {.Id = mcFindDuplicatesOfArtists, .Caption = u"Doppelte Einträge suchen (innerhalb der Artists)"},
     {.Id = mcFindSimilarArtists, .Caption = u"Ähnlich klingende Artists suchen"},
-    {.Id = mcVerifyLengths, .Caption = u"Korrektheit von Länge und Format sicherstellen"},
     {.Id = mcReadBackupCd, .Caption = u"Songs von einer Backup-CD wieder einlesen"},
     {.Id = mcPrepareBurning, .Caption = u"Brennen auf CD vorbereiten"},
     {.Id = mcLoadLyrics, .Caption = u"Lyrikfang downloaden"},
-    {.Id = mcEnterLength, .Caption = u"Länge manuell eingeben"},
     {.Id = mcConvert, .Caption = u"Song konvertieren"},
     {.Id = mcCacheCdSongs, .Caption = u"Songs von CD zwischenspeichern"},
     {.Id = mcDropCaches, .Caption = u"Zwischenspeicherungen entfernen"},

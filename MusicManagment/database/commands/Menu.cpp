@@ -17,15 +17,23 @@ constexpr MenuLine kSortLines[] = {411, 412, 413, 414, 415, 416, 417, 418, 419, 
 constexpr MenuOutline kSort{u"Anordnen nach", kSortLines, mcSortSubmenu};
 constexpr MenuLine kSubSortLines[] = {431, 432, 433};
 constexpr MenuOutline kSubSort{u"Untergeordnet anordnen nach", kSubSortLines, mcSubSortSubmenu};
-constexpr MenuLine kSongLines[] = {mcPlay, mcAddToPlayList, mcOpenExternally, mcTakeGenre,  kSeparator,
-                                   &kSort, &kSubSort,       mcReverse,        mcFollowFocus};
+constexpr MenuLine kTagLines[] = {mcSetFlag, mcRemoveFlag, kSeparator, mcRereadTags, mcRemoveTags};
+constexpr MenuOutline kTags{
+    .Caption = u"Tags und Flags", .Lines = kTagLines, .Id = mcTagsSubmenu, .For = kWriting};
+constexpr MenuLine kSongLines[] = {mcPlay,     mcAddToPlayList, mcOpenExternally, mcTakeGenre, &kTags,
+                                   kSeparator, &kSort,          &kSubSort,        mcReverse,   mcFollowFocus};
+constexpr MenuLine kAllSongsLines[] = {mcAdaptAllGenres, mcSetFlagOfAll,  mcRemoveFlagOfAll,
+                                       kSeparator,       mcRereadAllTags, mcRemoveAllTags};
+constexpr MenuOutline kAllSongs{
+    .Caption = u"Tags und Flags aller Songs", .Lines = kAllSongsLines, .Id = mcAllSongsSubmenu};
 constexpr MenuLine kExtrasLines[] = {mcFindDuplicates,     mcFindDuplicatesOfArtists,
                                      mcFindSimilarArtists, mcVerifyLengths,
                                      mcSearchNew,          mcReadBackupCd,
                                      mcPrepareBurning,     mcLoadLyrics,
                                      mcEnterLength,        mcConvert,
-                                     kSeparator,           mcCacheCdSongs,
-                                     mcDropCaches,         mcRenameCds};
+                                     &kAllSongs,           kSeparator,
+                                     mcCacheCdSongs,       mcDropCaches,
+                                     mcRenameCds};
 constexpr MenuLine kOverviewLines[] = {301, 302, 303, 304, 305, kWritableSeparator, mcRecount};
 
 constexpr MenuOutline kDatabase{.Caption = u"Datenbank", .Lines = kDatabaseLines, .For = kWriting};
@@ -55,7 +63,7 @@ CommandDispatcher& TMusicDatabase::Commands() {
                                     void* platformItem) { return TellOfClick(*this, item, platformItem); }});
     for (const DatabaseCommands& capability :
          {kFileCommands, kIntakeCommands, kFindCommands, kSongFileCommands, kOrderCommands, kOverviewCommands,
-          kPlayCommands, kLaterCommands})
+          kPlayCommands, kBatchCommands, kLaterCommands})
         commands_->Register(*this, capability);
     for (Listeners<>* change :
          {&CurrentOperation().Started, &CurrentOperation().Ended, &Events().ReadOnlyChanged})

@@ -1,0 +1,99 @@
+#include "app/BatchCommands.h"
+
+#include "CommonRUKTools/CommandDispatcher.h"
+#include "CommonRUKTools/Dialogs.h"
+#include "MusicManagment/database/Command.h"
+#include "MusicManagment/database/batches/BatchReport.h"
+#include "MusicManagment/database/batches/FlagBatch.h"
+#include "MusicManagment/database/batches/TagBatch.h"
+#include "app/views/SongListWidget.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+QString DiscardQuestion(const TMusicDatabase& database, const std::vector<SongHandle>& songs, bool banned) {
+    const TID3Tag* only = songs.size() == 1 ? database.Songs().Find(songs.front()) : nullptr;
+    const QString what =
+        only != nullptr ? u'"' + only->Artist + u" - "_s + only->Title + u'"' : SongCountText(songs.size());
+    const QString begin = (songs.size() == 1 ? u"Soll "_s : u"Sollen "_s) + what;
+    return begin +
+           (banned
+                ? u" in die Bann-Liste aufgenommen, aus der Datenbank entfernt und in den Papierkorb gelegt "
+                  "werden? Verbannte Songs werden nicht wieder aufgenommen."_s
+                : u" aus der Datenbank entfernt und in den Papierkorb gelegt werden?"_s);
+}
+
+}  // namespace
+
+BatchCommands::BatchCommands(TMusicDatabase& database, SongListWidget& list)
+    : database_(database), list_(list) {
+    const auto handle = [this](int id, std::function<void()> run) {
+        handlers_ += database_.Commands().Handle(id, {.Run = std::move(run)});
+    };
+    handle(mcTakeGenre, [this] { AdaptGenre(); });
+    handle(mcVerifyLengths, [this] { VerifyLengths(); });
+    handle(mcEnterLength, [this] { EnterLength(); });
+    handle(mcRemoveTags, [this] { RemoveTags(); });
+    handle(mcRereadTags, [this] { RereadTags(); });
+    for (const int id : {mcSetFlag, mcRemoveFlag})
+        handle(id, [this, id] { ChangeFlag(id); });
+    for (const int id : {mcRemoveFromDisk, mcBan})
+        handle(id, [this, id] { Discard(id); });
+}
+
+BatchSongs BatchCommands::Chosen() const {
+    ViewSelection selection{.Marked = list_.ChosenHandles()};
+    if (const SongIndex focused = list_.FocusedSong(); focused >= 0)
+        selection.Selected = database_.Songs().HandleOf(focused);
+    if (selection.Marked.empty()) return {};
+    BatchSongs songs = MarkedSongs(selection);
+    TellOfPassedMarks(songs);
+    return songs;
+}
+
+void BatchCommands::AdaptGenre() {
+    if (const BatchSongs songs = Chosen(); !songs.IsEmpty()) ReportAdaption(AdaptGenres(database_, songs));
+}
+
+void BatchCommands::VerifyLengths() {
+    if (const BatchSongs songs = Chosen(); !songs.IsEmpty()) ReportLengths(::VerifyLengths(database_, songs));
+}
+
+void BatchCommands::EnterLength() {
+    const SongIndex focused = list_.FocusedSong();
+    if (focused >= 0) ReportBatch(::EnterLength(database_, database_.Songs().HandleOf(focused)));
+}
+
+void BatchCommands::ChangeFlag(int id) {
+    const BatchSongs songs = Chosen();
+    if (songs.IsEmpty()) return;
+    const FlagChange change = id == mcSetFlag ? FlagChange::Set : FlagChange::Remove;
+    if (const auto flag = AskForFlag(change)) ReportBatch(::ChangeFlag(database_, songs, *flag, change));
+}
+
+void BatchCommands::RemoveTags() {
+    const BatchSongs songs = Chosen();
+    if (!songs.IsEmpty() && MayRemoveTags(songs.Range)) ReportBatch(::RemoveTags(database_, songs));
+}
+
+void BatchCommands::RereadTags() {
+    const BatchSongs songs = Chosen();
+    if (!songs.IsEmpty() && MayRereadTags(songs.Range)) ReportBatch(::RereadTags(database_, songs));
+}
+
+void BatchCommands::Discard(int id) {
+    const std::vector<SongHandle> songs = list_.ChosenHandles();
+    if (songs.empty()) return;
+    const bool banned = id == mcBan;
+    if (UserDialogs().Ask({.Text = DiscardQuestion(database_, songs, banned),
+                           .Buttons = {banned ? u"Verbannen"_s : u"In den Papierkorb"_s, u"Abbrechen"_s},
+                           .Cancel = 1}) != 0)
+        return;
+    const SongHandle next = list_.NextAfter(songs);
+    const QString caption = SongCountText(songs.size()) + (banned ? u" verbannen"_s : u" löschen"_s);
+    const BatchResult result =
+        DiscardSongs(database_, caption, songs, banned ? Banning::Banned : Banning::NotBanned);
+    list_.FocusSong(database_.Songs().PositionOf(next), QAbstractItemView::EnsureVisible);
+    ReportBatch(result);
+}
