@@ -1,5 +1,6 @@
 #!/usr/bin/env python3
-"""make_seeds.py FOLDER: writes small sound files as a start for audio_fuzz (first byte: options)."""
+"""make_seeds.py FOLDER: writes small sound files as a start for audio_fuzz and tag_writing_fuzz
+(first byte: options)."""
 
 import struct
 import sys
@@ -45,6 +46,12 @@ def id3v2_tags():
 def id3v1():
     return (b"TAG" + b"Waterloo".ljust(30, b"\0") + b"ABBA".ljust(30, b"\0") + bytes(30) + b"1974" +
             bytes(29) + b"\7\x11")
+
+
+def ape():
+    def edge(flags):
+        return b"APETAGEX" + struct.pack("<IIII", 2000, 32, 0, flags) + bytes(8)
+    return edge(0xA0000000) + edge(0x80000000)
 
 
 def vbr(text, offset, numbers, header=FRAME):
@@ -106,6 +113,8 @@ def files():
     yield "asf", asf()
     yield "asf_tag", trailing(asf(), tags["v24"]) + b""
     yield "stacked", tags["v23"] * 3 + frames(2)
+    yield "ape", tags["v24"] + frames(2) + ape() + id3v1()
+    yield "mpeg_trailing", trailing(tags["v22"] + frames(2), tags["v24"])
 
 
 def main():
@@ -114,7 +123,7 @@ def main():
     folder = Path(sys.argv[1])
     folder.mkdir(parents=True, exist_ok=True)
     for name, content in files():
-        for options in (0, 7):
+        for options in (0, 7, 0x9E):
             (folder / f"{name}_{options}").write_bytes(bytes([options]) + content)
 
 

@@ -11,5 +11,6 @@ void AppendFrame(ByteWriter& stream, const TagFrame& frame) {
 }
 
 void MoveOddIdsBack(std::vector<TagFrame>& frames) {
-    std::ranges::stable_partition(frames, [](const TagFrame& frame) { return frame.Id.size() == 4; });
+    std::stable_partition(frames.begin(), frames.end(),
+                          [](const TagFrame& frame) { return frame.Id.size() == 4; });
 }

@@ -139,7 +139,6 @@ class LayoutSearch {
                 throw EStreamError(u"der ID3v2-Tag hat eine unbekannte Version"_s);
             if (*end > file_.Size())
                 throw EStreamError(u"der ID3v2-Tag reicht über das Ende der Datei hinaus"_s);
-            layout_.IsLeadingTagWhole = IsWholeTag(file_, 0);
             AddLeading(0, *end);
             FindStacked();
         }
@@ -150,14 +149,16 @@ class LayoutSearch {
     void AddLeading(std::int64_t position, std::int64_t end) {
         layout_.Tags.push_back(position);
         layout_.Sound.Begin = end;
+        layout_.AreLeadingTagsWhole = layout_.AreLeadingTagsWhole && IsWholeTag(file_, position);
     }
 
-    // Whatever is no whole tag stays as it is.
     void FindStacked() {
         while (true) {
             const std::int64_t position = layout_.Sound.Begin;
             const auto end = EndOfID3v2Tag(file_, position);
-            if (!end || *end > file_.Size() || !IsWholeTag(file_, position)) return;
+            if (!end || *end > file_.Size()) return;
+            const auto header = ID3v2Header::Read(file_, position);
+            if (!HasKnownFrameLayout(*header)) return;
             AddLeading(position, *end);
         }
     }

@@ -20,7 +20,7 @@ struct TagLayout {
 
     Kind Container = Kind::Mpeg;
     std::vector<std::int64_t> Tags{};     // positions of the ID3v2 tags, the one that our reader takes first
-    bool IsLeadingTagWhole = true;        // false: its frames are not all there is to it
+    bool AreLeadingTagsWhole = true;      // false: their frames are not all there is to them
     FileRange Sound{};                    // with whatever else is no tag of ours
     std::vector<FileRange> Behind{};      // APE tags
     std::optional<std::int64_t> Id3v1{};  // the last one of the file

@@ -159,9 +159,9 @@ class TagMerge {
             case TagField::Title:
                 return record_.Title == CleanedTitle(old_) || Says(field);
             case TagField::Length:
-                return Says(field) || (HasFrame(field) && record_.Length == asRead_.Length);
+                return Says(field) || (HasFrame(field) && IsLengthAsRead());
             case TagField::FileType:
-                return Says(field) || (HasFrame(field) && record_.MPEGLayer == asRead_.MPEGLayer);
+                return Says(field) || (HasFrame(field) && IsFormatAsRead());
             case TagField::Genre:
                 return IsGenreUnchanged();
             case TagField::Comment:
@@ -175,6 +175,15 @@ class TagMerge {
 
     bool Says(TagField field) const {
         return SayTheSame(field, wanted_, old_) || SayTheSame(field, wanted_, oldModern_);
+    }
+
+    // The sound tells it, not the frame; and who does not know it has nothing to say against the frame.
+    bool IsLengthAsRead() const { return record_.Length == 0 || record_.Length == asRead_.Length; }
+    bool IsFormatAsRead() const {
+        TID3Tag unknown;
+        ResetTag(false, unknown, 0);
+        const QString& format = record_.MPEGLayer;
+        return format.isEmpty() || format == unknown.MPEGLayer || format == asRead_.MPEGLayer;
     }
 
     bool HasFrame(TagField field) const {

@@ -65,7 +65,7 @@ class TagPlan {
  public:
     TagPlan(ByteSource& file, const QString& path, const TagEdit& edit, const TagWriteOptions& options)
         : file_(file), edit_(edit), layout_(FindTags(file, path)) {
-        if (!layout_.IsLeadingTagWhole) throw EStreamError(u"der ID3v2-Tag ist beschädigt"_s);
+        if (!layout_.AreLeadingTagsWhole) throw EStreamError(u"der ID3v2-Tag ist beschädigt"_s);
         std::vector<StoredTag> tags;
         for (const std::int64_t position : layout_.Tags)
             tags.push_back(ReadStoredTag(file, position));
@@ -136,7 +136,7 @@ class TagPlan {
 
 // A damaged tag may lie about its size: what stands behind it must be sound.
 void CheckBeginOfSound(ByteSource& file, const TagLayout& layout) {
-    if (layout.IsLeadingTagWhole || layout.Container != TagLayout::Kind::Mpeg) return;
+    if (layout.AreLeadingTagsWhole || layout.Container != TagLayout::Kind::Mpeg) return;
     const auto frame = FindMpegFrame(file, layout.Sound.Begin);
     if (!frame || !frame->Confirmed || frame->Position != layout.Sound.Begin)
         throw EStreamError(u"der ID3v2-Tag ist beschädigt"_s);
