@@ -193,7 +193,7 @@ class LayoutSearch {
     bool TakeTrailer() {
         const std::int64_t end = layout_.Sound.End;
         const auto position = TagOfTrailerBefore(file_, end);
-        if (!position || *position < std::max(layout_.Sound.Begin, std::int64_t{kHeadSize})) return false;
+        if (!position || *position < layout_.Sound.Begin) return false;
         const auto tagEnd = EndOfID3v2Tag(file_, *position);
         if (!tagEnd || *tagEnd > end - kTagTrailerSize || !IsWholeTag(file_, *position) ||
             SkipZeros(file_, *tagEnd) < end - kTagTrailerSize)
