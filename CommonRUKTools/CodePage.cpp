@@ -197,6 +197,8 @@ bool FitsLegacy(QStringView text) {
 }
 
 QByteArray ToLegacy(QStringView text) {
+    // Most texts are ASCII throughout, which is the same in every page.
+    if (QtPrivate::isAscii(text)) return text.toLatin1();
     QByteArray bytes;
     ForEachCharacter(text, [&bytes](QStringView character) {
         const QByteArray exact = LegacyCharacter(character);
