@@ -54,7 +54,7 @@ class EHalfDone : public EStreamError {
 
 // How a file gets its new version: written over in its place, or built anew beside it, from where it takes
 // the name in one step. The latter keeps owner, mode, access lists and further attributes; where it would cut
-// a hard link or lose the owner, the whole file is written over in its place instead.
+// a hard link or lose the owner, a file of up to 256 MiB is written over in its place as a whole instead.
 struct PatchPlan {
     QString Path{};  // of the file itself: a symbolic link stays one
     FileState Before{};

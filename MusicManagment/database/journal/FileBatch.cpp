@@ -131,23 +131,24 @@ void FileBatch::Add(FileItem item) {
     }
     for (FileItem::Wanted& step : item.steps_)
         step.Patch = {};  // the plan has it
-    planned.Done = [this, item = std::move(item)](std::size_t done, const QString& message) {
-        Note(item, done, message);
+    const PlannedStep* patch = PatchIn(planned);
+    const int otherNames = patch != nullptr ? patch->OtherNames : 0;
+    planned.Done = [this, item = std::move(item), otherNames](std::size_t done, const QString& message) {
+        Note(item, {.StepsDone = static_cast<int>(done), .Message = message, .OtherNames = otherNames});
     };
     run_->Add(std::move(planned));
 }
 
-void FileBatch::Note(const FileItem& item, std::size_t done, const QString& message) {
-    for (std::size_t i = 0; i < done; ++i) {
-        const FileItem::Wanted& step = item.steps_[i];
+void FileBatch::Note(const FileItem& item, const ItemResult& result) {
+    for (int i = 0; i < result.StepsDone; ++i) {
+        const FileItem::Wanted& step = item.steps_[static_cast<std::size_t>(i)];
         if (step.Kind == StepKind::Record) records_.push_back(step.Record);
         if (step.Kind == StepKind::Ban) bans_.push_back(step.Ban);
     }
-    const ItemResult result{.StepsDone = static_cast<int>(done), .Message = message};
     if (result.IsComplete())
         ++done_;
     else
-        failures_ << message;
+        failures_ << result.Message;
     if (!item.done_) return;
     ApplyWhatIsDone();  // whoever is told finds the collection as it is now
     item.done_(result);

@@ -16,7 +16,8 @@ class TMusicDatabase;
 // What came of the steps of one item.
 struct ItemResult {
     int StepsDone = 0;
-    QString Message{};  // why the next one failed; empty when all were done
+    QString Message{};   // why the next one failed; empty when all were done
+    int OtherNames = 0;  // hard links under which the new version is seen as well; for the user to know
 
     bool IsComplete() const { return Message.isEmpty(); }
 };
@@ -33,6 +34,7 @@ class FileItem {
     // The song's record as it is and as it is to be; only what differs changes. Without the first it comes
     // into the collection, without the second it goes.
     FileItem& Record(std::optional<TID3Tag> before, std::optional<TID3Tag> after);
+    // An entry that the list does not have, or has.
     FileItem& Ban(const QString& entry);
     FileItem& Unban(const QString& entry);
     // Told once, when it is known: with this item's group, or at once when it cannot begin. Must not throw.
@@ -87,7 +89,7 @@ class FileBatch {
     const QStringList& Songs() const { return songs_; }
 
  private:
-    void Note(const FileItem& item, std::size_t done, const QString& message);
+    void Note(const FileItem& item, const ItemResult& result);
     void ApplyWhatIsDone();
 
     Journal* journal_;

@@ -88,6 +88,7 @@ PlannedStep PlanPatchStep(const QString& path, FilePatch patch, const FileState&
                     .After = plan.After,
                     .Inverse = std::move(plan.Inverse)};
     planned.Patch = std::move(plan.Patch);
+    planned.OtherNames = plan.OtherNames;
     return planned;
 }
 

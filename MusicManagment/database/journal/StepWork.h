@@ -7,8 +7,9 @@
 // A step with what only carrying it out needs.
 struct PlannedStep {
     JournalStep Step{};
-    FilePatch Patch{};  // of StepKind::Patch
-    QString Refused{};  // what is told when the bin does not take the file
+    FilePatch Patch{};   // of StepKind::Patch
+    int OtherNames = 0;  // hard links beside this name, of a patch
+    QString Refused{};   // what is told when the bin does not take the file
 
     qint64 Bytes() const { return Patch.InsertedBytes() + Step.Inverse.InsertedBytes(); }
 };
