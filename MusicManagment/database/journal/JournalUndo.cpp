@@ -32,8 +32,8 @@ std::vector<std::size_t> BackOrder(const StandingItem& item) {
     std::vector<std::size_t> order;
     for (std::size_t i = item.size(); i-- > 0;)
         order.push_back(i);
-    std::ranges::stable_partition(order,
-                                  [&item](std::size_t i) { return item[i].Step.Kind == StepKind::Patch; });
+    std::stable_partition(order.begin(), order.end(),
+                          [&item](std::size_t i) { return item[i].Step.Kind == StepKind::Patch; });
     return order;
 }
 
