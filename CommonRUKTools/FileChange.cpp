@@ -226,7 +226,8 @@ QString FolderThatIsThere(const QString& path) {
 void FlushOne(const QString& path) {
     if (FileSource::Exists(path)) WorkFile::Existing(path, FileCalls::Access::Read).Flush();
     PassGate(DiskStep::Flush, path, kCannotWrite);
-    if (!FileCalls::FlushFolder(FolderThatIsThere(path))) ThrowSystemError(kCannotWrite, path, errno);
+    if (CurrentWriteGate().WaitsForDisk() && !FileCalls::FlushFolder(FolderThatIsThere(path)))
+        ThrowSystemError(kCannotWrite, path, errno);
 }
 
 }  // namespace
@@ -248,7 +249,7 @@ void FlushFiles(const QStringList& paths) {
         if (!FileCalls::Look(folder, facts) || flushed.contains(facts.State.Device)) continue;
         flushed.insert(facts.State.Device);
         PassGate(DiskStep::Flush, path, kCannotWrite);
-        if (FileCalls::FlushFileSystem(folder)) continue;
+        if (!CurrentWriteGate().WaitsForDisk() || FileCalls::FlushFileSystem(folder)) continue;
         if (errno != ENOSYS) ThrowSystemError(kCannotWrite, path, errno);
         std::ranges::for_each(paths, FlushOne);
         return;

@@ -117,7 +117,8 @@ void WorkFile::TakeAttributes(const WorkFile& from, FileCalls::Attributes which)
 
 void WorkFile::Flush() {
     PassGate(DiskStep::Flush, path_, kCannotWrite);
-    if (!FlushToDisk(file_)) ThrowSystemError(kCannotWrite, path_, errno);
+    if (CurrentWriteGate().WaitsForDisk() && !FlushToDisk(file_))
+        ThrowSystemError(kCannotWrite, path_, errno);
 }
 
 // --- Helpers ---

@@ -33,6 +33,9 @@ class StepGate : public WriteGate {
     std::size_t LongestWrite() const override {
         return 700;
     }
+    bool WaitsForDisk() const override {
+        return false;
+    }
 
     int Steps = 0;
     bool BetweenFileSystems = false;  // every move leads to another one

@@ -9,7 +9,6 @@
 #include "MusicManagment/database/journal/Journal.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
-#include "tests/database/RecordingTrash.h"
 #include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
@@ -20,13 +19,19 @@ namespace {
 class SongUpdatesTest : public testing::Test {
  protected:
     SongUpdatesTest() {
+        // The desktop's bin of this user lies there.
+        qputenv("XDG_DATA_HOME", QFile::encodeName(folder_.Path(u"data"_s)));
+        QDir(folder_.Path()).mkdir(u"data"_s);
         SetJournal(&journal_);
         database_.SetAsynchronous(false);
         database_.SetModernTags(true);
         database_.SetRenameInPlace(true);
         database_.SetOrder({.SortType = stPath, .SubSortType = sstPath});
     }
-    ~SongUpdatesTest() override { SetJournal(nullptr); }
+    ~SongUpdatesTest() override {
+        SetJournal(nullptr);
+        qunsetenv("XDG_DATA_HOME");
+    }
 
     SongHandle Add(const QString& name, quint8 mainGenre = 0) {
         SongOverrides overrides;
@@ -76,7 +81,6 @@ TEST_F(SongUpdatesTest, AnEditReachesFileRecordAndNameAndIsTakenBackAsAWhole) {
 }
 
 TEST_F(SongUpdatesTest, WhatIsInTheWayIsAskedAboutAfterTagAndRecordAreWritten) {
-    const RecordingTrash trash;
     const SongHandle a = Add(u"Queen - A.wav"_s);
     const SongHandle b = Add(u"Queen - B.wav"_s);
     const SongHandle c = Add(u"Queen - C.wav"_s);
