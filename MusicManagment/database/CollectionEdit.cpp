@@ -87,6 +87,7 @@ bool CollectionEdit::Commit() {
     if (!database_.TakesChanges()) return false;
     RemoveSongs();
     ChangeSongs();
+    TellRenamed();
     AddSongs();
     return true;
 }
@@ -128,11 +129,23 @@ void CollectionEdit::ChangeMany() {
 
 // A song that was to change twice has changed once.
 void CollectionEdit::NoteChange(SongHandle song, TID3Tag before, TID3Tag after) {
+    if (before.FileName != after.FileName) renamed_.emplace_back(song, before.FileName);
     const auto [known, isNew] = changedAt_.try_emplace(song.Slot, done_.size());
     if (isNew)
         done_.push_back({song, std::move(before), std::move(after)});
     else
         done_[known->second].After = std::move(after);
+}
+
+void CollectionEdit::TellRenamed() {
+    PathChanges renamed;
+    std::unordered_set<quint32> told;
+    for (const auto& [song, path] : std::exchange(renamed_, {})) {
+        const TID3Tag* record = database_.Songs().Find(song);
+        const bool isFirst = told.insert(song.Slot).second;
+        if (record != nullptr && isFirst && record->FileName != path) renamed.insert(path, record->FileName);
+    }
+    if (!renamed.isEmpty()) database_.Events().Renamed.Tell(renamed);
 }
 
 void CollectionEdit::PlaceAgain(const std::vector<SongHandle>& songs) {

@@ -2,6 +2,7 @@
 
 #include <optional>
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include "MusicManagment/database/MusicManagment.h"
@@ -50,6 +51,7 @@ class CollectionEdit {
     void ChangeSongs();
     void ChangeMany();
     void NoteChange(SongHandle song, TID3Tag before, TID3Tag after);
+    void TellRenamed();
     void AddSongs();
     void PlaceAgain(const std::vector<SongHandle>& songs);
 
@@ -58,5 +60,6 @@ class CollectionEdit {
     std::vector<Changing> changes_;
     std::vector<Adding> additions_;
     std::vector<SongEdit> done_;
-    std::unordered_map<quint32, std::size_t> changedAt_;  // in done_, by slot
+    std::unordered_map<quint32, std::size_t> changedAt_;   // in done_, by slot
+    std::vector<std::pair<SongHandle, QString>> renamed_;  // each with the path that it had
 };

@@ -1,10 +1,14 @@
 #pragma once
 
+#include <QHash>
 #include <QString>
 
 #include "CommonRUKTools/Listeners.h"
 #include "MusicManagment/database/SongTypes.h"
 #include "ReadMPEGHeader/ID3Tag.h"
+
+// Old path to new path, of songs that change their paths at the same time: two of them may swap theirs.
+using PathChanges = QHash<QString, QString>;
 
 // What happens to a collection, told once to everybody who has subscribed. A song that is given another place
 // by a change or an insertion is told of when it stands there. Listeners must not throw.
@@ -18,8 +22,8 @@ struct CollectionEvents {
     Listeners<SongIndex, SongIndex> Moved;
     // Where the song stood, and its record.
     Listeners<SongIndex, const TID3Tag&> Removed;
-    // A song has another path now: old, new. Comes after Changed.
-    Listeners<const QString&, const QString&> Renamed;
+    // Songs have other paths now. Comes after Changed, once for all that changed together.
+    Listeners<const PathChanges&> Renamed;
     // Around a new order of the same songs.
     Listeners<> Reordering;
     Listeners<> Reordered;

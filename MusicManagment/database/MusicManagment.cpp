@@ -158,7 +158,12 @@ SongIndex TMusicDatabase::UpdateEntry(SongIndex index, TID3Tag record) {
     if (!TakesChanges() || index < 0 || index >= Count()) return -1;
     const SongHandle song = songs_.HandleOf(index);
     EnsureSorted();
-    return ChangeSong(songs_.PositionOf(song), std::move(record));
+    index = songs_.PositionOf(song);
+    const QString before = Song(index).FileName;
+    const QString after = record.FileName;
+    const SongIndex place = ChangeSong(index, std::move(record));
+    if (before != after) events_.Renamed.Tell({{before, after}});
+    return place;
 }
 
 // In a list that is in order.
@@ -182,7 +187,6 @@ TID3Tag TMusicDatabase::PutRecord(SongIndex index, TID3Tag record) {
 void TMusicDatabase::TellChanged(SongIndex place, const TID3Tag& before) {
     const TID3Tag after = Song(place);
     events_.Changed.Tell(place, before, after);
-    if (before.FileName != after.FileName) events_.Renamed.Tell(before.FileName, after.FileName);
 }
 
 bool TMusicDatabase::RemoveEntry(SongIndex index) {

@@ -32,7 +32,8 @@ class Mirror {
                 EXPECT_TRUE(song == before);
                 song = after;
             });
-        subscriptions_ += events.Renamed.Subscribe([this](auto&, const QString& path) { Renamed << path; });
+        subscriptions_ +=
+            events.Renamed.Subscribe([this](const PathChanges& paths) { Renamed << paths.values(); });
         subscriptions_ += events.Reordered.Subscribe([this] { Songs = Contents(); });
     }
     std::vector<TID3Tag> Contents() const {
