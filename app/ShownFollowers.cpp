@@ -8,6 +8,8 @@ void ShownFollowers::Begin(std::vector<QString> songs) {
     End();
     if (onlyThisSong_) return;
     songs_ = std::move(songs);
+    renaming_ = list_.MusicDatabase()->Events().Renamed.Subscribe(
+        [this](const PathChanges& renamed) { FollowRenamed(renamed); });
     waiting_ = next_ = 1;
     QueueNext();
 }
@@ -16,7 +18,13 @@ void ShownFollowers::End() {
     for (; waiting_ < next_; ++waiting_)
         list_.Dequeue(list_.IndexOf(songs_[waiting_]));
     songs_.clear();
+    renaming_.End();
     waiting_ = next_ = 0;
+}
+
+void ShownFollowers::FollowRenamed(const PathChanges& renamed) {
+    for (QString& song : songs_)
+        song = renamed.value(song, song);
 }
 
 // What has left the queue plays, or was passed over.

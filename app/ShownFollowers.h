@@ -34,9 +34,11 @@ class ShownFollowers : public SettingsClient {
 
  private:
     void QueueNext();
+    void FollowRenamed(const PathChanges& renamed);
 
     TPlayList& list_;
     std::vector<QString> songs_;
+    Subscription renaming_;    // of the database, while there are songs
     std::size_t waiting_ = 0;  // the first of those in the queue
     std::size_t next_ = 0;     // the one behind them
     bool onlyThisSong_ = false;

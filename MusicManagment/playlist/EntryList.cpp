@@ -51,6 +51,19 @@ void EntryList::SetRecord(int index, TID3Tag record) {
     seconds_ += SecondsOf(entry);
 }
 
+std::vector<int> EntryList::Rename(const QHash<QString, QString>& names) {
+    std::vector<int> renamed;
+    int index = 0;
+    for (const Item& item : items_) {
+        if (const auto name = names.constFind(item.Entry->Name); name != names.constEnd()) {
+            item.Entry->Name = *name;
+            renamed.push_back(index);
+        }
+        ++index;
+    }
+    return renamed;
+}
+
 void EntryList::Remove(int index) {
     seconds_ -= SecondsOf(At(index));
     items_.removeAt(static_cast<std::size_t>(index));

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QHash>
 #include <memory>
 #include <vector>
 
@@ -22,6 +23,8 @@ class EntryList {
 
     void Insert(int position, PlayListEntry entry);
     void SetRecord(int index, TID3Tag record);
+    // Gives the entries with these names others; returns where they stand.
+    std::vector<int> Rename(const QHash<QString, QString>& names);
     void Remove(int index);
     void Clear();
     void Assign(std::vector<PlayListEntry> entries);

@@ -203,6 +203,7 @@ void TPlayList::SetScanTime(int milliseconds) {
 
 void TPlayList::SetMusicDatabase(TMusicDatabase* database) {
     if (database == database_) return;
+    renaming_.End();
     if (database_) {
         database_->LeaveSettings(*this);
         if (database_->PlayList() == this) database_->SetPlayList(nullptr);
@@ -211,6 +212,8 @@ void TPlayList::SetMusicDatabase(TMusicDatabase* database) {
     if (database == nullptr) return;
     database->SetPlayList(this);
     database->JoinSettings(*this);
+    renaming_ =
+        database->Events().Renamed.Subscribe([this](const PathChanges& renamed) { FollowRenamed(renamed); });
 }
 
 void TPlayList::SetPlaySound(SongPlayer* player) {

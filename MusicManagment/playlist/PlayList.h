@@ -111,7 +111,8 @@ class TPlayList : public QObject, public SettingsClient {
 
     // --- Files (PlayListFiles.h, PlayListCommands.cpp) ---
     const QString& PlayListFileName() const { return playListFileName_; }
-    // Whether entries have come, gone or moved since the list was loaded or saved.
+    // Whether entries have come, gone or moved, or files of entries were renamed, since the list was loaded
+    // or saved.
     bool Modified() const { return modified_; }
     // Loads the list; an empty name begins an empty one. Throws EPlayListException or EStreamError; the list
     // is then as it was, but empty and without a name when the file is of an unknown version.
@@ -152,7 +153,8 @@ class TPlayList : public QObject, public SettingsClient {
 
     // --- Wiring ---
     TMusicDatabase* MusicDatabase() const { return database_; }
-    // The database gets its reference to this list, and keeps its settings.
+    // The database gets its reference to this list, and keeps its settings. Entries follow its songs to other
+    // paths.
     void SetMusicDatabase(TMusicDatabase* database);
     SongPlayer* PlaySound() const { return player_; }
     // A player tells when it goes: SetPlaySound(nullptr).
@@ -221,6 +223,9 @@ class TPlayList : public QObject, public SettingsClient {
     // Drop.cpp
     std::vector<PlayListEntry> EntriesFor(const QStringList& paths) const;
 
+    // Renamed.cpp
+    void FollowRenamed(const PathChanges& renamed);
+
     // PlayListCommands.cpp
     std::vector<PlayListEntry> ReadList(const QString& fileName) const;
     void Replace(std::vector<PlayListEntry> entries, const QString& fileName);
@@ -228,6 +233,7 @@ class TPlayList : public QObject, public SettingsClient {
 
     PlayListEvents events_;
     Subscriptions forwarding_;  // to OnChange
+    Subscription renaming_;     // of the database
     EntryList entries_;
     std::deque<RememberedEntry> history_;
     QList<EntryId> queue_;

@@ -8,7 +8,7 @@
 // then.
 struct PlayListEvents {
     Listeners<int> Inserted;                   // where the new entry stands
-    Listeners<int> Changed;                    // whose record was read anew
+    Listeners<int> Changed;                    // whose record was read anew, or whose file was renamed
     Listeners<int> Removed;                    // where the entry stood
     Listeners<const std::vector<int>&> Moved;  // where the entry of each position stood before
     Listeners<> Cleared;                       // the list was emptied

@@ -365,6 +365,8 @@ void SongListWidget::FollowModel() {
     connect(&songs_, &QAbstractItemModel::modelReset, this, &SongListWidget::RestoreFocus);
     songs_.OnFilterChange = [this] { FilterChanged(); };
     subscriptions_ += database_.Events().Reordered.Subscribe([this] { FollowOrder(); });
+    subscriptions_ += database_.Events().Renamed.Subscribe(
+        [this](const PathChanges& renamed) { focusedPath_ = renamed.value(focusedPath_, focusedPath_); });
 }
 
 // Songs that come in above the visible ones do not push them out of sight; a list at its top stays there.

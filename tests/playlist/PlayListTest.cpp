@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include "MusicManagment/database/CollectionEdit.h"
 #include "tests/playlist/Playing.h"
 
 using namespace Qt::StringLiterals;
@@ -81,6 +82,46 @@ TEST_F(PlayListTest, ASongOfTheDatabaseNeedsOne) {
     EXPECT_EQ(list_.Entry(1).Record, database.Song(0));
     for (const int none : {-1, 1})
         EXPECT_THROW(list_.InsertSong(0, none), EMusicDatabaseException);
+}
+
+TEST_F(PlayListTest, EntriesQueueAndHistoryFollowTheirSongsToOtherPathsAndBack) {
+    TMusicDatabase database;
+    list_.SetMusicDatabase(&database);
+    for (const QString& song : {u"a"_s, u"b"_s, u"c"_s})
+        database.AddEntry(folder_.Add(song + u".wav"_s), SongOf(7));
+    Add(u"abca"_s);
+    list_.PlayEntry(0);
+    list_.PlayEntry(1);
+    list_.Enqueue(2);
+    list_.Enqueue(3);
+    list_.Save(folder_.Path(u"list.m3u"_s));
+    list_.SetStandardFileName(list_.PlayListFileName());
+
+    CollectionEdit edit(database);
+    const auto rename = [&](const QString& from, const QString& to) {
+        edit.Rename(database.Songs().HandleOf(*database.Songs().Find(Path(from))), Path(to));
+    };
+    rename(u"b"_s, u"c"_s);  // these two swap
+    rename(u"c"_s, u"b"_s);
+    rename(u"a"_s, u"x"_s);
+    Changes();
+    ASSERT_TRUE(edit.Commit());
+    EXPECT_EQ(Listed(), u"xcbx"_s);
+    EXPECT_EQ(Changes().split(u' ').size(), 4);
+    EXPECT_EQ(list_.Entry(3).Record, *database.Songs().Find(Path(u"x"_s)));
+    EXPECT_EQ(Names(list_.Queue()), u"bx"_s);
+    EXPECT_EQ(Names(list_.History()), u"cx"_s);
+    EXPECT_EQ(Current(), u"c"_s);
+    EXPECT_EQ(list_.CurrentFile(), Path(u"c"_s));
+    EXPECT_FALSE(list_.Modified());  // the standard file is written anyway
+
+    list_.SetStandardFileName(QString());
+    CollectionEdit back(database);
+    back.TakeBack(edit.Done());
+    ASSERT_TRUE(back.Commit());
+    EXPECT_EQ(Listed(), u"abca"_s);
+    EXPECT_EQ(Names(list_.History()), u"ba"_s);
+    EXPECT_TRUE(list_.Modified());
 }
 
 TEST_F(PlayListTest, WhatHasNoFileLeaves) {
