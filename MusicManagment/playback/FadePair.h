@@ -15,6 +15,7 @@ class FadePair {
     // nullptr when it cannot fade.
     FadingBackend* CurrentFades() const { return AsFading(current_.get()); }
     bool HasLeaving() const { return leaving_ != nullptr; }
+    QString FileOfLeaving() const { return leaving_ ? leaving_->BackendFile() : QString(); }
 
     void SetCurrent(Song song) { current_ = std::move(song); }
     void SetLeaving(Song song) { leaving_ = std::move(song); }

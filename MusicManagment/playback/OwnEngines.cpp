@@ -117,6 +117,11 @@ void OwnEngines::PlayBeside(const QString& path) {
     pair_.SetLeaving(std::move(song));
 }
 
+// Another program goes on knowing the file by the name that it was given.
+void OwnEngines::FollowRenamed(const QString& path) {
+    if (IsOpen() && engine_ != TEngine::WinAmp) Song().SetBackendFile(path);
+}
+
 void OwnEngines::SetGain(float gain) {
     gain_ = std::clamp(gain, 0.0F, 1.0F);
     if (opener_.Table().SetSharedGain) opener_.Table().SetSharedGain(gain_);

@@ -50,6 +50,11 @@ class OwnEngines : public PlayTarget {
     TPlaySoundContainer& Song() const { return *pair_.Current(); }
     FadePair& Fades() { return pair_; }
 
+    // The file of the song that sounds beside the current one; empty without one.
+    QString FileBeside() const { return pair_.FileOfLeaving(); }
+    // The current song's file has this path now.
+    void FollowRenamed(const QString& path);
+
     // 0 to 1 of the amplitude: now and from now on.
     void SetGain(float gain);
 

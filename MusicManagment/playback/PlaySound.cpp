@@ -76,6 +76,10 @@ void TPlaySound::Play() {
 void TPlaySound::AnnounceSong() {
     events_.Started.Tell();
     Feedback(fbStarted);
+    ShowSong();
+}
+
+void TPlaySound::ShowSong() {
     if (panel_ != nullptr) panel_->ShowSong(fileName_);
     RedrawPanel();
     if (controller_ == nullptr) return;
@@ -141,6 +145,7 @@ void TPlaySound::RestartAutoStop() {
 }
 
 quint32 TPlaySound::GetPosition() {
+    if (released_) return released_->Position;
     return waiting_ ? waiting_->Position : Chosen().Position();
 }
 
@@ -163,10 +168,12 @@ void TPlaySound::NoticeResumed() {
 }
 
 quint32 TPlaySound::GetLength() {
+    if (released_) return released_->Length;
     return waiting_ ? waiting_->Length : Chosen().Length();
 }
 
 TPSStatus TPlaySound::GetStatus() {
+    if (released_) return released_->Status;
     if (waiting_) return waiting_->Plays ? psPaused : psStopped;
     return Chosen().Status();
 }
@@ -230,14 +237,21 @@ void TPlaySound::SetGain(float gain) {
 
 void TPlaySound::SetMusicDatabase(TMusicDatabase* database) {
     if (database == database_) return;
+    renaming_.End();
     if (database_) {
         database_->LeaveSettings(*this);
-        if (database_->PlaySound() == this) database_->SetPlaySound(nullptr);
+        if (database_->PlaySound() == this) {
+            database_->SetPlaySound(nullptr);
+            database_->OnReleaseFile = nullptr;
+        }
     }
     database_ = database;
     if (database == nullptr) return;
     database->SetPlaySound(this);
     database->JoinSettings(*this);
+    database->OnReleaseFile = [this](const QString& path) { return ReleaseFile(path); };
+    renaming_ =
+        database->Events().Renamed.Subscribe([this](const PathChanges& renamed) { FollowRenamed(renamed); });
 }
 
 void TPlaySound::SetPlayList(TPlayList* playList) {

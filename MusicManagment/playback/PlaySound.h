@@ -114,7 +114,8 @@ class TPlaySound : public TPlaySoundContainer,
 
     // --- Wiring ---
     TMusicDatabase* MusicDatabase() const { return database_; }
-    // The database gets its reference to this player, and keeps its settings.
+    // The database gets its reference to this player, and keeps its settings. The player follows its songs to
+    // other paths, and lets go of a file that it moves or removes (OnReleaseFile).
     void SetMusicDatabase(TMusicDatabase* database);
     TPlayList* PlayList() const { return playList_; }
     // The playlist gets its reference to this player.
@@ -176,6 +177,15 @@ class TPlaySound : public TPlaySoundContainer,
         bool Plays;        // it goes on by itself
         int Looks;         // for the output, in vain
     };
+    // What the song did when its file was let go of.
+    struct Released {
+        TPSStatus Status;
+        quint32 Position;  // ms
+        quint32 Length;    // ms
+        bool Stops;        // it was fading to its stop
+        bool Ends;         // the next song was about to follow
+        std::optional<Waiting> Output;
+    };
 
     // PlaySoundOpen.cpp
     PlayTarget& Chosen();
@@ -186,6 +196,7 @@ class TPlaySound : public TPlaySoundContainer,
     // PlaySound.cpp
     void ForwardEvents();
     void AnnounceSong();
+    void ShowSong();
     void FinishStop();
     void NoticeResumed();
     void StartTimers();
@@ -203,6 +214,15 @@ class TPlaySound : public TPlaySoundContainer,
     void WaitForOutput(const QString& reason, bool begun);
     void GoOn();
     void OpenAtPosition(quint32 position);
+
+    // PlaySoundRelease.cpp
+    void FollowRenamed(const PathChanges& renamed);
+    std::function<void(const QString& path)> ReleaseFile(const QString& path);
+    bool LetGo();
+    void TakeUp(const QString& from, const QString& path);
+    void GoBack(const Released& song);
+    void PlayFrom(const Released& song);
+    void WaitAgain(const Waiting& song);
 
     // PlaySoundTick.cpp
     void RunTick(TickKind kind);
@@ -230,6 +250,7 @@ class TPlaySound : public TPlaySoundContainer,
 
     PlayerEvents events_;
     Subscriptions forwarding_;  // from the events to the members called On...
+    Subscription renaming_;     // of the database
     EngineSettings settings_;
     OwnEngines engines_;
     std::unique_ptr<ExternalTarget> external_;
@@ -238,6 +259,7 @@ class TPlaySound : public TPlaySoundContainer,
     PlayTimers timers_;
     PlayCountClock playCount_;
     std::optional<Waiting> waiting_;
+    std::optional<Released> released_;
     bool outputTold_ = false;  // of the failure that goes on
     QStringList untold_;       // failures, while a message about another one stands
     bool telling_ = false;

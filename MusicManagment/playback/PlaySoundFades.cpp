@@ -46,6 +46,7 @@ bool TPlaySound::PlayWithCrossFade(const QString& path) {
     // A song that is faded in counts as well, though its name does not go through SetFileName.
     if (path != fileName_ && done == Carried::Out) playCount_.Arm();
     fileName_ = path;
+    released_.reset();
     if (done == Carried::OnItsWay) return RestartAutoStop(), true;
     waiting_.reset();
     coFileName_.clear();

@@ -34,6 +34,7 @@ void TPlaySound::Close() {
     if (playExtern_) external_->Close();
     StopTimers();
     waiting_.reset();
+    released_.reset();
     engines_.Close();
 }
 

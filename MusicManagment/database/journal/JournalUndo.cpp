@@ -104,13 +104,36 @@ class TakingBack {
                                std::size_t done, const QString& message) {
                 Note(steps, records, done, message);
             };
-            run_.Add(std::move(planned));
+            Carry(std::move(planned));
         } catch (const EFileChanged& error) {
             result_.Problems << error.Message();
         } catch (const EStreamError& error) {
             result_.Problems << error.Message();
             ++failedNow_;
         }
+    }
+
+    // Whoever holds a file that leaves its place lets go of it, and does not wait for the other items.
+    void Carry(PlannedItem planned) {
+        for (const PlannedStep& each : planned.Steps) {
+            const JournalStep& step = each.Step;
+            const auto takeUp = Release(step);
+            if (!takeUp) continue;
+            const QString from = step.Path;
+            const QString to = step.Kind == StepKind::Move ? step.To : from;
+            run_.Settle();
+            const int before = result_.Items;
+            run_.Add(std::move(planned));
+            run_.Settle();
+            return takeUp(result_.Items > before ? to : from);
+        }
+        run_.Add(std::move(planned));
+    }
+
+    std::function<void(const QString& path)> Release(const JournalStep& step) const {
+        const bool leaves = step.Kind == StepKind::Move || step.Kind == StepKind::Trash;
+        if (!leaves || database_ == nullptr || !database_->OnReleaseFile) return nullptr;
+        return database_->OnReleaseFile(step.Path);
     }
 
     // Files that belong to a waiting item are looked at when that is done.

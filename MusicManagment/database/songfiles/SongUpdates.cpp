@@ -91,7 +91,9 @@ class SongChanges {
         item.Steps.Record(*found, std::nullopt);
         item.Count = 1;
         Add(std::move(item));
-        if (released) batch_.Settle();
+        if (!released) return;
+        batch_.Settle();
+        released(path);
     }
 
     BatchResult Finish() {

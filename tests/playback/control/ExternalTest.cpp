@@ -74,6 +74,18 @@ class ExternalTest : public PlayerTest {
     ScriptedPanel panel_;
 };
 
+TEST_F(ExternalTest, AFileThatMovesIsLetGoOfThereAndTakenUpAgain) {
+    TMusicDatabase database;
+    player_.SetMusicDatabase(&database);
+    OpenThere(u"a.mp3"_s);
+    script_.Answers = {{1, 1234}, {4, psPaused}};
+    const auto takeUp = database.OnReleaseFile(player_.FileName());
+    EXPECT_EQ(script_.Take(), QStringList({u"4 0"_s, u"1 0"_s, u"3 0"_s, u"13 0"_s, u"14 0"_s}));
+    takeUp(Add(u"x.mp3"_s));
+    EXPECT_EQ(script_.Take(), QStringList({u"17 \"x.mp3\""_s, u"15 0"_s, u"2 1234"_s, u"20 0"_s}));
+    player_.SetMusicDatabase(nullptr);
+}
+
 // Where feedback goes, then 13 settings, whose values arrive in another test.
 constexpr qsizetype kGreeting = 14;
 
