@@ -2,9 +2,12 @@
 
 #include <QLocale>
 #include <algorithm>
+#include <limits>
+#include <type_traits>
 
 #include "CommonRUKTools/Clock.h"
 #include "MusicManagment/database/GroupLists.h"
+#include "ReadMPEGHeader/DerivedGenre.h"
 #include "ReadMPEGHeader/DisplayTexts.h"
 #include "ReadMPEGHeader/Genres.h"
 
@@ -57,6 +60,101 @@ qint64 NumberOf(Song song) {
     return song.*Member;
 }
 
+// --- Editing ---
+
+QString GenreEdited(Song song) {
+    if (song.Genre == kNoGenre) return {};
+    const QString name = GenreName(song.Genre);
+    return GenreByName(name) == song.Genre ? name : QString::number(song.Genre);
+}
+
+QString MainGenreEdited(Song song) {
+    return MainGenreLongName(song.MainGenre);
+}
+
+QString RemixText(Song song) {
+    return song.Remix ? u"ja"_s : u"nein"_s;
+}
+
+QString FlagsEdited(Song song) {
+    const QStringList names = SongFlagNames();
+    QStringList set;
+    for (qsizetype i = 0; i < names.size(); ++i)
+        if ((song.Flags & (1U << i)) != 0) set << names[i];
+    return set.join(u", "_s);
+}
+
+template <auto Member>
+bool SetText(TID3Tag& song, const QString& text) {
+    song.*Member = text;
+    return true;
+}
+
+// No text is the number 0.
+template <auto Member>
+bool SetNumber(TID3Tag& song, const QString& text) {
+    using Value = std::remove_reference_t<decltype(song.*Member)>;
+    bool isNumber = true;
+    const QString trimmed = text.trimmed();
+    const qulonglong number = trimmed.isEmpty() ? 0 : trimmed.toULongLong(&isNumber);
+    if (!isNumber || number > std::numeric_limits<Value>::max()) return false;
+    song.*Member = static_cast<Value>(number);
+    return true;
+}
+
+bool SetYear(TID3Tag& song, const QString& text) {
+    const QString year = text.trimmed().toUpper();
+    if (!year.isEmpty() && !IsValidYearText(year)) return false;
+    song.Year = year.isEmpty() ? u"0000"_s : year;
+    return true;
+}
+
+bool SetGenre(TID3Tag& song, const QString& text) {
+    const QString genre = text.trimmed();
+    if (const auto named = GenreByName(genre)) {
+        song.Genre = *named;
+        return true;
+    }
+    if (!genre.isEmpty()) return SetNumber<&TID3Tag::Genre>(song, genre);
+    song.Genre = kNoGenre;
+    return true;
+}
+
+bool SetMainGenre(TID3Tag& song, const QString& text) {
+    const QString genre = text.trimmed();
+    const quint8 named = MainGenreNamed(genre);
+    if (named != 0 || genre.isEmpty() || genre.compare(MainGenreLongName(0), Qt::CaseInsensitive) == 0) {
+        song.MainGenre = named;
+        return true;
+    }
+    TID3Tag numbered;
+    if (!SetNumber<&TID3Tag::MainGenre>(numbered, genre) || numbered.MainGenre >= kMainGenreCount)
+        return false;
+    song.MainGenre = numbered.MainGenre;
+    return true;
+}
+
+bool SetRemix(TID3Tag& song, const QString& text) {
+    const QString answer = text.trimmed().toLower();
+    if (!QStringList{u"ja"_s, u"nein"_s, u"true"_s, u"false"_s, u"1"_s, u"0"_s}.contains(answer))
+        return false;
+    song.Remix = answer == u"ja"_s || answer == u"true"_s || answer == u"1"_s;
+    return true;
+}
+
+// Names of flags, or the whole word as a number. Bits without a name stay where names are given.
+bool SetFlags(TID3Tag& song, const QString& text) {
+    const QStringList names = SongFlagNames();
+    quint32 flags = song.Flags & ~((1U << names.size()) - 1);
+    for (const QString& part : text.split(u',', Qt::SkipEmptyParts)) {
+        const qsizetype bit = names.indexOf(part.trimmed());
+        if (bit < 0) return !text.trimmed().isEmpty() && SetNumber<&TID3Tag::Flags>(song, text);
+        flags |= 1U << bit;
+    }
+    song.Flags = flags;
+    return true;
+}
+
 using Id = SongFieldId;
 using Group = FieldGroup;
 
@@ -69,8 +167,8 @@ constexpr SongField kFields[] = {
      .Sort = stTitle,
      .FilterNames = u"titel title",
      .InPlainSearch = true,
-     .Editable = true,
-     .FormName = "title"},
+     .FormName = "title",
+     .Set = &SetText<&TID3Tag::Title>},
     {.Id = Id::Artist,
      .Caption = u"Artist",
      .ShortCaption = u"Artist",
@@ -79,8 +177,8 @@ constexpr SongField kFields[] = {
      .Sort = stArtist,
      .FilterNames = u"artist interpret",
      .InPlainSearch = true,
-     .Editable = true,
-     .FormName = "artist"},
+     .FormName = "artist",
+     .Set = &SetText<&TID3Tag::Artist>},
     {.Id = Id::Album,
      .Caption = u"Album",
      .ShortCaption = u"Album",
@@ -89,8 +187,8 @@ constexpr SongField kFields[] = {
      .Sort = stAlbum,
      .FilterNames = u"album",
      .InPlainSearch = true,
-     .Editable = true,
-     .FormName = "album"},
+     .FormName = "album",
+     .Set = &SetText<&TID3Tag::Album>},
     {.Id = Id::Year,
      .Caption = u"Jahr",
      .ShortCaption = u"Jahr",
@@ -100,8 +198,9 @@ constexpr SongField kFields[] = {
      .Sort = stYear,
      .FilterNames = u"jahr year",
      .InPlainSearch = true,
-     .Editable = true,
-     .FormName = "year"},
+     .FormName = "year",
+     .Set = &SetYear,
+     .Accepts = u"vier Ziffern"},
     {.Id = Id::Length,
      .Caption = u"Länge",
      .ShortCaption = u"Länge",
@@ -117,16 +216,20 @@ constexpr SongField kFields[] = {
      .Text = &GenreDisplayText,
      .Sort = stGenre,
      .FilterNames = u"genre",
-     .Editable = true,
-     .FormName = "mainGenre"},
+     .FormName = "mainGenre",
+     .Set = &SetMainGenre,
+     .Edited = &MainGenreEdited,
+     .Accepts = u"eines der 20 Hauptgenres"},
     {.Id = Id::Genre,
      .Caption = u"Genre",
      .ShortCaption = u"ID3-Genre",
      .Group = Group::Tag,
      .Text = &GenreText,
      .FilterNames = u"id3genre",
-     .Editable = true,
-     .FormName = "genre"},
+     .FormName = "genre",
+     .Set = &SetGenre,
+     .Edited = &GenreEdited,
+     .Accepts = u"ein Genre aus der Liste"},
     {.Id = Id::Track,
      .Caption = u"Track",
      .ShortCaption = u"Track",
@@ -134,8 +237,9 @@ constexpr SongField kFields[] = {
      .Text = &TrackText,
      .Number = &NumberOf<&TID3Tag::Track>,
      .FilterNames = u"track",
-     .Editable = true,
-     .FormName = "track"},
+     .FormName = "track",
+     .Set = &SetNumber<&TID3Tag::Track>,
+     .Accepts = u"eine Zahl von 0 bis 255"},
     {.Id = Id::BitRate,
      .Caption = u"Bitrate",
      .ShortCaption = u"Bitrate",
@@ -168,7 +272,10 @@ constexpr SongField kFields[] = {
      .Text = [](Song song) { return QString::number(song.PlayCount); },
      .Number = &NumberOf<&TID3Tag::PlayCount>,
      .Sort = stPlayCnt,
-     .FilterNames = u"beliebtheit playcount"},
+     .FilterNames = u"beliebtheit playcount",
+     .FormName = "playCount",
+     .Set = &SetNumber<&TID3Tag::PlayCount>,
+     .Accepts = u"eine Zahl"},
     {.Id = Id::Comment,
      .Caption = u"Kommentar",
      .ShortCaption = u"Kommentar",
@@ -177,8 +284,8 @@ constexpr SongField kFields[] = {
      .Sort = stComment,
      .FilterNames = u"kommentar comment",
      .InPlainSearch = true,
-     .Editable = true,
-     .FormName = "comment"},
+     .FormName = "comment",
+     .Set = &SetText<&TID3Tag::Comment>},
     {.Id = Id::AddTime,
      .Caption = u"Hinzugefügt am",
      .ShortCaption = u"Datum",
@@ -191,7 +298,11 @@ constexpr SongField kFields[] = {
      .Group = Group::Collection,
      .Text = &FlagsText,
      .Sort = stFlags,
-     .FilterNames = u"flag"},
+     .FilterNames = u"flag",
+     .FormName = "flags",
+     .Set = &SetFlags,
+     .Edited = &FlagsEdited,
+     .Accepts = u"Namen von Flags"},
     {.Id = Id::Path,
      .Caption = u"Pfad",
      .ShortCaption = u"Pfad",
@@ -215,6 +326,14 @@ constexpr SongField kFields[] = {
      .ShortCaption = u"Framegröße",
      .Group = Group::Technical,
      .Text = &FrameSizeText},
+    {.Id = Id::Remix,
+     .Caption = u"Remix",
+     .ShortCaption = u"Remix",
+     .Group = Group::Tag,
+     .Text = &RemixText,
+     .FormName = "remix",
+     .Set = &SetRemix,
+     .Accepts = u"ja oder nein"},
 };
 
 constexpr RecordMember kMembers[] = {
@@ -254,6 +373,10 @@ std::span<const SongField> SongFields() {
 
 const SongField& FieldOf(SongFieldId id) {
     return kFields[static_cast<std::size_t>(id)];
+}
+
+QString EditText(const SongField& field, const TID3Tag& song) {
+    return field.Edited != nullptr ? field.Edited(song) : field.Text(song);
 }
 
 QString SearchedText(const SongField& field, const TID3Tag& song) {

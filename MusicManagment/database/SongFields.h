@@ -32,6 +32,7 @@ enum class SongFieldId {
     Emphasis,
     HeaderFlags,
     FrameSize,
+    Remix,
 };
 
 enum class FieldGroup { File, Tag, Technical, Collection };
@@ -50,13 +51,21 @@ struct SongField {
     // Empty: the filter does not know it.
     const char16_t* FilterNames = u"";
     bool InPlainSearch = false;  // a word without a field's name is looked for here too
-    bool Editable = false;       // in the tag form
-    const char* FormName = "";   // its name there
+    const char* FormName = "";   // its name in the tag form
+    // Takes what a user enters. False, and the song as it was, where the field cannot hold that. nullptr:
+    // nobody edits the field.
+    bool (*Set)(TID3Tag& song, const QString& text) = nullptr;
+    // What is shown for editing; nullptr: Text.
+    QString (*Edited)(const TID3Tag& song) = nullptr;
+    const char16_t* Accepts = u"";  // what Set takes, where that is not every text: "vier Ziffern"
 };
 
 // All fields, in the order of SongFieldId.
 std::span<const SongField> SongFields();
 const SongField& FieldOf(SongFieldId id);
+
+// What an editor shows of a field.
+QString EditText(const SongField& field, const TID3Tag& song);
 
 // What the filter looks through: the shown text, and for the main genre also the genre of the tag.
 QString SearchedText(const SongField& field, const TID3Tag& song);
