@@ -27,26 +27,6 @@ constexpr PlaceholderText kTexts[] = {
     {u"%ID3FLAGS%", u"Angaben des MPEG-Kopfes"},
 };
 
-TID3Tag ExampleSong() {
-    TID3Tag song;
-    song.Artist = u"Die Beispiele"_s;
-    song.Title = u"Ein schöner Tag"_s;
-    song.Album = u"Sommer"_s;
-    song.Year = u"2003"_s;
-    song.Comment = u"Radiofassung"_s;
-    song.MPEGLayer = u"MPEG 1.0 Layer III"_s;
-    song.Length = 225;
-    song.Genre = 13;  // Pop
-    song.BitRate = 192;
-    song.SampleRate = 44100;
-    song.ChannelMode = 3;
-    song.Emphasis = 1;
-    song.Original = true;
-    song.Track = 4;
-    song.MainGenre = 8;  // Rock/Pop
-    return song;
-}
-
 // The first text between percent signs that looks like a place-holder and is none.
 QString UnknownPlaceholder(QString pattern) {
     for (const QString& name : NamePatternPlaceholders())
@@ -65,6 +45,26 @@ bool HasPlaceholder(const QString& pattern) {
 
 std::span<const PlaceholderText> PlaceholderTexts() {
     return kTexts;
+}
+
+TID3Tag ExampleSong() {
+    TID3Tag song;
+    song.Artist = u"Die Beispiele"_s;
+    song.Title = u"Ein schöner Tag"_s;
+    song.Album = u"Sommer"_s;
+    song.Year = u"2003"_s;
+    song.Comment = u"Radiofassung"_s;
+    song.MPEGLayer = u"MPEG 1.0 Layer III"_s;
+    song.Length = 225;
+    song.Genre = 13;  // Pop
+    song.BitRate = 192;
+    song.SampleRate = 44100;
+    song.ChannelMode = 3;
+    song.Emphasis = 1;
+    song.Original = true;
+    song.Track = 4;
+    song.MainGenre = 8;  // Rock/Pop
+    return song;
 }
 
 QString ExampleName(const QString& pattern) {

@@ -4,6 +4,8 @@
 #include <optional>
 #include <span>
 
+#include "ReadMPEGHeader/ID3Tag.h"
+
 // What a place-holder of a name pattern stands for.
 struct PlaceholderText {
     const char16_t* Name;  // "%TITLE%"
@@ -13,6 +15,8 @@ struct PlaceholderText {
 // Every place-holder, the ones that are used most first.
 std::span<const PlaceholderText> PlaceholderTexts();
 
+// An invented song, without a path.
+TID3Tag ExampleSong();
 // The file name that a pattern gives an invented song.
 QString ExampleName(const QString& pattern);
 

@@ -111,8 +111,9 @@ TEST_F(OptionsFormTest, RulesAreChosenTogetherOrOneByOne) {
     EXPECT_FALSE(tags.isEnabled());
     Field<QRadioButton>(u"ModernRules"_s).click();
     EXPECT_TRUE(tags.isChecked());
+    EXPECT_TRUE(Field<QCheckBox>(u"KeepFolders"_s).isChecked());  // the same on the page of the files
     EXPECT_TRUE(form_->Apply());
-    EXPECT_TRUE(database_.ModernTags());
+    EXPECT_TRUE(database_.ModernTags() && database_.RenameInPlace());
     Field<QRadioButton>(u"SingleRules"_s).click();
     EXPECT_TRUE(tags.isEnabled());
     tags.click();

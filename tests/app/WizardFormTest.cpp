@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <QCheckBox>
+#include <QFileInfo>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
@@ -11,6 +12,7 @@
 #include <QTemporaryDir>
 #include <QTest>
 
+#include "CommonRUKTools/MusicFolder.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
@@ -79,13 +81,20 @@ TEST_F(WizardFormTest, TheChoicesAreSummedUpAndHandedBack) {
     Child<QRadioButton>(u"rename"_s).setChecked(true);
     Child<QLineEdit>(u"pattern"_s).setText(u"%ALBUM% - %TRACKNR%"_s);
     EXPECT_EQ(Child<QLabel>(u"example"_s).text(), u"Beispiel: Sommer - 4.mp3"_s);
+    const auto place = [this] { return Child<QLabel>(u"placeExample"_s).text().remove(QChar(0x200B)); };
+    const QString folder = QFileInfo(MusicFolder()).absoluteFilePath() + u"/Sommer"_s;
+    EXPECT_EQ(place(), u"Beispiel: Aus %1/lied04.mp3 wird %1/Sommer - 4.mp3"_s.arg(folder));
+    Child<QCheckBox>(u"KeepFolders"_s).click();
+    EXPECT_TRUE(place().endsWith(u"wird "_s + folder_.path() + folder + u"/Sommer - 4.mp3"_s))
+        << place().toStdString();
     GoTo(3);
     QString summary = Child<QLabel>(u"summary"_s).text();
     EXPECT_EQ(summary.remove(QChar(0x200B)),
               u"Nach Songs durchsucht werden mit ihren Unterordnern:\n    /musik\n    /hörspiele\n\nDateien "
               "werden nach diesem Muster benannt, wenn sich ihre Tags ändern:\n    %ALBUM% - %TRACKNR%\nund "
               "liegen dann nach Genres geordnet in:\n    "_s +
-                  folder_.path());
+                  folder_.path() + u"\nDateien ohne Genre kommen mit ihrem alten Pfad dorthin."_s);
+    EXPECT_FALSE(wizard_->Choice().RenameInPlace);
     Child<QCheckBox>(u"scanNow"_s).setChecked(false);
     Return();
     EXPECT_EQ(wizard_->Choice().Folders, QStringList({u"/musik"_s, u"/hörspiele"_s}));

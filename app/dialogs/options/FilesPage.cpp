@@ -3,6 +3,7 @@
 #include <QCheckBox>
 #include <QDir>
 #include <QFormLayout>
+#include <QLabel>
 #include <QLineEdit>
 
 #include "CommonRUKTools/AbsolutePath.h"
@@ -32,10 +33,23 @@ FilesPage::FilesPage()
                      new RootFolderField(u"Stammordner der Songs"_s));
     byGenre_ =
         AddCheck(naming, u"MoveMP3sAfterGenreChange"_s, u"Dateien in den Ordner ihres &Genres verschieben"_s,
-                 u"Der Ordner liegt im Stammordner. Songs ohne Genre bleiben, wo sie sind."_s);
+                 u"Der Ordner liegt im Stammordner und gilt für Songs mit einem Hauptgenre."_s);
+    inPlace_ = AddCheck(naming, u"KeepFolders"_s, u"Dateien beim Umbenennen in ihrem Ordner &lassen"_s,
+                        u"Gilt für Songs, die kein Ordner eines Genres aufnimmt. Sonst kommen sie mit ihrem "
+                        "ganzen alten Pfad unter den Stammordner, wie in den früheren Versionen."_s);
+    placeExample_ = new QLabel;
+    placeExample_->setObjectName(u"placeExample"_s);
+    placeExample_->setTextFormat(Qt::PlainText);
+    placeExample_->setWordWrap(true);
+    naming.addRow(placeExample_);
     fields_.Bind(rename_, DatabaseSettings::kRenameAndMoveMP3s);
     fields_.Bind(byGenre_, DatabaseSettings::kMoveMP3sAfterGenreChange);
+    fields_.Bind(inPlace_, DatabaseSettings::kRenameInPlace);
     connect(rename_, &QCheckBox::toggled, this, [this] { EnableNaming(); });
+    for (const QCheckBox* rule : {byGenre_, inPlace_})
+        connect(rule, &QCheckBox::toggled, this, [this] { ShowExample(); });
+    for (const QLineEdit* field : {&pattern_->Edit(), &root_->Edit()})
+        connect(field, &QLineEdit::textChanged, this, [this] { ShowExample(); });
     QFormLayout& genres = AddGroup(u"Ordner der Genres"_s);
     genreFolders_ =
         AddWide(genres, u"MP3MoveSubDirs"_s, u"Namen der &Ordner im Stammordner"_s, new GenreFolderTable,
@@ -44,6 +58,7 @@ FilesPage::FilesPage()
 
 void FilesPage::Load(const TMusicDatabase& database, const TRWReg& settings) {
     OptionsPage::Load(database, settings);
+    example_ = RenameExample(database);
     folders_->SetFolders(database.UpdateFolders());
     ShowNaming(database.MP3MoveRootDir(), database.MP3NamePattern(), database.MP3MoveSubDirs());
     RememberShown();
@@ -60,6 +75,7 @@ void FilesPage::ShowNaming(const QString& root, const QString& pattern, const QS
     pattern_->SetPattern(pattern);
     genreFolders_->SetNames(genreFolders);
     EnableNaming();
+    ShowExample();
 }
 
 void FilesPage::RememberShown() {
@@ -101,7 +117,15 @@ void FilesPage::Apply(TMusicDatabase& database, TRWReg& settings) {
 }
 
 void FilesPage::EnableNaming() {
-    for (QWidget* field :
-         {static_cast<QWidget*>(pattern_), static_cast<QWidget*>(root_), static_cast<QWidget*>(byGenre_)})
+    for (QWidget* field : std::initializer_list<QWidget*>{pattern_, root_, byGenre_, inPlace_, placeExample_})
         field->setEnabled(rename_->isChecked());
+}
+
+void FilesPage::ShowExample() {
+    if (genreFolders_ == nullptr) return;  // the page is still being made
+    placeExample_->setText(example_.Text({.Pattern = pattern_->Pattern(),
+                                          .RootFolder = root_->Folder(),
+                                          .ByGenre = byGenre_->isChecked(),
+                                          .GenreFolders = genreFolders_->Names(),
+                                          .InPlace = inPlace_->isChecked()}));
 }

@@ -1,5 +1,6 @@
 #include "app/dialogs/options/OptionsForm.h"
 
+#include <QCheckBox>
 #include <QDialogButtonBox>
 #include <QHBoxLayout>
 #include <QLineEdit>
@@ -14,6 +15,7 @@
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/commands/DatabaseSettings.h"
 #include "MusicManagment/database/commands/Settings.h"
 #include "app/dialogs/PageScroller.h"
 #include "app/dialogs/options/CdsPage.h"
@@ -63,6 +65,7 @@ TOptionsForm::TOptionsForm(TMusicDatabase& database, TRWReg& settings, QWidget* 
     AddPage(new PlaybackPage(database_));
     AddPage(new CdsPage);
     AddPage(new RemoteControlPage(database_));
+    LinkTwins();
     SetUpButtons();  // after the pages, as the tab key goes
     SetUpLayout();
     connect(list_, &QListWidget::currentRowChanged, this, [this](int row) {
@@ -85,6 +88,14 @@ void TOptionsForm::AddPage(OptionsPage* page) {
     stack_->addWidget(new PageScroller(page));
     pages_.push_back(page);
     WatchChanges(*page, [this] { SetChanged(true); });
+}
+
+// One setting on two pages: with the rules, and where it is about.
+void TOptionsForm::LinkTwins() {
+    auto* rule = stack_->findChild<QCheckBox*>(DatabaseSettings::kRenameInPlace.Row.Name.toString());
+    auto* field = stack_->findChild<QCheckBox*>(u"KeepFolders"_s);
+    connect(rule, &QCheckBox::toggled, field, &QCheckBox::setChecked);
+    connect(field, &QCheckBox::toggled, rule, &QCheckBox::setChecked);
 }
 
 void TOptionsForm::SetUpButtons() {

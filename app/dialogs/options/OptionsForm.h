@@ -35,6 +35,7 @@ class TOptionsForm : public QDialog {
 
  private:
     void AddPage(OptionsPage* page);
+    void LinkTwins();
     void SetUpButtons();
     void SetUpLayout();
     void SetUpSize();

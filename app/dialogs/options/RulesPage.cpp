@@ -38,6 +38,13 @@ RulesPage::RulesPage(const TMusicDatabase& database)
     AddText(reading,
             u"Gilt für Dateien, die von nun an gelesen werden. Songs, die schon in der Datenbank sind, "
             "liest „Datenbank updaten (Auch ID3-Tags auf Änderungen prüfen)...“ neu."_s);
+    QFormLayout& naming = AddGroup(u"Dateien umbenennen"_s);
+    fields_.Bind(
+        AddRule(naming, DatabaseSettings::kRenameInPlace.Row.Name,
+                u"Dateien beim Umbenennen in ihrem &Ordner lassen"_s,
+                u"Nur der Name ändert sich. Klassisch kommt die Datei mit ihrem ganzen alten Pfad unter den "
+                "Stammordner. Ein Beispiel zeigt die Seite „Dateien und Ordner“."_s),
+        DatabaseSettings::kRenameInPlace);
     QFormLayout& lists = AddGroup(u"PlayLists lesen"_s);
     fields_.Bind(
         AddRule(lists, PlayListSettings::kModernLists.Row.Name, u"&PlayLists anderer Programme"_s,
@@ -91,6 +98,12 @@ void RulesPage::Load(const TMusicDatabase& database, const TRWReg& settings) {
 void RulesPage::LoadDefaults() {
     OptionsPage::LoadDefaults();
     ShowChoice();
+}
+
+// A rule may have been changed on the page of what it is about.
+void RulesPage::showEvent(QShowEvent* event) {
+    OptionsPage::showEvent(event);
+    if (!single_->isChecked()) ShowChoice();
 }
 
 void RulesPage::SetAll(bool modern) {

@@ -15,6 +15,9 @@ class RulesPage : public OptionsPage {
     void Load(const TMusicDatabase& database, const TRWReg& settings) override;
     void LoadDefaults() override;
 
+ protected:
+    void showEvent(QShowEvent* event) override;
+
  private:
     void AddChoice();
     QCheckBox* AddRule(QFormLayout& group, QStringView name, const QString& caption,

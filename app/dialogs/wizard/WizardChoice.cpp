@@ -15,8 +15,13 @@ WizardChoice FirstChoice(const TMusicDatabase& database) {
 }
 
 WizardChoice CurrentChoice(const TMusicDatabase& database) {
-    return {database.UpdateFolders(), database.RenameAndMoveMP3s(), AbsolutePath(database.MP3MoveRootDir()),
-            database.MP3NamePattern()};
+    return {.Folders = database.UpdateFolders(),
+            .RenameAndMove = database.RenameAndMoveMP3s(),
+            .RootFolder = AbsolutePath(database.MP3MoveRootDir()),
+            .Pattern = database.MP3NamePattern(),
+            .RenameInPlace = database.RenameInPlace(),
+            .GenreFolders = database.MP3MoveSubDirs(),
+            .Example = RenameExample(database)};
 }
 
 void ApplyChoice(const WizardChoice& choice, TMusicDatabase& database) {
@@ -31,4 +36,5 @@ void ApplyChoice(const WizardChoice& choice, TMusicDatabase& database) {
     database.SetMoveMP3sAfterGenreChange(true);
     database.SetMP3MoveRootDir(choice.RootFolder);
     database.SetMP3NamePattern(choice.Pattern);
+    database.SetRenameInPlace(choice.RenameInPlace);
 }

@@ -3,6 +3,9 @@
 #include <QString>
 #include <QStringList>
 
+#include "MusicManagment/database/SongTypes.h"
+#include "app/dialogs/RenameExample.h"
+
 class TMusicDatabase;
 
 // What the user chooses when the collection is set up.
@@ -12,6 +15,9 @@ struct WizardChoice {
     QString RootFolder{};
     QString Pattern{};
     bool ScanNow = true;
+    bool RenameInPlace = true;  // where no genre folder is a file's place
+    QStringList GenreFolders = DefaultGenreFolderNames();
+    RenameExample Example{};
 };
 
 // What is proposed at the first start: the user's music folder, where there is one, and files that stay as

@@ -27,13 +27,6 @@ bool Refuse(const QString& fault, QLineEdit& field) {
     return false;
 }
 
-// A long path is broken behind a separator instead of making the window wider.
-QString Breakable(const QString& path) {
-    constexpr QChar kZeroWidthSpace(0x200B);
-    QString text = QDir::toNativeSeparators(path);
-    return text.replace(QDir::separator(), QString(QDir::separator()) + kZeroWidthSpace);
-}
-
 QString SummaryOf(const WizardChoice& choice) {
     QStringList lines;
     if (choice.Folders.isEmpty()) {
@@ -49,7 +42,9 @@ QString SummaryOf(const WizardChoice& choice) {
     } else {
         lines << u"Dateien werden nach diesem Muster benannt, wenn sich ihre Tags ändern:"_s
               << u"    "_s + choice.Pattern << u"und liegen dann nach Genres geordnet in:"_s
-              << u"    "_s + Breakable(choice.RootFolder);
+              << u"    "_s + Breakable(choice.RootFolder)
+              << (choice.RenameInPlace ? u"Dateien ohne Genre bleiben in ihrem Ordner."_s
+                                       : u"Dateien ohne Genre kommen mit ihrem alten Pfad dorthin."_s);
     }
     return lines.join(u'\n');
 }
@@ -109,7 +104,9 @@ RenameSheet::RenameSheet(WizardChoice& choice)
       keep_(new QRadioButton(u"&Nein, die Dateien behalten ihre Namen und ihren Ort"_s)),
       rename_(new QRadioButton(u"&Ja, umbenennen und nach Genres ordnen"_s)),
       root_(new RootFolderField(u"Stammordner der Songs"_s)),
-      pattern_(new NamePatternEdit) {
+      pattern_(new NamePatternEdit),
+      inPlace_(new QCheckBox(u"Dateien beim Umbenennen in ihrem &Ordner lassen"_s)),
+      placeExample_(new QLabel) {
     keep_->setObjectName(u"keep"_s);
     rename_->setObjectName(u"rename"_s);
     Rows().addWidget(keep_);
@@ -120,6 +117,13 @@ RenameSheet::RenameSheet(WizardChoice& choice)
     form->setRowWrapPolicy(QFormLayout::WrapLongRows);
     form->addRow(u"&Stammordner:"_s, root_);
     form->addRow(u"&Muster der Namen:"_s, pattern_);
+    inPlace_->setObjectName(u"KeepFolders"_s);
+    inPlace_->setChecked(choice.RenameInPlace);
+    form->addRow(inPlace_);
+    placeExample_->setObjectName(u"placeExample"_s);
+    placeExample_->setTextFormat(Qt::PlainText);
+    placeExample_->setWordWrap(true);
+    form->addRow(placeExample_);
     Rows().addWidget(details);
     AddText(
         u"Platzhalter stehen zwischen Prozentzeichen und werden durch die Angaben des Songs ersetzt, etwa "
@@ -131,6 +135,18 @@ RenameSheet::RenameSheet(WizardChoice& choice)
     (choice.RenameAndMove ? rename_ : keep_)->setChecked(true);
     root_->SetFolder(choice.RootFolder);
     pattern_->SetPattern(choice.Pattern);
+    connect(inPlace_, &QCheckBox::toggled, this, [this] { ShowExample(); });
+    for (const QLineEdit* field : {&pattern_->Edit(), &root_->Edit()})
+        connect(field, &QLineEdit::textChanged, this, [this] { ShowExample(); });
+    ShowExample();
+}
+
+void RenameSheet::ShowExample() {
+    placeExample_->setText(choice_.Example.Text({.Pattern = pattern_->Pattern(),
+                                                 .RootFolder = root_->Folder(),
+                                                 .ByGenre = true,
+                                                 .GenreFolders = choice_.GenreFolders,
+                                                 .InPlace = inPlace_->isChecked()}));
 }
 
 bool RenameSheet::validatePage() {
@@ -140,6 +156,7 @@ bool RenameSheet::validatePage() {
     if (const auto fault = FaultOfPattern(pattern_->Pattern())) return Refuse(*fault, pattern_->Edit());
     choice_.RootFolder = root_->Folder();
     choice_.Pattern = pattern_->Pattern();
+    choice_.RenameInPlace = inPlace_->isChecked();
     return true;
 }
 

@@ -51,10 +51,14 @@ class RenameSheet : public WizardSheet {
     bool validatePage() override;
 
  private:
+    void ShowExample();
+
     QRadioButton* keep_;
     QRadioButton* rename_;
     RootFolderField* root_;
     NamePatternEdit* pattern_;
+    QCheckBox* inPlace_;
+    QLabel* placeExample_;
 };
 
 // "Fertig": what will be done.
