@@ -245,6 +245,7 @@ void FilteredSongs::FollowSongs() {
         rows_ = WantedRows();
         endResetModel();
     });
+    connect(&songs_, &QAbstractItemModel::headerDataChanged, this, &QAbstractItemModel::headerDataChanged);
     const auto beforeInsert = [this](const QModelIndex&, int first, int last) {
         if (!filtering_) beginInsertRows({}, first, last);
     };

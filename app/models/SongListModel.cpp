@@ -26,6 +26,13 @@ QVariant CellAlignment(const SongColumn& column) {
     return QVariant::fromValue(column.Alignment | Qt::AlignVCenter);
 }
 
+QString FlagName(quint32 flag) {
+    const QStringList names = SongFlagNames();
+    for (qsizetype bit = 0; bit < names.size(); ++bit)
+        if (flag == 1U << bit) return names[bit];
+    return {};
+}
+
 // The views' own font, but bold.
 QVariant BoldFont() {
     QFont font;
@@ -94,14 +101,22 @@ int SongListModel::columnCount(const QModelIndex& parent) const {
 }
 
 Qt::ItemFlags SongListModel::flags(const QModelIndex& index) const {
-    const Qt::ItemFlags flags = QAbstractTableModel::flags(index);
-    return index.isValid() ? flags | Qt::ItemIsDragEnabled : flags;
+    Qt::ItemFlags flags = QAbstractTableModel::flags(index);
+    if (index.isValid()) flags |= Qt::ItemIsDragEnabled;
+    if (ShowsMark(index) && database_.TakesChanges()) flags |= Qt::ItemIsUserCheckable;
+    return flags;
 }
 
 QVariant SongListModel::data(const QModelIndex& index, int role) const {
     if (!index.isValid()) return {};
     const SongColumn& column = ColumnOf(index.column());
     if (role == Qt::TextAlignmentRole) return CellAlignment(column);
+    if (ShowsMark(index)) {
+        if (role != Qt::CheckStateRole) return {};
+        const TID3Tag* song = SongAt(index.row());
+        const bool isSet = song != nullptr && (song->Flags & database_.ShownFlag()) != 0;
+        return isSet ? Qt::Checked : Qt::Unchecked;
+    }
     if (role != Qt::DisplayRole && (role != Qt::FontRole || playing_.isEmpty())) return {};
     const TID3Tag* song = SongAt(index.row());
     if (role == Qt::FontRole) return song != nullptr && song->FileName == playing_ ? BoldFont() : QVariant();
@@ -121,11 +136,32 @@ void SongListModel::ShowFontOf(const QString& path) {
     if (song >= 0) Q_EMIT dataChanged(index(song, 0), index(song, columnCount() - 1), {Qt::FontRole});
 }
 
+bool SongListModel::ShowsMark(const QModelIndex& index) const {
+    return database_.ShownFlag() != 0 && ColumnOf(index.column()).Id == SongFieldId::Flags;
+}
+
+// The mark changes with the song, which takes a while.
+bool SongListModel::setData(const QModelIndex& index, const QVariant& value, int role) {
+    if (role != Qt::CheckStateRole || !index.isValid() || !ShowsMark(index) || !OnFlagClick) return false;
+    const TID3Tag* song = SongAt(index.row());
+    if (song == nullptr) return false;
+    OnFlagClick(database_.Songs().HandleOf(*song), value.toInt() == Qt::Checked);
+    return true;
+}
+
+void SongListModel::ShownFlagChanged() {
+    const int column = ColumnOfSortType(stFlags);
+    Q_EMIT headerDataChanged(Qt::Horizontal, column, column);
+    if (rows_ > 0) Q_EMIT dataChanged(index(0, column), index(rows_ - 1, column));
+}
+
 QVariant SongListModel::headerData(int section, Qt::Orientation orientation, int role) const {
     if (orientation != Qt::Horizontal || section < 0 || section >= columnCount()) return {};
     const SongColumn& column = ColumnOf(section);
     if (role == Qt::TextAlignmentRole) return CellAlignment(column);
-    return role == Qt::DisplayRole ? column.Caption() : QVariant();
+    if (role != Qt::DisplayRole) return {};
+    const bool showsMark = column.Id == SongFieldId::Flags && database_.ShownFlag() != 0;
+    return showsMark ? FlagName(database_.ShownFlag()) : column.Caption();
 }
 
 // --- Order ---

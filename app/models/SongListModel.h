@@ -2,6 +2,7 @@
 
 #include <QAbstractTableModel>
 #include <QTimer>
+#include <functional>
 
 #include "MusicManagment/database/MusicManagment.h"
 #include "app/models/RowJournal.h"
@@ -23,6 +24,10 @@ class SongListModel : public QAbstractTableModel {
     void SetOrder(const SongOrder& order);
     // Tells the views at once what has changed.
     void SyncViews();
+    // Another flag is shown as a mark (TMusicDatabase::ShownFlag).
+    void ShownFlagChanged();
+    // The user clicked at the mark of a song, which is to have it or not.
+    std::function<void(SongHandle song, bool on)> OnFlagClick;
     // Marks the song that plays, by its path; empty for none.
     void SetPlaying(const QString& path);
 
@@ -30,6 +35,7 @@ class SongListModel : public QAbstractTableModel {
     int columnCount(const QModelIndex& parent = {}) const override;
     Qt::ItemFlags flags(const QModelIndex& index) const override;
     QVariant data(const QModelIndex& index, int role = Qt::DisplayRole) const override;
+    bool setData(const QModelIndex& index, const QVariant& value, int role = Qt::EditRole) override;
     QVariant headerData(int section, Qt::Orientation orientation, int role = Qt::DisplayRole) const override;
 
  private:
@@ -40,6 +46,7 @@ class SongListModel : public QAbstractTableModel {
     void ScheduleSync();
     void SyncRows();
     void PlaceRows();
+    bool ShowsMark(const QModelIndex& index) const;
     void ShowFontOf(const QString& path);
 
     TMusicDatabase& database_;

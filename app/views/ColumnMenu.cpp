@@ -1,7 +1,9 @@
 #include "app/views/ColumnMenu.h"
 
+#include <QActionGroup>
 #include <QHeaderView>
 
+#include "app/CommandMenu.h"
 #include "app/models/SongColumns.h"
 
 using namespace Qt::StringLiterals;
@@ -18,6 +20,24 @@ ColumnMenu::ColumnMenu(QHeaderView& header, int section, QWidget* parent) : QMen
     connect(addAction(u"Alle Spalten &zurücksetzen"_s), &QAction::triggered, this, [this] {
         if (OnReset) OnReset();
     });
+}
+
+void ColumnMenu::AddFlags(quint32 shown, std::function<void(quint32)> choose) {
+    QMenu* menu = addMenu(u"Spalte „&Flags“ zeigt"_s);
+    menu->setObjectName(u"flagMenu"_s);
+    auto* group = new QActionGroup(menu);
+    QString letters;
+    const auto add = [&](const QString& caption, quint32 flag) {
+        QAction* action = menu->addAction(WithAccessKey(caption, letters));
+        action->setCheckable(true);
+        action->setChecked(flag == shown);
+        group->addAction(action);
+        connect(action, &QAction::triggered, this, [choose, flag] { choose(flag); });
+    };
+    add(u"Alle Flags als Text"_s, 0);
+    const QStringList names = SongFlagNames();
+    for (int i = 0; i < names.size(); ++i)
+        add(names[i], 1U << i);
 }
 
 void ColumnMenu::AddColumns(QHeaderView& header) {

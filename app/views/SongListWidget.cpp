@@ -190,7 +190,18 @@ void SongListWidget::ShowColumnMenu(const QPoint& position) {
     menu->setAttribute(Qt::WA_DeleteOnClose);
     menu->OnFit = [this](int section) { resizeColumnToContents(section); };
     menu->OnReset = [this] { ResetColumns(); };
+    menu->AddFlags(database_.ShownFlag(), Guarded([this](quint32 flag) { ShowFlag(flag); }));
     menu->popup(header.viewport()->mapToGlobal(position));
+}
+
+void SongListWidget::ShowFlag(quint32 flag) {
+    SongOrder order = database_.Order();
+    order.ShownFlag = flag;
+    if (order.SortType == stFlags)
+        SetOrder(order);
+    else
+        database_.SetShownFlag(flag);
+    songs_.Songs().ShownFlagChanged();
 }
 
 // --- Focus and marks ---
@@ -215,6 +226,24 @@ std::vector<SongHandle> SongListWidget::ChosenHandles() const {
     for (const SongIndex song : ChosenSongs())
         handles.push_back(database_.Songs().HandleOf(song));
     return handles;
+}
+
+std::vector<SongHandle> SongListWidget::ChosenInShownOrder(std::size_t most) const {
+    std::vector<SongHandle> chosen;
+    const auto add = [&](int row) {
+        if (const SongIndex index = songs_.IndexAt(row); index >= 0)
+            chosen.push_back(database_.Songs().HandleOf(index));
+    };
+    const RowRanges marked = MarkedRows(*selectionModel());
+    const bool several = marked.size() > 1 || (marked.size() == 1 && marked[0].First < marked[0].Last);
+    if (!several && currentIndex().isValid()) {
+        add(currentIndex().row());
+        return chosen;
+    }
+    for (const auto& [first, last] : marked)
+        for (int row = first; row <= last && chosen.size() < most; ++row)
+            add(row);
+    return chosen;
 }
 
 SongIndex SongListWidget::FocusedSong() const {
@@ -309,6 +338,15 @@ SongHandle SongListWidget::NextAfter(const std::vector<SongHandle>& going) const
             --row;
     return row >= 0 && row < songs_.rowCount() ? database_.Songs().HandleOf(*songs_.SongAt(row))
                                                : SongHandle();
+}
+
+SongHandle SongListWidget::Neighbour(SongHandle song, int rows) const {
+    songs_.Songs().SyncViews();
+    const SongIndex place = database_.Songs().PositionOf(song);
+    int row = place >= 0 ? songs_.RowOfSource(place) : -1;
+    if (row < 0) row = currentIndex().row();
+    const SongIndex neighbour = row >= 0 ? songs_.IndexAt(row + rows) : -1;
+    return neighbour >= 0 ? database_.Songs().HandleOf(neighbour) : SongHandle();
 }
 
 std::size_t SongListWidget::MarkSongs(const QStringList& paths) {

@@ -33,6 +33,9 @@ class SongListWidget : public QTableView {
     // What a command is about: the marked songs, else the focused one.
     std::vector<SongIndex> ChosenSongs() const;
     std::vector<SongHandle> ChosenHandles() const;
+    // What an editor of many songs is about, in the order that is shown: the marked songs; where only one is
+    // marked the focused one. At most so many.
+    std::vector<SongHandle> ChosenInShownOrder(std::size_t most) const;
     // -1 when no song has the focus.
     SongIndex FocusedSong() const;
     // The marked songs as a drag takes them along, in the order of the list.
@@ -48,6 +51,9 @@ class SongListWidget : public QTableView {
     bool FocusSong(SongIndex song, ScrollHint where = PositionAtCenter);
     // The song that gets the focus when these have gone: the next one below the focus, else the next above.
     SongHandle NextAfter(const std::vector<SongHandle>& going) const;
+    // The shown song so many rows below this one (above, when negative), or below the focus where this one is
+    // not shown; no song at the ends of the list.
+    SongHandle Neighbour(SongHandle song, int rows) const;
     // Marks these songs and no others, and shows the first of them, which gets the focus. Returns how many of
     // them are shown.
     std::size_t MarkSongs(const QStringList& paths);
@@ -63,6 +69,10 @@ class SongListWidget : public QTableView {
     // False when these are no saved columns; nothing has changed then.
     bool RestoreColumns(const QByteArray& saved);
     void ResetColumns();
+
+    // The flag that the column of the flags shows as a mark, which a click changes; 0: the names of all
+    // flags. Throws EMusicDatabaseException while a long operation runs.
+    void ShowFlag(quint32 flag);
 
     // Where the menu of the marked songs is asked for, on the screen.
     std::function<void(const QPoint&)> OnContextMenu;

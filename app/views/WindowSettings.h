@@ -11,6 +11,8 @@ namespace WindowSettings {
 inline constexpr Setting<QByteArray> kMainForm{u"MainForm"};
 inline constexpr Setting<QByteArray> kMainFormState{u"MainFormState"};
 inline constexpr Setting<QByteArray> kSongListColumns{u"SongListColumns"};
+// The flag that the song list shows as a mark; 0: the names of all flags.
+inline constexpr Setting<int> kSongListFlag{u"SongListFlag", 0, 0, sfRemixed};
 inline constexpr Setting<QString> kLinkPath{u"LinkPath"};
 // Absent counts as true.
 inline constexpr Setting<bool> kFirstTime{u"FirstTime", true};

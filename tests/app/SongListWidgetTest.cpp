@@ -300,4 +300,38 @@ TEST_F(SongListWidgetTest, TheMenuOfTheHeaderChoosesColumns) {
     EXPECT_EQ(list_.SaveColumns(), before);
 }
 
+TEST_F(SongListWidgetTest, AChosenFlagIsAMarkThatAClickChangesAndThatIsSortedBy) {
+    TID3Tag song = database_.Song(7);
+    song.Flags = sfBurned | sfDamaged;
+    database_.UpdateEntry(7, song);
+    model_.SyncViews();
+    const QModelIndex mark = shown_.index(7, static_cast<int>(SongFieldId::Flags));
+    EXPECT_EQ(mark.data(Qt::CheckStateRole), QVariant());
+    list_.ShowFlag(sfDamaged);
+    EXPECT_EQ(list_.model()->headerData(mark.column(), Qt::Horizontal), u"Beschädigt"_s);
+    EXPECT_EQ(mark.data().toString() + mark.siblingAtRow(8).data().toString(), QString());
+    EXPECT_EQ(mark.data(Qt::CheckStateRole).toInt(), Qt::Checked);
+    EXPECT_EQ(mark.siblingAtRow(8).data(Qt::CheckStateRole).toInt(), Qt::Unchecked);
+
+    std::vector<std::pair<SongHandle, bool>> clicks;
+    model_.OnFlagClick = [&](SongHandle handle, bool on) { clicks.emplace_back(handle, on); };
+    list_.scrollTo(mark);
+    list_.horizontalScrollBar()->setValue(list_.horizontalScrollBar()->maximum());
+    QStyleOptionViewItem option;
+    option.rect = list_.visualRect(mark);
+    option.features = QStyleOptionViewItem::HasCheckIndicator;
+    const QRect box = list_.style()->subElementRect(QStyle::SE_ItemViewItemCheckIndicator, &option, &list_);
+    QTest::mouseClick(list_.viewport(), Qt::LeftButton, {}, box.center());
+    ASSERT_EQ(clicks.size(), 1U);
+    EXPECT_EQ(clicks[0].first, database_.Songs().HandleOf(7));
+    EXPECT_FALSE(clicks[0].second);
+    EXPECT_EQ(database_.Song(7).Flags, song.Flags);  // whoever is told changes it
+
+    database_.SetOrder(
+        {.SortType = stFlags, .SubSortType = sstATL, .Backwards = true, .ShownFlag = sfDamaged});
+    EXPECT_EQ(database_.Song(0).Title, song.Title);
+    list_.ShowFlag(sfRemixed);
+    EXPECT_NE(database_.Song(0).Title, song.Title);
+}
+
 }  // namespace
