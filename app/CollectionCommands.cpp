@@ -74,6 +74,10 @@ void CollectionCommands::AddPaths(const QStringList& paths) {
 }
 
 bool CollectionCommands::KeepChanges() {
+    return MayLeave() && SaveChanges();
+}
+
+bool CollectionCommands::SaveChanges() {
     if (!database_.Modified()) return true;
     if (StandardInUse()) return SaveCurrent();
     const QString name = database_.FileName().isEmpty()
@@ -91,8 +95,13 @@ bool CollectionCommands::MayClose() {
         bannList_.Save();
         return true;
     };
-    return SavedOrGivenUp([this] { return KeepChanges(); },
-                          u"Die Änderungen in der Datenbank sind noch nicht gespeichert."_s) &&
+    const auto saveDatabase = [this] {
+        return SavedOrGivenUp([this] { return SaveChanges(); },
+                              u"Die Änderungen in der Datenbank sind noch nicht gespeichert."_s);
+    };
+    // Saved before the question, which may stand longer than the system waits for the program to end, and
+    // after it, which may have changed songs.
+    return saveDatabase() && MayLeave() && saveDatabase() &&
            SavedOrGivenUp(saveBannList, u"Die Bann-Liste ist noch nicht gespeichert."_s);
 }
 

@@ -22,6 +22,9 @@ class CollectionCommands {
     // Told when another collection was opened from its file.
     std::function<void()> OnOpened;
 
+    // Asked before the collection or the program goes; false keeps it.
+    std::function<bool()> OnLeave;
+
     void New();
     void Open();
     void OpenFile(const QString& path);
@@ -42,6 +45,8 @@ class CollectionCommands {
     BannListFile& BannList() { return bannList_; }
 
  private:
+    bool MayLeave() const { return !OnLeave || OnLeave(); }
+    bool SaveChanges();
     bool StandardInUse() const;
     bool SaveCurrent();
     void Opened();

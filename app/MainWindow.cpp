@@ -13,6 +13,7 @@
 #include <QTimer>
 #include <QUrl>
 #include <QVBoxLayout>
+#include <bit>
 
 #include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/CommandRunner.h"
@@ -30,6 +31,7 @@
 #include "app/SettingsCommands.h"
 #include "app/ShellCommands.h"
 #include "app/SongCommands.h"
+#include "app/SongFlags.h"
 #include "app/ToolWindows.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/NewInstallation.h"
@@ -38,11 +40,15 @@
 #include "app/views/EmptyState.h"
 #include "app/views/FilterField.h"
 #include "app/views/SongListWidget.h"
+#include "app/views/TagForm.h"
 #include "app/views/WindowSettings.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
+
+// One more than the editor takes, so that it can tell the user.
+constexpr std::size_t kMostEditedSongs = TID3TagForm::kMostSongs + 1;
 
 // A batch of this program or another was ended in its middle.
 void TellTakenBack(const RecoveryResult& result) {
@@ -134,9 +140,13 @@ void TTunesteadMainWnd::SetUpStatusBar() {
     constexpr int kMarkedDelay = 80;  // milliseconds
     markedTimer_.setSingleShot(true);
     markedTimer_.setInterval(kMarkedDelay);
-    connect(&markedTimer_, &QTimer::timeout, this, [this] { ShowMarked(); });
-    connect(list_->selectionModel(), &QItemSelectionModel::selectionChanged, &markedTimer_,
-            [this] { markedTimer_.start(); });
+    connect(&markedTimer_, &QTimer::timeout, this, [this] {
+        ShowMarked();
+        ShowChosenTags();
+    });
+    const auto later = [this] { markedTimer_.start(); };
+    connect(list_->selectionModel(), &QItemSelectionModel::selectionChanged, &markedTimer_, later);
+    connect(list_->selectionModel(), &QItemSelectionModel::currentRowChanged, &markedTimer_, later);
 }
 
 void TTunesteadMainWnd::SetUpMenu() {
@@ -168,10 +178,43 @@ void TTunesteadMainWnd::SetUpToolWindows() {
     };
     connect(list_->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
             [this](const QModelIndex& song) { toolWindows_->ShowSong(shown_.SongAt(song.row())); });
+    SetUpTagForm();
     playing_ = std::make_unique<Playing>(*this, database_, *list_,
                                          PlayingOptions{options_.Files.PlayList(), options_.Engines,
                                                         options_.Spectrum, options_.MakeExternalPlayer});
     playing_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
+}
+
+void TTunesteadMainWnd::SetUpTagForm() {
+    TID3TagForm& form = toolWindows_->TagForm();
+    form.OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
+    form.OnReturn = [this](const std::vector<SongHandle>& songs) {
+        QStringList paths;
+        for (const SongHandle song : songs)
+            if (const TID3Tag* record = database_.Songs().Find(song)) paths << record->FileName;
+        list_->MarkSongs(paths);
+        return list_->ChosenInShownOrder(kMostEditedSongs);
+    };
+    form.OnStep = [this](int rows) { StepTags(rows); };
+    commands_.OnLeave = [&form] { return form.MayLeave(); };
+    // After the click, in whose middle the list would change.
+    songs_.OnFlagClick = [this](SongHandle song, bool on) {
+        QTimer::singleShot(
+            0, this, Guarded([this, song, on] { SetSongFlag(database_, song, database_.ShownFlag(), on); }));
+    };
+}
+
+void TTunesteadMainWnd::ShowChosenTags() {
+    const auto by = list_->hasFocus() ? TID3TagForm::ChosenBy::User : TID3TagForm::ChosenBy::Program;
+    toolWindows_->TagForm().ShowSongs(list_->ChosenInShownOrder(kMostEditedSongs), by);
+}
+
+// The neighbour is the one of before: what is applied may move the edited song to another place.
+void TTunesteadMainWnd::StepTags(int rows) {
+    TID3TagForm& form = toolWindows_->TagForm();
+    const SongHandle next = list_->Neighbour(form.EditedSong(rows), rows);
+    if (!form.MayLeave()) return;
+    list_->FocusSong(database_.Songs().PositionOf(next), QAbstractItemView::EnsureVisible);
 }
 
 // Those that need the window itself; its parts handle theirs.
@@ -204,6 +247,9 @@ void TTunesteadMainWnd::LoadSettings() {
     WriteSetting(settings, WindowSettings::kFirstTime, false);
     if (const auto columns = ReadSetting(settings, WindowSettings::kSongListColumns))
         list_->RestoreColumns(*columns);
+    if (const int flag = ReadSetting(settings, WindowSettings::kSongListFlag).value_or(0);
+        std::has_single_bit(static_cast<unsigned>(flag)))
+        list_->ShowFlag(static_cast<quint32>(flag));
     database_.Commands().Changed.Tell();
 }
 
@@ -214,6 +260,7 @@ void TTunesteadMainWnd::StoreSettings() {
     WriteSetting(settings, WindowSettings::kMainForm, saveGeometry());
     WriteSetting(settings, WindowSettings::kMainFormState, saveState());
     WriteSetting(settings, WindowSettings::kSongListColumns, list_->SaveColumns());
+    WriteSetting(settings, WindowSettings::kSongListFlag, static_cast<int>(database_.ShownFlag()));
     settings.Flush();
 }
 

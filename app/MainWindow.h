@@ -73,6 +73,9 @@ class TTunesteadMainWnd : public QMainWindow {
     void SetUpPlacement();
     void SetUpMenu();
     void SetUpToolWindows();
+    void SetUpTagForm();
+    void ShowChosenTags();
+    void StepTags(int rows);
     void FindNext();
     void ShowMarked();
     void LoadSettings();

@@ -16,7 +16,7 @@ ToolWindows::ToolWindows(QMainWindow& window, TMusicDatabase& database)
     : database_(database),
       overview_(new TOverviewForm(database, &window)),
       properties_(new TPropertyForm(database, &window)),
-      tag_(new TID3TagForm(&window)) {
+      tag_(new TID3TagForm(database, &window)) {
     window.addDockWidget(Qt::LeftDockWidgetArea, overview_);
     window.addDockWidget(Qt::RightDockWidgetArea, properties_);
     window.tabifyDockWidget(properties_, tag_);
@@ -35,10 +35,10 @@ ToolWindows::ToolWindows(QMainWindow& window, TMusicDatabase& database)
 void ToolWindows::FollowSong() {
     CollectionEvents& events = database_.Events();
     subscriptions_ += events.Changed.Subscribe([this](SongIndex index, const TID3Tag&, const TID3Tag& song) {
-        if (index == database_.Songs().PositionOf(song_)) Show(&song);
+        if (index == database_.Songs().PositionOf(song_)) properties_->ShowSong(&song);
     });
     const auto forget = [this] {
-        if (database_.Songs().Find(song_) == nullptr) Show(nullptr);
+        if (database_.Songs().Find(song_) == nullptr) properties_->ShowSong(nullptr);
     };
     subscriptions_ += events.Replaced.Subscribe(forget);
     subscriptions_ += events.Cleared.Subscribe(forget);
@@ -59,12 +59,7 @@ void ToolWindows::HandleCommands(TMusicDatabase& database) {
 
 void ToolWindows::ShowSong(const TID3Tag* song) {
     song_ = song != nullptr ? database_.Songs().HandleOf(*song) : SongHandle();
-    Show(song);
-}
-
-void ToolWindows::Show(const TID3Tag* song) {
     properties_->ShowSong(song);
-    tag_->ShowSong(song);
 }
 
 void ToolWindows::AddTo(QMenu& menu) {

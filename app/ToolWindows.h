@@ -1,6 +1,7 @@
 #pragma once
 
 #include <functional>
+#include <vector>
 
 #include "CommonRUKTools/Listeners.h"
 #include "MusicManagment/database/SongList.h"
@@ -23,16 +24,17 @@ class ToolWindows {
     // Told when other groups are chosen in the overview.
     std::function<void(const GroupSelection&)> OnSelectionChanged;
 
-    // Shows a song of the database in the windows that are about one, which follow its changes; nullptr for
+    // Shows a song of the database in the window of its properties, which follows its changes; nullptr for
     // none.
     void ShowSong(const TID3Tag* song);
+    // The editor of the marked songs' tags.
+    TID3TagForm& TagForm() { return *tag_; }
     // Adds the items that show and hide the windows.
     void AddTo(QMenu& menu);
 
  private:
     void HandleCommands(TMusicDatabase& database);
     void FollowSong();
-    void Show(const TID3Tag* song);
 
     TMusicDatabase& database_;
     TOverviewForm* overview_;

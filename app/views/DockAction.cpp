@@ -11,7 +11,10 @@ bool IsInFront(const QDockWidget& dock) {
 }
 
 void Toggle(QDockWidget& dock) {
-    if (IsInFront(dock)) return dock.hide();
+    if (IsInFront(dock)) {
+        dock.close();  // which it may refuse
+        return;
+    }
     dock.show();
     dock.raise();
 }
