@@ -195,6 +195,7 @@ void TTunesteadMainWnd::SetUpTagForm() {
         list_->MarkSongs(paths);
         return list_->ChosenInShownOrder(kMostEditedSongs);
     };
+    form.OnAskOrder = [this] { return list_->ChosenInShownOrder(kMostEditedSongs); };
     form.OnStep = [this](int rows) { StepTags(rows); };
     commands_.OnLeave = [&form] { return form.MayLeave(); };
     // After the click, in whose middle the list would change.

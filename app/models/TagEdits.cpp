@@ -39,6 +39,13 @@ QString FaultText(QStringView field, QStringView accepts) {
 
 }  // namespace
 
+bool AreSameSongs(std::vector<SongHandle> some, std::vector<SongHandle> others) {
+    if (some.size() != others.size()) return false;
+    std::ranges::sort(some, {}, &SongHandle::Slot);
+    std::ranges::sort(others, {}, &SongHandle::Slot);
+    return some == others;
+}
+
 // --- Songs ---
 
 void TagEdits::SetSongs(const std::vector<SongHandle>& songs) {
@@ -55,6 +62,14 @@ std::vector<SongHandle> TagEdits::Songs() const {
     for (const Held& held : songs_)
         songs.push_back(held.Song);
     return songs;
+}
+
+void TagEdits::Reorder(const std::vector<SongHandle>& order) {
+    if (!AreSameSongs(order, Songs())) return;
+    std::map<quint32, std::size_t> places;
+    for (const SongHandle song : order)
+        places.emplace(song.Slot, places.size());
+    std::ranges::sort(songs_, {}, [&](const Held& held) { return places[held.Song.Slot]; });
 }
 
 const TID3Tag* TagEdits::First() const {

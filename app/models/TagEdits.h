@@ -9,6 +9,9 @@
 #include "MusicManagment/database/songfiles/SongUpdates.h"
 #include "app/models/FileTags.h"
 
+// In whatever order.
+bool AreSameSongs(std::vector<SongHandle> some, std::vector<SongHandle> others);
+
 // What the tag editor has of the songs that it works on: what they have in common, what the user made of it,
 // and what each of them is to become. A field that nobody touched stays as it is in every song, whatever
 // happens to that song meanwhile. Songs are held by their handles; one that has gone is left out.
@@ -23,6 +26,8 @@ class TagEdits {
     std::size_t Count() const { return songs_.size(); }
     // The record of the first song; nullptr when there is none.
     const TID3Tag* First() const;
+    // Puts the songs into this order; does nothing when these are not the same songs.
+    void Reorder(const std::vector<SongHandle>& order);
     // Looks at the records again. True when songs have gone.
     bool Refresh();
     QStringList Paths() const;

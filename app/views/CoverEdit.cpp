@@ -4,7 +4,6 @@
 #include <QDragEnterEvent>
 #include <QGridLayout>
 #include <QGuiApplication>
-#include <QLabel>
 #include <QMimeData>
 #include <QPushButton>
 #include <QShortcut>
@@ -19,15 +18,16 @@
 #include "app/models/CoverPictures.h"
 #include "app/models/TagEdits.h"
 #include "app/views/CoverView.h"
+#include "app/views/WrappedLabel.h"
 
 using namespace Qt::StringLiterals;
 
 CoverEdit::CoverEdit(TagEdits& edits, QWidget* parent)
-    : QWidget(parent), edits_(edits), view_(new CoverView(this)), state_(new QLabel(this)) {
+    : QWidget(parent),
+      edits_(edits),
+      view_(new CoverView(this)),
+      state_(new WrappedLabel(u"coverState"_s, this)) {
     setAcceptDrops(true);
-    state_->setObjectName(u"coverState"_s);
-    state_->setTextFormat(Qt::PlainText);
-    state_->setWordWrap(true);
     add_ = AddButton(u"addCover"_s, u"Hin&zufügen..."_s, &CoverEdit::Add);
     add_->setToolTip(u"PNG oder JPEG. Ein Bild lässt sich auch hierher ziehen."_s);
     paste_ = AddButton(u"pasteCover"_s, u"E&infügen"_s, &CoverEdit::Paste);

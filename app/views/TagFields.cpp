@@ -189,7 +189,7 @@ void TagFields::AddTracks() {
     number_->setObjectName(u"number"_s);
     number_->setToolTip(u"Gibt den Songs in der Reihenfolge der Liste die Tracks 1, 2, 3 ..."_s);
     connect(number_, &QPushButton::clicked, this, Guarded([this] {
-                edits_.Number();
+                if (OnNumber) OnNumber();
                 Tell();
             }));
     layout->addWidget(track, 1);

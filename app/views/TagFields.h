@@ -34,6 +34,8 @@ class TagFields : public QWidget {
 
     // Told after each edit.
     std::function<void()> OnEdited;
+    // Has the songs numbered; may throw.
+    std::function<void()> OnNumber;
 
  protected:
     bool eventFilter(QObject* watched, QEvent* event) override;

@@ -2,7 +2,6 @@
 
 #include <QCloseEvent>
 #include <QHBoxLayout>
-#include <QLabel>
 #include <QLocale>
 #include <QPushButton>
 #include <QScopedValueRollback>
@@ -22,6 +21,7 @@
 #include "app/views/TagFields.h"
 #include "app/views/TagPreviewList.h"
 #include "app/views/WaitCursor.h"
+#include "app/views/WrappedLabel.h"
 
 using namespace Qt::StringLiterals;
 
@@ -57,14 +57,12 @@ TID3TagForm::TID3TagForm(TMusicDatabase& database, QWidget* parent)
     tabs_->addTab(new PageScroller(cover_), u"&Cover"_s);
     tabs_->addTab(preview_, u"V&orschau"_s);
     layout->addWidget(tabs_, 1);
-    summary_ = new QLabel(content);
-    summary_->setObjectName(u"tagSummary"_s);
-    summary_->setTextFormat(Qt::PlainText);
-    summary_->setWordWrap(true);
+    summary_ = new WrappedLabel(u"tagSummary"_s, content);
     layout->addWidget(summary_);
     layout->addWidget(MakeButtons());
     setWidget(content);
     fields_->OnEdited = [this] { Edited(); };
+    fields_->OnNumber = [this] { Number(); };
     cover_->OnEdited = [this] { Edited(); };
     SetUpKeys();
     FollowDatabase();
@@ -155,7 +153,7 @@ void TID3TagForm::ShowSongs(const std::vector<SongHandle>& songs, ChosenBy by) {
         if (!stale_) Take(songs);
         return;
     }
-    const bool others = songs != edits_.Songs() && songs != kept_ && !songs.empty();
+    const bool others = !songs.empty() && songs != kept_ && !AreSameSongs(songs, edits_.Songs());
     if (others && by == ChosenBy::User && !visibleRegion().isEmpty())
         askTimer_.start();
     else
@@ -245,6 +243,12 @@ void TID3TagForm::LookAgain() {
 void TID3TagForm::Edited() {
     kept_.clear();
     ShowAll();
+}
+
+// The list may have another order than when the songs were chosen.
+void TID3TagForm::Number() {
+    if (OnAskOrder) edits_.Reorder(OnAskOrder());
+    edits_.Number();
 }
 
 bool TID3TagForm::MayLeave() {
@@ -352,7 +356,7 @@ void TID3TagForm::ShowHead() {
         text = SongCountText(edits_.Count());
     else if (const TID3Tag* song = edits_.First())
         text = song->FileName.mid(LastSeparator(song->FileName) + 1);
-    const bool others = edits_.Touched() && !chosen_.empty() && chosen_ != edits_.Songs();
+    const bool others = edits_.Touched() && !chosen_.empty() && !AreSameSongs(chosen_, edits_.Songs());
     head_->setText(others ? text + u" (nicht die markierten)"_s : text);
     const TID3Tag* song = edits_.First();
     head_->setToolTip(song != nullptr && edits_.Count() == 1 ? song->FileName : head_->text());

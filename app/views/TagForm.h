@@ -44,6 +44,8 @@ class TID3TagForm : public QDockWidget {
 
     // Wants the next (1) or the previous (-1) song of the list to be chosen.
     std::function<void(int step)> OnStep;
+    // Asks which songs are chosen in the list, in its order.
+    std::function<std::vector<SongHandle>()> OnAskOrder;
     // Wants its songs to be marked in the list again; returns the songs that are chosen then.
     std::function<std::vector<SongHandle>(const std::vector<SongHandle>&)> OnReturn;
     // Told what came of a command, in a sentence for the status bar.
@@ -65,6 +67,7 @@ class TID3TagForm : public QDockWidget {
     void ReadFiles();
     void RecordsChanged();
     void LookAgain();
+    void Number();
     void Edited();
     void ShowAll();
     void ShowHead();

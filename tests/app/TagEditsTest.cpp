@@ -114,7 +114,9 @@ TEST_F(TagEditsTest, NumberingFollowsTheGivenOrderAndClosesGaps) {
     EXPECT_EQ(Lines(), QStringList({u"Drei.mp3"_s, u"Track: (leer) → 1"_s, u"Eins.mp3"_s,
                                     u"Track: (leer) → 2"_s, u"Tracks: (leer) → 3"_s, u"Zwei.mp3"_s,
                                     u"Track: (leer) → 3"_s, u"Tracks: ? → 3"_s}));
-    database_.RemoveEntry(database_.Songs().PositionOf(songs_[0]));
+    edits_.Reorder({songs_[1], songs_[2], songs_[0]});
+    EXPECT_EQ(edits_.Updates()[2].Record.Title, u"Drei"_s);
+    database_.RemoveEntry(database_.Songs().PositionOf(songs_[1]));
     edits_.Refresh();
     EXPECT_EQ(edits_.Updates()[1].Record.Track, 2);
     edits_.Edit(Id::Track, u"7"_s);

@@ -3,7 +3,6 @@
 #include <QCheckBox>
 #include <QDir>
 #include <QFormLayout>
-#include <QLabel>
 #include <QLineEdit>
 
 #include "CommonRUKTools/AbsolutePath.h"
@@ -15,6 +14,7 @@
 #include "app/dialogs/NamePatternTexts.h"
 #include "app/dialogs/RootFolderField.h"
 #include "app/dialogs/options/GenreFolderTable.h"
+#include "app/views/WrappedLabel.h"
 
 using namespace Qt::StringLiterals;
 
@@ -37,10 +37,7 @@ FilesPage::FilesPage()
     inPlace_ = AddCheck(naming, u"KeepFolders"_s, u"Dateien beim Umbenennen in ihrem Ordner &lassen"_s,
                         u"Gilt für Songs, die kein Ordner eines Genres aufnimmt. Sonst kommen sie mit ihrem "
                         "ganzen alten Pfad unter den Stammordner, wie in den früheren Versionen."_s);
-    placeExample_ = new QLabel;
-    placeExample_->setObjectName(u"placeExample"_s);
-    placeExample_->setTextFormat(Qt::PlainText);
-    placeExample_->setWordWrap(true);
+    placeExample_ = new WrappedLabel(u"placeExample"_s);
     naming.addRow(placeExample_);
     fields_.Bind(rename_, DatabaseSettings::kRenameAndMoveMP3s);
     fields_.Bind(byGenre_, DatabaseSettings::kMoveMP3sAfterGenreChange);

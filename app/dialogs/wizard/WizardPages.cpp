@@ -14,6 +14,7 @@
 #include "app/dialogs/NamePatternTexts.h"
 #include "app/dialogs/PageScroller.h"
 #include "app/dialogs/RootFolderField.h"
+#include "app/views/WrappedLabel.h"
 
 using namespace Qt::StringLiterals;
 
@@ -106,7 +107,7 @@ RenameSheet::RenameSheet(WizardChoice& choice)
       root_(new RootFolderField(u"Stammordner der Songs"_s)),
       pattern_(new NamePatternEdit),
       inPlace_(new QCheckBox(u"Dateien beim Umbenennen in ihrem &Ordner lassen"_s)),
-      placeExample_(new QLabel) {
+      placeExample_(new WrappedLabel(u"placeExample"_s)) {
     keep_->setObjectName(u"keep"_s);
     rename_->setObjectName(u"rename"_s);
     Rows().addWidget(keep_);
@@ -120,9 +121,6 @@ RenameSheet::RenameSheet(WizardChoice& choice)
     inPlace_->setObjectName(u"KeepFolders"_s);
     inPlace_->setChecked(choice.RenameInPlace);
     form->addRow(inPlace_);
-    placeExample_->setObjectName(u"placeExample"_s);
-    placeExample_->setTextFormat(Qt::PlainText);
-    placeExample_->setWordWrap(true);
     form->addRow(placeExample_);
     Rows().addWidget(details);
     AddText(
