@@ -223,6 +223,16 @@ void TTunesteadMainWnd::HandleCommands() {
     CommandDispatcher& commands = database_.Commands();
     handlers_ += commands.Handle(mcFind, {.Run = [this] { filter_->Activate(); }});
     handlers_ += commands.Handle(mcFindNext, {.Run = [this] { FindNext(); }});
+    handlers_ += commands.Add({.Id = scEditTags,
+                               .Caption = u"ID3-Tag bearbeiten"_s,
+                               .Letter = u't',
+                               .Keys = u"F2"_s,
+                               .Icon = u"document-edit"_s,
+                               .Menu = u"Song"},
+                              {.Run = [this] {
+                                  ShowChosenTags();
+                                  toolWindows_->TagForm().Edit();
+                              }});
     handlers_ += commands.Add({.Id = scExit,
                                .Caption = u"Beenden"_s,
                                .Letter = u'b',
