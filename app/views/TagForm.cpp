@@ -187,7 +187,7 @@ void TID3TagForm::ReadFiles() {
 
 void TID3TagForm::showEvent(QShowEvent* event) {
     QDockWidget::showEvent(event);
-    if (stale_ && !edits_.Touched()) Take(chosen_);
+    if (std::exchange(stale_, false)) LookAgain();
 }
 
 void TID3TagForm::Edit() {
@@ -226,6 +226,10 @@ void TID3TagForm::RecordsChanged() {
 }
 
 void TID3TagForm::LookAgain() {
+    if (!isVisible() && !edits_.Touched()) {
+        stale_ = true;
+        return;
+    }
     const bool wasTouched = edits_.Touched();
     const std::size_t before = edits_.Count();
     edits_.Refresh();

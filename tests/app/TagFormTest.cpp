@@ -29,9 +29,12 @@ class TagFormTest : public testing::Test {
         database_.SetSortType(stTitle);
         for (const QString& name : {u"Band - Eins.wav"_s, u"Band - Zwei.wav"_s})
             database_.AddSong(folder_.Add(name, 2));
+        window_.setCentralWidget(new QWidget);
         window_.addDockWidget(Qt::RightDockWidgetArea, &form_);
+        window_.resize(1024, 700);
         form_.OnDone = [this](const QString& sentence) { told_ << sentence; };
         window_.show();
+        EXPECT_TRUE(QTest::qWaitForWindowActive(&window_));
         form_.Edit();
         Choose({0, 1});
     }
@@ -146,7 +149,8 @@ TEST_F(TagFormTest, WhatAFieldCannotHoldIsNotApplied) {
 TEST_F(TagFormTest, NothingIsClippedAndEveryKeyIsUniqueInAnyFontSize) {
     Type("title", u"Neu"_s);
     WithEveryFontSize([&](int size) {
-        QApplication::processEvents();
+        for (int i = 0; i < 3; ++i)
+            QApplication::processEvents();
         EXPECT_EQ(ClippedCaptions(form_), QStringList()) << size;
         EXPECT_EQ(AmbiguousKeys(form_), QStringList()) << size;
     });
