@@ -99,9 +99,9 @@ bool CollectionCommands::MayClose() {
         return SavedOrGivenUp([this] { return SaveChanges(); },
                               u"Die Änderungen in der Datenbank sind noch nicht gespeichert."_s);
     };
-    // Saved before the question, which may stand longer than the system waits for the program to end, and
-    // after it, which may have changed songs.
-    return saveDatabase() && MayLeave() && saveDatabase() &&
+    // What is saved without a question is saved before this one, too: it may stand longer than the system
+    // waits for the program to end.
+    return (!StandardInUse() || saveDatabase()) && MayLeave() && saveDatabase() &&
            SavedOrGivenUp(saveBannList, u"Die Bann-Liste ist noch nicht gespeichert."_s);
 }
 

@@ -39,6 +39,7 @@
 #include "app/desktop/SingleInstance.h"
 #include "app/views/EmptyState.h"
 #include "app/views/FilterField.h"
+#include "app/views/PlaylistForm.h"
 #include "app/views/SongListWidget.h"
 #include "app/views/TagForm.h"
 #include "app/views/WindowSettings.h"
@@ -182,6 +183,7 @@ void TTunesteadMainWnd::SetUpToolWindows() {
     playing_ = std::make_unique<Playing>(*this, database_, *list_,
                                          PlayingOptions{options_.Files.PlayList(), options_.Engines,
                                                         options_.Spectrum, options_.MakeExternalPlayer});
+    toolWindows_->LieBehind(playing_->ListForm());
     playing_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
 }
 

@@ -40,6 +40,7 @@ class Playing {
 
     TPlayList& PlayList() { return list_; }
     TPlaySound& Player() { return player_; }
+    TPlaylistForm& ListForm() { return *listForm_; }
 
     // Adds the menus of the playlist and the player.
     void AddMenusTo(QMenuBar& bar);

@@ -13,7 +13,8 @@
 #include "app/views/TagForm.h"
 
 ToolWindows::ToolWindows(QMainWindow& window, TMusicDatabase& database)
-    : database_(database),
+    : window_(window),
+      database_(database),
       overview_(new TOverviewForm(database, &window)),
       properties_(new TPropertyForm(database, &window)),
       tag_(new TID3TagForm(database, &window)) {
@@ -30,6 +31,12 @@ ToolWindows::ToolWindows(QMainWindow& window, TMusicDatabase& database)
     overview_->Overview().OnTypeChanged = [&database](TOVType) { database.Commands().Changed.Tell(); };
     HandleCommands(database);
     FollowSong();
+}
+
+void ToolWindows::LieBehind(QDockWidget& front) {
+    window_.tabifyDockWidget(&front, properties_);
+    window_.tabifyDockWidget(properties_, tag_);
+    front.raise();
 }
 
 void ToolWindows::FollowSong() {

@@ -7,6 +7,7 @@
 #include "MusicManagment/database/SongList.h"
 #include "app/models/GroupSelection.h"
 
+class QDockWidget;
 class QMainWindow;
 class QMenu;
 class TID3TagForm;
@@ -27,6 +28,8 @@ class ToolWindows {
     // Shows a song of the database in the window of its properties, which follows its changes; nullptr for
     // none.
     void ShowSong(const TID3Tag* song);
+    // Puts the sheets behind a window at the same edge: beside it they would be too low.
+    void LieBehind(QDockWidget& front);
     // The editor of the marked songs' tags.
     TID3TagForm& TagForm() { return *tag_; }
     // Adds the items that show and hide the windows.
@@ -36,6 +39,7 @@ class ToolWindows {
     void HandleCommands(TMusicDatabase& database);
     void FollowSong();
 
+    QMainWindow& window_;
     TMusicDatabase& database_;
     TOverviewForm* overview_;
     TPropertyForm* properties_;
