@@ -1,6 +1,6 @@
 #include "app/SongFlags.h"
 
-#include "CommonRUKTools/Dialogs.h"
+#include "MusicManagment/database/batches/BatchReport.h"
 #include "MusicManagment/database/songfiles/SongUpdates.h"
 
 using namespace Qt::StringLiterals;
@@ -11,7 +11,7 @@ void SetSongFlag(TMusicDatabase& database, SongHandle song, quint32 flag, bool o
     TID3Tag changed = *record;
     changed.Flags = on ? changed.Flags | flag : changed.Flags & ~flag;
     if (changed == *record) return;
-    const UpdateResult result = UpdateSongs(database, on ? u"Flag setzen"_s : u"Flag entfernen"_s,
-                                            {{.Song = song, .Record = changed}}, Renaming::BySettings);
-    if (!result.Failed.isEmpty()) UserDialogs().ShowMessage(MessageKind::Warning, result.Failed.join(u'\n'));
+    const BatchResult result = UpdateSongs(database, on ? u"Flag setzen"_s : u"Flag entfernen"_s,
+                                           {{.Song = song, .Record = changed}}, Renaming::BySettings);
+    if (!result.Failed.isEmpty()) ReportBatch(result);
 }
