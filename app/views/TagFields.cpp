@@ -14,6 +14,7 @@
 #include <QShortcut>
 #include <QSignalBlocker>
 #include <QStringListModel>
+#include <QStyle>
 
 #include "CommonRUKTools/CommandRunner.h"
 #include "MusicManagment/database/MusicManagment.h"
@@ -172,6 +173,8 @@ void TagFields::AddTracks() {
         else
             ::Show(*track, edits_.Shown(Id::Track));
     };
+    track->setMinimumWidth(fontMetrics().horizontalAdvance(kDifferent + u"  "_s) +
+                           2 * style()->pixelMetric(QStyle::PM_DefaultFrameWidth));
     trackField.Label = AddRow(CaptionOf(Id::Track), row);
     trackField.Label->setBuddy(track);
     auto* total = new QLineEdit;

@@ -18,6 +18,7 @@ QString Sentence(const BatchResult& result) {
 
 void ReportBatch(const BatchResult& result, std::vector<ReportSection> sections) {
     sections.insert(sections.begin(), {u"Nicht geändert werden konnte(n)"_s, result.Failed, true});
+    // A complaint about nothing would open the report all the same.
     std::erase_if(sections, [](const ReportSection& section) { return section.Lines.isEmpty(); });
     UserDialogs().ShowReport(
         {.Message = Sentence(result), .Sections = std::move(sections), .OpenAsText = {}});
