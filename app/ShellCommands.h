@@ -7,5 +7,5 @@ enum ShellCommandId : int {
     scWizard = 9003,
     scUndo = 9004,
     scRedo = 9005,
-    scEditTags = 9010,
+    scEditTags = 9006,
 };

@@ -13,9 +13,9 @@
 #include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/batches/BatchReport.h"
 #include "app/desktop/Icons.h"
 #include "app/dialogs/PageScroller.h"
-#include "app/models/CollectionTotals.h"
 #include "app/views/CoverEdit.h"
 #include "app/views/ElidedLabel.h"
 #include "app/views/TagFields.h"
@@ -303,35 +303,20 @@ bool TID3TagForm::Apply() {
         fields_->FocusFault();
         return false;
     }
-    const UpdateResult result = Update();
+    const BatchResult result = Update();
     // Where something is left to do the edits stay; songs that have them already do not change again.
     if (result.Failed.isEmpty() && !result.Stopped) edits_.Discard();
     LookAgain();
-    Tell(result);
+    if (result.Changed > 0 || !result.Failed.isEmpty()) ReportBatch(result);
     return !edits_.Touched();
 }
 
-UpdateResult TID3TagForm::Update() {
+BatchResult TID3TagForm::Update() {
     const QScopedValueRollback applying(applying_, true);
     std::vector<SongUpdate> updates = edits_.Updates();
     if (updates.empty()) return {};
     const QString caption = updates.size() == 1 ? u"1 Tag"_s : u"%1 Tags"_s.arg(updates.size());
     return UpdateSongs(database_, caption, std::move(updates), Renaming::BySettings);
-}
-
-void TID3TagForm::Tell(const UpdateResult& result) const {
-    QString sentence = result.Changed == 1 ? u"1 Tag geändert"_s : u"%1 Tags geändert"_s.arg(result.Changed);
-    if (result.Renamed > 0)
-        sentence += (result.Renamed == 1 ? u", 1 Datei umbenannt"_s
-                                         : u", %1 Dateien umbenannt"_s.arg(result.Renamed));
-    sentence += u'.';
-    if (result.Failed.isEmpty()) {
-        if (OnDone) OnDone(sentence);
-        return;
-    }
-    UserDialogs().ShowReport({.Message = sentence,
-                              .Sections = {{u"Nicht geänderte Dateien"_s, result.Failed, true}},
-                              .OpenAsText = {}});
 }
 
 // --- What is shown ---

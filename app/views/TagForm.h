@@ -74,8 +74,7 @@ class TID3TagForm : public QDockWidget {
     void ShowState();
     void ShowPreview();
     bool IsEditable() const;
-    UpdateResult Update();
-    void Tell(const UpdateResult& result) const;
+    BatchResult Update();
 
     TMusicDatabase& database_;
     TagEdits edits_;

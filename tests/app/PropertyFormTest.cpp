@@ -5,9 +5,7 @@
 #include <QBuffer>
 #include <QClipboard>
 #include <QFile>
-#include <QLineEdit>
 #include <QMainWindow>
-#include <QPlainTextEdit>
 #include <QTemporaryDir>
 #include <QTest>
 
