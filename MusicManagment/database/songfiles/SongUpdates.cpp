@@ -46,8 +46,8 @@ class SongChanges {
     SongChanges(TMusicDatabase& database, const QString& caption, const QString& progress, std::size_t count)
         : database_(database),
           run_(std::in_place, database, progress),
-          batch_(JournalFor(count), &database, caption),
-          count_(count) {}
+          count_(count),
+          batch_(JournalFor(count), &database, caption) {}
 
     // False when the user stopped.
     bool Next() {
@@ -224,11 +224,11 @@ class SongChanges {
     TMusicDatabase& database_;
     std::optional<ProgressRun> run_;
     BatchResult result_;
-    FileBatch batch_;
     QSet<QString> targets_;
     QSet<quint32> changed_;  // songs, by slot
     std::size_t count_;
     std::size_t taken_ = 0;
+    FileBatch batch_;  // the last one: as it goes it tells what came of its items
 };
 
 QString ProgressText(const QString& progress, const QString& caption) {
