@@ -24,8 +24,8 @@ class WriteGate {
     virtual ~WriteGate() = default;
     // 0 lets it happen; otherwise it fails with this error number (errno).
     virtual int Before(DiskStep step, const QString& path) = 0;
-    // Whether a flush waits for the disk. A process that ends loses nothing that the system has taken over, so a
-    // test of that need not wait.
+    // Whether a flush waits for the disk. A process that ends loses nothing that the system has taken over,
+    // so a test of that need not wait.
     virtual bool WaitsForDisk() const { return true; }
     // The most bytes that are written in one step. Longer writes become several.
     virtual std::size_t LongestWrite() const { return std::numeric_limits<std::size_t>::max(); }

@@ -111,6 +111,7 @@ class Journal {
     mutable FileState read_;  // of the file when it was read
 };
 
-// The journal in use; none unless one was set, and then nothing can be taken back. The caller keeps ownership.
+// The journal in use; none unless one was set, and then nothing can be taken back. The caller keeps
+// ownership.
 Journal* CurrentJournal();
 void SetJournal(Journal* journal);
