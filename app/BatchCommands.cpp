@@ -6,6 +6,8 @@
 #include "MusicManagment/database/batches/BatchReport.h"
 #include "MusicManagment/database/batches/FlagBatch.h"
 #include "MusicManagment/database/batches/TagBatch.h"
+#include "app/dialogs/BannListDialog.h"
+#include "app/dialogs/RenameDialog.h"
 #include "app/views/SongListWidget.h"
 
 using namespace Qt::StringLiterals;
@@ -36,6 +38,8 @@ BatchCommands::BatchCommands(TMusicDatabase& database, SongListWidget& list)
     handle(mcEnterLength, [this] { EnterLength(); });
     handle(mcRemoveTags, [this] { RemoveTags(); });
     handle(mcRereadTags, [this] { RereadTags(); });
+    handle(mcRenameByPattern, [this] { RenameByPattern(); });
+    handle(mcEditBannList, [this] { EditBannList(); });
     for (const int id : {mcSetFlag, mcRemoveFlag})
         handle(id, [this, id] { ChangeFlag(id); });
     for (const int id : {mcRemoveFromDisk, mcBan})
@@ -96,4 +100,19 @@ void BatchCommands::Discard(int id) {
         DiscardSongs(database_, caption, songs, banned ? Banning::Banned : Banning::NotBanned);
     list_.FocusSong(database_.Songs().PositionOf(next), QAbstractItemView::EnsureVisible);
     ReportBatch(result);
+}
+
+void BatchCommands::RenameByPattern() {
+    const BatchSongs songs = Chosen();
+    if (songs.IsEmpty()) return;
+    RenameDialog dialog(database_, songs.Songs, list_.window());
+    dialog.exec();
+    const std::vector<SongMove> moves = dialog.Moves();
+    if (!moves.empty())
+        ReportBatch(MoveSongs(database_, SongCountText(moves.size()) + u" umbenennen"_s, moves));
+}
+
+void BatchCommands::EditBannList() {
+    BannListDialog dialog(database_.BannList(), list_.window());
+    if (dialog.exec() == QDialog::Accepted) database_.BannList() = dialog.List();
 }

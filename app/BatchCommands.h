@@ -20,6 +20,8 @@ class BatchCommands {
     void RemoveTags();
     void RereadTags();
     void Discard(int id);
+    void RenameByPattern();
+    void EditBannList();
 
     TMusicDatabase& database_;
     SongListWidget& list_;

@@ -1,8 +1,4 @@
-#include <QSet>
-
-#include "CommonRUKTools/FileSource.h"
-#include "MusicManagment/database/songfiles/RenameTarget.h"
-#include "MusicManagment/database/songfiles/SongUpdates.h"
+#include "MusicManagment/database/songfiles/RenamePlan.h"
 #include "cli/ChosenSongs.h"
 #include "cli/CommandLine.h"
 #include "cli/Commands.h"
@@ -15,32 +11,7 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-struct Plan {
-    SongMove Move;
-    QString From;
-    QString Problem{};  // empty where there is none
-};
-
-std::vector<Plan> PlanMoves(const TMusicDatabase& database, const ChosenSongs& chosen,
-                            const QString& pattern) {
-    std::vector<Plan> plans;
-    QSet<QString> targets;
-    for (const SongHandle song : chosen.Songs) {
-        const TID3Tag& record = *database.Songs().Find(song);
-        const QString target = RenameTargetByPattern(database, pattern, record.FileName, record);
-        if (target.compare(record.FileName, Qt::CaseInsensitive) == 0) continue;
-        Plan plan{.Move = {.Song = song, .Target = target}, .From = record.FileName};
-        if (targets.contains(target))
-            plan.Problem = u"Ein anderer Song bekommt diesen Namen"_s;
-        else if (FileSource::Exists(target))
-            plan.Problem = u"Die Datei existiert bereits"_s;
-        targets.insert(target);
-        plans.push_back(std::move(plan));
-    }
-    return plans;
-}
-
-void WritePlan(const Plan& plan, const QString& problem, bool asJson, Console& console) {
+void WritePlan(const PlannedRename& plan, const QString& problem, bool asJson, Console& console) {
     if (!asJson) {
         const QString text = Printable(plan.From) + u" → "_s + Printable(plan.Move.Target);
         return console.WriteLine(problem.isEmpty() ? text : text + u": "_s + Printable(problem));
@@ -54,12 +25,10 @@ void WritePlan(const Plan& plan, const QString& problem, bool asJson, Console& c
 }
 
 // A song that is in the way of another is not asked about here: both stay.
-BatchResult CarryOut(TMusicDatabase& database, const std::vector<Plan>& plans, Console& console) {
+BatchResult CarryOut(TMusicDatabase& database, const std::vector<PlannedRename>& plans, Console& console) {
     const JournalSession journal(console, &database);
     const RunWatcher watcher(database, console, StopBy::Interrupt);
-    std::vector<SongMove> moves;
-    for (const Plan& plan : plans)
-        if (plan.Problem.isEmpty()) moves.push_back(plan.Move);
+    const std::vector<SongMove> moves = PossibleMoves(plans);
     return MoveSongs(database, SongCountText(moves.size()) + u" umbenennen"_s, moves);
 }
 
@@ -73,11 +42,11 @@ int RunRename(const Arguments& arguments, Console& console) {
     const ChosenSongs chosen = ChooseSongs(database, arguments, console);
     const QString pattern =
         arguments.Has(u"--pattern") ? arguments.Value(u"--pattern") : database.MP3NamePattern();
-    const std::vector<Plan> plans = PlanMoves(database, chosen, pattern);
+    const std::vector<PlannedRename> plans = PlanRenames(database, chosen.Songs, pattern);
     bool clear = chosen.AllFound;
     BatchResult result;
     if (!dryRun) result = CarryOut(database, plans, console);
-    for (const Plan& plan : plans) {
+    for (const PlannedRename& plan : plans) {
         const TID3Tag* song = database.Songs().Find(plan.Move.Song);
         const bool stayed =
             !dryRun && plan.Problem.isEmpty() && song != nullptr && song->FileName == plan.From;

@@ -59,6 +59,8 @@ enum MenuCommand : int {
     mcRemoveFlag = 602,
     mcRemoveTags = 603,
     mcRereadTags = 604,
+    mcRenameByPattern = 605,
+    mcEditBannList = 606,
     mcAllSongsSubmenu = 610,
     mcAdaptAllGenres = 611,
     mcSetFlagOfAll = 612,

@@ -12,7 +12,8 @@ constexpr MenuLine kDatabaseLines[] = {mcNew,    mcOpen,           mcSave,     m
                                        mcUpdate, mcUpdateWithTags, mcAddSongs, mcAddFolder};
 constexpr MenuLine kEditLines[] = {
     mcFind,         mcFindOnline,       mcFindNext,           kSeparator,       mcMarkAll, mcInvertMarks,
-    mcMarkByFilter, kWritableSeparator, mcRemoveFromDatabase, mcRemoveFromDisk, mcBan,     mcCopyTo};
+    mcMarkByFilter, kWritableSeparator, mcRemoveFromDatabase, mcRemoveFromDisk, mcBan,     mcEditBannList,
+    mcCopyTo};
 constexpr MenuLine kSortLines[] = {411, 412, 413, 414, 415, 416, 417, 418, 419, 420, 421, 422, 423};
 constexpr MenuOutline kSort{u"Anordnen nach", kSortLines, mcSortSubmenu};
 constexpr MenuLine kSubSortLines[] = {431, 432, 433};
@@ -20,8 +21,9 @@ constexpr MenuOutline kSubSort{u"Untergeordnet anordnen nach", kSubSortLines, mc
 constexpr MenuLine kTagLines[] = {mcSetFlag, mcRemoveFlag, kSeparator, mcRereadTags, mcRemoveTags};
 constexpr MenuOutline kTags{
     .Caption = u"Tags und Flags", .Lines = kTagLines, .Id = mcTagsSubmenu, .For = kWriting};
-constexpr MenuLine kSongLines[] = {mcPlay,     mcAddToPlayList, mcOpenExternally, mcTakeGenre, &kTags,
-                                   kSeparator, &kSort,          &kSubSort,        mcReverse,   mcFollowFocus};
+constexpr MenuLine kSongLines[] = {mcPlay,    mcAddToPlayList,   mcOpenExternally, mcTakeGenre,
+                                   &kTags,    mcRenameByPattern, kSeparator,       &kSort,
+                                   &kSubSort, mcReverse,         mcFollowFocus};
 constexpr MenuLine kAllSongsLines[] = {mcAdaptAllGenres, mcSetFlagOfAll,  mcRemoveFlagOfAll,
                                        kSeparator,       mcRereadAllTags, mcRemoveAllTags};
 constexpr MenuOutline kAllSongs{

@@ -22,6 +22,8 @@ constexpr DatabaseCommand kRows[] = {
      .Keys = u"Ctrl+C",
      .Icon = u"edit-copy",
      .For = kWriting},
+    {.Id = mcRenameByPattern, .Caption = u"Umbenennen nach Muster...", .Keys = u"Shift+F2", .For = kWriting},
+    {.Id = mcEditBannList, .Caption = u"Bann-Liste bearbeiten...", .For = kWriting},
     {.Id = mcOpenExternally, .Caption = u"Mit externem Programm öffnen", .For = kWriting},
 };
 
