@@ -39,7 +39,7 @@ bool ReportChanges(const BatchResult& result, Console& console) {
 }
 
 QString BannListFor(const QString& fileName, const Arguments& arguments) {
-    if (const QString list = arguments.Value(kBannListOption.Name); !list.isEmpty()) return list;
+    if (QString list = arguments.Value(kBannListOption.Name); !list.isEmpty()) return list;
     const StandardFiles standard = LocateStandardFiles();
     const bool isStandard =
         !fileName.isEmpty() && AbsolutePath(fileName) == AbsolutePath(standard.Database());
