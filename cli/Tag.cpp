@@ -102,6 +102,7 @@ BatchResult CarryOut(TMusicDatabase& database, const std::vector<Planned>& plans
     const JournalSession journal(console, &database);
     const RunWatcher watcher(database, console, StopBy::Interrupt);
     std::vector<SongUpdate> updates;
+    updates.reserve(plans.size());
     for (const Planned& plan : plans)
         updates.push_back(plan.Update);
     const QString caption = plans.size() == 1 ? u"1 Tag"_s : QString::number(plans.size()) + u" Tags"_s;
