@@ -43,7 +43,7 @@ BatchResult RunUpdates(TMusicDatabase& database, const BatchSongs& songs, const 
     auto updates = Collect(database, songs, heading, maker, stopped);
     const QString caption = done + u" ("_s + SongCountText(updates.size()) + u')';
     BatchResult result;
-    if (!updates.empty()) result = UpdateSongs(database, caption, std::move(updates), renaming, heading);
+    if (!updates.empty()) result = UpdateSongs(database, caption, updates, renaming, heading);
     result.Stopped = result.Stopped || stopped;
     return result;
 }

@@ -237,8 +237,8 @@ QString ProgressText(const QString& progress, const QString& caption) {
 
 }  // namespace
 
-BatchResult UpdateSongs(TMusicDatabase& database, const QString& caption, std::vector<SongUpdate> updates,
-                        Renaming renaming, const QString& progress) {
+BatchResult UpdateSongs(TMusicDatabase& database, const QString& caption,
+                        const std::vector<SongUpdate>& updates, Renaming renaming, const QString& progress) {
     SongChanges changes(database, caption, ProgressText(progress, caption), updates.size());
     for (const SongUpdate& update : updates) {
         if (!changes.Next()) break;

@@ -42,8 +42,9 @@ struct BatchResult {
 // user, when another operation runs or another program changes files.
 
 // Changes tags and records and then, when asked, renames. `progress` is the heading of the operation.
-BatchResult UpdateSongs(TMusicDatabase& database, const QString& caption, std::vector<SongUpdate> updates,
-                        Renaming renaming, const QString& progress = QString());
+BatchResult UpdateSongs(TMusicDatabase& database, const QString& caption,
+                        const std::vector<SongUpdate>& updates, Renaming renaming,
+                        const QString& progress = QString());
 
 // A new path for the file of each song; the same as it has means nothing.
 struct SongMove {
