@@ -106,8 +106,8 @@ BatchResult CarryOut(TMusicDatabase& database, const std::vector<Planned>& plans
     for (const Planned& plan : plans)
         updates.push_back(plan.Update);
     const QString caption = plans.size() == 1 ? u"1 Tag"_s : QString::number(plans.size()) + u" Tags"_s;
-    return UpdateSongs(database, caption, std::move(updates),
-                       renames ? Renaming::BySettings : Renaming::Never, u"Tags schreiben"_s);
+    return UpdateSongs(database, caption, updates, renames ? Renaming::BySettings : Renaming::Never,
+                       u"Tags schreiben"_s);
 }
 
 int RunTag(const Arguments& arguments, Console& console) {

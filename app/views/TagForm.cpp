@@ -316,7 +316,7 @@ BatchResult TID3TagForm::Update() {
     std::vector<SongUpdate> updates = edits_.Updates();
     if (updates.empty()) return {};
     const QString caption = updates.size() == 1 ? u"1 Tag"_s : u"%1 Tags"_s.arg(updates.size());
-    return UpdateSongs(database_, caption, std::move(updates), Renaming::BySettings);
+    return UpdateSongs(database_, caption, updates, Renaming::BySettings);
 }
 
 // --- What is shown ---
