@@ -28,7 +28,7 @@ constexpr std::int64_t kLargestWhole = std::int64_t{256} << 20;
 }
 
 QString RealPath(const QString& path) {
-    const QString real = QFileInfo(path).canonicalFilePath();
+    QString real = QFileInfo(path).canonicalFilePath();
     if (real.isEmpty()) ThrowSystemError(kCannotOpen, path, ENOENT);
     return real;
 }
