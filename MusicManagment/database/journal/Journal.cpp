@@ -33,6 +33,7 @@ BatchInfo InfoOf(const RestOfBatch& rest) {
 
 std::vector<BatchInfo> InfosOf(const std::vector<RestOfBatch>& list) {
     std::vector<BatchInfo> infos;
+    infos.reserve(list.size());
     for (const RestOfBatch& rest : list)
         infos.push_back(InfoOf(rest));
     return infos;

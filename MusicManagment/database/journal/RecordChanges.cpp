@@ -66,11 +66,11 @@ class Application {
             ++result_.LeftAlone;
             return;
         }
-        TID3Tag record = Merged(*song, before, after);
+        const TID3Tag record = Merged(*song, before, after);
         nowAt_.remove(song->FileName);
         nowAt_.insert(record.FileName, handle);
         handles_.insert(handle.Slot, handle);
-        changed_.insert(handle.Slot, std::move(record));
+        changed_.insert(handle.Slot, record);
     }
 
     void Remove(const TID3Tag& record) {
