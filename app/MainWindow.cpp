@@ -20,6 +20,8 @@
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/RWReg.h"
 #include "MusicManagment/database/Command.h"
+#include "MusicManagment/database/batches/BatchReport.h"
+#include "MusicManagment/database/batches/FlagBatch.h"
 #include "MusicManagment/database/commands/Settings.h"
 #include "MusicManagment/database/intake/IntakeReport.h"
 #include "app/ArrangementCommands.h"
@@ -31,7 +33,6 @@
 #include "app/SettingsCommands.h"
 #include "app/ShellCommands.h"
 #include "app/SongCommands.h"
-#include "app/SongFlags.h"
 #include "app/ToolWindows.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/NewInstallation.h"
@@ -202,9 +203,15 @@ void TTunesteadMainWnd::SetUpTagForm() {
     commands_.OnLeave = [&form] { return form.MayLeave(); };
     // After the click, in whose middle the list would change.
     songs_.OnFlagClick = [this](SongHandle song, bool on) {
-        QTimer::singleShot(
-            0, this, Guarded([this, song, on] { SetSongFlag(database_, song, database_.ShownFlag(), on); }));
+        const auto change = on ? FlagChange::Set : FlagChange::Remove;
+        QTimer::singleShot(0, this, Guarded([this, song, change] { ChangeShownFlag(song, change); }));
     };
+}
+
+void TTunesteadMainWnd::ChangeShownFlag(SongHandle song, FlagChange change) {
+    const auto flag = static_cast<TSongFlag>(database_.ShownFlag());
+    const BatchResult result = ChangeFlag(database_, OneSong(song), flag, change);
+    if (!result.Failed.isEmpty()) ReportBatch(result);
 }
 
 void TTunesteadMainWnd::ShowChosenTags() {

@@ -30,6 +30,7 @@ class BatchCommands;
 class SongCommands;
 class SongListWidget;
 class ToolWindows;
+enum class FlagChange;
 struct StartRequest;
 
 // What the main window is started with.
@@ -75,6 +76,7 @@ class TTunesteadMainWnd : public QMainWindow {
     void SetUpToolWindows();
     void SetUpTagForm();
     void ShowChosenTags();
+    void ChangeShownFlag(SongHandle song, FlagChange change);
     void StepTags(int rows);
     void FindNext();
     void ShowMarked();

@@ -52,25 +52,22 @@ ChosenSongs ReadSongs(TMusicDatabase& database, const QStringList& paths, Consol
     return chosen;
 }
 
-struct Planned {
-    SongUpdate Update;
-    TID3Tag Before;
-};
-
-std::vector<Planned> Plan(const TMusicDatabase& database, const ChosenSongs& chosen,
-                          const Arguments& arguments) {
+std::vector<SongUpdate> Plan(const TMusicDatabase& database, const ChosenSongs& chosen,
+                             const Arguments& arguments) {
     const TagAssignments assignments(arguments.Values(u"--set"));
     const auto cover = CoverOf(arguments);
-    std::vector<Planned> plans;
+    std::vector<SongUpdate> updates;
     for (const SongHandle song : chosen.Songs) {
         const TID3Tag& before = *database.Songs().Find(song);
-        Planned plan{.Update = {.Song = song, .Record = before}, .Before = before};
-        assignments.Apply(plan.Update.Record);
-        plan.Update.TrackTotal = assignments.TrackTotal();
-        plan.Update.Cover = cover;
-        plans.push_back(std::move(plan));
+        SongUpdate update{.Song = song,
+                          .Basis = before,
+                          .Record = before,
+                          .TrackTotal = assignments.TrackTotal(),
+                          .Cover = cover};
+        assignments.Apply(update.Record);
+        updates.push_back(std::move(update));
     }
-    return plans;
+    return updates;
 }
 
 void WriteDifferences(const TID3Tag& before, const TID3Tag& after, bool asJson, Console& console) {
@@ -91,21 +88,17 @@ void WriteDifferences(const TID3Tag& before, const TID3Tag& after, bool asJson, 
 }
 
 // What would happen, without the file.
-TID3Tag Expected(const TMusicDatabase& database, const Planned& plan, bool renames) {
-    TID3Tag record = plan.Update.Record;
-    if (renames) record.FileName = RenameTarget(database, plan.Before.FileName, record);
+TID3Tag Expected(const TMusicDatabase& database, const SongUpdate& update, bool renames) {
+    TID3Tag record = update.Record;
+    if (renames) record.FileName = RenameTarget(database, update.Basis.FileName, record);
     return record;
 }
 
-BatchResult CarryOut(TMusicDatabase& database, const std::vector<Planned>& plans, bool renames,
+BatchResult CarryOut(TMusicDatabase& database, const std::vector<SongUpdate>& updates, bool renames,
                      Console& console) {
     const JournalSession journal(console, &database);
     const RunWatcher watcher(database, console, StopBy::Interrupt);
-    std::vector<SongUpdate> updates;
-    updates.reserve(plans.size());
-    for (const Planned& plan : plans)
-        updates.push_back(plan.Update);
-    const QString caption = plans.size() == 1 ? u"1 Tag"_s : QString::number(plans.size()) + u" Tags"_s;
+    const QString caption = updates.size() == 1 ? u"1 Tag"_s : QString::number(updates.size()) + u" Tags"_s;
     return UpdateSongs(database, caption, updates, renames ? Renaming::BySettings : Renaming::Never,
                        u"Tags schreiben"_s);
 }
@@ -123,16 +116,16 @@ int RunTag(const Arguments& arguments, Console& console) {
     if (!fileName.isEmpty()) OpenForChanges(database, fileName, dryRun, console);
     const ChosenSongs chosen = fileName.isEmpty() ? ReadSongs(database, arguments.Operands(), console)
                                                   : NamedSongs(database, arguments.Operands(), console);
-    const std::vector<Planned> plans = Plan(database, chosen, arguments);
+    const std::vector<SongUpdate> updates = Plan(database, chosen, arguments);
     if (dryRun) {
-        for (const Planned& plan : plans)
-            WriteDifferences(plan.Before, Expected(database, plan, renames), asJson, console);
+        for (const SongUpdate& update : updates)
+            WriteDifferences(update.Basis, Expected(database, update, renames), asJson, console);
         return chosen.AllFound ? esDone : esFailed;
     }
-    const BatchResult result = CarryOut(database, plans, renames, console);
-    for (const Planned& plan : plans)
-        if (const TID3Tag* song = database.Songs().Find(plan.Update.Song))
-            WriteDifferences(plan.Before, *song, asJson, console);
+    const BatchResult result = CarryOut(database, updates, renames, console);
+    for (const SongUpdate& update : updates)
+        if (const TID3Tag* song = database.Songs().Find(update.Song))
+            WriteDifferences(update.Basis, *song, asJson, console);
     return ReportChanges(result, console) && chosen.AllFound ? esDone : esFailed;
 }
 

@@ -5,7 +5,7 @@
 #include <optional>
 #include <vector>
 
-#include "ReadMPEGHeader/ID3Tag.h"
+#include "MusicManagment/database/SongFields.h"
 
 // Changes of the fields of a record, as "FIELD=VALUE" names them: fields as in the JSON of a song, with
 // "trackTotal" besides. Genres go by number or name, flags by number or by names with commas between them,
@@ -20,7 +20,7 @@ class TagAssignments {
 
  private:
     struct Change {
-        void (*Set)(TID3Tag& record, const QString& value);
+        const SongField* Field;
         QString Value;
     };
     std::vector<Change> changes_;

@@ -147,9 +147,11 @@ bool SetFlags(TID3Tag& song, const QString& text) {
     const QStringList names = SongFlagNames();
     quint32 flags = song.Flags & ~((1U << names.size()) - 1);
     for (const QString& part : text.split(u',', Qt::SkipEmptyParts)) {
-        const qsizetype bit = names.indexOf(part.trimmed());
-        if (bit < 0) return !text.trimmed().isEmpty() && SetNumber<&TID3Tag::Flags>(song, text);
-        flags |= 1U << bit;
+        const auto named = std::ranges::find_if(names, [name = part.trimmed()](const QString& flag) {
+            return flag.compare(name, Qt::CaseInsensitive) == 0;
+        });
+        if (named == names.end()) return !text.trimmed().isEmpty() && SetNumber<&TID3Tag::Flags>(song, text);
+        flags |= 1U << (named - names.begin());
     }
     song.Flags = flags;
     return true;
@@ -386,4 +388,14 @@ QString SearchedText(const SongField& field, const TID3Tag& song) {
 
 std::span<const RecordMember> RecordMembers() {
     return kMembers;
+}
+
+TID3Tag MergedChange(TID3Tag song, const TID3Tag& before, const TID3Tag& after, MergeConflict conflict) {
+    const auto take = [&](auto member) {
+        const bool isFree = conflict == MergeConflict::TakesMerged || song.*member == before.*member;
+        if (before.*member != after.*member && isFree) song.*member = after.*member;
+    };
+    for (const RecordMember& row : kMembers)
+        std::visit(take, row.Member);
+    return song;
 }

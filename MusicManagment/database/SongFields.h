@@ -80,3 +80,9 @@ struct RecordMember {
 
 // All members of the record, in the order of its definition.
 std::span<const RecordMember> RecordMembers();
+
+// Which of two changes of the same member counts: the one that is merged, or the one that the song has had
+// meanwhile.
+enum class MergeConflict { TakesMerged, KeepsSong };
+// A song with the members in which two records differ, as the later of them has them; all others stay.
+TID3Tag MergedChange(TID3Tag song, const TID3Tag& before, const TID3Tag& after, MergeConflict conflict);

@@ -243,7 +243,8 @@ std::vector<SongUpdate> TagEdits::Updates() const {
     for (const Held& held : songs_) {
         const TID3Tag* record = database_.Songs().Find(held.Song);
         if (record == nullptr) continue;
-        SongUpdate update{.Song = held.Song, .Record = Edited(*record, place++), .Cover = cover_};
+        SongUpdate update{
+            .Song = held.Song, .Basis = *record, .Record = Edited(*record, place++), .Cover = cover_};
         if (total && total != held.Total) update.TrackTotal = total;
         if (update.Record != *record || update.TrackTotal || update.Cover)
             updates.push_back(std::move(update));

@@ -40,9 +40,7 @@ class SongUpdatesTest : public testing::Test {
     }
     const TID3Tag& Song(SongHandle song) const { return *database_.Songs().Find(song); }
     SongUpdate Titled(SongHandle song, const QString& title) const {
-        SongUpdate update;
-        update.Song = song;
-        update.Record = Song(song);
+        SongUpdate update{.Song = song, .Basis = Song(song), .Record = Song(song)};
         update.Record.Title = title;
         return update;
     }
@@ -123,6 +121,20 @@ TEST_F(SongUpdatesTest, TwoSongsOfOneBatchDoNotTakeTheSameName) {
     EXPECT_EQ(Song(a).FileName, folder_.Path(u"Queen - C.wav"_s));
     EXPECT_EQ(Song(b).FileName, folder_.Path(u"Queen - B.wav"_s));
     EXPECT_TRUE(result.Stopped);
+}
+
+TEST_F(SongUpdatesTest, WhatChangedMeanwhileStaysBesideAnEdit) {
+    const SongHandle a = Add(u"Queen - A.wav"_s);
+    const SongUpdate edit = Titled(a, u"X"_s);
+    TID3Tag played = Song(a);
+    played.PlayCount = 3;
+    database_.UpdateEntry(database_.Songs().PositionOf(a), played);
+    UpdateSongs(database_, u"1 Tag"_s, {edit}, Renaming::Never);
+    EXPECT_TRUE(Song(a).Title == u"X"_s && Song(a).PlayCount == 3);
+    EXPECT_EQ(Reread(a).PlayCount, 3u);
+    const SongIndex place =
+        UpdateSongEntry(database_, database_.Songs().PositionOf(a), Titled(a, u"Y"_s).Record, true);
+    EXPECT_EQ(database_.Song(place).FileName, folder_.Path(u"Queen - Y.wav"_s));
 }
 
 TEST_F(SongUpdatesTest, AFileThatCannotBeWrittenKeepsItsRecordAndTheOthersGoOn) {

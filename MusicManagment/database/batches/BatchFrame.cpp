@@ -22,6 +22,7 @@ std::vector<SongUpdate> Collect(TMusicDatabase& database, const BatchSongs& song
         const TID3Tag before = *song;
         if (auto update = maker(before)) {
             update->Song = songs.Songs[i];
+            update->Basis = before;
             updates.push_back(std::move(*update));
         }
         const qint64 now = CurrentClock().Ticks();

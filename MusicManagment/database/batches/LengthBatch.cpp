@@ -152,9 +152,7 @@ BatchResult EnterLength(TMusicDatabase& database, SongHandle song) {
     if (!seconds) throw EMusicDatabaseException(*text + u" ist keine Länge."_s);
     record = database.Songs().Find(song);
     if (record == nullptr) return {};
-    SongUpdate update;
-    update.Song = song;
-    update.Record = WithLength(*record, *seconds);
-    if (update.Record == *record) return {};
+    const SongUpdate update{.Song = song, .Basis = *record, .Record = WithLength(*record, *seconds)};
+    if (update.Record == update.Basis) return {};
     return UpdateSongs(database, u"Länge eingeben"_s, {update}, Renaming::Never);
 }

@@ -7,16 +7,6 @@
 
 namespace {
 
-TID3Tag Merged(TID3Tag song, const TID3Tag& before, const TID3Tag& after) {
-    for (const RecordMember& member : RecordMembers())
-        std::visit(
-            [&](auto field) {
-                if (before.*field != after.*field && song.*field == before.*field) song.*field = after.*field;
-            },
-            member.Member);
-    return song;
-}
-
 // Collects what is to happen to each song, however many of the changes are about it.
 class Application {
  public:
@@ -66,7 +56,7 @@ class Application {
             ++result_.LeftAlone;
             return;
         }
-        const TID3Tag record = Merged(*song, before, after);
+        const TID3Tag record = MergedChange(*song, before, after, MergeConflict::KeepsSong);
         nowAt_.remove(song->FileName);
         nowAt_.insert(record.FileName, handle);
         handles_.insert(handle.Slot, handle);

@@ -6,6 +6,7 @@
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/BannList.h"
 #include "MusicManagment/database/Progress.h"
+#include "MusicManagment/database/SongFields.h"
 #include "MusicManagment/database/journal/FileBatch.h"
 #include "MusicManagment/database/songfiles/RenameTarget.h"
 
@@ -61,7 +62,9 @@ class SongChanges {
         const TID3Tag* song = database_.Songs().Find(update.Song);
         if (song == nullptr) return;
         const TID3Tag before = *song;
-        SongItem item{.Song = update.Song, .Record = update.Record};
+        SongItem item{
+            .Song = update.Song,
+            .Record = MergedChange(before, update.Basis, update.Record, MergeConflict::TakesMerged)};
         item.Record.FileName = before.FileName;
         try {
             AddTags(item, update);
@@ -70,9 +73,10 @@ class SongChanges {
             return;
         }
         if (item.Record != before) item.ChangeFrom(before);
-        MoveTo(std::move(item), renaming == Renaming::BySettings
-                                    ? RenameTarget(database_, before.FileName, update.Record)
-                                    : before.FileName);
+        const QString target = renaming == Renaming::BySettings
+                                   ? RenameTarget(database_, before.FileName, item.Record)
+                                   : before.FileName;
+        MoveTo(std::move(item), target);
     }
 
     void Move(SongHandle song, const QString& target) {
@@ -269,9 +273,7 @@ BatchResult DiscardSongs(TMusicDatabase& database, const QString& caption,
 SongIndex UpdateSongEntry(TMusicDatabase& database, SongIndex index, const TID3Tag& info, bool rename) {
     if (index < 0 || index >= database.Count()) return -1;
     const SongHandle song = database.Songs().HandleOf(index);
-    SongUpdate update;
-    update.Song = song;
-    update.Record = info;
+    const SongUpdate update{.Song = song, .Basis = database.Song(index), .Record = info};
     const BatchResult result =
         UpdateSongs(database, u"1 Tag"_s, {update}, rename ? Renaming::BySettings : Renaming::Never);
     if (!result.Failed.isEmpty()) UserDialogs().ShowMessage(MessageKind::Error, result.Failed.join(u'\n'));

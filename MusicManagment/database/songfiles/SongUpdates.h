@@ -20,7 +20,10 @@ enum class TagAction {
 // What a song is to become.
 struct SongUpdate {
     SongHandle Song{};
-    TID3Tag Record{};                 // its path does not count
+    // The record that the update was made from, and as it is to be; paths do not count. Only what differs
+    // changes: a play that was counted meanwhile stays counted.
+    TID3Tag Basis{};
+    TID3Tag Record{};
     std::optional<int> TrackTotal{};  // for the tag; nothing: the one that stands there stays
     std::optional<CoverChange> Cover{};
     TagAction Tags = TagAction::Write;
