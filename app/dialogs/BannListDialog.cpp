@@ -49,14 +49,15 @@ void BannListDialog::SetUpLayout() {
     filter_->setPlaceholderText(u"Filtern"_s);
     filter_->setAccessibleName(u"Filter"_s);
     filter_->setClearButtonEnabled(true);
-    connect(filter_, &QLineEdit::textChanged, shown_, &QSortFilterProxyModel::setFilterFixedString);
+    connect(filter_, &QLineEdit::textChanged, shown_,
+            Guarded([this](const QString& text) { shown_->setFilterFixedString(text); }));
     view_->setModel(shown_);
     view_->setAccessibleName(u"Verbannte Songs"_s);
     view_->setUniformItemSizes(true);
     view_->setEditTriggers(QListView::NoEditTriggers);
     view_->setSelectionMode(QListView::ExtendedSelection);
     auto* deleteKey = new QShortcut(QKeySequence::Delete, view_, nullptr, nullptr, Qt::WidgetShortcut);
-    connect(deleteKey, &QShortcut::activated, this, [this] { RemoveChosen(); });
+    connect(deleteKey, &QShortcut::activated, this, Guarded([this] { RemoveChosen(); }));
     auto* side = new QVBoxLayout;
     const auto addButton = [this, side](const QString& caption, std::function<void()> run) {
         auto* button = new QPushButton(caption, this);
