@@ -6,6 +6,7 @@
 #include "MusicManagment/database/batches/GenreAdaption.h"
 #include "MusicManagment/database/batches/LengthBatch.h"
 #include "MusicManagment/database/batches/TagBatch.h"
+#include "MusicManagment/database/batches/TagsFromNames.h"
 #include "MusicManagment/database/journal/Journal.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
@@ -170,6 +171,23 @@ TEST_F(SongUpdatesTest, FlagsAreWrittenOnceAndTagsAreRemovedAndReadAgain) {
     EXPECT_EQ(RereadTags(database_, all).Changed, 1);
     EXPECT_EQ(Song(a).Title, u"Z"_s);
     EXPECT_EQ(Song(a).PlayCount, 7u);
+}
+
+TEST_F(SongUpdatesTest, TagsFromNamesLeaveTheNamesAndAreTakenBackTogether) {
+    const SongHandle a = Add(u"1999/07 A.wav"_s);
+    const SongHandle b = Add(u"1999/B.wav"_s);
+    const QByteArray before = folder_.Get(u"1999/07 A.wav"_s);
+    const BatchResult result =
+        TakeTagsFromNames(database_, AllSongs(database_), NameMatcher(u"%YEAR%/%TRACKNR% %TITLE%"_s));
+    EXPECT_EQ(result.Changed, 1);
+    EXPECT_EQ(result.Renamed, 0) << "although the settings rename what changes";
+    const TID3Tag written = Reread(a);
+    EXPECT_EQ(written.Title + written.Year + QString::number(written.Track), u"A19997"_s);
+    EXPECT_EQ(Song(b).Year, u"0000"_s);
+    EXPECT_EQ(journal_.ToUndo()->Caption, u"Tags aus Dateinamen (1 Song)"_s);
+    journal_.Undo(&database_);
+    EXPECT_EQ(folder_.Get(u"1999/07 A.wav"_s), before);
+    EXPECT_EQ(Song(a).Year, u"0000"_s);
 }
 
 TEST_F(SongUpdatesTest, GenresAreAdaptedFromTheSameArtistOrAsked) {
