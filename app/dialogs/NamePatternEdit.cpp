@@ -6,15 +6,26 @@
 #include <QMenu>
 #include <QPushButton>
 
+#include "CommonRUKTools/CommandRunner.h"
 #include "app/dialogs/NamePatternTexts.h"
 
 using namespace Qt::StringLiterals;
+
+namespace {
+
+// What is wrong is said while it is typed, so that nobody has to wait for a message.
+QString ExampleOf(const QString& pattern) {
+    return FaultOfPattern(pattern).value_or(u"Beispiel: "_s + ExampleName(pattern));
+}
+
+}  // namespace
 
 NamePatternEdit::NamePatternEdit(QWidget* parent)
     : QWidget(parent),
       edit_(new QLineEdit(this)),
       insert_(new QPushButton(u"&Platzhalter"_s, this)),
-      example_(new QLabel(this)) {
+      shown_(new QLabel(this)),
+      description_(ExampleOf) {
     setFocusProxy(edit_);
     edit_->setObjectName(u"pattern"_s);
     edit_->setAccessibleName(u"Muster für die Dateinamen"_s);
@@ -22,22 +33,22 @@ NamePatternEdit::NamePatternEdit(QWidget* parent)
     insert_->setObjectName(u"placeholders"_s);
     insert_->setToolTip(u"Fügt einen Platzhalter an der Schreibmarke ein"_s);
     setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Preferred);
-    example_->setObjectName(u"example"_s);
-    example_->setTextFormat(Qt::PlainText);
-    example_->setWordWrap(true);
+    shown_->setObjectName(u"example"_s);
+    shown_->setTextFormat(Qt::PlainText);
+    shown_->setWordWrap(true);
     // A long pattern without blanks does not make the window wider.
-    QSizePolicy policy = example_->sizePolicy();
+    QSizePolicy policy = shown_->sizePolicy();
     policy.setHorizontalPolicy(QSizePolicy::Ignored);
-    example_->setSizePolicy(policy);
+    shown_->setSizePolicy(policy);
     AddPlaceholders();
     auto* layout = new QGridLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->setColumnStretch(0, 1);
     layout->addWidget(edit_, 0, 0);
     layout->addWidget(insert_, 0, 1);
-    layout->addWidget(example_, 1, 0, 1, 2);
-    connect(edit_, &QLineEdit::textChanged, this, [this] { ShowExample(); });
-    ShowExample();
+    layout->addWidget(shown_, 1, 0, 1, 2);
+    connect(edit_, &QLineEdit::textChanged, this, Guarded([this] { ShowDescription(); }));
+    ShowDescription();
 }
 
 QString NamePatternEdit::Pattern() const {
@@ -54,16 +65,19 @@ void NamePatternEdit::AddPlaceholders() {
     for (const PlaceholderText& text : PlaceholderTexts()) {
         const QString name = QString::fromUtf16(text.Name);
         connect(menu->addAction(QString::fromUtf16(text.Meaning) + u'\t' + name), &QAction::triggered, this,
-                [this, name] {
+                Guarded([this, name] {
                     edit_->insert(name);
                     edit_->setFocus();
-                });
+                }));
     }
     insert_->setMenu(menu);
 }
 
-// What is wrong is said while it is typed, so that nobody has to wait for a message.
-void NamePatternEdit::ShowExample() {
-    const auto fault = FaultOfPattern(Pattern());
-    example_->setText(fault ? *fault : u"Beispiel: "_s + ExampleName(Pattern()));
+void NamePatternEdit::SetDescription(Description description) {
+    description_ = std::move(description);
+    ShowDescription();
+}
+
+void NamePatternEdit::ShowDescription() {
+    shown_->setText(description_(Pattern()));
 }
