@@ -8,7 +8,9 @@
 #include "MusicManagment/database/batches/TagBatch.h"
 #include "app/dialogs/BannListDialog.h"
 #include "app/dialogs/RenameDialog.h"
+#include "app/dialogs/TagsFromNamesDialog.h"
 #include "app/views/SongListWidget.h"
+#include "app/views/WindowSettings.h"
 
 using namespace Qt::StringLiterals;
 
@@ -30,6 +32,7 @@ QString DiscardQuestion(const TMusicDatabase& database, const std::vector<SongHa
 
 BatchCommands::BatchCommands(TMusicDatabase& database, SongListWidget& list)
     : database_(database), list_(list) {
+    database_.JoinSettings(*this);
     const auto handle = [this](int id, std::function<void()> run) {
         handlers_ += database_.Commands().Handle(id, {.Run = std::move(run)});
     };
@@ -39,6 +42,7 @@ BatchCommands::BatchCommands(TMusicDatabase& database, SongListWidget& list)
     handle(mcRemoveTags, [this] { RemoveTags(); });
     handle(mcRereadTags, [this] { RereadTags(); });
     handle(mcRenameByPattern, [this] { RenameByPattern(); });
+    handle(mcTagsFromNames, [this] { TakeTagsFromNames(); });
     handle(mcEditBannList, [this] { EditBannList(); });
     for (const int id : {mcSetFlag, mcRemoveFlag})
         handle(id, [this, id] { ChangeFlag(id); });
@@ -110,6 +114,25 @@ void BatchCommands::RenameByPattern() {
     const std::vector<SongMove> moves = dialog.Moves();
     if (!moves.empty())
         ReportBatch(MoveSongs(database_, SongCountText(moves.size()) + u" umbenennen"_s, moves));
+}
+
+void BatchCommands::TakeTagsFromNames() {
+    const BatchSongs songs = Chosen();
+    if (songs.IsEmpty()) return;
+    TagsFromNamesDialog dialog(database_, songs.Songs,
+                               tagPattern_.isEmpty() ? database_.MP3NamePattern() : tagPattern_,
+                               list_.window());
+    if (dialog.exec() != QDialog::Accepted) return;
+    tagPattern_ = dialog.Pattern();
+    ReportBatch(::TakeTagsFromNames(database_, songs, NameMatcher(tagPattern_)));
+}
+
+void BatchCommands::LoadSettings(const TRWReg& settings) {
+    tagPattern_ = ReadSetting(settings, WindowSettings::kTagsFromNamesPattern).value_or(tagPattern_);
+}
+
+void BatchCommands::SaveSettings(TRWReg& settings) const {
+    WriteSetting(settings, WindowSettings::kTagsFromNamesPattern, tagPattern_);
 }
 
 void BatchCommands::EditBannList() {

@@ -2,14 +2,18 @@
 
 #include "CommonRUKTools/Listeners.h"
 #include "MusicManagment/database/batches/BatchSongs.h"
+#include "MusicManagment/database/commands/Settings.h"
 
 class SongListWidget;
 
 // The batch commands about the songs that the list has marked, and those that take them off the disk. Each
 // tells itself what came of it.
-class BatchCommands {
+class BatchCommands : public SettingsClient {
  public:
     BatchCommands(TMusicDatabase& database, SongListWidget& list);
+
+    void LoadSettings(const TRWReg& settings) override;
+    void SaveSettings(TRWReg& settings) const override;
 
  private:
     BatchSongs Chosen() const;
@@ -21,9 +25,11 @@ class BatchCommands {
     void RereadTags();
     void Discard(int id);
     void RenameByPattern();
+    void TakeTagsFromNames();
     void EditBannList();
 
     TMusicDatabase& database_;
     SongListWidget& list_;
+    QString tagPattern_;  // of the last time that tags were taken from names
     Subscriptions handlers_;
 };

@@ -61,6 +61,7 @@ enum MenuCommand : int {
     mcRereadTags = 604,
     mcRenameByPattern = 605,
     mcEditBannList = 606,
+    mcTagsFromNames = 607,
     mcAllSongsSubmenu = 610,
     mcAdaptAllGenres = 611,
     mcSetFlagOfAll = 612,

@@ -2,6 +2,7 @@
 
 #include <QRegularExpression>
 
+#include "MusicManagment/database/songfiles/NameMatch.h"
 #include "MusicManagment/database/songfiles/NamePattern.h"
 
 using namespace Qt::StringLiterals;
@@ -33,6 +34,15 @@ QString UnknownPlaceholder(QString pattern) {
         pattern.remove(name);
     static const QRegularExpression expression(u"%[A-Za-z]\\w*%"_s);
     return expression.match(pattern).captured();
+}
+
+// Whatever it is for.
+std::optional<QString> FaultOfText(const QString& pattern) {
+    if (pattern.trimmed().isEmpty()) return u"Das Muster für die Dateinamen ist leer."_s;
+    const QString unknown = UnknownPlaceholder(pattern);
+    if (unknown.isEmpty()) return std::nullopt;
+    return u"Den Platzhalter "_s + unknown +
+           u" im Muster für die Dateinamen gibt es nicht. Platzhalter werden groß geschrieben."_s;
 }
 
 bool HasPlaceholder(const QString& pattern) {
@@ -72,12 +82,14 @@ QString ExampleName(const QString& pattern) {
 }
 
 std::optional<QString> FaultOfPattern(const QString& pattern) {
-    if (pattern.trimmed().isEmpty()) return u"Das Muster für die Dateinamen ist leer."_s;
-    const QString unknown = UnknownPlaceholder(pattern);
-    if (!unknown.isEmpty())
-        return u"Den Platzhalter "_s + unknown +
-               u" im Muster für die Dateinamen gibt es nicht. Platzhalter werden groß geschrieben."_s;
+    if (auto fault = FaultOfText(pattern)) return fault;
     if (!HasPlaceholder(pattern))
         return u"Das Muster für die Dateinamen enthält keinen Platzhalter: alle Songs bekämen denselben Namen."_s;
     return std::nullopt;
+}
+
+std::optional<QString> FaultOfReading(const QString& pattern) {
+    if (auto fault = FaultOfText(pattern)) return fault;
+    const NameMatcher matcher(pattern);
+    return matcher.Fault().isEmpty() ? std::nullopt : std::optional(matcher.Fault());
 }

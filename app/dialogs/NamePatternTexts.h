@@ -20,5 +20,7 @@ TID3Tag ExampleSong();
 // The file name that a pattern gives an invented song.
 QString ExampleName(const QString& pattern);
 
-// What is wrong with a pattern, for the user; nothing when it can be used.
+// What is wrong with a pattern that files are to be named by, for the user; nothing when it can be used.
 std::optional<QString> FaultOfPattern(const QString& pattern);
+// The same of one that their names are to be read by.
+std::optional<QString> FaultOfReading(const QString& pattern);

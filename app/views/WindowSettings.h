@@ -13,6 +13,8 @@ inline constexpr Setting<QByteArray> kMainFormState{u"MainFormState"};
 inline constexpr Setting<QByteArray> kSongListColumns{u"SongListColumns"};
 // The flag that the song list shows as a mark; 0: the names of all flags.
 inline constexpr Setting<int> kSongListFlag{u"SongListFlag", 0, 0, sfRemixed};
+// By which tags were read from the names of files last; empty: that of the files' names.
+inline constexpr Setting<QString> kTagsFromNamesPattern{u"TagsFromNamesPattern"};
 inline constexpr Setting<QString> kLinkPath{u"LinkPath"};
 // Absent counts as true.
 inline constexpr Setting<bool> kFirstTime{u"FirstTime", true};

@@ -23,6 +23,10 @@ constexpr DatabaseCommand kRows[] = {
      .Icon = u"edit-copy",
      .For = kWriting},
     {.Id = mcRenameByPattern, .Caption = u"Umbenennen nach Muster...", .Keys = u"Shift+F2", .For = kWriting},
+    {.Id = mcTagsFromNames,
+     .Caption = u"Tags aus dem Dateinamen...",
+     .Keys = u"Ctrl+Shift+F2",
+     .For = kWriting},
     {.Id = mcEditBannList, .Caption = u"Bann-Liste bearbeiten...", .For = kWriting},
     {.Id = mcOpenExternally, .Caption = u"Mit externem Programm öffnen", .For = kWriting},
 };
