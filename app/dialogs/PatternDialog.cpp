@@ -17,7 +17,7 @@ using namespace Qt::StringLiterals;
 namespace {
 
 constexpr int kPauseMs = 250;
-constexpr int kWidth = 110;  // average characters
+constexpr int kWidth = 130;  // average characters
 constexpr int kHeight = 28;  // lines
 
 }  // namespace
@@ -43,11 +43,11 @@ class PatternDialog::Rows : public QAbstractTableModel {
         return parent.isValid() ? 0 : static_cast<int>(outcome_.Rows);
     }
     int columnCount(const QModelIndex& parent) const override {
-        return parent.isValid() ? 0 : static_cast<int>(outcome_.Headings.size());
+        return parent.isValid() ? 0 : static_cast<int>(outcome_.Columns.size());
     }
     QVariant headerData(int section, Qt::Orientation orientation, int role) const override {
         if (orientation != Qt::Horizontal || role != Qt::DisplayRole) return {};
-        return outcome_.Headings.value(section);
+        return outcome_.Columns[static_cast<std::size_t>(section)].Heading;
     }
     QVariant data(const QModelIndex& index, int role) const override {
         if (!index.isValid()) return {};
@@ -87,8 +87,10 @@ void PatternDialog::SetUpLayout() {
     table_->setTabKeyNavigation(false);
     table_->setAlternatingRowColors(true);
     table_->setTextElideMode(Qt::ElideMiddle);
+    table_->setWordWrap(false);
     table_->verticalHeader()->hide();
-    table_->horizontalHeader()->setSectionResizeMode(QHeaderView::Stretch);
+    table_->horizontalHeader()->setHighlightSections(false);
+    table_->horizontalHeader()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
     summary_->setObjectName(u"summary"_s);
     summary_->setTextFormat(Qt::PlainText);
     summary_->setWordWrap(true);
@@ -124,7 +126,10 @@ void PatternDialog::Show() {
     pause_.stop();
     rows_->Renew([this] { return Plan(Pattern()); });
     const PatternOutcome& outcome = rows_->Outcome();
-    summary_->setText(outcome.Fault.value_or(Summary(outcome)));
+    for (int column = 0; const PatternColumn& each : outcome.Columns)
+        table_->horizontalHeader()->setSectionResizeMode(
+            column++, each.Narrow ? QHeaderView::ResizeToContents : QHeaderView::Stretch);
+    summary_->setText(outcome.Fault ? QString() : Summary(outcome));
     agree_->setEnabled(!outcome.Fault && outcome.Possible > 0);
 }
 

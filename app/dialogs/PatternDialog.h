@@ -1,9 +1,9 @@
 #pragma once
 
 #include <QDialog>
-#include <QStringList>
 #include <QTimer>
 #include <optional>
+#include <vector>
 
 #include "app/dialogs/NamePatternEdit.h"
 
@@ -11,10 +11,15 @@ class QLabel;
 class QPushButton;
 class QTableView;
 
+struct PatternColumn {
+    QString Heading;
+    bool Narrow = false;  // as wide as its texts; the others share the rest
+};
+
 // What the songs of a PatternDialog come to by a pattern.
 struct PatternOutcome {
     std::optional<QString> Fault{};  // what is wrong with the pattern; then nothing else counts
-    QStringList Headings{};          // of the columns; the last tells what is in the way
+    std::vector<PatternColumn> Columns{};
     std::size_t Rows = 0;
     std::size_t Possible = 0;  // songs that something happens with
     std::size_t Blocked = 0;   // songs that something is in the way of
@@ -38,7 +43,7 @@ class PatternDialog : public QDialog {
 
     // The first look, when the constructor has everything that Plan and Cell need.
     void Begin(const QString& pattern);
-    // How the line below the pattern tells what comes of it.
+    // The line below the pattern; it tells what is wrong with it, too.
     void Describe(NamePatternEdit::Description description);
 
     // Looks at the songs. Cells are asked for when they are seen.

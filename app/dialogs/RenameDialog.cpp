@@ -21,7 +21,7 @@ PatternOutcome RenameDialog::Plan(const QString& pattern) {
     if (auto fault = FaultOfPattern(pattern)) return {.Fault = std::move(fault)};
     plans_ = PlanRenames(database_, songs_, pattern);
     const std::size_t possible = PossibleMoves(plans_).size();
-    return {.Headings = {u"Alter Name"_s, u"Neuer Name"_s, u"Im Weg"_s},
+    return {.Columns = {{u"Alter Name"_s}, {u"Neuer Name"_s}, {u"Im Weg"_s}},
             .Rows = plans_.size(),
             .Possible = possible,
             .Blocked = plans_.size() - possible};

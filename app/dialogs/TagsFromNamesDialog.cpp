@@ -35,10 +35,13 @@ PatternOutcome TagsFromNamesDialog::Plan(const QString& pattern) {
     fields_ = matcher.Fields();
     folders_ = matcher.Folders();
     plans_ = PlanTagsFromNames(database_, songs_, matcher);
-    PatternOutcome outcome{.Headings = {u"Datei"_s}, .Rows = plans_.size()};
-    for (const SongFieldId id : fields_)
-        outcome.Headings << QString::fromUtf16(FieldOf(id).Caption);
-    outcome.Headings << u"Im Weg"_s;
+    PatternOutcome outcome{.Columns = {{u"Datei"_s}}, .Rows = plans_.size()};
+    for (const SongFieldId id : fields_) {
+        const SongField& field = FieldOf(id);
+        outcome.Columns.push_back(
+            {.Heading = QString::fromUtf16(field.Caption), .Narrow = field.Number != nullptr});
+    }
+    outcome.Columns.push_back({u"Im Weg"_s});
     for (const PlannedTags& plan : plans_) {
         outcome.Possible += plan.Changes ? 1 : 0;
         outcome.Blocked += plan.Reading.Problem.isEmpty() ? 0 : 1;
@@ -74,7 +77,7 @@ QVariant TagsFromNamesDialog::FieldCell(const TID3Tag& before, const PlannedTags
         case Qt::DisplayRole:
             return text;
         case Qt::ToolTipRole:
-            return text == old ? u"%1 bleibt"_s.arg(text) : u"%1 (bisher: %2)"_s.arg(text, old);
+            return text == old ? text : u"%1 (bisher: %2)"_s.arg(text, old.isEmpty() ? u"leer"_s : old);
         case Qt::ForegroundRole:
             return text == old ? palette().color(QPalette::Disabled, QPalette::Text) : QVariant();
         default:

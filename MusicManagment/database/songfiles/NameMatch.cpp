@@ -273,7 +273,7 @@ QString NameMatcher::ProblemOf(const QString& text) const {
         }
     if (Walk(*this, text, Walk::Care::NeitherFieldsNorRepeats).Succeeds())
         return u"Der Name sagt zu demselben Platzhalter Verschiedenes"_s;
-    return u"Der Name passt nicht zum Muster"_s;
+    return u"Passt nicht zum Muster"_s;
 }
 
 TID3Tag WithNamedFields(TID3Tag record, const NameReading& reading) {
