@@ -23,6 +23,8 @@ constexpr struct {
     {u"%TRACKNR%", Id::Track}, {u"%MAINGENRE%", Id::MainGenre},
 };
 
+constexpr QStringView kTooMany = u"Der Name lässt sich auf zu viele Arten teilen";
+
 std::optional<SongFieldId> FieldFilledBy(const QString& placeholder) {
     for (const auto& row : kFilled)
         if (placeholder == QStringView(row.Name)) return row.Field;
@@ -163,8 +165,9 @@ std::vector<SongFieldId> NameMatcher::Fields() const {
 
 // --- A name ---
 
-// Looks for the values of the place-holders. What has failed is remembered, so that a name takes its length
-// times that of the pattern, however many blanks divide it.
+// Looks for the values of the place-holders. What has failed is remembered, so that it does not matter in how
+// many ways the blanks of a long name divide it. Where place-holders recur it may matter all the same: there
+// the number of tries is bounded.
 class NameMatcher::Walk {
  public:
     // What counts; less of it where nothing fits, to tell why.
@@ -179,10 +182,16 @@ class NameMatcher::Walk {
           failed_(parts_.size(), std::vector<bool>(static_cast<std::size_t>(text.size()) + 1)) {}
 
     bool Succeeds() { return Fits(0, 0); }
+    // Whether there were more ways to divide the name than it could try.
+    bool GaveUp() const { return tries_ > kMostTries; }
     // Only when it has succeeded.
     const QString& Value(std::size_t placeholder) const { return *values_[placeholder]; }
 
  private:
+    static constexpr int kMostTries = 50'000;
+
+    bool RepeatsCount() const { return care_ != Care::NeitherFieldsNorRepeats; }
+
     // Whether the text from there on is what the parts from this one on say.
     bool Fits(std::size_t part, qsizetype at) {
         if (part == parts_.size()) return at == text_.size();
@@ -196,7 +205,7 @@ class NameMatcher::Walk {
     bool PartFits(std::size_t part, qsizetype at) {
         const auto number = parts_[part].Number;
         if (!number) return TextFits(part, parts_[part].Text, at);
-        const bool stoodBefore = values_[*number] && care_ != Care::NeitherFieldsNorRepeats;
+        const bool stoodBefore = values_[*number] && RepeatsCount();
         return stoodBefore ? TextFits(part, *values_[*number], at) : ValueFits(part, *number, at);
     }
 
@@ -209,10 +218,11 @@ class NameMatcher::Walk {
         const qsizetype separator = text_.indexOf(u'/', at);
         const qsizetype last = separator < 0 ? text_.size() : separator;
         for (qsizetype end = EndFrom(part, at); end >= 0 && end <= last; end = EndFrom(part, end + 1)) {
+            if (++tries_ > kMostTries) break;
             const QString value = text_.mid(at, end - at);
             if (care_ == Care::All && field && !EnteredIn(*field, value)) continue;
             values_[number] = value;
-            if (placeholders_[number].Recurs) ForgetBehind(part);
+            if (placeholders_[number].Recurs && RepeatsCount()) ForgetBehind(part);
             if (Fits(part + 1, end)) return true;
         }
         values_[number].reset();
@@ -237,6 +247,7 @@ class NameMatcher::Walk {
     Care care_;
     std::vector<std::optional<QString>> values_;  // one for each place-holder; nothing while it is open
     std::vector<std::vector<bool>> failed_;
+    int tries_ = 0;
 };
 
 // The part of the path that the pattern is about.
@@ -250,7 +261,7 @@ QString NameMatcher::TextOf(const QString& path) const {
 NameReading NameMatcher::Read(const QString& path) const {
     const QString text = TextOf(path);
     Walk walk(*this, text, Walk::Care::All);
-    if (!walk.Succeeds()) return {.Problem = ProblemOf(text)};
+    if (!walk.Succeeds()) return {.Problem = walk.GaveUp() ? kTooMany.toString() : ProblemOf(text)};
     NameReading reading;
     for (std::size_t i = 0; i < placeholders_.size(); ++i) {
         const auto& field = placeholders_[i].Field;
@@ -271,6 +282,7 @@ QString NameMatcher::ProblemOf(const QString& text) const {
             return u"%1 erwartet %2, nicht „%3“"_s.arg(field.Caption, field.Accepts,
                                                        anyValues.Value(i).trimmed());
         }
+    if (anyValues.GaveUp()) return kTooMany.toString();
     if (Walk(*this, text, Walk::Care::NeitherFieldsNorRepeats).Succeeds())
         return u"Der Name sagt zu demselben Platzhalter Verschiedenes"_s;
     return u"Passt nicht zum Muster"_s;
