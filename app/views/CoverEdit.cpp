@@ -47,8 +47,9 @@ CoverEdit::CoverEdit(TagEdits& edits, QWidget* parent)
     auto* paste = new QShortcut(QKeySequence::Paste, this);
     paste->setContext(Qt::WidgetWithChildrenShortcut);
     connect(paste, &QShortcut::activated, this, Guarded([this] {
-                if (editable_) Paste();
+                if (paste_->isEnabled()) Paste();
             }));
+    connect(QGuiApplication::clipboard(), &QClipboard::dataChanged, this, Guarded([this] { Refresh(); }));
     Refresh();
 }
 
@@ -91,7 +92,7 @@ void CoverEdit::Refresh() {
     state_->setText(State());
     const bool mayHaveOne = !picture.isEmpty() || differ_ || (!edits_.Cover() && !reason_.isEmpty());
     add_->setEnabled(editable_);
-    paste_->setEnabled(editable_);
+    paste_->setEnabled(editable_ && CanPaste());
     save_->setEnabled(!picture.isEmpty());
     remove_->setEnabled(editable_ && mayHaveOne);
 }
@@ -118,9 +119,13 @@ void CoverEdit::Add() {
     Tell();
 }
 
-void CoverEdit::Paste() {
+bool CoverEdit::CanPaste() {
     const QMimeData* held = QGuiApplication::clipboard()->mimeData();
-    if (held != nullptr) Take(*held);
+    return held != nullptr && MayHoldPicture(*held);
+}
+
+void CoverEdit::Paste() {
+    if (const QMimeData* held = QGuiApplication::clipboard()->mimeData()) Take(*held);
 }
 
 void CoverEdit::Take(const QMimeData& given) {

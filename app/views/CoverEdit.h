@@ -32,6 +32,7 @@ class CoverEdit : public QWidget {
  private:
     QPushButton* AddButton(const QString& name, const QString& caption, void (CoverEdit::*command)());
     void Add();
+    static bool CanPaste();
     void Paste();
     void Save();
     void Remove();
