@@ -4,7 +4,7 @@
 #include "CommonRUKTools/Errors.h"
 #include "ReadMPEGHeader/FieldValues.h"
 #include "ReadMPEGHeader/ReadingProfile.h"
-#include "ReadMPEGHeader/id3v2/ID3v2Header.h"
+#include "ReadMPEGHeader/id3v2/ID3v2Position.h"
 #include "ReadMPEGHeader/mpeg/FrameCount.h"
 
 using namespace Qt::StringLiterals;
@@ -16,8 +16,7 @@ constexpr std::int64_t kFramesOfDoubt = 2;
 
 std::optional<std::int64_t> FirstFrame(ByteSource& stream) {
     return ModernProfile().FindFirstFrame(stream, [&stream](std::int64_t position) {
-        const auto tag = ID3v2Header::Read(stream, position);
-        return tag ? position + static_cast<std::int64_t>(kId3v2HeaderSize) + tag->Size : position;
+        return EndOfID3v2Tag(stream, position).value_or(position);
     });
 }
 

@@ -1,24 +1,20 @@
 #include "ReadMPEGHeader/mpeg/FrameCount.h"
 
 #include <algorithm>
-#include <array>
 #include <optional>
-#include <string_view>
 
 #include "ReadMPEGHeader/SearchRange.h"
-#include "ReadMPEGHeader/mpeg/MpegFrame.h"
+#include "ReadMPEGHeader/mpeg/FrameSearch.h"
+#include "ReadMPEGHeader/mpeg/VbrHeader.h"
 
 namespace {
 
 constexpr std::size_t kHeaderSize = 4;
 constexpr std::size_t kLookAhead = kLargestIsoFrame + kHeaderSize;
 
-// What may stand behind the last frame.
-constexpr std::array<std::string_view, 6> kBehindAudio = {"TAG", "APETAGEX", "LYRICSBEGIN",
-                                                          "ID3", "RIFF",     "3DI"};
-
-bool IsBehindAudio(ByteSpan bytes) {
-    return std::ranges::any_of(kBehindAudio, [bytes](auto mark) { return StartsWith(bytes, mark); });
+// Beside the tags: they end a stream that is known to be one, but are no proof of a frame before them.
+bool EndsStream(ByteSpan bytes) {
+    return IsBehindAudio(bytes) || StartsWith(bytes, "RIFF") || StartsWith(bytes, "3DI");
 }
 
 std::optional<IsoFrame> FollowableFrame(ByteSpan bytes) {
@@ -47,10 +43,8 @@ class FrameWalk {
 
     // The frame that holds one has no sound.
     void ReadVbrHeader(const IsoFrame& frame) {
-        const ByteSpan bytes = Here().first(std::min(Here().size(), frame.Size));
-        if (bytes.size() < kVbrHeaderSpan) return;
-        const auto header = MpegHeader::DecodeModern({bytes[0], bytes[1], bytes[2], bytes[3]});
-        const auto vbr = FindVbrHeaderModern(bytes, header);
+        const ByteSpan bytes = Here();
+        const auto vbr = VbrHeaderIn(bytes.first(std::min(bytes.size(), frame.Size)));
         if (!vbr) return;
         count_.Announced = vbr->FrameCount;
         position_ += Length(frame);
@@ -59,7 +53,7 @@ class FrameWalk {
     // One frame further; false at the end.
     bool Step() {
         const ByteSpan bytes = Here();
-        if (bytes.size() < kHeaderSize || IsBehindAudio(bytes)) return false;
+        if (bytes.size() < kHeaderSize || EndsStream(bytes)) return false;
         const auto frame = FollowableFrame(bytes);
         if (!frame || !frame->Matches(count_.First)) return SkipToNextFrame();
         if (frame->Size > bytes.size()) return false;  // cut off, as the last frame of many files is
@@ -77,7 +71,7 @@ class FrameWalk {
         bool isPadding = true;
         for (; position_ < stream_.Size(); ++position_, ++skipped) {
             const ByteSpan bytes = Here();
-            if (bytes.empty() || IsBehindAudio(bytes)) break;
+            if (bytes.empty() || EndsStream(bytes)) break;
             if (IsConfirmed(bytes)) {
                 count_.Skipped += skipped;
                 return true;

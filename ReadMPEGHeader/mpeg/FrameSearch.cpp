@@ -15,27 +15,19 @@ namespace {
 // A frame and the header of the one behind it.
 constexpr std::size_t kLookAhead = std::max(kLargestIsoFrame + 4, kVbrHeaderSpan);
 
-// What may follow the last frame of a file.
 constexpr std::array<std::string_view, 4> kBehindAudio = {"TAG", "APETAGEX", "LYRICSBEGIN", "ID3"};
-
-bool HoldsVbrHeader(ByteSpan frame) {
-    if (frame.size() < kVbrHeaderSpan) return false;
-    const auto header = MpegHeader::DecodeModern({frame[0], frame[1], frame[2], frame[3]});
-    return FindVbrHeaderModern(frame, header).has_value();
-}
 
 // True when `bytes` begin with a frame that proves to be one: by a VBR header in it, or by what stands where
 // it ends. `bytes` hold what follows it, too, or reach to the end of the file.
 bool IsConfirmedFrame(ByteSpan bytes) {
     const auto frame = IsoFrame::Parse(bytes);
     if (!frame) return false;
-    if (HoldsVbrHeader(bytes)) return true;
+    if (VbrHeaderIn(bytes)) return true;
     if (frame->Size == 0 || frame->Size > bytes.size()) return false;
     const ByteSpan behind = bytes.subspan(frame->Size);
     if (behind.empty()) return true;  // the file ends with the frame
     const auto next = IsoFrame::Parse(behind);
-    return next ? next->Matches(*frame)
-                : std::ranges::any_of(kBehindAudio, [behind](auto mark) { return StartsWith(behind, mark); });
+    return next ? next->Matches(*frame) : IsBehindAudio(behind);
 }
 
 // Index of the next pair of bytes that is a sync, `bytes.size()` when there is none.
@@ -51,6 +43,10 @@ std::size_t NextSync(ByteSpan bytes, std::size_t from) {
 }
 
 }  // namespace
+
+bool IsBehindAudio(ByteSpan bytes) {
+    return std::ranges::any_of(kBehindAudio, [bytes](auto mark) { return StartsWith(bytes, mark); });
+}
 
 std::optional<FoundFrame> FindMpegFrame(ByteSource& stream, std::int64_t begin) {
     const std::int64_t end = std::min(stream.Size(), begin + kSearchBytes);

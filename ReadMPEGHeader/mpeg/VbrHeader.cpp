@@ -87,3 +87,8 @@ std::optional<VbrHeader> FindVbrHeaderModern(ByteSpan frame, const MpegHeader& h
     if (found && found->StreamBytes == 0u) found->StreamBytes.reset();
     return found;
 }
+
+std::optional<VbrHeader> VbrHeaderIn(ByteSpan frame) {
+    if (frame.size() < kVbrHeaderSpan) return std::nullopt;
+    return FindVbrHeaderModern(frame, MpegHeader::DecodeModern({frame[0], frame[1], frame[2], frame[3]}));
+}

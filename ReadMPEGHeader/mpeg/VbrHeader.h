@@ -32,3 +32,5 @@ std::optional<VbrHeader> FindVbrHeaderClassic(ByteSpan frame, const MpegHeader& 
 // "Xing", "Info" and "VBRI" as encoders write them: behind the side information of each version, with only
 // the fields that the flags announce; a size of 0 tells nothing.
 std::optional<VbrHeader> FindVbrHeaderModern(ByteSpan frame, const MpegHeader& header);
+// The same for a frame whose header is yet to be read.
+std::optional<VbrHeader> VbrHeaderIn(ByteSpan frame);
