@@ -77,14 +77,8 @@ void WriteOutcome(const Outcome& outcome, bool asJson, Console& console) {
     line.Begin();
     line.Number("changed", outcome.Changes.Changed);
     line.Number("renamed", outcome.Changes.Renamed);
-    line.BeginArray("failed");
-    for (const QString& failure : outcome.Changes.Failed)
-        line.Item(failure);
-    line.EndArray();
-    line.BeginArray("remarks");
-    for (const QString& remark : outcome.Remarks)
-        line.Item(remark);
-    line.EndArray();
+    line.Texts("failed", outcome.Changes.Failed);
+    line.Texts("remarks", outcome.Remarks);
     console.Write(line.End());
 }
 

@@ -130,6 +130,15 @@ void JsonLine::Text(std::string_view key, QStringView value) {
     PutQuoted(value);
 }
 
+void JsonLine::Texts(std::string_view key, const QStringList& values) {
+    BeginArray(key);
+    for (const QString& value : values) {
+        Separate();
+        PutQuoted(value);
+    }
+    EndArray();
+}
+
 void JsonLine::Number(std::string_view key, qint64 value) {
     PutKey(key);
     PutNumber(value);
@@ -159,11 +168,6 @@ void JsonLine::BeginArray(std::string_view key) {
 
 void JsonLine::EndArray() {
     Close(']');
-}
-
-void JsonLine::Item(QStringView value) {
-    Separate();
-    PutQuoted(value);
 }
 
 void JsonLine::BeginItem() {

@@ -1,7 +1,7 @@
 #pragma once
 
 #include <QByteArrayView>
-#include <QStringView>
+#include <QStringList>
 #include <string_view>
 #include <vector>
 
@@ -16,6 +16,7 @@ class JsonLine {
     QByteArrayView End();
 
     void Text(std::string_view key, QStringView value);
+    void Texts(std::string_view key, const QStringList& values);
     void Number(std::string_view key, qint64 value);
     // The shortest form that reads back as the same number; null for what JSON cannot hold.
     void Real(std::string_view key, double value);
@@ -24,7 +25,6 @@ class JsonLine {
 
     void BeginArray(std::string_view key);
     void EndArray();
-    void Item(QStringView value);
     void BeginItem();
     void EndItem();
 

@@ -41,10 +41,7 @@ void WriteResult(const IntakeResult& result, bool asJson, Console& console) {
     line.Number("known", result.Known);
     line.Number("banned", result.Banned);
     line.Number("unreadable", result.Unreadable);
-    line.BeginArray("files");
-    for (const QString& file : result.NewFiles)
-        line.Item(file);
-    line.EndArray();
+    line.Texts("files", result.NewFiles);
     console.Write(line.End());
 }
 

@@ -42,10 +42,7 @@ void WriteResult(const UndoResult& result, bool asJson, Console& console) {
     line.Begin();
     line.Text("caption", result.Caption);
     line.Number("items", result.Items);
-    line.BeginArray("problems");
-    for (const QString& problem : result.Problems)
-        line.Item(problem);
-    line.EndArray();
+    line.Texts("problems", result.Problems);
     console.Write(line.End());
 }
 

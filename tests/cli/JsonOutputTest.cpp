@@ -57,7 +57,6 @@ TEST(JsonOutput, ArraysAndObjectsNest) {
     for (int round = 0; round < 2; ++round) {  // the second line starts anew
         line.Begin();
         line.BeginArray("a");
-        line.Item(u"x");
         line.BeginItem();
         line.Number("n", -5);
         line.Null("z");
@@ -65,7 +64,9 @@ TEST(JsonOutput, ArraysAndObjectsNest) {
         line.BeginItem();
         line.EndItem();
         line.EndArray();
+        line.Texts("t", {u"x"_s, u"y"_s});
         line.Flag("f", true);
-        EXPECT_EQ(line.End().toByteArray(), "{\"a\":[\"x\",{\"n\":-5,\"z\":null},{}],\"f\":true}\n");
+        EXPECT_EQ(line.End().toByteArray(),
+                  "{\"a\":[{\"n\":-5,\"z\":null},{}],\"t\":[\"x\",\"y\"],\"f\":true}\n");
     }
 }
