@@ -9,6 +9,10 @@
 #include <optional>
 #include <utility>
 
+// For files that are read: that waits for the disk far more than it computes, so this does not follow the
+// number of cores.
+inline constexpr int kReadingThreads = 4;
+
 // Pieces of work with the numbers 0, 1, 2, ..., done by a few threads ahead of their turn and handed out in
 // their order. All questions come back on the caller's thread.
 template <typename Result>

@@ -1,9 +1,8 @@
 #include "MusicManagment/database/batches/LengthBatch.h"
 
 #include "CommonRUKTools/Dialogs.h"
-#include "CommonRUKTools/WorkAhead.h"
-#include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/batches/BatchFrame.h"
+#include "MusicManagment/database/batches/FilesAhead.h"
 #include "ReadMPEGHeader/DisplayTexts.h"
 #include "ReadMPEGHeader/LengthCheck.h"
 
@@ -11,7 +10,6 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr int kThreads = 4;
 constexpr int kLongestLength = 65535;  // seconds, as a record holds them
 
 constexpr BatchTexts kVerifying = {.All = u"Korrektheit von Länge und Format sicherstellen",
@@ -55,36 +53,6 @@ std::optional<SongUpdate> RecordOnly(const TID3Tag& song, TID3Tag record) {
     return update;
 }
 
-// The files of a batch, looked through by threads ahead of their turn.
-class FileChecks {
- public:
-    FileChecks(TMusicDatabase& database, const BatchSongs& songs)
-        : database_(database),
-          songs_(songs),
-          work_(songs.Songs.size(), kThreads, [this](std::size_t number, auto) { return WorkOf(number); }) {}
-
-    // The check of the next song that is still there. Nothing when the user stopped meanwhile.
-    std::optional<Checked> Next() {
-        do
-            work_.Next();
-        while (database_.Songs().Find(songs_.Songs[next_++]) == nullptr);
-        const auto goOn = [this] { return !database_.Progress(database_.LastProgress(), false, false); };
-        return work_.Take(goOn);
-    }
-
- private:
-    std::function<Checked()> WorkOf(std::size_t number) const {
-        const TID3Tag* song = database_.Songs().Find(songs_.Songs[number]);
-        if (song == nullptr) return {};
-        return [path = database_.ResolveSongPath(song->FileName)] { return CheckFile(path); };
-    }
-
-    TMusicDatabase& database_;
-    const BatchSongs& songs_;
-    std::size_t next_ = 0;
-    WorkAhead<Checked> work_;
-};
-
 LengthBatchResult MeasureLengths(TMusicDatabase& database, const BatchSongs& songs,
                                  const LengthMeasure& measure) {
     LengthBatchResult result;
@@ -105,7 +73,7 @@ LengthBatchResult VerifyLengths(TMusicDatabase& database, const BatchSongs& song
     if (measure) return MeasureLengths(database, songs, measure);
     LengthBatchResult result;
     QStringList failed;
-    FileChecks checks(database, songs);
+    FilesAhead<Checked> checks(database, songs, CheckFile);
     const auto maker = [&](const TID3Tag& song) -> std::optional<SongUpdate> {
         const auto checked = checks.Next();
         if (!checked) return std::nullopt;

@@ -2,6 +2,7 @@
 
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/batches/BatchFrame.h"
+#include "MusicManagment/database/batches/FilesAhead.h"
 #include "ReadMPEGHeader/FileNameTag.h"
 
 using namespace Qt::StringLiterals;
@@ -81,16 +82,19 @@ BatchResult RemoveTags(TMusicDatabase& database, const BatchSongs& songs) {
 }
 
 BatchResult RereadTags(TMusicDatabase& database, const BatchSongs& songs) {
-    BatchResult unread;
-    const ReadOptions options = database.AudioReadOptions();
+    QStringList unread;
+    FilesAhead<SongReading> files(
+        database, songs,
+        [options = database.AudioReadOptions()](const QString& path) { return ReadSong(path, options); });
     const auto maker = [&](const TID3Tag& song) -> std::optional<SongUpdate> {
-        SongReading reading = ReadSong(database.ResolveSongPath(song.FileName), options);
-        if (!reading.Succeeded()) {
-            unread.Failed << song.FileName + u": "_s + reading.Failure();
+        auto reading = files.Next();
+        if (!reading) return std::nullopt;
+        if (!reading->Succeeded()) {
+            unread << song.FileName + u": "_s + reading->Failure();
             return std::nullopt;
         }
         SongUpdate update;
-        update.Record = std::move(reading.Tag);
+        update.Record = std::move(reading->Tag);
         KeepCollectionFields(song, update.Record);
         update.Tags = TagAction::Leave;
         if (update.Record == song) return std::nullopt;
@@ -98,6 +102,6 @@ BatchResult RereadTags(TMusicDatabase& database, const BatchSongs& songs) {
     };
     BatchResult result =
         RunUpdates(database, songs, kRereading, u"ID3-Tags neu einlesen"_s, Renaming::Never, maker);
-    result.Failed = unread.Failed + result.Failed;
+    result.Failed = unread + result.Failed;
     return result;
 }

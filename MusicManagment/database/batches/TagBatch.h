@@ -14,5 +14,5 @@ bool MayRereadTags(BatchRange range);
 // The records get title and artist of the files' names.
 BatchResult RemoveTags(TMusicDatabase& database, const BatchSongs& songs);
 
-// Takes texts and technical data from the files again.
+// Takes texts and technical data from the files again, which several threads read.
 BatchResult RereadTags(TMusicDatabase& database, const BatchSongs& songs);

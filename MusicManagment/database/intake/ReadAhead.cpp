@@ -6,9 +6,6 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-// Reading waits for the disk far more than it computes, so this does not follow the number of cores.
-constexpr int kThreads = 4;
-
 SongReading ReadWhatever(const QString& path, const ReadOptions& options) {
     try {
         return ReadSong(path, options);
@@ -25,7 +22,7 @@ SongReading ReadWhatever(const QString& path, const ReadOptions& options) {
 ReadAhead::ReadAhead(QStringList paths, const ReadOptions& options,
                      std::function<bool(const QString& path)> isKnown)
     : paths_(std::move(paths)),
-      work_(static_cast<std::size_t>(paths_.size()), kThreads,
+      work_(static_cast<std::size_t>(paths_.size()), kReadingThreads,
             [this, &options, isKnown = std::move(isKnown)](
                 std::size_t number, WorkAhead<SongReading>::When when) -> WorkAhead<SongReading>::Work {
                 const QString& path = paths_[static_cast<qsizetype>(number)];

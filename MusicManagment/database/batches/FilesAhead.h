@@ -1,0 +1,44 @@
+#pragma once
+
+#include "CommonRUKTools/WorkAhead.h"
+#include "MusicManagment/database/batches/BatchSongs.h"
+
+// What a batch reads from the files of its songs: by threads, some files ahead of their turn, and handed out
+// in the order of the songs.
+template <typename Result>
+class FilesAhead {
+ public:
+    // Runs in several threads at a time.
+    using Reader = std::function<Result(const QString& path)>;
+
+    // Database and songs must live as long.
+    FilesAhead(TMusicDatabase& database, const BatchSongs& songs, Reader read)
+        : database_(database),
+          songs_(songs),
+          read_(std::move(read)),
+          work_(songs.Songs.size(), kReadingThreads,
+                [this](std::size_t number, auto) { return WorkOf(number); }) {}
+
+    // What was read for the next song that is still in the collection; there must be one. Lets the interface
+    // work while it is not there yet; nothing when the user stopped meanwhile. Throws what the reader threw.
+    std::optional<Result> Next() {
+        do
+            work_.Next();
+        while (database_.Songs().Find(songs_.Songs[next_++]) == nullptr);
+        const auto goOn = [this] { return !database_.Progress(database_.LastProgress(), false, false); };
+        return work_.Take(goOn);
+    }
+
+ private:
+    std::function<Result()> WorkOf(std::size_t number) const {
+        const TID3Tag* song = database_.Songs().Find(songs_.Songs[number]);
+        if (song == nullptr) return {};
+        return [read = read_, path = database_.ResolveSongPath(song->FileName)] { return read(path); };
+    }
+
+    TMusicDatabase& database_;
+    const BatchSongs& songs_;
+    Reader read_;
+    std::size_t next_ = 0;
+    WorkAhead<Result> work_;
+};
