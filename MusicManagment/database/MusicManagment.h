@@ -32,6 +32,12 @@ class EMusicDatabaseException : public ERukException {
     using ERukException::ERukException;
 };
 
+// Nobody can be asked for the lengths of songs (TMusicDatabase::OnMeasureLength).
+class ENoLengthMeasure : public ERukException {
+ public:
+    using ERukException::ERukException;
+};
+
 using TNotifyEvent = std::function<void(TMusicDatabase&)>;
 using TChangeEvent = std::function<void(TMusicDatabase&, SongIndex index, TChangeType change)>;
 // `platformItem` is the toolkit's own item, nullptr when the command came another way. With `proceed` set to
@@ -192,6 +198,7 @@ class TMusicDatabase : public QObject {
     const std::vector<CdName>& CDNames() const { return cdNames_; }
     void SetCDNames(
         std::vector<CdName> names);  // sorted by name; of one serial the last stays, serial 0 is dropped
+    // Whether lengths are verified by OnMeasureLength.
     bool UseWinAmpForLenCheck() const { return useWinAmpForLenCheck_; }
     void SetUseWinAmpForLenCheck(bool value) { useWinAmpForLenCheck_ = value; }
     bool ReadOnly() const { return readOnly_; }
@@ -310,6 +317,9 @@ class TMusicDatabase : public QObject {
     // A file is about to be moved or removed: whoever holds it open lets go of it, and returns what takes it
     // up again under the path that it has then. Empty where nobody holds it.
     std::function<std::function<void(const QString& path)>(const QString& path)> OnReleaseFile;
+    // Asks another player how long a song is, in milliseconds, and lets the interface work meanwhile. Throws
+    // ENoLengthMeasure when there is none to ask, another exception when it does not tell.
+    std::function<quint32(const QString& path)> OnMeasureLength;
     // The playlist has played all its songs; `showException` is whether the user is told.
     std::function<void(TMusicDatabase&, bool& showException)> OnAllFilesPlayed;
 

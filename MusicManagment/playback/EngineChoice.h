@@ -40,6 +40,9 @@ class EngineTable {
     // Sets how loud the back ends are that share a sound library, 0 to 1 of the amplitude; the others have a
     // loudness each (GainBackend.h).
     std::function<void(float gain)> SetSharedGain;
+    // Asks the other player how long a song is, in milliseconds. Throws EWinAmpMissing when there is none,
+    // EWinAmpException when it does not tell.
+    std::function<quint32(const QString& path, const EngineSettings& settings)> AskLength;
 
  private:
     std::map<TEngine, Maker> makers_;

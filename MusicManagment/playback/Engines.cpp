@@ -31,6 +31,13 @@ TWinAmpSettings WinAmpSettings(const EngineSettings& settings) {
     return winAmp;
 }
 
+quint32 AskWinAmp(const QString& path, const EngineSettings& settings) {
+    TWinAmpPlaySound song(WinAmpSettings(settings));
+    song.SetBackendFile(path);
+    song.Open();
+    return song.AskLength();
+}
+
 }  // namespace
 
 EngineTable MakeEngines(const std::shared_ptr<FmodLibrary>& library,
@@ -47,6 +54,7 @@ EngineTable MakeEngines(const std::shared_ptr<FmodLibrary>& library,
     table.Register(TEngine::WinAmp, [](const EngineSettings& settings) -> Backend {
         return std::make_unique<TWinAmpPlaySound>(WinAmpSettings(settings));
     });
+    table.AskLength = AskWinAmp;
     return table;
 }
 

@@ -43,6 +43,7 @@ class OwnEngines : public PlayTarget {
     bool IsOpen() const { return pair_.Current() != nullptr; }
     // The engine that has the song, be it after others refused.
     std::optional<TEngine> Engine() const { return IsOpen() ? std::optional(engine_) : std::nullopt; }
+    const EngineTable& Table() const { return opener_.Table(); }
     // Changes with every song that is opened or closed.
     unsigned Generation() const { return opener_.Generation(); }
     bool CanFade() const { return pair_.CurrentFades() != nullptr; }

@@ -243,6 +243,7 @@ void TPlaySound::SetMusicDatabase(TMusicDatabase* database) {
         if (database_->PlaySound() == this) {
             database_->SetPlaySound(nullptr);
             database_->OnReleaseFile = nullptr;
+            database_->OnMeasureLength = nullptr;
         }
     }
     database_ = database;
@@ -250,8 +251,21 @@ void TPlaySound::SetMusicDatabase(TMusicDatabase* database) {
     database->SetPlaySound(this);
     database->JoinSettings(*this);
     database->OnReleaseFile = [this](const QString& path) { return ReleaseFile(path); };
+    database->OnMeasureLength = [this](const QString& path) { return MeasureLength(path); };
     renaming_ =
         database->Events().Renamed.Subscribe([this](const PathChanges& renamed) { FollowRenamed(renamed); });
+}
+
+quint32 TPlaySound::MeasureLength(const QString& path) const {
+    if (!engines_.Table().AskLength) throw ENoLengthMeasure(u"Dieses Programm hat keinen Weg dorthin."_s);
+    // The other player has one song at a time.
+    if (engines_.Engine() == TEngine::WinAmp)
+        throw ENoLengthMeasure(u"Der Player spielt dort gerade einen Song ab."_s);
+    try {
+        return engines_.Table().AskLength(path, settings_);
+    } catch (const EWinAmpMissing& error) {
+        throw ENoLengthMeasure(error.Message());
+    }
 }
 
 void TPlaySound::SetPlayList(TPlayList* playList) {

@@ -115,7 +115,8 @@ class TPlaySound : public TPlaySoundContainer,
     // --- Wiring ---
     TMusicDatabase* MusicDatabase() const { return database_; }
     // The database gets its reference to this player, and keeps its settings. The player follows its songs to
-    // other paths, and lets go of a file that it moves or removes (OnReleaseFile).
+    // other paths, lets go of a file that it moves or removes (OnReleaseFile), and asks the WinAmp engine for
+    // the lengths of songs (OnMeasureLength).
     void SetMusicDatabase(TMusicDatabase* database);
     TPlayList* PlayList() const { return playList_; }
     // The playlist gets its reference to this player.
@@ -203,6 +204,7 @@ class TPlaySound : public TPlaySoundContainer,
     void StopTimers();
     void RestartAutoStop();
     SongIndex SongInDatabase() const;
+    quint32 MeasureLength(const QString& path) const;
 
     // PlaySoundFades.cpp
     bool FadesWanted() const;

@@ -227,6 +227,27 @@ TEST_F(SongUpdatesTest, ALengthIsEnteredAsMinutesOrSeconds) {
     EXPECT_EQ(Song(a).Length, 2);  // what the file really holds
 }
 
+TEST_F(SongUpdatesTest, LengthsAreAskedForUntilNobodyIsThereToAsk) {
+    const SongHandle a = Add(u"Queen - A.wav"_s);
+    const SongHandle b = Add(u"Queen - B.wav"_s);
+    database_.SetUseWinAmpForLenCheck(true);
+    std::function<void()> refuse = [] { throw ERukException(u"keine Länge"_s); };
+    database_.OnMeasureLength = [&](const QString& path) -> quint32 {
+        if (path == Song(b).FileName) refuse();
+        return 61'999;
+    };
+    LengthBatchResult result = VerifyLengths(database_, AllSongs(database_));
+    EXPECT_TRUE(Song(a).Length == 61 && Song(a).Flags == sfLengthCorrect && Song(b).Flags == 0);
+    EXPECT_EQ(result.Updates.Failed, QStringList{Song(b).FileName + u": keine Länge"_s});
+    EXPECT_EQ(result.Remark, QString());
+
+    refuse = [] { throw ENoLengthMeasure(u"Niemand da."_s); };
+    result = VerifyLengths(database_, AllSongs(database_));
+    EXPECT_TRUE(Song(a).Length == 2 && Song(b).Length == 2 && Song(b).Flags == sfLengthCorrect);
+    EXPECT_EQ(result.Updates.Failed, QStringList());
+    EXPECT_TRUE(result.Remark.endsWith(u"Niemand da."_s));
+}
+
 TEST(BatchSongs, ASingleMarkMeansTheSelectedSong) {
     const SongHandle marked{1, 1};
     const SongHandle selected{2, 1};

@@ -29,7 +29,9 @@ void ReportAdaption(const GenreAdaption& result) {
 }
 
 void ReportLengths(const LengthBatchResult& result) {
-    ReportBatch(result.Updates, {{u"Beschädigt"_s, result.Damaged, true}});
+    std::vector<ReportSection> sections = {{u"Beschädigt"_s, result.Damaged, true}};
+    if (!result.Remark.isEmpty()) sections.push_back({u"Hinweis"_s, {result.Remark}});
+    ReportBatch(result.Updates, std::move(sections));
 }
 
 void TellOfPassedMarks(const BatchSongs& songs) {

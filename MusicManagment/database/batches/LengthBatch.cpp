@@ -1,6 +1,9 @@
 #include "MusicManagment/database/batches/LengthBatch.h"
 
+#include <algorithm>
+
 #include "CommonRUKTools/Dialogs.h"
+#include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/database/batches/BatchFrame.h"
 #include "MusicManagment/database/batches/FilesAhead.h"
 #include "ReadMPEGHeader/DisplayTexts.h"
@@ -18,12 +21,12 @@ constexpr BatchTexts kVerifying = {.All = u"Korrektheit von Länge und Format si
 
 struct Checked {
     std::optional<LengthCheck> Check;
-    QString Failure;
+    QString Failure;  // why there is none
 };
 
 Checked CheckFile(const QString& path) {
     try {
-        return {.Check = CheckLength(path), .Failure = {}};
+        return {.Check = CheckLength(path), .Failure = u"In der Datei ist kein Klang gefunden worden"_s};
     } catch (const EStreamError& error) {
         return {.Check = {}, .Failure = error.Message()};
     }
@@ -53,44 +56,73 @@ std::optional<SongUpdate> RecordOnly(const TID3Tag& song, TID3Tag record) {
     return update;
 }
 
-LengthBatchResult MeasureLengths(TMusicDatabase& database, const BatchSongs& songs,
-                                 const LengthMeasure& measure) {
+LengthBatchResult RunCheck(TMusicDatabase& database, const BatchSongs& songs, const SongUpdateMaker& maker) {
     LengthBatchResult result;
-    const auto maker = [&](const TID3Tag& song) -> std::optional<SongUpdate> {
-        const int seconds = measure(database.ResolveSongPath(song.FileName));
-        if (seconds > 0) return RecordOnly(song, WithLength(song, std::min(seconds, kLongestLength)));
-        result.Damaged << song.FileName + u": Die Länge konnte nicht gemessen werden"_s;
-        return std::nullopt;
-    };
     result.Updates = RunUpdates(database, songs, kVerifying, u"Länge prüfen"_s, Renaming::Never, maker);
     return result;
 }
 
-}  // namespace
-
-LengthBatchResult VerifyLengths(TMusicDatabase& database, const BatchSongs& songs,
-                                const LengthMeasure& measure) {
-    if (measure) return MeasureLengths(database, songs, measure);
-    LengthBatchResult result;
+LengthBatchResult CountFrames(TMusicDatabase& database, const BatchSongs& songs) {
+    QStringList damaged;
     QStringList failed;
     FilesAhead<Checked> checks(database, songs, CheckFile);
     const auto maker = [&](const TID3Tag& song) -> std::optional<SongUpdate> {
         const auto checked = checks.Next();
         if (!checked) return std::nullopt;
-        if (!checked->Failure.isEmpty()) {
+        if (!checked->Check) {
             failed << song.FileName + u": "_s + checked->Failure;
             return std::nullopt;
         }
-        if (!checked->Check) {
-            failed << song.FileName + u": In der Datei ist kein Klang gefunden worden"_s;
-            return std::nullopt;
-        }
-        if (!checked->Check->Damage.isEmpty())
-            result.Damaged << song.FileName + u": "_s + checked->Check->Damage;
+        if (!checked->Check->Damage.isEmpty()) damaged << song.FileName + u": "_s + checked->Check->Damage;
         return RecordOnly(song, Verified(song, *checked->Check));
     };
-    result.Updates = RunUpdates(database, songs, kVerifying, u"Länge prüfen"_s, Renaming::Never, maker);
+    LengthBatchResult result = RunCheck(database, songs, maker);
+    result.Damaged = std::move(damaged);
     result.Updates.Failed = failed + result.Updates.Failed;
+    return result;
+}
+
+int AskForLength(const TMusicDatabase& database, const TID3Tag& song) {
+    const QString path = database.ResolveSongPath(song.FileName);
+    if (!FileSource::Exists(path)) throw EStreamError(u"Datei nicht gefunden"_s);
+    return static_cast<int>(std::min(database.OnMeasureLength(path) / 1000, quint32{kLongestLength}));
+}
+
+// Throws ENoLengthMeasure; nothing has happened then.
+LengthBatchResult AskForLengths(TMusicDatabase& database, const BatchSongs& songs) {
+    if (!database.OnMeasureLength) throw ENoLengthMeasure(u"Dieses Programm hat keinen Weg dorthin."_s);
+    QStringList failed;
+    const auto maker = [&](const TID3Tag& song) -> std::optional<SongUpdate> {
+        try {
+            return RecordOnly(song, WithLength(song, AskForLength(database, song)));
+        } catch (const ENoLengthMeasure&) {
+            throw;
+        } catch (const EAbort&) {
+            throw;
+        } catch (const ERukException& error) {
+            failed << song.FileName + u": "_s + error.Message();
+            return std::nullopt;
+        }
+    };
+    LengthBatchResult result = RunCheck(database, songs, maker);
+    result.Updates.Failed = failed + result.Updates.Failed;
+    return result;
+}
+
+}  // namespace
+
+LengthBatchResult VerifyLengths(TMusicDatabase& database, const BatchSongs& songs) {
+    if (!database.UseWinAmpForLenCheck()) return CountFrames(database, songs);
+    QString reason;
+    try {
+        return AskForLengths(database, songs);
+    } catch (const ENoLengthMeasure& error) {
+        reason = error.Message();
+    }
+    LengthBatchResult result = CountFrames(database, songs);
+    result.Remark =
+        u"Winamp kann nicht nach den Längen gefragt werden; stattdessen sind die Frames gezählt worden. "_s +
+        reason;
     return result;
 }
 

@@ -27,6 +27,12 @@ class EWinAmpException : public ERukException {
     using ERukException::ERukException;
 };
 
+// There is no other player, and none that could be started.
+class EWinAmpMissing : public EWinAmpException {
+ public:
+    using EWinAmpException::EWinAmpException;
+};
+
 // The way to the loudspeaker failed: no device, or the sound server has gone. Nothing is said of the song,
 // and no other engine would do better. Not derived from the engines' own classes, so that nobody takes it for
 // a failure of theirs.

@@ -50,6 +50,10 @@ QString Seconds(int milliseconds) {
     throw EWinAmpException(message);
 }
 
+[[noreturn]] void ThrowMissing(const QString& message) {
+    throw EWinAmpMissing(message);
+}
+
 // The place of a name on the bus among the players that are known to work, their number for another one.
 qsizetype RankOf(const QString& name) {
     const QStringList known = KnownPlayers();
@@ -164,6 +168,23 @@ quint32 TWinAmpPlaySound::GetLength() {
     return ToMilliseconds(state_.Length);
 }
 
+quint32 TWinAmpPlaySound::AskLength() {
+    if (wish_ == Wish::Nothing) return 0;
+    MprisState state = state_;
+    const auto isKnown = [player = player_, file = BackendFile(), &state] {
+        return state.Length > 0 || (player->ReadState(state) == MprisPlayer::Answer::Done &&
+                                    IsSameFile(state.File, file) && state.Length > 0);
+    };
+    const bool told = Undisturbed([&isKnown, disturbed = Disturbance(), timeout = settings_.FileTimeout] {
+        return WaitUntil([&] { return disturbed() || isKnown(); }, timeout);
+    });
+    if (!told)
+        Throw(u"Der Player "_s + player_->PlainName() + u" nennt keine Länge der Datei "_s + BackendFile() +
+              u"."_s);
+    state_.Length = state.Length;
+    return ToMilliseconds(state.Length);
+}
+
 // Players understand volume as it is set on a slider: about the root of the amplitude.
 void TWinAmpPlaySound::SetGain(float gain) {
     if (player_) player_->SendVolume(std::sqrt(static_cast<double>(gain)));
@@ -179,7 +200,7 @@ TPSStatus TWinAmpPlaySound::GetStatus() {
 
 void TWinAmpPlaySound::Load() {
     if (!settings_.Bus.isConnected())
-        Throw(u"Es gibt keinen Sitzungsbus (D-Bus), über den ein Player gesteuert werden könnte."_s);
+        ThrowMissing(u"Es gibt keinen Sitzungsbus (D-Bus), über den ein Player gesteuert werden könnte."_s);
     Player player = FindPlayer();
     if (!player || !HandFileOver(player)) player = StartAndWait();
     // From here on it is to be stopped when the song is closed; without one the former stays.
@@ -210,27 +231,27 @@ PlayerProgram TWinAmpPlaySound::ProgramToStart() const {
     if (name == kDefaultFile) {
         if (settings_.ClassName == kDefaultClass) {
             if (auto program = FindKnownPlayer()) return *program;
-            Throw(u"Es läuft kein Player, und keiner von diesen ist installiert: "_s +
-                  KnownPlayers().join(u", "_s) + u"."_s);
+            ThrowMissing(u"Es läuft kein Player, und keiner von diesen ist installiert: "_s +
+                         KnownPlayers().join(u", "_s) + u"."_s);
         }
         name = settings_.ClassName.toLower();
     }
     if (auto program = FindPlayerProgram(name)) return *program;
-    Throw(u"Kann den Player "_s + name + u" nicht finden."_s);
+    ThrowMissing(u"Kann den Player "_s + name + u" nicht finden."_s);
 }
 
 TWinAmpPlaySound::Player TWinAmpPlaySound::StartAndWait() {
     const PlayerProgram program = ProgramToStart();
     const std::optional<qint64> process = StartPlayer(program, BackendFile());
-    if (!process) Throw(u"Kann den Player "_s + program.Path + u" nicht starten."_s);
+    if (!process) ThrowMissing(u"Kann den Player "_s + program.Path + u" nicht starten."_s);
     Player player;
     Undisturbed([this, &player, disturbed = Disturbance(), timeout = settings_.StartTimeout] {
         return WaitUntil([&] { return disturbed() || (player = FindPlayer()) != nullptr; }, timeout);
     });
     if (player) return player;
     EndPlayer(program, *process);
-    Throw(u"Der Player "_s + program.Path + u" hat sich nicht innerhalb von "_s +
-          Seconds(settings_.StartTimeout) + u" Sekunden gemeldet."_s);
+    ThrowMissing(u"Der Player "_s + program.Path + u" hat sich nicht innerhalb von "_s +
+                 Seconds(settings_.StartTimeout) + u" Sekunden gemeldet."_s);
 }
 
 // False when the player has gone.
@@ -256,7 +277,7 @@ void TWinAmpPlaySound::StartAgainWithFile(const MprisPlayer& player) {
     const QString name = settings_.File == kDefaultFile ? player.PlainName() : settings_.File;
     const std::optional<PlayerProgram> program = FindPlayerProgram(name);
     if (!program || !StartPlayer(*program, BackendFile()))
-        Throw(u"Kann den Player "_s + name + u" nicht starten."_s);
+        ThrowMissing(u"Kann den Player "_s + name + u" nicht starten."_s);
 }
 
 void TWinAmpPlaySound::WaitForFile(const Player& player) {

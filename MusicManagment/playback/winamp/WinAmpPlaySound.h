@@ -33,7 +33,7 @@ class TWinAmpPlaySound : public TPlaySoundContainer, public GainBackend {
     explicit TWinAmpPlaySound(const TWinAmpSettings& settings = {}, QObject* parent = nullptr);
     ~TWinAmpPlaySound() override;
 
-    // These throw EWinAmpException.
+    // These throw EWinAmpException, EWinAmpMissing where there is no player.
     void Open() override;
     void Play() override;
     void Stop() override;
@@ -45,6 +45,9 @@ class TWinAmpPlaySound : public TPlaySoundContainer, public GainBackend {
     quint32 GetPosition() override;
     quint32 GetLength() override;
     TPSStatus GetStatus() override;
+    // The length of a song that was opened, in milliseconds; waits for a player that does not know it at
+    // once. Throws EWinAmpException when it does not tell.
+    quint32 AskLength();
     void SetGain(float gain) override;
 
  private:

@@ -167,6 +167,18 @@ TEST_F(WinAmpTest, WhatTheUserDoesInThePlayerIsNoticed) {
     EXPECT_EQ(sound->GetStatus(), psPlaying);
 }
 
+TEST_F(WinAmpTest, ALengthThatThePlayerLearnsLaterIsWaitedFor) {
+    player_.Appear();
+    player_.Length = 0;
+    const auto sound = Sound();
+    sound->Open();
+    QTimer::singleShot(0, sound.get(), [this] { player_.Length = 61'000'000; });
+    EXPECT_EQ(sound->AskLength(), 61000U);
+    player_.Vanish();
+    settings_.File = folder_.filePath(u"none"_s);
+    EXPECT_THROW(Sound()->Open(), EWinAmpMissing);
+}
+
 TEST_F(WinAmpTest, LoudnessIsThatOfTheOtherPlayersSlider) {
     const auto sound = Playing();
     sound->SetGain(0.25F);
