@@ -137,5 +137,7 @@ void BatchCommands::SaveSettings(TRWReg& settings) const {
 
 void BatchCommands::EditBannList() {
     BannListDialog dialog(database_.BannList(), list_.window());
-    if (dialog.exec() == QDialog::Accepted) database_.BannList() = dialog.List();
+    if (dialog.exec() != QDialog::Accepted) return;
+    database_.BannList() = dialog.List();
+    database_.Events().BannListChanged.Tell();
 }

@@ -3,6 +3,7 @@
 #include <QDir>
 
 #include "CommonRUKTools/CommandDispatcher.h"
+#include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/Command.h"
 #include "MusicManagment/database/MusicManagment.h"
@@ -30,6 +31,7 @@ bool SavedOrGivenUp(const std::function<bool()>& save, const QString& loss) {
 CollectionCommands::CollectionCommands(TMusicDatabase& database, StandardFiles files)
     : database_(database), files_(std::move(files)), bannList_(database.BannList(), files_) {
     database_.Lock().SetWanted(true);
+    handlers_ += database_.Events().BannListChanged.Subscribe(Guarded([this] { bannList_.Save(); }));
     const std::pair<int, void (CollectionCommands::*)()> commands[] = {
         {mcNew, &CollectionCommands::New},
         {mcOpen, &CollectionCommands::Open},

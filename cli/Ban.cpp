@@ -1,6 +1,5 @@
-#include "CommonRUKTools/FileSource.h"
-#include "MusicManagment/database/BannList.h"
 #include "MusicManagment/database/songfiles/SongUpdates.h"
+#include "cli/BannListKeeper.h"
 #include "cli/ChosenSongs.h"
 #include "cli/CommandLine.h"
 #include "cli/Commands.h"
@@ -36,7 +35,7 @@ int RunBan(const Arguments& arguments, Console& console) {
     const InterruptGuard guard;
     TMusicDatabase database;
     PrepareDatabase(database);
-    if (FileSource::Exists(listFile)) LoadBannList(database.BannList(), listFile);
+    const BannListKeeper list(database, listFile, console);
     if (lists) {
         WriteList(database, console);
         return esDone;
@@ -44,8 +43,7 @@ int RunBan(const Arguments& arguments, Console& console) {
     OpenForChanges(database, fileName, false, console);
     const ChosenSongs chosen = NamedSongs(database, arguments.Operands(), console);
     const BatchResult result = BanSongs(database, chosen, console);
-    SaveBannList(database.BannList(), listFile);
-    return ReportChanges(result, console) && chosen.AllFound ? esDone : esFailed;
+    return ReportChanges(result, console) && chosen.AllFound && list.IsKept() ? esDone : esFailed;
 }
 
 constexpr OptionRow kOptions[] = {

@@ -1,8 +1,7 @@
 #include <QDateTime>
 
 #include "CommonRUKTools/AbsolutePath.h"
-#include "CommonRUKTools/FileSource.h"
-#include "MusicManagment/database/BannList.h"
+#include "cli/BannListKeeper.h"
 #include "cli/CommandLine.h"
 #include "cli/Commands.h"
 #include "cli/JournalSession.h"
@@ -62,17 +61,13 @@ int RunUndo(const Arguments& arguments, Console& console) {
     TMusicDatabase database;
     PrepareDatabase(database);
     if (!fileName.isEmpty()) OpenForChanges(database, AbsolutePath(fileName), false, console);
-    const QString bannList = BannListFor(fileName, arguments);
-    if (FileSource::Exists(bannList)) LoadBannList(database.BannList(), bannList);
-    const int banned = database.BannList().Count();
+    const BannListKeeper bannList(database, BannListFor(fileName, arguments), console);
     const UndoResult result = journal.Undo(fileName.isEmpty() ? nullptr : &database);
     if (!fileName.isEmpty()) database.SaveAfterCommand();
-    if (database.BannList().Count() != banned && !bannList.isEmpty())
-        SaveBannList(database.BannList(), bannList);
     WriteResult(result, asJson, console);
     for (const QString& problem : result.Problems)
         console.Message(Printable(problem));
-    return result.Problems.isEmpty() ? esDone : esFailed;
+    return result.Problems.isEmpty() && bannList.IsKept() ? esDone : esFailed;
 }
 
 constexpr OptionRow kOptions[] = {

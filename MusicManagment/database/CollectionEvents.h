@@ -33,6 +33,8 @@ struct CollectionEvents {
     Listeners<> Cleared;
     // So many songs are about to come from a file.
     Listeners<int> Reserve;
+    // The ban list has other entries; told once a command, which has not ended yet.
+    Listeners<> BannListChanged;
     // A medium has come or gone: songs look different, none has changed.
     Listeners<> MediaChanged;
     Listeners<> ModifiedChanged;

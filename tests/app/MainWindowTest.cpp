@@ -25,6 +25,7 @@
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
 #include "tests/app/ScriptedBackend.h"
+#include "tests/database/RecordingTrash.h"
 #include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
@@ -347,6 +348,24 @@ TEST_F(MainWindowTest, TheSongThatWasAskedAboutIsRemovedAndUndoBringsItBack) {
     EXPECT_TRUE(undo->isEnabled());
     Command(u"Neue Datenbank"_s)->trigger();  // has nothing to take back
     EXPECT_EQ(undo->text(), u"&Rückgängig"_s);
+}
+
+TEST_F(MainWindowTest, TheFileOfTheBanListFollowsEachBanAndItsUndoAtOnce) {
+    const RecordingTrash trash;
+    MakeSongs(3);
+    Start({Music()});
+    int told = 0;
+    const Subscription watching = Database().Events().BannListChanged.Subscribe([&] { ++told; });
+    List().selectAll();
+    dialogs_.Answers = {kYes};
+    Database().ClickMenuItem(mcBan);
+    EXPECT_EQ(Database().Count(), 0);
+    EXPECT_EQ(folder_.Get(u"data/Tunestead3_BannList.str"_s).count("\r\n"), 3);
+    EXPECT_EQ(told, 1);
+    Command(u"Rückgängig: 3 Songs verbannen"_s)->trigger();
+    EXPECT_EQ(Database().Count(), 3);
+    EXPECT_EQ(folder_.Get(u"data/Tunestead3_BannList.str"_s), QByteArray());
+    EXPECT_EQ(told, 2);
 }
 
 TEST_F(MainWindowTest, WhatACommandOrAnEventHandlerThrowsIsTold) {

@@ -168,7 +168,7 @@ void FileBatch::ApplyWhatIsDone() {
         songs_ << applied.Songs;
         records_.clear();
     }
-    ApplyBans(*database_, std::exchange(bans_, {}));
+    if (ApplyBans(*database_, std::exchange(bans_, {}))) bannListChanged_ = true;
 }
 
 void FileBatch::Finish(const QString& caption) {
@@ -176,6 +176,8 @@ void FileBatch::Finish(const QString& caption) {
     const auto run = std::move(run_);
     run->Settle();
     ApplyWhatIsDone();
+    // Before the batch counts as ended: until then the next start brings the list up to date.
+    if (bannListChanged_) database_->Events().BannListChanged.Tell();
     run->Finish(caption, false);
     if (journal_ != nullptr && run->HasBegun()) journal_->Changed.Tell();
 }

@@ -97,6 +97,7 @@ class FileBatch {
     std::unique_ptr<BatchRun> run_;
     std::vector<RecordChange> records_;  // done on the disk, not yet in the database
     std::vector<BanChange> bans_;
+    bool bannListChanged_ = false;
     QStringList songs_;
     QStringList failures_;
     int done_ = 0;

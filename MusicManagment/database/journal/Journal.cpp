@@ -171,7 +171,7 @@ int Journal::BringUpToDate(TMusicDatabase& database) const {
                 records.push_back(loaded->Record);
         }
     }
-    ApplyBans(database, bans);
+    if (ApplyBans(database, bans)) database.Events().BannListChanged.Tell();
     return records.empty() ? 0
                            : static_cast<int>(ApplyRecords(database, records, Applying::Again).Songs.size());
 }

@@ -179,7 +179,7 @@ class TakingBack {
     void Apply() {
         if (database_ == nullptr) return;
         result_.Songs = ApplyRecords(*database_, records_).Songs;
-        ApplyBans(*database_, bans_);
+        if (ApplyBans(*database_, bans_)) database_->Events().BannListChanged.Tell();
     }
 
     JournalFile& source_;

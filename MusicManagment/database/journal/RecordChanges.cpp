@@ -101,11 +101,17 @@ AppliedRecords ApplyRecords(TMusicDatabase& database, const std::vector<RecordCh
     return application.Commit();
 }
 
-void ApplyBans(TMusicDatabase& database, const std::vector<BanChange>& changes) {
+bool ApplyBans(TMusicDatabase& database, const std::vector<BanChange>& changes) {
     SortedTextList& list = database.BannList();
+    bool changed = false;
     for (const BanChange& change : changes) {
         const int at = list.IndexOf(change.Entry);
-        if (change.Added && at < 0) list.Insert(change.Entry);
-        if (!change.Added && at >= 0) list.RemoveAt(at);
+        if (change.Added == (at >= 0)) continue;
+        if (change.Added)
+            list.Insert(change.Entry);
+        else
+            list.RemoveAt(at);
+        changed = true;
     }
+    return changed;
 }

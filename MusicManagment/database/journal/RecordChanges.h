@@ -23,4 +23,5 @@ enum class Applying {
 // to it since, a counted play for example, stays.
 AppliedRecords ApplyRecords(TMusicDatabase& database, const std::vector<RecordChange>& changes,
                             Applying how = Applying::First);
-void ApplyBans(TMusicDatabase& database, const std::vector<BanChange>& changes);
+// True when the ban list has other entries now; whoever calls tells of it (BannListChanged) once a command.
+bool ApplyBans(TMusicDatabase& database, const std::vector<BanChange>& changes);
