@@ -154,6 +154,7 @@ void TTunesteadMainWnd::SetUpStatusBar() {
 void TTunesteadMainWnd::SetUpMenu() {
     songCommands_ = std::make_unique<SongCommands>(database_, *list_, journal_);
     batchCommands_ = std::make_unique<BatchCommands>(database_, *list_);
+    songCommands_->OnOpenDatabase = [this](const QString& path) { commands_.OpenFile(path); };
     songCommands_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
     settingsCommands_ =
         std::make_unique<SettingsCommands>(*this, database_, kSettingsKey.toString(), options_.SettingsFile);

@@ -1,5 +1,8 @@
 #include "app/SongCommands.h"
 
+#include <QDir>
+#include <QFileInfo>
+
 #include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/Shell.h"
@@ -22,6 +25,13 @@ QStringList PathsOf(const TMusicDatabase& database, const std::vector<SongHandle
     for (const SongHandle song : songs)
         if (const TID3Tag* record = database.Songs().Find(song)) paths << record->FileName;
     return paths;
+}
+
+QString StepCaption(const QString& name, const UndoStep& step) {
+    if (step.Caption.isEmpty()) return name;
+    const QString caption = name + u": "_s + step.Caption;
+    return step.Elsewhere.isEmpty() ? caption
+                                    : caption + u" (in "_s + QFileInfo(step.Elsewhere).fileName() + u')';
 }
 
 }  // namespace
@@ -59,25 +69,40 @@ void SongCommands::HandleCommands() {
 void SongCommands::AddUndo() {
     AddStep(
         {.Id = scRedo, .Letter = u'w', .Keys = u"Ctrl+Shift+Z"_s, .Icon = u"edit-redo"_s},
-        u"Wiederherstellen"_s, [this] { return undo_.RedoCaption(); },
+        u"Wiederherstellen"_s, [this] { return undo_.ToRedo(); },
         [this] { Show(undo_.DoAgain(), u"Wiederhergestellt: "_s); });
     AddStep(
         {.Id = scUndo, .Letter = u'r', .Keys = u"Ctrl+Z"_s, .Icon = u"edit-undo"_s, .BehindLine = false},
-        u"Rückgängig"_s, [this] { return undo_.Caption(); },
+        u"Rückgängig"_s, [this] { return undo_.ToUndo(); },
         [this] { Show(undo_.TakeBack(), u"Rückgängig gemacht: "_s); });
     undoChanges_ = undo_.Changed.Subscribe([this] { database_.Commands().Changed.Tell(); });
 }
 
-void SongCommands::AddStep(ShellCommand command, const QString& name, const std::function<QString()>& what,
-                           std::function<void()> run) {
-    const auto caption = [name, what] { return what().isEmpty() ? name : name + u": "_s + what(); };
+void SongCommands::AddStep(ShellCommand command, const QString& name, const std::function<UndoStep()>& last,
+                           const std::function<void()>& run) {
+    const auto caption = [name, last] { return StepCaption(name, last()); };
+    const auto isEnabled = [this, last] {
+        const UndoStep step = last();
+        return !step.Caption.isEmpty() && (!step.Elsewhere.isEmpty() || !database_.ReadOnly());
+    };
+    const auto openAndRun = [this, last, run] {
+        OfferToOpen(last());
+        if (last().Elsewhere.isEmpty()) run();
+    };
     command.Caption = caption();
     command.Menu = u"Bearbeiten";
     command.Where = ShellCommand::Place::First;
-    handlers_ += database_.Commands().Add(
-        command, {.Run = std::move(run),
-                  .IsEnabled = [this, what] { return !what().isEmpty() && !database_.ReadOnly(); },
-                  .Caption = caption});
+    handlers_ +=
+        database_.Commands().Add(command, {.Run = openAndRun, .IsEnabled = isEnabled, .Caption = caption});
+}
+
+void SongCommands::OfferToOpen(const UndoStep& step) const {
+    if (step.Elsewhere.isEmpty() || !OnOpenDatabase) return;
+    const QString question = u'"' + step.Caption + u"\" gehört zu einer anderen Datenbank:\n"_s +
+                             QDir::toNativeSeparators(step.Elsewhere) +
+                             u"\n\nSoll sie dafür geöffnet werden?"_s;
+    if (UserDialogs().Ask({.Text = question, .Buttons = {u"Öffnen"_s, u"Abbrechen"_s}, .Cancel = 1}) == 0)
+        OnOpenDatabase(step.Elsewhere);
 }
 
 void SongCommands::Show(const UndoResult& result, const QString& done) {

@@ -20,13 +20,16 @@ class SongCommands {
 
     // Told what came of a command, in a sentence for the status bar.
     std::function<void(const QString&)> OnDone;
+    // Opens another collection, whose last step is to be taken back; the user may refuse.
+    std::function<void(const QString& path)> OnOpenDatabase;
 
  private:
     void HandleCommands();
     void AddUndo();
-    // A command of the list of steps; `what` is its last step, empty for none.
-    void AddStep(ShellCommand command, const QString& name, const std::function<QString()>& what,
-                 std::function<void()> run);
+    // A command of the list of steps.
+    void AddStep(ShellCommand command, const QString& name, const std::function<UndoStep()>& last,
+                 const std::function<void()>& run);
+    void OfferToOpen(const UndoStep& step) const;
     void Show(const UndoResult& result, const QString& done);
     void RemoveChosen();
     void CopyChosen();

@@ -45,6 +45,15 @@ void WriteResult(const UndoResult& result, bool asJson, Console& console) {
     console.Write(line.End());
 }
 
+UndoResult UndoIn(TMusicDatabase* database, Journal& journal) {
+    try {
+        return journal.Undo(database);
+    } catch (const EOtherDatabase& error) {
+        if (error.Database().isEmpty()) throw;
+        throw ERukException(error.Message() + u" (anzugeben mit --db)"_s);
+    }
+}
+
 int RunUndo(const Arguments& arguments, Console& console) {
     const bool asJson = arguments.Has(u"--json");
     const InterruptGuard guard;
@@ -56,13 +65,13 @@ int RunUndo(const Arguments& arguments, Console& console) {
         console.Message(u"Es gibt nichts, was rückgängig gemacht werden kann."_s);
         return esFailed;
     }
-    // The batch names its database; the option is for one that lies elsewhere by now.
+    // The batch names its database; any other is refused.
     const QString fileName = arguments.Has(u"--db") ? arguments.Value(u"--db") : last->Database;
     TMusicDatabase database;
     PrepareDatabase(database);
     if (!fileName.isEmpty()) OpenForChanges(database, AbsolutePath(fileName), false, console);
     const BannListKeeper bannList(database, BannListFor(fileName, arguments), console);
-    const UndoResult result = journal.Undo(fileName.isEmpty() ? nullptr : &database);
+    const UndoResult result = UndoIn(fileName.isEmpty() ? nullptr : &database, journal);
     if (!fileName.isEmpty()) database.SaveAfterCommand();
     WriteResult(result, asJson, console);
     for (const QString& problem : result.Problems)
@@ -71,7 +80,8 @@ int RunUndo(const Arguments& arguments, Console& console) {
 }
 
 constexpr OptionRow kOptions[] = {
-    {u"--db", u"DATENBANK", u"Sammlung, um deren Songs es geht; Vorgabe ist die, in der sie geändert wurden"},
+    {u"--db", u"DATENBANK",
+     u"Sammlung, um deren Songs es geht; Vorgabe ist die des letzten Vorgangs, eine andere wird abgelehnt"},
     kBannListOption,
     {u"--list", u"", u"zeigt nur, was rückgängig gemacht werden kann, das Letzte zuerst"},
     {u"--json", u"", u"ein JSON-Objekt je Vorgang und Zeile"},

@@ -346,8 +346,14 @@ TEST_F(MainWindowTest, TheSongThatWasAskedAboutIsRemovedAndUndoBringsItBack) {
     dialogs_.Answers = {kYes};
     Database().ClickMenuItem(mcRemoveFromDatabase);
     EXPECT_TRUE(undo->isEnabled());
-    Command(u"Neue Datenbank"_s)->trigger();  // has nothing to take back
-    EXPECT_EQ(undo->text(), u"&Rückgängig"_s);
+    Command(u"Neue Datenbank"_s)->trigger();  // has nothing to take back, but the other one has
+    EXPECT_EQ(undo->text(), u"&Rückgängig: 1 Song entfernen (in Tunestead3_Database.tsdb)"_s);
+    undo->trigger();
+    EXPECT_EQ(Database().Count(), 0);
+    dialogs_.Answers = {kYes};
+    undo->trigger();
+    EXPECT_EQ(Database().FileName(), StandardDatabase());
+    EXPECT_EQ(Database().Count(), 4);
 }
 
 TEST_F(MainWindowTest, TheFileOfTheBanListFollowsEachBanAndItsUndoAtOnce) {

@@ -75,6 +75,9 @@ TEST_F(ChangeCommandsTest, SongsAreFlaggedBannedAndBroughtBack) {
     EXPECT_EQ(Run(u"ban"_s, {u"--bannlist"_s, bans, u"--list"_s}).Out, u"Zoe - C\n"_s);
     EXPECT_EQ(Run(u"trash"_s, {Song(u"Anna - B.wav"_s)}).Status, esDone);
     EXPECT_EQ(Files(), QStringList{u"Anna - A.wav"_s});
+    RunWords({u"scan"_s, u"--db"_s, Path(u"other.tsdb"_s), Path(u"music"_s)});
+    const auto refused = RunWords({u"undo"_s, u"--db"_s, Path(u"other.tsdb"_s)});
+    EXPECT_TRUE(refused.Status == esFailed && refused.Err.contains(database_ + u" (anzugeben mit --db)"_s));
     EXPECT_EQ(RunWords({u"undo"_s}).Status, esDone);
     EXPECT_EQ(RunWords({u"undo"_s, u"--bannlist"_s, bans}).Status, esDone);
     EXPECT_EQ(Files().size(), 3);

@@ -9,6 +9,10 @@ UndoList::UndoList(TMusicDatabase& database, Journal& journal) : database_(datab
     subscriptions_ += database.Events().Replaced.Subscribe(tell);
 }
 
-QString UndoList::CaptionOf(const std::optional<BatchInfo>& batch) const {
-    return batch && batch->IsFor(database_) ? batch->Caption : QString();
+UndoStep UndoList::StepOf(const std::optional<BatchInfo>& batch) const {
+    if (!batch) return {};
+    if (batch->IsFor(database_)) return {.Caption = batch->Caption};
+    // The songs of a collection that was never saved are gone with it.
+    if (batch->Database.isEmpty()) return {};
+    return {.Caption = batch->Caption, .Elsewhere = batch->Database};
 }

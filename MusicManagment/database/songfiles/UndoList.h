@@ -7,23 +7,28 @@
 
 class TMusicDatabase;
 
-// What the journal has to take back for the collection that is open: the last batch, where it is about songs
-// of this one or about files alone.
+// A step that can be taken back, or done again.
+struct UndoStep {
+    QString Caption{};  // as a menu names it; empty when there is no step
+    // Path of the database that has to be opened before; empty when it is, or none is needed.
+    QString Elsewhere{};
+};
+
+// What the journal has to take back: the last batch, for the collection that is open or another one.
 class UndoList {
  public:
     UndoList(TMusicDatabase& database, Journal& journal);
 
-    // What would be taken back, and done again, as a menu names it; empty when there is nothing.
-    QString Caption() const { return CaptionOf(journal_.ToUndo()); }
-    QString RedoCaption() const { return CaptionOf(journal_.ToRedo()); }
-    // Throws what the journal throws.
+    UndoStep ToUndo() const { return StepOf(journal_.ToUndo()); }
+    UndoStep ToRedo() const { return StepOf(journal_.ToRedo()); }
+    // Throw what the journal throws.
     UndoResult TakeBack() { return journal_.Undo(&database_); }
     UndoResult DoAgain() { return journal_.Redo(&database_); }
 
     Listeners<> Changed;
 
  private:
-    QString CaptionOf(const std::optional<BatchInfo>& batch) const;
+    UndoStep StepOf(const std::optional<BatchInfo>& batch) const;
 
     TMusicDatabase& database_;
     Journal& journal_;
