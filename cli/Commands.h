@@ -30,6 +30,7 @@ extern const CommandRow kBatchCommand;
 extern const CommandRow kBanCommand;
 extern const CommandRow kTrashCommand;
 extern const CommandRow kUndoCommand;
+extern const CommandRow kDuplicatesCommand;
 
 // All of them, in the order of the help.
 std::span<const CommandRow* const> AllCommands();

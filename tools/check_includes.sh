@@ -10,7 +10,7 @@ cd "$(dirname "$(realpath "$0")")/.."
 floors="core sorting
 journal
 search songfiles tsdb
-batches intake
+batches duplicates intake
 commands"
 
 links=$(mktemp)

@@ -1,0 +1,151 @@
+#include "MusicManagment/database/duplicates/PairSearch.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <numeric>
+#include <random>
+
+#include "MusicManagment/database/duplicates/DuplicateSearch.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+using Match = TextBlocks::Match;
+
+// The distance as it is defined, cell by cell.
+std::size_t PlainDistance(std::u32string_view a, std::u32string_view b) {
+    std::vector<std::vector<std::size_t>> cell(a.size() + 1, std::vector<std::size_t>(b.size() + 1));
+    for (std::size_t i = 0; i <= a.size(); ++i)
+        for (std::size_t j = 0; j <= b.size(); ++j)
+            cell[i][j] = i == 0   ? j
+                         : j == 0 ? i
+                                  : std::min({cell[i - 1][j] + 1, cell[i][j - 1] + 1,
+                                              cell[i - 1][j - 1] + (a[i - 1] == b[j - 1] ? 0 : 1)});
+    return cell[a.size()][b.size()];
+}
+
+// Texts of all lengths up to `longest`, one in two made of an earlier one by some edits.
+ComparedTexts MakeTexts(std::size_t count, std::size_t longest, QStringView letters, std::mt19937& random) {
+    const auto below = [&random](auto limit) { return random() % static_cast<std::uint32_t>(limit); };
+    const auto letter = [&] { return letters[below(letters.size())]; };
+    std::vector<QString> made;
+    ComparedTexts texts;
+    while (made.size() < count) {
+        QString text;
+        if (made.empty() || below(2) == 0) {
+            for (std::size_t length = below(longest + 1); length > 0; --length)
+                text += letter();
+        } else {
+            text = made[below(made.size())];
+            for (std::size_t edits = below(static_cast<std::size_t>(text.size()) / 2 + 2); edits > 0;
+                 --edits) {
+                const auto place = static_cast<qsizetype>(below(text.size() + 1));
+                const auto kind = below(3);
+                if (kind == 0 && text.size() < static_cast<qsizetype>(longest)) text.insert(place, letter());
+                if (kind == 1) text.remove(place, 1);
+                if (kind == 2 && place < text.size()) text[place] = letter();
+            }
+        }
+        texts.Add(text);
+        made.push_back(text);
+    }
+    texts.Classify();
+    return texts;
+}
+
+std::vector<Match> PlainMatches(const ComparedTexts& texts, std::uint32_t reference, int percent) {
+    std::vector<Match> matches;
+    for (std::uint32_t i = 0; i < texts.Count(); ++i) {
+        const std::size_t longer = std::max(texts.Length(reference), texts.Length(i));
+        const std::size_t distance = PlainDistance(texts.Text(reference), texts.Text(i));
+        if (100 * distance <= static_cast<std::size_t>(100 - percent) * longer)
+            matches.push_back({i, static_cast<std::uint32_t>(distance)});
+    }
+    return matches;
+}
+
+TEST(PairSearch, EveryWayOfComparingFindsWhatTheDefinitionTells) {
+    std::mt19937 random(7);
+    const QString many = u"abcdefghijklmnopqrstuvwxyz 0123456789-'äöüßé日本語дж"_s;
+    for (const std::size_t longest : {14u, 39u, 43u, 81u, 130u, 190u})
+        for (const QString& letters : {u"abc"_s, many})
+            for (const int percent : {60, 85}) {
+                const ComparedTexts texts = MakeTexts(160, longest, letters, random);
+                std::vector<std::uint32_t> numbers(texts.Count());
+                std::iota(numbers.begin(), numbers.end(), 0);
+                TextBlocks::OrderForBlocks(texts, numbers);
+                for (std::uint32_t reference = 0; reference < texts.Count(); reference += 9) {
+                    const auto expected = PlainMatches(texts, reference, percent);
+                    for (const LaneKernels& kernels : ProcessorLanes()) {
+                        TextBlocks::Workspace workspace;
+                        const TextBlocks blocks(texts, numbers, percent, kernels);
+                        ASSERT_EQ(blocks.MatchesOf(reference, workspace), expected)
+                            << longest << ' ' << percent;
+                    }
+                }
+            }
+}
+
+TEST(PairSearch, PairsComeOnceInTheOrderOfTheReferences) {
+    ComparedTexts texts;
+    for (const QString& text :
+         {u"Abba"_s, u"ABBA"_s, u"Queen"_s, u"abbas"_s, u""_s, u""_s, u"A\u0308bba"_s, u"äbba"_s})
+        texts.Add(text);
+    texts.Classify();
+    const auto rows = [&texts](std::vector<std::uint32_t> groups, std::vector<std::uint32_t> references) {
+        std::vector<std::array<std::uint32_t, 3>> found;
+        SearchPairs(
+            {.Texts = &texts,
+             .Groups = std::move(groups),
+             .References = std::move(references),
+             .Percent = 80},
+            [&](std::uint32_t reference, std::span<const Match> matches) {
+                for (const Match& match : matches)
+                    found.push_back({reference, match.Number, match.Distance});
+                return found.size() < 3;
+            },
+            [] { return true; });
+        return found;
+    };
+    using Rows = std::vector<std::array<std::uint32_t, 3>>;
+    EXPECT_EQ(rows({}, {1, 3}), (Rows{{1, 0, 0}, {1, 3, 1}, {3, 0, 1}}));  // that of 1 and 3 is told once
+    EXPECT_EQ(rows({}, {4, 5, 6, 7}), (Rows{{4, 5, 0}, {6, 7, 0}}));
+    EXPECT_EQ(rows({0, 1, 0, 1, 0, 0, 0, 0}, {0, 1, 2, 3}), (Rows{{1, 3, 1}}));
+    EXPECT_EQ(rows({}, {0, 1, 2, 3, 4, 5}), (Rows{{0, 1, 0}, {0, 3, 1}, {1, 3, 1}}));  // ended there
+}
+
+TEST(Duplicates, ComeInTheOrderOfTheCollectionByNameOrWithinAnArtist) {
+    TMusicDatabase database;
+    const auto add = [&database](const QString& path, const QString& artist, const QString& title) {
+        TID3Tag song;
+        song.Artist = artist;
+        song.Title = title;
+        const SongIndex index = database.AddEntry(path, song, AddAs::Returning);
+        return database.Songs().HandleOf(index);
+    };
+    database.SetSortType(stPath);
+    const SongHandle a = add(u"/m/1.mp3"_s, u"Queen"_s, u"Innuendo"_s);
+    const SongHandle b = add(u"/m/2.mp3"_s, u"QUEEN"_s, u"innuendo"_s);
+    const SongHandle c = add(u":12AB34CD:\\3.mp3"_s, u"Queen"_s, u"Innuendos"_s);
+    const SongHandle d = add(u"/m/4.mp3"_s, u"Other"_s, u"Innuendo"_s);
+    const auto rows = [&database](const DuplicateQuery& query) {
+        DuplicateRows found;
+        EXPECT_EQ(FindDuplicates(database, query, found), DuplicateEnd::Done);
+        std::vector<std::pair<SongHandle, SongHandle>> pairs;
+        for (std::size_t row = 0; row < found.Count(); ++row)
+            pairs.emplace_back(found.At(row).First, found.At(row).Second);
+        return pairs;
+    };
+    using Pairs = std::vector<std::pair<SongHandle, SongHandle>>;
+    EXPECT_EQ(rows({.SameArtistOnly = true}), (Pairs{{a, b}, {a, c}, {b, c}}));
+    EXPECT_EQ(rows({.LeastPercent = 100}), (Pairs{{a, b}}));
+    EXPECT_EQ(rows({.References = {b}, .LeastPercent = 90}), (Pairs{{b, a}, {b, c}}));
+    EXPECT_EQ(rows({.References = {d, b}, .AmongReferencesOnly = true}), (Pairs{{b, d}}));
+    EXPECT_EQ(SimilarityText(100), u"100%"_s);
+    EXPECT_EQ(SimilarityText(94.1176), u" 94.1"_s);
+    EXPECT_EQ(ComparedName(*database.Songs().Find(c), false), u"[CD] queen - innuendos"_s);
+}
+
+}  // namespace
