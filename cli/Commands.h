@@ -31,6 +31,7 @@ extern const CommandRow kBanCommand;
 extern const CommandRow kTrashCommand;
 extern const CommandRow kUndoCommand;
 extern const CommandRow kDuplicatesCommand;
+extern const CommandRow kSimilarArtistsCommand;
 
 // All of them, in the order of the help.
 std::span<const CommandRow* const> AllCommands();

@@ -6,7 +6,9 @@
 #include <numeric>
 #include <random>
 
+#include "CommonRUKTools/ColognePhonetics.h"
 #include "MusicManagment/database/duplicates/DuplicateSearch.h"
+#include "MusicManagment/database/duplicates/SimilarArtists.h"
 
 using namespace Qt::StringLiterals;
 
@@ -146,6 +148,28 @@ TEST(Duplicates, ComeInTheOrderOfTheCollectionByNameOrWithinAnArtist) {
     EXPECT_EQ(SimilarityText(100), u"100%"_s);
     EXPECT_EQ(SimilarityText(94.1176), u" 94.1"_s);
     EXPECT_EQ(ComparedName(*database.Songs().Find(c), false), u"[CD] queen - innuendos"_s);
+}
+
+TEST(SimilarArtists, AreAlikeOrSoundAlike) {
+    for (const auto& [name, code] : {std::pair{u"Müller-Lüdenscheidt"_s, "65752682"},
+                                     {u"Breschnew"_s, "17863"},
+                                     {u"Wikipedia"_s, "3412"},
+                                     {u"Xaver Cüche"_s, "483744"},
+                                     {u"Phil 2"_s, "35c"},
+                                     {u"東京"_s, ""}})
+        EXPECT_EQ(ColognePhonetics(name), code) << name.toStdString();
+    TMusicDatabase database;
+    for (const QString& artist :
+         {u"Beatles"_s, u"The Beatles"_s, u"Meier"_s, u"Mayr"_s, u"Xyz"_s, u"Xyz"_s}) {
+        TID3Tag song;
+        song.Artist = artist;
+        database.AddEntry(u"/m/%1"_s.arg(database.Count()), song, AddAs::Returning);
+    }
+    bool stopped = false;
+    const auto pairs = FindSimilarArtists(database, stopped);
+    ASSERT_EQ(pairs.size(), 2u);
+    EXPECT_TRUE(pairs[0].First == u"Beatles"_s && pairs[0].Second == u"The Beatles"_s);
+    EXPECT_TRUE(pairs[1].First == u"Mayr"_s && pairs[1].Second == u"Meier"_s);  // 40 percent
 }
 
 }  // namespace
