@@ -1,26 +1,114 @@
-#include <QString>
-#include <chrono>
+// Compares the names of 65,536 songs with each other, as the search for duplicates does, and the peers the
+// names of some of them with all: rows, seconds, and pairs a second of processor time. Arguments: number of
+// songs, "names" or "equal" or "long" for what they are called.
+
 #include <cstdio>
 #include <cstdlib>
+#include <ctime>
+#include <numeric>
 
+#include "CommonRUKTools/CompStr.h"
 #include "MusicManagment/database/duplicates/PairSearch.h"
-#include "bench/ProcessorTime.h"
 #include "bench/SongNames.h"
+
+#ifdef TUNESTEAD_RAPIDFUZZ
+#include <rapidfuzz/distance/Levenshtein.hpp>
+#endif
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+constexpr std::size_t kPeerReferences = 400;
+
+QString NameOf(int song, std::string_view kind) {
+    if (kind == "equal") return u"the same - name"_s;
+    const QString name = SongNames::Artist(song / 12) + u" - "_s + SongNames::Title(song);
+    return kind == "long" ? name.leftJustified(100, u'x', true) : name;
+}
+
+// Processor time of this program, of all its threads, s.
+double ProcessorSeconds() {
+    return static_cast<double>(std::clock()) / CLOCKS_PER_SEC;
+}
+
+void Tell(const char* what, std::size_t rows, double pairs, double seconds, double processor) {
+    std::printf("%-22s %12zu rows %8.2f s %8.2f s of processor %8.1f million pairs/s\n", what, rows, seconds,
+                processor, pairs / processor / 1e6);
+}
+
+double Now() {
+    timespec time{};
+    clock_gettime(CLOCK_MONOTONIC, &time);
+    return static_cast<double>(time.tv_sec) + static_cast<double>(time.tv_nsec) / 1e9;
+}
+
+// `compare` tells how many rows a reference has.
+template <typename Compare>
+void MeasurePeer(const char* what, const ComparedTexts& texts, Compare compare) {
+    const std::size_t references = std::min(kPeerReferences, texts.Count());
+    const double start = Now();
+    const double processor = ProcessorSeconds();
+    std::size_t rows = 0;
+    for (std::size_t i = 0; i < references; ++i)
+        rows += compare(i * texts.Count() / references);
+    const double pairs = static_cast<double>(references) * static_cast<double>(texts.Count());
+    Tell(what, rows, pairs, Now() - start, ProcessorSeconds() - processor);
+}
+
+void MeasureSearch(const char* what, const ComparedTexts& texts, int threads) {
+    PairQuery query{.Texts = &texts, .Threads = threads};
+    query.References.resize(texts.Count());
+    std::iota(query.References.begin(), query.References.end(), 0);
+    const double start = Now();
+    const double processor = ProcessorSeconds();
+    std::size_t rows = 0;
+    const auto found = [&rows](std::uint32_t, auto matches) {
+        rows += matches.size();
+        return rows < 20'000'000;
+    };
+    SearchPairs(query, found, [] { return true; });
+    const double count = static_cast<double>(texts.Count());
+    Tell(what, rows, count * (count - 1) / 2, Now() - start, ProcessorSeconds() - processor);
+}
+
+std::size_t PlainRows(const ComparedTexts& texts, std::size_t reference) {
+    std::size_t rows = 0;
+    for (std::size_t i = 0; i < texts.Count(); ++i) {
+        const std::size_t longer = std::max(texts.Length(reference), texts.Length(i));
+        if (IsAlike(EditDistance(texts.Text(reference), texts.Text(i)), longer)) ++rows;
+    }
+    return rows;
+}
+
+#ifdef TUNESTEAD_RAPIDFUZZ
+std::size_t RapidfuzzRows(const ComparedTexts& texts, std::size_t reference) {
+    const auto text = texts.Text(reference);
+    const rapidfuzz::CachedLevenshtein<char32_t> cached(text.begin(), text.end());
+    std::size_t rows = 0;
+    for (std::size_t i = 0; i < texts.Count(); ++i) {
+        const auto other = texts.Text(i);
+        if (cached.normalized_similarity(other.begin(), other.end(), 0.6) >= 0.6) ++rows;
+    }
+    return rows;
+}
+#endif
+
+}  // namespace
 
 int main(int argc, char** argv) {
     const int count = argc > 1 ? std::atoi(argv[1]) : 65536;
+    const std::string_view kind = argc > 2 ? argv[2] : "names";
     ComparedTexts texts;
-    for (int i = 0; i < count; ++i)
-        texts.Add(SongNames::Artist(i / 12) + QStringLiteral(" - ") + SongNames::Title(i));
+    for (int song = 0; song < count; ++song)
+        texts.Add(NameOf(song, kind));
     texts.Classify();
-    PairQuery query{.Texts = &texts};
-    for (int i = 0; i < (argc > 2 ? std::atoi(argv[2]) : count); ++i) query.References.push_back(static_cast<std::uint32_t>(i));
-    query.Threads = argc > 3 ? std::atoi(argv[3]) : 0;
-    const auto start = std::chrono::steady_clock::now();
-    const auto cpu = std::clock();
-    std::size_t rows = 0;
-    SearchPairs(query, [&](std::uint32_t, auto matches) { rows += matches.size(); return true; }, [] { return true; });
-    const double pairs = double(query.References.size()) * (count - double(query.References.size()) / 2);
-    const double seconds = double(std::clock() - cpu) / CLOCKS_PER_SEC;
-    std::printf("%zu rows, %.2f s, cpu %.2f s, %.1f Mpairs/s\n", rows, std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count(), seconds, pairs / seconds / 1e6);
+    MeasureSearch("search, one thread", texts, 1);
+    MeasureSearch("search, all threads", texts, 0);
+    MeasurePeer("one by one", texts, [&](std::size_t reference) { return PlainRows(texts, reference); });
+#ifdef TUNESTEAD_RAPIDFUZZ
+    MeasurePeer("rapidfuzz, one thread", texts,
+                [&](std::size_t reference) { return RapidfuzzRows(texts, reference); });
+#endif
+    return 0;
 }
