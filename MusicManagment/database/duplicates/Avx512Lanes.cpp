@@ -1,3 +1,8 @@
+// GCC 12 takes what its own header leaves undefined on purpose for a mistake of ours.
+#if defined(__GNUC__) && !defined(__clang__)
+#pragma GCC diagnostic ignored "-Wmaybe-uninitialized"
+#endif
+
 #include <immintrin.h>
 
 #include "MusicManagment/database/duplicates/LaneKernel.h"

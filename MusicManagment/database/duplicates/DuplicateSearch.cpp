@@ -59,8 +59,7 @@ class Participants {
             if (const SongIndex place = database.Songs().PositionOf(song); place >= 0)
                 places.push_back(place);
         std::ranges::sort(places);
-        const auto twice = std::ranges::unique(places);
-        places.erase(twice.begin(), twice.end());
+        places.erase(std::unique(places.begin(), places.end()), places.end());
         return places;
     }
 
