@@ -191,19 +191,23 @@ class LayoutSearch {
     }
 
     bool TakeTrailer() {
+        const auto position = TagOfTrailerBefore(file_, layout_.Sound.End);
+        // A tag that was put in front later hides the one behind the sound, which would come to light again
+        // when that goes.
+        return position && (TakeTrailed(*position) || TakeTrailed(*position + layout_.Sound.Begin));
+    }
+
+    bool TakeTrailed(std::int64_t position) {
         const std::int64_t end = layout_.Sound.End;
-        const auto position = TagOfTrailerBefore(file_, end);
-        if (!position || *position < layout_.Sound.Begin) return false;
-        const auto tagEnd = EndOfID3v2Tag(file_, *position);
-        if (!tagEnd || *tagEnd > end - kTagTrailerSize || !IsWholeTag(file_, *position) ||
-            SkipZeros(file_, *tagEnd) < end - kTagTrailerSize)
+        const auto tagEnd = EndOfID3v2Tag(file_, position);
+        if (position < layout_.Sound.Begin || !tagEnd || *tagEnd > end - kTagTrailerSize ||
+            !IsWholeTag(file_, position) || SkipZeros(file_, *tagEnd) < end - kTagTrailerSize)
             return false;
-        // Only a trailer at the very end is seen by the reader.
-        if (end == file_.Size())
-            layout_.Tags.insert(layout_.Tags.begin(), *position);
+        if (FindID3v2Tag(file_) == position)
+            layout_.Tags.insert(layout_.Tags.begin(), position);
         else
-            layout_.Tags.push_back(*position);
-        layout_.Sound.End = *position;
+            layout_.Tags.push_back(position);
+        layout_.Sound.End = position;
         return true;
     }
 

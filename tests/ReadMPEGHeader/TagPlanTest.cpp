@@ -324,11 +324,15 @@ TEST(TagPlan, RemovalLeavesSoundAndApeTag) {
     Mp3Builder file;
     file.Raw(tag).Raw(TitledTag("x", "y", 4).Build()).Raw(kSound).Raw(ape);
     file.Id3v1("T", "B").TrailingTag(tag);
-    MemorySource source(file.Data());
-    const Bytes bare = Patched(file.Data(), PlanTagRemoval(source, kTagPath));
-    EXPECT_EQ(bare, Joined({kSound, ape}));
-    MemorySource again(bare);
-    EXPECT_TRUE(PlanTagRemoval(again, kTagPath).ChangesNothing(std::ssize(bare)));
+    // The tag in front came later: the trailer leads astray until that goes.
+    const Bytes hidden = Joined({tag, Mp3Builder().Raw(kSound).Raw(ape).TrailingTag(tag).Data()});
+    for (const Bytes& each : {file.Data(), hidden}) {
+        MemorySource source(each);
+        const Bytes bare = Patched(each, PlanTagRemoval(source, kTagPath));
+        EXPECT_EQ(bare, Joined({kSound, ape}));
+        MemorySource again(bare);
+        EXPECT_TRUE(PlanTagRemoval(again, kTagPath).ChangesNothing(std::ssize(bare)));
+    }
 }
 
 TEST(TagPlan, TheFrontCoverIsReplacedAndOthersStay) {
