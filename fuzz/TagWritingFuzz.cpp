@@ -110,10 +110,9 @@ void CheckChange(ByteSpan file, const QString& path, unsigned choice) {
     const bool tagMoves =
         FindTags(source, path).Container == TagLayout::Kind::Mpeg && FindID3v2Tag(source).value_or(0) > 0;
     if (edit.Record.Comment.isEmpty() || tagMoves) return;
-    // Where a length is reckoned from the size of the file, the old tag that came behind it counts.
-    TagEdit same = edit;
-    same.Record.Length = ReadSong(again, path, reading).Tag.Length;
-    Require(PlanTag(again, path, same, options).ChangesNothing(again.Size()));
+    // A length that is reckoned from the size of the file grows with the old tag behind it.
+    if (ReadSong(again, path, reading).Tag.Length != edit.Record.Length) return;
+    Require(PlanTag(again, path, edit, options).ChangesNothing(again.Size()));
 }
 
 void CheckRemoval(ByteSpan file, const QString& path) {
