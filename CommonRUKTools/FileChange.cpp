@@ -33,6 +33,24 @@ QString RealPath(const QString& path) {
     return real;
 }
 
+// A file that is open for changing, as a source of its old bytes.
+class OpenedSource : public ByteSource {
+ public:
+    explicit OpenedSource(const WorkFile& file) : file_(file), size_(file.Look().State.Size) {}
+
+    std::int64_t Size() const override { return size_; }
+    std::size_t ReadAt(std::int64_t position, std::span<std::uint8_t> target) override {
+        const std::int64_t left = std::max<std::int64_t>(0, size_ - position);
+        const auto count = static_cast<std::size_t>(std::min<std::int64_t>(left, std::ssize(target)));
+        file_.Read(position, target.first(count));
+        return count;
+    }
+
+ private:
+    const WorkFile& file_;
+    std::int64_t size_;
+};
+
 // The same change in one that needs no second file, where that would lose something.
 void WriteOverWhole(PatchPlan& plan, ByteSource& old) {
     plan.Patch = plan.Patch.Whole(old);
@@ -97,6 +115,7 @@ void WriteInPlace(const PatchPlan& plan) {
     if (!file.Look().State.IsStill(plan.Before)) ThrowChanged(plan.Path);
     try {
         WriteOver(file, plan.Patch);
+        file.SetModified(plan.After.ModifiedNs);
     } catch (const EStreamError& failure) {
         try {
             RestoreInPlace(plan);
@@ -130,12 +149,13 @@ PatchPlan PlanPatch(const QString& path, FilePatch patch, const FileState& expec
                     std::int64_t modifiedNs) {
     PatchPlan plan;
     plan.Path = RealPath(path);
-    FileSource old(plan.Path);
     FileCalls::Facts facts;
     if (!FileCalls::Look(plan.Path, facts)) ThrowSystemError(kCannotOpen, plan.Path, errno);
     if (!facts.State.IsStill(expected)) ThrowChanged(path);
     if (facts.State.ReadOnly) throw EStreamError(u"Die Datei "_s + path + u" ist schreibgeschützt."_s);
-    WorkFile::Existing(plan.Path, FileCalls::Access::Change);  // throws where it may not be written
+    const WorkFile file = WorkFile::Existing(plan.Path, FileCalls::Access::Change);
+    if (!file.Look().State.IsStill(expected)) ThrowChanged(path);
+    OpenedSource old(file);
 
     plan.Before = facts.State;
     plan.OtherNames = facts.Names - 1;
@@ -165,11 +185,7 @@ void WritePatch(const PatchPlan& plan) {
 }
 
 FileState FinishPatch(const PatchPlan& plan) {
-    if (plan.IsInPlace()) {
-        WorkFile file = WorkFile::Existing(plan.Path, FileCalls::Access::Change);
-        file.SetModified(plan.After.ModifiedNs);
-        return file.Look().State;
-    }
+    if (plan.IsInPlace()) return StateOf(plan.Path);
     try {
         if (!StateOf(plan.Path).IsStill(plan.Before)) ThrowChanged(plan.Path);
         TakeName(plan.Temporary, plan.Path);
@@ -242,9 +258,10 @@ void FlushFiles(const QStringList& paths) {
     QSet<quint64> flushed;
     QSet<QString> looked;
     for (const QString& path : paths) {
+        const QString own = path.left(path.lastIndexOf(u'/'));
+        if (looked.contains(own)) continue;
+        looked.insert(own);
         const QString folder = FolderThatIsThere(path);
-        if (looked.contains(folder)) continue;
-        looked.insert(folder);
         FileCalls::Facts facts;
         if (!FileCalls::Look(folder, facts) || flushed.contains(facts.State.Device)) continue;
         flushed.insert(facts.State.Device);

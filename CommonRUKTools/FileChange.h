@@ -74,7 +74,7 @@ PatchPlan PlanPatch(const QString& path, FilePatch patch, const FileState& expec
                     std::int64_t modifiedNs = 0);
 // Writes the new version, in place or beside. Throws; EHalfDone only in place.
 void WritePatch(const PatchPlan& plan);
-// Gives what was built the file's name, once it is on the disk; in place nothing is left to do but the time.
+// Gives what was built the file's name, once it is on the disk; in place nothing is left to do.
 // Returns what the file is now. Throws EFileChanged when the file was changed meanwhile.
 FileState FinishPatch(const PatchPlan& plan);
 // Brings the old version back, whatever WritePatch and FinishPatch have done of the plan, also nothing, and

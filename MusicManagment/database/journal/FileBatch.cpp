@@ -1,6 +1,5 @@
 #include "MusicManagment/database/journal/FileBatch.h"
 
-#include <QFileInfo>
 #include <algorithm>
 #include <utility>
 
@@ -120,8 +119,7 @@ FileBatch::~FileBatch() {
 
 void FileBatch::Add(FileItem item) {
     const bool waits = std::ranges::any_of(item.steps_, [this](const FileItem::Wanted& step) {
-        return run_->Touches(step.Path) || run_->Touches(step.To) ||
-               (step.Kind == StepKind::Patch && run_->Touches(QFileInfo(step.Path).canonicalFilePath()));
+        return run_->Touches(step.Path) || run_->Touches(step.To);
     });
     if (waits) Settle();
     PlannedItem planned = item.Plan();
