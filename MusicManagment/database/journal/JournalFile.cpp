@@ -142,7 +142,7 @@ StoredBatch* JournalContents::Find(quint64 id) {
 JournalContents ReadJournal(ByteSource& file) {
     JournalContents contents;
     if (file.Size() == 0) return contents;
-    BufferedSource buffered(file, std::size_t{1} << 16);
+    BufferedSource buffered(file);  // in small pieces: between two heads there may be a picture
     const auto magic =
         buffered.ReadExactly(0, std::min<std::size_t>(kMagic.size(), static_cast<std::size_t>(file.Size())));
     contents.IsOurs = std::ranges::equal(magic, AsBytes(kMagic));
@@ -283,12 +283,13 @@ void JournalFile::Open() {
 void JournalFile::Write(std::size_t stepsToCome) {
     const std::size_t size = pending_.Size();
     if (stepsToCome > 0) pending_.Zeros(kFrameHeader + kOutcomeHead + stepsToCome * kOutcomeEntry);
-    const ByteWriter frames = std::exchange(pending_, {});
+    writing_.Clear();
+    std::swap(writing_, pending_);
     Open();
     if (hasTornTail_) file_->Resize(contents_.End);
     // What stays behind the end may hold whole frames; it must not be joined to those that come.
     hasTornTail_ = true;
-    file_->Write(contents_.End, frames.Bytes());
+    file_->Write(contents_.End, writing_.Bytes());
     hasTornTail_ = false;
     contents_.End += static_cast<qint64>(size);
 }

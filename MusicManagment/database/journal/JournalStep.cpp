@@ -1,5 +1,6 @@
 #include "MusicManagment/database/journal/JournalStep.h"
 
+#include <QtEndian>
 #include <algorithm>
 #include <string_view>
 #include <type_traits>
@@ -42,8 +43,9 @@ FileState ReadState(ByteReader& reader) {
 // UTF-16, because a path may hold what is no valid text.
 void WriteText(ByteWriter& writer, const QString& text) {
     writer.U32Le(static_cast<quint32>(text.size()));
-    for (const QChar c : text)
-        writer.U16Le(c.unicode());
+    std::vector<std::uint8_t> units(2 * static_cast<std::size_t>(text.size()));
+    qToLittleEndian<char16_t>(text.utf16(), text.size(), units.data());
+    writer.Raw(units);
 }
 
 QString ReadText(ByteReader& reader) {
