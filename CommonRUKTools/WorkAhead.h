@@ -24,7 +24,9 @@ class WorkAhead {
     // it is taken. It runs in another thread.
     using Maker = std::function<Work(std::size_t number, When when)>;
 
-    WorkAhead(std::size_t count, int threads, Maker maker) : count_(count), maker_(std::move(maker)) {
+    // `window`: so many pieces are begun at most, among them the current one.
+    WorkAhead(std::size_t count, int threads, Maker maker, std::size_t window = 64)
+        : count_(count), maker_(std::move(maker)), window_(window) {
         pool_.setMaxThreadCount(threads);
     }
     // Gives up what was not taken; waits only for what is being done.
@@ -39,7 +41,7 @@ class WorkAhead {
     void Next() {
         if (current_) ahead_.pop_front();
         current_ = current_ ? *current_ + 1 : 0;
-        while (ahead_.size() < kWindow && *current_ + ahead_.size() < count_)
+        while (ahead_.size() < window_ && *current_ + ahead_.size() < count_)
             ahead_.push_back(Begin(*current_ + ahead_.size(), When::Ahead));
     }
 
@@ -55,7 +57,6 @@ class WorkAhead {
     }
 
  private:
-    static constexpr std::size_t kWindow = 64;  // pieces, among them the current one
     static constexpr std::chrono::milliseconds kPatience{30};
 
     std::future<Result> Begin(std::size_t number, When when) {
@@ -68,6 +69,7 @@ class WorkAhead {
 
     std::size_t count_;
     Maker maker_;
+    std::size_t window_;
     std::optional<std::size_t> current_;
     std::deque<std::future<Result>>
         ahead_;  // from the current one on; not valid where nothing was to be done

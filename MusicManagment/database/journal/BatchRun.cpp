@@ -5,8 +5,8 @@
 namespace {
 
 // A group's old and new bytes are in memory, and so long does a crash lose what was done.
-constexpr qint64 kBytesOfGroup = qint64{16} << 20;
-constexpr std::size_t kFilesOfGroup = 256;
+constexpr qint64 kBytesOfGroup = qint64{32} << 20;
+constexpr std::size_t kFilesOfGroup = 1024;
 constexpr std::size_t kStepsOfGroup = 20'000;
 
 }  // namespace

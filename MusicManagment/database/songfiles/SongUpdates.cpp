@@ -2,13 +2,12 @@
 
 #include <QSet>
 
-#include "CommonRUKTools/BufferedSource.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/BannList.h"
 #include "MusicManagment/database/Progress.h"
-#include "MusicManagment/database/SongFields.h"
 #include "MusicManagment/database/journal/FileBatch.h"
 #include "MusicManagment/database/songfiles/RenameTarget.h"
+#include "MusicManagment/database/songfiles/TagPlans.h"
 
 using namespace Qt::StringLiterals;
 
@@ -58,16 +57,16 @@ class SongChanges {
         return !result_.Stopped;
     }
 
-    void Update(const SongUpdate& update, Renaming renaming) {
+    void Update(const SongUpdate& update, TagPlans& plans, Renaming renaming) {
         const TID3Tag* song = database_.Songs().Find(update.Song);
         if (song == nullptr) return;
         const TID3Tag before = *song;
-        SongItem item{
-            .Song = update.Song,
-            .Record = MergedChange(before, update.Basis, update.Record, MergeConflict::TakesMerged)};
-        item.Record.FileName = before.FileName;
+        SongItem item{.Song = update.Song, .Record = RecordAfter(update, before)};
         try {
-            AddTags(item, update);
+            if (auto change = plans.Take(item.Record)) {
+                item.Steps.Patch(before.FileName, std::move(change->Patch), change->Before);
+                ++item.Count;
+            }
         } catch (const EStreamError& error) {
             result_.Failed << before.FileName + u": "_s + error.Message();
             return;
@@ -123,24 +122,6 @@ class SongChanges {
             ++Count;
         }
     };
-
-    void AddTags(SongItem& item, const SongUpdate& update) const {
-        const QString& path = item.Record.FileName;
-        if (update.Tags == TagAction::Leave || IsCdPath(path)) return;
-        const FileState state = StateOf(path);
-        FileSource file(path);
-        BufferedSource source(file);
-        const ReadProfile profile = database_.ModernTags() ? ReadProfile::Modern : ReadProfile::Classic;
-        FilePatch patch =
-            update.Tags == TagAction::Remove
-                ? PlanTagRemoval(source, path)
-                : PlanTag(source, path,
-                          {.Record = item.Record, .TrackTotal = update.TrackTotal, .Cover = update.Cover},
-                          {.Profile = profile});
-        if (patch.ChangesNothing(file.Size())) return;
-        item.Steps.Patch(path, std::move(patch), state);
-        ++item.Count;
-    }
 
     void Add(SongItem item) {
         if (item.Count == 0 && item.Target.isEmpty()) return;
@@ -244,9 +225,11 @@ QString ProgressText(const QString& progress, const QString& caption) {
 BatchResult UpdateSongs(TMusicDatabase& database, const QString& caption,
                         const std::vector<SongUpdate>& updates, Renaming renaming, const QString& progress) {
     SongChanges changes(database, caption, ProgressText(progress, caption), updates.size());
+    TagPlans plans(database, updates);
     for (const SongUpdate& update : updates) {
         if (!changes.Next()) break;
-        changes.Update(update, renaming);
+        plans.Next();
+        changes.Update(update, plans, renaming);
     }
     return changes.Finish();
 }
