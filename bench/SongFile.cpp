@@ -193,7 +193,8 @@ void WriteSongFile(const QString& path, const SongFile& song) {
     if (song.Vbr) AppendXing(head, frames);
     const auto audioStart = static_cast<std::int64_t>(head.Size());
     std::int64_t number = 0;
-    for (; number < frames.Count() && frames.Start(number) < kHeadBytes; ++number)
+    const std::int64_t headBytes = song.HasHole ? kHeadBytes : frames.Bytes();
+    for (; number < frames.Count() && frames.Start(number) < headBytes; ++number)
         frames.Append(head, number);
 
     while (number < frames.Count() && frames.Bytes() - frames.Start(number) > kTailBytes)

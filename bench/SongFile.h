@@ -15,9 +15,9 @@ struct SongFile {
     std::size_t CoverBytes = 0;   // size of the picture, 0 none
     bool Vbr = false;             // frames of many sizes and a Xing header, else 128 kbit/s
     std::int64_t AudioBytes = 0;  // about
+    bool HasHole = true;          // where readers of headers and tags never look
 };
 
-// Writes ID3v2 tag, MPEG 1 Layer III frames at 44100 Hz and ID3v1 tag. Only the first and the last frames are
-// written; between them the file has a hole, so that a collection of any size fits on the disk. Readers of
-// headers and tags never look there. Throws EStreamError.
+// Writes ID3v2 tag, MPEG 1 Layer III frames at 44100 Hz and ID3v1 tag. With a hole only the first and the
+// last frames are written, so that a collection of any size fits on the disk. Throws EStreamError.
 void WriteSongFile(const QString& path, const SongFile& song);

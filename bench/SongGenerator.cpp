@@ -46,7 +46,11 @@ QStringList SongGenerator::Write(const QString& folder) const {
         if (!root.mkpath(place))
             throw EStreamError(u"Kann den Ordner nicht anlegen: "_s + root.filePath(place));
         for (int number = first; number < std::min(first + kSongsOfAnAlbum, Songs); ++number) {
-            const SongFile song = Song(number, artist, album, CoverBytes);
+            SongFile song = Song(number, artist, album, CoverBytes);
+            if (AudioBytes > 0) {
+                song.AudioBytes = AudioBytes;
+                song.HasHole = false;
+            }
             const QString name =
                 song.Artist + u" - "_s + song.Title + u" ("_s + QString::number(number) + u").mp3"_s;
             paths.push_back(root.filePath(place + u'/' + name));
