@@ -18,7 +18,7 @@ void WriteList(const TMusicDatabase& database, Console& console) {
 }
 
 BatchResult BanSongs(TMusicDatabase& database, const ChosenSongs& chosen, Console& console) {
-    const JournalSession journal(console, &database);
+    const JournalSession journal(console);
     const RunWatcher watcher(database, console, StopBy::Interrupt);
     return DiscardSongs(database, SongCountText(chosen.Songs.size()) + u" verbannen"_s, chosen.Songs,
                         Banning::Banned);

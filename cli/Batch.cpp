@@ -90,7 +90,7 @@ int RunBatchCommand(const Arguments& arguments, Console& console) {
     OpenForChanges(database, arguments.Value(u"--db"), false, console);
     const ChosenSongs chosen = ChooseSongs(database, arguments, console);
     const BatchSongs songs{.Range = BatchRange::Marked, .Songs = chosen.Songs};
-    const JournalSession journal(console, &database);
+    const JournalSession journal(console);
     const RunWatcher watcher(database, console, StopBy::Interrupt);
     const AgreeingDialogs agreeing(arguments.Has(u"--yes"));
     const Outcome outcome = deed(database, songs);

@@ -10,17 +10,27 @@ QString JournalPath() {
     return files.Journal();
 }
 
-}  // namespace
-
-JournalSession::JournalSession(Console& console, TMusicDatabase* database) : journal_(JournalPath()) {
-    journal_.OnTakenBack = [&console](const RecoveryResult& recovered) {
+// What was left half done is taken back now, or before the first batch.
+void TakeBackUnfinished(Journal& journal, Console& console) {
+    journal.OnTakenBack = [&console](const RecoveryResult& recovered) {
         if (!recovered.IsEmpty()) console.Message(recovered.Message());
     };
-    journal_.OnTakenBack(journal_.TakeBackUnfinished());
-    if (database != nullptr) journal_.BringUpToDate(*database);
+    journal.OnTakenBack(journal.TakeBackUnfinished());
+}
+
+}  // namespace
+
+JournalSession::JournalSession(Console& console) : journal_(JournalPath()) {
+    TakeBackUnfinished(journal_, console);
     SetJournal(&journal_);
 }
 
 JournalSession::~JournalSession() {
     SetJournal(nullptr);
+}
+
+void CatchUp(TMusicDatabase& database, Console& console) {
+    Journal journal(LocateStandardFiles().Journal());
+    TakeBackUnfinished(journal, console);
+    journal.BringUpToDate(database);
 }

@@ -8,7 +8,7 @@
 class JournalSession {
  public:
     // Throws EStreamError when the journal cannot be read.
-    explicit JournalSession(Console& console, TMusicDatabase* database = nullptr);
+    explicit JournalSession(Console& console);
     ~JournalSession();
     JournalSession(const JournalSession&) = delete;
     JournalSession& operator=(const JournalSession&) = delete;
@@ -18,3 +18,7 @@ class JournalSession {
  private:
     Journal journal_;
 };
+
+// Brings a database that is to be changed and saved into agreement with the files: a program that was ended
+// may not have saved what it had done. Throws EStreamError when the journal cannot be read.
+void CatchUp(TMusicDatabase& database, Console& console);

@@ -4,6 +4,7 @@
 #include "CommonRUKTools/FileSource.h"
 #include "CommonRUKTools/StandardFiles.h"
 #include "MusicManagment/database/BannList.h"
+#include "cli/JournalSession.h"
 
 using namespace Qt::StringLiterals;
 
@@ -29,6 +30,7 @@ void OpenForChanges(TMusicDatabase& database, const QString& fileName, bool only
     ReadInto(database, fileName, console, StopBy::Interrupt);
     database.SetFileName(fileName);
     database.SetAutoSave(-1);
+    CatchUp(database, console);
 }
 
 bool ReportChanges(const BatchResult& result, Console& console) {

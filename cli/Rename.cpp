@@ -26,7 +26,7 @@ void WritePlan(const PlannedRename& plan, const QString& problem, bool asJson, C
 
 // A song that is in the way of another is not asked about here: both stay.
 BatchResult CarryOut(TMusicDatabase& database, const std::vector<PlannedRename>& plans, Console& console) {
-    const JournalSession journal(console, &database);
+    const JournalSession journal(console);
     const RunWatcher watcher(database, console, StopBy::Interrupt);
     const std::vector<SongMove> moves = PossibleMoves(plans);
     return MoveSongs(database, SongCountText(moves.size()) + u" umbenennen"_s, moves);

@@ -5,6 +5,7 @@
 #include "MusicManagment/database/intake/Intake.h"
 #include "cli/CommandLine.h"
 #include "cli/Commands.h"
+#include "cli/JournalSession.h"
 #include "cli/JsonOutput.h"
 #include "cli/OpenedDatabase.h"
 #include "cli/platform/Terminal.h"
@@ -57,7 +58,10 @@ int RunScan(const Arguments& arguments, Console& console) {
     LoadBannListFor(database, fileName, arguments);
     ClaimFile(database, fileName);
     const bool isNew = !FileSource::Exists(fileName);
-    if (!isNew) ReadInto(database, fileName, console, StopBy::Interrupt);
+    if (!isNew) {
+        ReadInto(database, fileName, console, StopBy::Interrupt);
+        CatchUp(database, console);
+    }
 
     const IntakeResult result = TakeIn(database, paths, !arguments.Has(u"--no-subfolders"), console);
     // A path that was mistyped is no reason to make a database.

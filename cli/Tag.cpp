@@ -96,7 +96,7 @@ TID3Tag Expected(const TMusicDatabase& database, const SongUpdate& update, bool 
 
 BatchResult CarryOut(TMusicDatabase& database, const std::vector<SongUpdate>& updates, bool renames,
                      Console& console) {
-    const JournalSession journal(console, &database);
+    const JournalSession journal(console);
     const RunWatcher watcher(database, console, StopBy::Interrupt);
     const QString caption = updates.size() == 1 ? u"1 Tag"_s : QString::number(updates.size()) + u" Tags"_s;
     return UpdateSongs(database, caption, updates, renames ? Renaming::BySettings : Renaming::Never,

@@ -32,7 +32,7 @@ bool TrashSongs(const QString& fileName, const QStringList& paths, Console& cons
     PrepareDatabase(database);
     OpenForChanges(database, fileName, false, console);
     const ChosenSongs chosen = NamedSongs(database, paths, console);
-    const JournalSession journal(console, &database);
+    const JournalSession journal(console);
     const RunWatcher watcher(database, console, StopBy::Interrupt);
     const QString caption = SongCountText(chosen.Songs.size()) + u" löschen"_s;
     return ReportChanges(DiscardSongs(database, caption, chosen.Songs, Banning::NotBanned), console) &&
