@@ -29,8 +29,8 @@ JournalSession::~JournalSession() {
     SetJournal(nullptr);
 }
 
-void CatchUp(TMusicDatabase& database, Console& console) {
+int CatchUp(TMusicDatabase& database, Console& console) {
     Journal journal(LocateStandardFiles().Journal());
     TakeBackUnfinished(journal, console);
-    journal.BringUpToDate(database);
+    return journal.BringUpToDate(database);
 }

@@ -20,5 +20,6 @@ class JournalSession {
 };
 
 // Brings a database that is to be changed and saved into agreement with the files: a program that was ended
-// may not have saved what it had done. Throws EStreamError when the journal cannot be read.
-void CatchUp(TMusicDatabase& database, Console& console);
+// may not have saved what it had done. Returns how many songs have changed. Throws EStreamError when the
+// journal cannot be read.
+int CatchUp(TMusicDatabase& database, Console& console);

@@ -30,7 +30,8 @@ void OpenForChanges(TMusicDatabase& database, const QString& fileName, bool only
     ReadInto(database, fileName, console, StopBy::Interrupt);
     database.SetFileName(fileName);
     database.SetAutoSave(-1);
-    CatchUp(database, console);
+    // Now, because the command may find nothing to change.
+    if (CatchUp(database, console) > 0) database.SaveAfterCommand();
 }
 
 bool ReportChanges(const BatchResult& result, Console& console) {

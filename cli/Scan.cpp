@@ -60,6 +60,7 @@ int RunScan(const Arguments& arguments, Console& console) {
     const bool isNew = !FileSource::Exists(fileName);
     if (!isNew) {
         ReadInto(database, fileName, console, StopBy::Interrupt);
+        database.SetFileName(fileName);
         CatchUp(database, console);
     }
 

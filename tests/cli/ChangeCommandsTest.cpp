@@ -84,3 +84,21 @@ TEST_F(ChangeCommandsTest, SongsAreFlaggedBannedAndBroughtBack) {
     EXPECT_EQ(Run(u"list"_s, {}).Out.count(u'\n'), 3);
     EXPECT_EQ(Run(u"ban"_s, {u"--bannlist"_s, bans, u"--list"_s}).Out, QString());
 }
+
+TEST_F(ChangeCommandsTest, WhatAKilledProgramCouldNotSaveIsCaughtUpWithFirst) {
+    const QByteArray saved = folder_.Get(u"songs.tsdb"_s);
+    const QDateTime savedAt = QFileInfo(database_).lastModified();
+    const auto loseTheSave = [&] {
+        folder_.Put(u"songs.tsdb"_s, saved);
+        QFile file(database_);
+        ASSERT_TRUE(file.open(QIODevice::ReadWrite) &&
+                    file.setFileTime(savedAt, QFileDevice::FileModificationTime));
+    };
+    ASSERT_EQ(Run(u"tag"_s, {u"--set"_s, u"title=X"_s, Song(u"Anna - A.wav"_s)}).Status, esDone);
+    loseTheSave();
+    EXPECT_EQ(Run(u"scan"_s, {Path(u"music"_s)}).Status, esDone);
+    EXPECT_TRUE(Run(u"list"_s, {}).Out.contains(u"\tX\t"_s));
+    loseTheSave();
+    EXPECT_EQ(Run(u"rename"_s, {u"--pattern"_s, u"%TITLE%"_s, u"--all"_s}).Status, esDone);
+    EXPECT_EQ(Files(), (QStringList{u"B.wav"_s, u"C.wav"_s, u"X.wav"_s}));
+}

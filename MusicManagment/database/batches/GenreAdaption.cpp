@@ -36,13 +36,16 @@ class DonorChoice {
     }
 
  private:
-    std::optional<GenreDonors::Donor> AlikeOne(const QString& artist) const {
-        const auto like = donors_.MostAlike(artist);
+    std::optional<GenreDonors::Donor> AlikeOne(const QString& artist) {
+        auto known = likenesses_.constFind(artist);
+        if (known == likenesses_.cend()) known = likenesses_.insert(artist, donors_.MostAlike(artist));
+        const auto& like = *known;
         return like && UserTakes(artist, *like) ? std::optional(like->From) : std::nullopt;
     }
 
     GenreDonors donors_;
     bool asksOnce_;
+    QHash<QString, std::optional<GenreDonors::Likeness>> likenesses_;
     QHash<QString, std::optional<GenreDonors::Donor>> answers_;
 };
 
