@@ -101,6 +101,6 @@ class JournalFile {
     JournalContents contents_;
     std::unique_ptr<WorkFile> file_;
     ByteWriter pending_;
-    ByteWriter writing_;  // takes turns with it: memory of this size is costly to get
+    ByteWriter writing_;        // takes turns with it: memory of this size is costly to get
     bool hasTornTail_ = false;  // a write has failed in its middle
 };
