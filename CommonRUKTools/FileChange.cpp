@@ -218,15 +218,6 @@ void TakeBackPatch(const PatchPlan& plan) {
     FlushFiles({plan.Path});
 }
 
-FileState PatchFile(const QString& path, FilePatch patch, const FileState& expected) {
-    const PatchPlan plan = PlanPatch(path, std::move(patch), expected);
-    WritePatch(plan);
-    FlushFiles({plan.IsInPlace() ? plan.Path : plan.Temporary});
-    const FileState after = FinishPatch(plan);
-    FlushFiles({plan.Path});
-    return after;
-}
-
 // --- On the disk ---
 
 namespace {

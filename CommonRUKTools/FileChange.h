@@ -82,9 +82,6 @@ FileState FinishPatch(const PatchPlan& plan);
 // file is somebody else's by now, EStreamError when it cannot be done now.
 void TakeBackPatch(const PatchPlan& plan);
 
-// All of it at once, flushed.
-FileState PatchFile(const QString& path, FilePatch patch, const FileState& expected);
-
 // --- New places ---
 
 struct MovePlan {

@@ -4,30 +4,21 @@
 
 #include <numeric>
 
+#include "tests/CountingSource.h"
+
 namespace {
 
-// Counts how often it is asked.
-class CountingSource : public ByteSource {
- public:
-    explicit CountingSource(std::size_t size) : bytes_(size) {
-        std::iota(bytes_.begin(), bytes_.end(), std::uint8_t{0});
-    }
-    std::int64_t Size() const override { return static_cast<std::int64_t>(bytes_.size()); }
-    std::size_t ReadAt(std::int64_t position, std::span<std::uint8_t> target) override {
-        ++reads;
-        MemorySource source(bytes_);
-        return source.ReadAt(position, target);
-    }
-    int reads = 0;
-
- private:
-    std::vector<std::uint8_t> bytes_;
-};
+std::vector<std::uint8_t> BytesThatTellTheirPlace(std::size_t size) {
+    std::vector<std::uint8_t> bytes(size);
+    std::iota(bytes.begin(), bytes.end(), std::uint8_t{0});
+    return bytes;
+}
 
 }  // namespace
 
 TEST(BufferedSource, AFileIsReadInFewPieces) {
-    CountingSource file(1'000'000);
+    const auto contents = BytesThatTellTheirPlace(1'000'000);
+    CountingSource file(contents);
     BufferedSource source(file);
     std::array<std::uint8_t, 10> bytes{};
     const auto lookAt = [&](std::int64_t position) {
@@ -42,11 +33,12 @@ TEST(BufferedSource, AFileIsReadInFewPieces) {
         lookAt(position);
     lookAt(500'700);
     lookAt(999'900);
-    EXPECT_EQ(file.reads, 3);
+    EXPECT_EQ(file.Reads, 3);
 }
 
 TEST(BufferedSource, ReadsEndWithTheSource) {
-    CountingSource file(20'000);
+    const auto contents = BytesThatTellTheirPlace(20'000);
+    MemorySource file(contents);
     BufferedSource source(file);
     std::vector<std::uint8_t> bytes(30'000);
     EXPECT_EQ(source.ReadAt(0, bytes), 20'000u);  // larger than a window

@@ -4,6 +4,7 @@
 
 #include <random>
 
+#include "tests/ErrorOf.h"
 #include "tests/PrintQt.h"
 #include "tests/StepGate.h"
 #include "tests/database/SongFolder.h"
@@ -40,13 +41,13 @@ class FileChangeTest : public testing::Test {
         patch.Keep(3, size - 3);
         return patch;
     }
-    QString ErrorOfPatching(const QString& path, const FileState& expected) const {
-        try {
-            PatchFile(path, LongerHead(6), expected);
-        } catch (const EStreamError& error) {
-            return error.Message();
-        }
-        return {};
+    static void Patch(const QString& path, const FileState& expected) {
+        const PatchPlan plan = PlanPatch(path, LongerHead(6), expected);
+        WritePatch(plan);
+        FinishPatch(plan);
+    }
+    static QString ErrorOfPatching(const QString& path, const FileState& expected) {
+        return ErrorOf<EStreamError>([&] { Patch(path, expected); });
     }
 
     SongFolder folder_;
@@ -128,7 +129,7 @@ TEST_F(FileChangeTest, LinksModeAndAttributesStay) {
     const QByteArray name = QFile::encodeName(file_);
     ASSERT_EQ(::chmod(name.constData(), 0641), 0);
     const bool hasAttributes = ::setxattr(name.constData(), "user.note", "x", 1, 0) == 0;
-    PatchFile(link, LongerHead(6), StateOf(link));
+    Patch(link, StateOf(link));
     struct stat status {};
     char value = 0;
     ASSERT_EQ(::stat(name.constData(), &status), 0);

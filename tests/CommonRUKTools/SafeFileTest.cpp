@@ -2,8 +2,8 @@
 
 #include <gtest/gtest.h>
 
-#include "CommonRUKTools/Errors.h"
 #include "CommonRUKTools/FileSource.h"
+#include "tests/ErrorOf.h"
 #include "tests/PrintQt.h"
 #include "tests/database/SongFolder.h"
 
@@ -21,14 +21,11 @@ class SafeFileTest : public testing::Test {
  protected:
     // The message that writing "new" ends with; empty when it succeeds.
     static QString ErrorOfWriting(const QString& target) {
-        try {
+        return ErrorOf<EStreamError>([&] {
             SafeFile file(target);
             file.Write(AsBytes("new"));
             file.Commit();
-        } catch (const EStreamError& error) {
-            return error.Message();
-        }
-        return {};
+        });
     }
     QStringList Names() const {
         return QDir(folder_.Path()).entryList(QDir::Files | QDir::System | QDir::Hidden);
