@@ -107,16 +107,14 @@ TEST(Asf, AttributesStandInTheExtendedContentOrInTheLibrary) {
         int Genre;
     };
     const AttributeCase cases[] = {
-        AttributeCase{
-            {Number(u"WM/Year"_s, 3, 1999, 4), Number(u"WM/TrackNumber"_s, 3, 12, 4)}, u"1999", 12, 255},
-        AttributeCase{{Number(u"WM/Track"_s, 3, 4, 4), Text(u"WM/GenreID"_s, u"(17)"_s)}, u"", 5, 17},
-        AttributeCase{{Number(u"WM/Track"_s, 3, 4, 4), Number(u"WM/TrackNumber"_s, 5, 9, 2)}, u"", 9, 255},
-        AttributeCase{
-            {Number(u"WM/Track"_s, 4, UINT64_MAX, 8), Text(u"WM/Genre"_s, u"Keins davon"_s)}, u"", 0, 255},
-        AttributeCase{{Number(u"WM/TrackNumber"_s, 3, 256, 4), Number(u"WM/Year"_s, 3, 0, 4)}, u"", 0, 255},
-        AttributeCase{{Text(u"WM/GenreID"_s, u"(200)"_s), Text(u"WM/Genre"_s, u"Blues"_s)}, u"", 0, 0},
-        AttributeCase{{{u"WM/Year"_s, 1, {'1', '9'}}, Text(u"Date"_s, u"MCMXC"_s)}, u"MCMXC", 0, 255},
-        AttributeCase{{Number(u"WM/Year"_s, 2, 1, 2), {u"WM/TrackNumber"_s, 3, {}}}, u"1", 0, 255}};
+        {{Number(u"WM/Year"_s, 3, 1999, 4), Number(u"WM/TrackNumber"_s, 3, 12, 4)}, u"1999", 12, 255},
+        {{Number(u"WM/Track"_s, 3, 4, 4), Text(u"WM/GenreID"_s, u"(17)"_s)}, u"", 5, 17},
+        {{Number(u"WM/Track"_s, 3, 4, 4), Number(u"WM/TrackNumber"_s, 5, 9, 2)}, u"", 9, 255},
+        {{Number(u"WM/Track"_s, 4, UINT64_MAX, 8), Text(u"WM/Genre"_s, u"Keins davon"_s)}, u"", 0, 255},
+        {{Number(u"WM/TrackNumber"_s, 3, 256, 4), Number(u"WM/Year"_s, 3, 0, 4)}, u"", 0, 255},
+        {{Text(u"WM/GenreID"_s, u"(200)"_s), Text(u"WM/Genre"_s, u"Blues"_s)}, u"", 0, 0},
+        {{{u"WM/Year"_s, 1, {'1', '9'}}, Text(u"Date"_s, u"MCMXC"_s)}, u"MCMXC", 0, 255},
+        {{Number(u"WM/Year"_s, 2, 1, 2), {u"WM/TrackNumber"_s, 3, {}}}, u"1", 0, 255}};
     for (const auto& [values, year, track, genre] : cases) {
         for (const bool library : {false, true}) {
             AsfBuilder builder;

@@ -2,15 +2,14 @@
 
 #include <gtest/gtest.h>
 
-#include <QTemporaryDir>
 #include <cmath>
 
 #include "CommonRUKTools/Errors.h"
 #include "ReadMPEGHeader/Genres.h"
-#include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 #include "tests/ReadMPEGHeader/AsfBuilder.h"
 #include "tests/ReadMPEGHeader/Builders.h"
+#include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
 
@@ -20,12 +19,6 @@ constexpr std::array kProfiles = {ReadProfile::Classic, ReadProfile::Modern};
 
 Bytes TwoSeconds() {
     return WaveBuilder().Format(2, 1000).Chunk("data", 8000).Zeros(8000).Data();
-}
-
-void WriteFile(const QString& path, ByteSpan bytes) {
-    QFile file(path);
-    ASSERT_TRUE(file.open(QIODevice::WriteOnly));
-    file.write(reinterpret_cast<const char*>(bytes.data()), static_cast<qint64>(bytes.size()));
 }
 
 class BrokenMedium : public ByteSource {
@@ -51,18 +44,17 @@ TEST(AudioFile, RefusalsLeaveTheDefaultsAndErrorsAreThrown) {
         EXPECT_EQ(ReadAudioFile(path, options, tag), refusal);
         EXPECT_EQ(tag, fresh);
     }
-    const QTemporaryDir folder;
-    EXPECT_THROW(ReadAudioFile(folder.path(), options, tag), EStreamError);
+    EXPECT_THROW(ReadAudioFile(QDir::tempPath(), options, tag), EStreamError);
     BrokenMedium medium;
     EXPECT_EQ(ReadSong(medium, u"/m/x.mp3"_s, options).Error, u"Lesefehler"_s);
 }
 
 TEST(AudioFile, AMissingFileIsDescribedByItsName) {
-    const QTemporaryDir folder;
-    WriteFile(folder.filePath(u"f"_s), {});
+    const SongFolder folder;
+    folder.Put(u"f"_s, "");
     // Behind a file there is nothing, and the system would see the name that ends at a zero.
     for (const auto& name : {u"f/ABBA - Waterloo.mp3"_s, u"f\0/ABBA - Waterloo"_s}) {
-        const auto path = folder.filePath(name);
+        const auto path = folder.Path(name);
         const auto reading = ReadSong(path, InProfile(ReadProfile::Classic));
         EXPECT_EQ(reading.Refusal, u"Datei nicht gefunden"_s);
         EXPECT_EQ(reading.Tag.Artist, u"ABBA"_s);
@@ -73,13 +65,13 @@ TEST(AudioFile, AMissingFileIsDescribedByItsName) {
 }
 
 TEST(AudioFile, AnOrdinarySongIsReadInBothProfiles) {
-    const QTemporaryDir folder;
-    const auto path = folder.filePath(u"x.mp3"_s);
+    const SongFolder folder;
     const auto tags = TitledTag("Waterloo", "ABBA")
                           .Text("TRCK", "3/12")
                           .Text("TLEN", "999000")
                           .Text("TCON", "(18)Techno (RX)");
-    WriteFile(path, Mp3Builder().Raw(tags.Build()).Frames(400).Id3v1("other", "other").Data());
+    const Bytes song = Mp3Builder().Raw(tags.Build()).Frames(400).Id3v1("other", "other").Data();
+    const auto path = folder.Put(u"x.mp3"_s, ByteSpan(song));
     for (const auto profile : kProfiles) {
         TID3Tag tag;
         EXPECT_EQ(ReadAudioFile(path, InProfile(profile), tag), u""_s);
@@ -244,11 +236,4 @@ TEST(AudioFile, ADamagedTagCostsOnlyItself) {
     EXPECT_EQ(modern.Title, u"T"_s);
     EXPECT_EQ(modern.BitRate, 128);
     EXPECT_TRUE(ReadingOf(Mp3Builder().Frames(2).Data()).Remarks.Text.isEmpty());
-}
-
-TEST(AudioFile, TheFileTimeIsTheCallersOrNow) {
-    const HandClock clock;
-    const auto song = Mp3Builder().Frames(2).Data();
-    EXPECT_EQ(Read(song, ReadOptions()).AddTime, clock.Day);
-    EXPECT_EQ(Read(song).AddTime, 1);
 }

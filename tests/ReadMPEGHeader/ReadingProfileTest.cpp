@@ -89,14 +89,6 @@ TEST(ClassicSearch, OnlyOneTagIsReadWhereverWithModernRulesOnlyAtTheHead) {
     EXPECT_TRUE(FindModern(Mp3Builder().Frames(1).Raw(tag).Frames(1)).Tags.empty());
 }
 
-TEST(ModernSearch, ATextThatLooksLikeASyncDoesNotHideTheTag) {
-    const auto tag = Id3v2Builder().Frame("TIT2", std::string_view("\1\xFF\xFEH\0i\0", 7)).Build();
-    const auto file = Mp3Builder().Raw(tag).Frames(2);
-    EXPECT_EQ(FindModern(file).Frame, tag.size());
-    EXPECT_EQ(FindModern(file).Tags.size(), 1u);
-    EXPECT_TRUE(FindClassic(file).Tags.empty());
-}
-
 TEST(ModernSearch, AudioBehindALargePictureIsFound) {
     const auto tag = BigTag(1'000'000);
     const auto file = Mp3Builder().Raw(tag).Frames(3);
