@@ -45,14 +45,6 @@ void CollectionEdit::Change(SongHandle song, TID3Tag record) {
     changes_.push_back({song, std::move(record)});
 }
 
-void CollectionEdit::Rename(SongHandle song, const QString& path) {
-    const TID3Tag* record = database_.Songs().Find(song);
-    if (record == nullptr) return;
-    TID3Tag renamed = *record;
-    renamed.FileName = path;
-    Change(song, std::move(renamed));
-}
-
 void CollectionEdit::Add(TID3Tag record, AddAs as) {
     additions_.push_back({std::move(record), as});
 }

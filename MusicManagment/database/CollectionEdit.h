@@ -23,7 +23,6 @@ class CollectionEdit {
 
     // The record that the song is to have; with another path it is renamed in the collection.
     void Change(SongHandle song, TID3Tag record);
-    void Rename(SongHandle song, const QString& path);
     void Add(TID3Tag record, AddAs as = AddAs::New);
     void Remove(SongHandle song);
     bool IsEmpty() const { return removals_.empty() && changes_.empty() && additions_.empty(); }

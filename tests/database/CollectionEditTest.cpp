@@ -91,7 +91,9 @@ TEST_F(CollectionEditTest, EditsAreToldKeepTheOrderAndCanBeTakenBack) {
             } else if (kind == 1) {
                 edit.Add(RandomSong());
             } else if (kind == 2) {
-                edit.Rename(song, u":00000002:\\"_s + QString::number(++paths_));
+                TID3Tag renamed = *database_.Songs().Find(song);
+                renamed.FileName = u":00000002:\\"_s + QString::number(++paths_);
+                edit.Change(song, renamed);
             } else {
                 TID3Tag changed = RandomSong();
                 changed.FileName = database_.Songs().Find(song)->FileName;

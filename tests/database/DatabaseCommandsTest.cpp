@@ -2,6 +2,7 @@
 
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/tsdb/DatabaseFile.h"
+#include "tests/ErrorOf.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
 #include "tests/database/SongFolder.h"
@@ -40,15 +41,6 @@ class DatabaseCommandsTest : public testing::Test {
     SongFolder folder_;
     ScriptedDialogs dialogs_;
 };
-
-QString ErrorOf(const std::function<void()>& command) {
-    try {
-        command();
-    } catch (const EMusicDatabaseException& error) {
-        return error.Message();
-    }
-    return {};
-}
 
 }  // namespace
 

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "tests/PrintQt.h"
+#include "tests/database/Listing.h"
 
 using namespace Qt::StringLiterals;
 
@@ -18,13 +19,6 @@ TID3Tag Song(const QString& artist, const QString& album, const QString& year, q
     return song;
 }
 
-QStringList Texts(const SortedTextList& list) {
-    QStringList texts;
-    for (const auto& row : list)
-        texts << row.Text;
-    return texts;
-}
-
 // Goes through all values downwards: the list must have the rows in the order of the values nevertheless, a
 // stranger last.
 template <typename List>
@@ -36,7 +30,7 @@ QStringList Rows(QString (*bucket)(int), int most) {
         if (bucket(value) != expected[0]) expected.prepend(bucket(value));
         list.Insert(bucket(value));
     }
-    EXPECT_EQ(Texts(list), expected);
+    EXPECT_EQ(TextsOf(list), expected);
     return expected;
 }
 
@@ -65,7 +59,7 @@ TEST(GroupListsTest, ArtistsAndAlbumsAreSortedAndTellCasesApart) {
         groups.Add(Song(name, name, QString(), 0, 0));
     groups.Add(Song(u"abba"_s, u"neu"_s, QString(), 0, 0));
     const QStringList expected{u""_s, u"abba"_s, u"Abba"_s, u"Ärzte"_s, u"Bap"_s, u"zz top"_s, u"ZZ Top"_s};
-    EXPECT_EQ(Texts(groups.Artists()), expected);
+    EXPECT_EQ(TextsOf(groups.Artists()), expected);
     EXPECT_EQ(groups.RowSongCount(ovArtist, 1), 2);
     EXPECT_EQ(groups.RowSongCount(ovArtist, 2), 1);
     EXPECT_EQ(groups.RowCount(ovAlbum), 8);
@@ -106,5 +100,5 @@ TEST(GroupListsTest, RowsOfAFileAddUpAndMayBeWrong) {
     groups.AddRow(ovArtist, u"Queen"_s, 2);
     EXPECT_EQ(groups.RowSongCount(ovArtist, 0), 5);
     groups.Remove(Song(u"not in the file"_s, QString(), QString(), 0, 0));
-    EXPECT_EQ(Texts(groups.Artists()), QStringList{u"Queen"_s});
+    EXPECT_EQ(TextsOf(groups.Artists()), QStringList{u"Queen"_s});
 }

@@ -33,14 +33,14 @@ enum Doing : unsigned {
 constexpr int kHead = 44;
 constexpr qint64 kOldTime = 1'000'000'000'000;  // milliseconds
 
-// A few songs, their collection, and a batch that changes all of them. The contents of a file tell the title
-// that its record is to have.
+// A few songs, their collection and journal, and a batch that changes all of them. The contents of a file
+// tell the title that its record is to have.
 class Songs {
  public:
-    Songs(int count, unsigned doing) : count_(count), doing_(doing) {
+    Songs(int count, unsigned doing, JournalLimits limits = {})
+        : OwnJournal(folder_.Path(u"journal.tsj"_s), limits), count_(count), doing_(doing) {
         qputenv("XDG_DATA_HOME", QFile::encodeName(folder_.Path(u"data"_s)));
         QDir(folder_.Path()).mkdir(u"data"_s);
-        TMusicDatabase database;
         for (int i = 0; i < count; ++i) {
             folder_.Put(OldName(i), Old(i));
             QFile file(folder_.Path(OldName(i)));
@@ -48,79 +48,73 @@ class Songs {
                         file.setFileTime(QDateTime::fromMSecsSinceEpoch(kOldTime + i),
                                          QFileDevice::FileModificationTime));
             file.close();
-            EXPECT_GE(database.AddEntry(QString(), Record(folder_.Path(OldName(i)), OldTitle(i))), 0);
+            EXPECT_GE(Database.AddEntry(QString(), Record(folder_.Path(OldName(i)), OldTitle(i))), 0);
         }
-        EXPECT_TRUE(database.SaveDatabase(DatabasePath()));
+        EXPECT_TRUE(Database.SaveDatabase(folder_.Path(u"songs.tsdb"_s)));
     }
     ~Songs() { qunsetenv("XDG_DATA_HOME"); }
 
-    QString DatabasePath() const { return folder_.Path(u"songs.tsdb"_s); }
-    QString JournalPath() const { return folder_.Path(u"journal.tsj"_s); }
-
-    // As the program that is ended would do it: what the collection learns is not saved.
     void Change(StepGate& gate) {
-        TMusicDatabase database;
-        database.OpenDatabase(DatabasePath());
-        Journal journal(JournalPath());
-        Change(gate, journal, database);
-    }
-    void Change(StepGate& gate, Journal& journal, TMusicDatabase& database) {
         gate.BetweenFileSystems = (doing_ & kAcross) != 0;
-        FileBatch batch(&journal, &database, QString::number(count_) + u" Songs"_s);
+        FileBatch batch(&OwnJournal, &Database, QString::number(count_) + u" Songs"_s);
         for (int i = 0; i < count_; ++i)
             batch.Add(Item(i));
-        failures_ = batch.Failures();
         batch.Finish();
         failures_ = batch.Failures();
     }
     void Undo(StepGate& gate) {
-        TMusicDatabase database;
-        database.OpenDatabase(DatabasePath());
         gate.BetweenFileSystems = (doing_ & kAcross) != 0;
-        Journal(JournalPath()).Undo(&database);
+        OwnJournal.Undo(&Database);
+    }
+    void Ban(const QString& entry) {
+        FileBatch(&OwnJournal, &Database, entry).Add(std::move(FileItem().Ban(entry)));
     }
 
     // Each file is whole, the old or the new one, in the old place or the new one, and there is nothing else;
     // the collection knows each by its title and place. Returns how many are wholly as they were.
-    int CheckWhole(TMusicDatabase& database) const {
+    int CheckWhole() const {
         int old = 0;
         QStringList known;
         for (int i = 0; i < count_; ++i) {
             const bool moved = !QFile::exists(folder_.Path(OldName(i)));
             const QString name = moved ? NewName(i) : OldName(i);
             if (moved && (doing_ & kTrash) != 0) {
-                EXPECT_FALSE(database.Contains(folder_.Path(OldName(i))));
+                EXPECT_FALSE(Database.Contains(folder_.Path(OldName(i))));
                 continue;
             }
             known << name;
             const QByteArray contents = folder_.Get(name);
             EXPECT_TRUE(contents == Old(i) || contents == New(i)) << name.toStdString();
             const bool isNew = contents != Old(i);
-            const SongIndex song = database.IndexOf(folder_.Path(name));
+            const SongIndex song = Database.IndexOf(folder_.Path(name));
             EXPECT_GE(song, 0) << name.toStdString();
             if (song >= 0) {
-                EXPECT_EQ(database.Song(song).Title, isNew ? NewTitle(i) : OldTitle(i));
+                EXPECT_EQ(Database.Song(song).Title, isNew ? NewTitle(i) : OldTitle(i));
             }
             const bool hasOldTime =
                 QFileInfo(folder_.Path(name)).lastModified().toMSecsSinceEpoch() == kOldTime + i;
             EXPECT_EQ(hasOldTime, !isNew);
             if (!isNew && !moved) ++old;
         }
-        EXPECT_EQ(database.Count(), known.size());
+        EXPECT_EQ(Database.Count(), known.size());
         EXPECT_EQ(Names(), known);
         return old;
     }
+    // Everything can be taken back.
+    void CheckTakingBack() {
+        while (OwnJournal.ToUndo())
+            ASSERT_EQ(OwnJournal.Undo(&Database).Problems, QStringList());
+        ASSERT_EQ(CheckWhole(), count_);
+    }
     // What a start of the program does after it was ended anywhere.
-    void Recover(Journal& journal, TMusicDatabase& database) {
-        const RecoveryResult recovered = journal.TakeBackUnfinished();
-        EXPECT_EQ(recovered.Problems, QStringList());
-        database.OpenDatabase(DatabasePath());
-        journal.BringUpToDate(database);
+    void Recover() {
+        EXPECT_EQ(OwnJournal.TakeBackUnfinished().Problems, QStringList());
+        Database.OpenDatabase(QString(Database.FileName()));
+        OwnJournal.BringUpToDate(Database);
     }
 
-    int Count() const { return count_; }
     const QStringList& Failures() const { return failures_; }
-    SongFolder& Folder() { return folder_; }
+    const SongFolder& Folder() const { return folder_; }
 
     static QString OldName(int i) { return u"old%1.mp3"_s.arg(i, 3, 10, QChar(u'0')); }
     QString NewName(int i) const {
@@ -201,7 +195,13 @@ class Songs {
         return names;
     }
 
-    SongFolder folder_;
+    const SongFolder folder_;
+
+ public:
+    TMusicDatabase Database;
+    Journal OwnJournal;
+
+ private:
     int count_;
     unsigned doing_;
     QStringList failures_;
@@ -244,7 +244,6 @@ class KilledTest : public JournalTest, public testing::WithParamInterface<Case> 
  protected:
     // Returns how far apart the moments lie at which a process is ended: all of them, or as many evenly
     // spread ones.
-    static int ChangeAll(Songs&& songs) { return ChangeAll(songs); }
     static int ChangeAll(Songs& songs) {
         constexpr int kMoments = 40;
         StepGate gate;
@@ -254,16 +253,12 @@ class KilledTest : public JournalTest, public testing::WithParamInterface<Case> 
     }
     // After any end: whole files, an agreeing collection, and everything can be taken back.
     static void CheckAfter(Songs& songs) {
-        TMusicDatabase database;
-        Journal journal(songs.JournalPath());
-        songs.Recover(journal, database);
-        songs.CheckWhole(database);
-        while (journal.ToUndo())
-            ASSERT_EQ(journal.Undo(&database).Problems, QStringList());
-        ASSERT_EQ(songs.CheckWhole(database), songs.Count());
+        songs.Recover();
+        songs.CheckWhole();
+        ASSERT_NO_FATAL_FAILURE(songs.CheckTakingBack());
         EXPECT_FALSE(QFile::exists(songs.Folder().Path(u"to"_s)));
         EXPECT_TRUE(QDir(songs.Folder().Path(u"data/Trash/info"_s)).isEmpty());
-        EXPECT_TRUE(journal.TakeBackUnfinished().IsEmpty());
+        EXPECT_TRUE(songs.OwnJournal.TakeBackUnfinished().IsEmpty());
     }
 };
 
@@ -281,13 +276,14 @@ INSTANTIATE_TEST_SUITE_P(Journal, KilledTest,
 #ifndef Q_OS_WIN
 TEST_P(KilledTest, WhereverABatchEndsEachFileIsWholeAndTheCollectionAgrees) {
     const Case& what = GetParam();
-    const int stride = ChangeAll(Songs(what.Songs, what.Doing));
+    Songs trial(what.Songs, what.Doing);
+    const int stride = ChangeAll(trial);
     bool ended = false;
     for (int step = 0; !ended; step += stride) {
         Songs songs(what.Songs, what.Doing);
         ended = RunsToItsEnd(step, [&songs](StepGate& gate) { songs.Change(gate); });
         SCOPED_TRACE(step);
-        RunsToItsEnd(step % 11, [&songs](StepGate&) { Journal(songs.JournalPath()).TakeBackUnfinished(); });
+        RunsToItsEnd(step % 11, [&songs](StepGate&) { songs.OwnJournal.TakeBackUnfinished(); });
         ASSERT_NO_FATAL_FAILURE(CheckAfter(songs));
         if (HasFailure()) return;
     }
@@ -299,10 +295,7 @@ TEST_P(KilledTest, WhereverTakingBackEndsTheRestCanBeTakenBack) {
     for (int step = 0, stride = 0; !ended; step += stride) {
         Songs songs(what.Songs, what.Doing);
         stride = ChangeAll(songs);  // taking back has about as many steps
-        TMusicDatabase database;
-        Journal journal(songs.JournalPath());
-        songs.Recover(journal, database);
-        ASSERT_TRUE(database.SaveDatabase());
+        ASSERT_TRUE(songs.Database.SaveDatabase());
         ended = RunsToItsEnd(step, [&songs](StepGate& gate) { songs.Undo(gate); });
         SCOPED_TRACE(step);
         ASSERT_NO_FATAL_FAILURE(CheckAfter(songs));
@@ -317,45 +310,39 @@ TEST_F(JournalTest, AFullDiskAtAnyWriteLeavesEachFileWhole) {
             for (int step = 0, last = 1; step < last; ++step) {
                 SCOPED_TRACE(testing::Message() << doing << " " << step);
                 Songs songs(3, doing);
-                TMusicDatabase database;
-                database.OpenDatabase(songs.DatabasePath());
-                Journal journal(songs.JournalPath());
                 {
                     StepGate gate(step, then);
-                    songs.Change(gate, journal, database);
+                    songs.Change(gate);
                     last = gate.Steps;
                 }
-                journal.TakeBackUnfinished();
-                songs.CheckWhole(database);
-                while (journal.ToUndo())
-                    ASSERT_EQ(journal.Undo(&database).Problems, QStringList());
-                ASSERT_EQ(songs.CheckWhole(database), songs.Count());
+                songs.OwnJournal.TakeBackUnfinished();
+                songs.CheckWhole();
+                ASSERT_NO_FATAL_FAILURE(songs.CheckTakingBack());
                 if (HasFailure()) return;
             }
 }
 
 TEST_F(JournalTest, ABatchIsTakenBackAndDoneAgainUntilAnotherIsDone) {
     Songs songs(3, kRebuild | kRename);
-    TMusicDatabase database;
-    database.OpenDatabase(songs.DatabasePath());
-    Journal journal(songs.JournalPath());
+    TMusicDatabase& database = songs.Database;
+    Journal& journal = songs.OwnJournal;
     StepGate gate;
-    songs.Change(gate, journal, database);
-    ASSERT_EQ(songs.CheckWhole(database), 0);
+    songs.Change(gate);
+    ASSERT_EQ(songs.CheckWhole(), 0);
     for (int i = 0; i < 2; ++i) {
         ASSERT_TRUE(journal.ToUndo());
         EXPECT_EQ(journal.ToUndo()->Caption, u"3 Songs"_s);
         EXPECT_EQ(journal.ToUndo()->Files, 3);
         EXPECT_EQ(journal.Undo(&database).Items, 3);
-        EXPECT_EQ(songs.CheckWhole(database), 3);
+        EXPECT_EQ(songs.CheckWhole(), 3);
         EXPECT_FALSE(journal.ToUndo());
-        EXPECT_EQ(Journal(songs.JournalPath()).Redo(&database).Items, 3);  // as after a restart
-        EXPECT_EQ(songs.CheckWhole(database), 0);
+        EXPECT_EQ(Journal(journal.Path()).Redo(&database).Items, 3);  // as after a restart
+        EXPECT_EQ(songs.CheckWhole(), 0);
         EXPECT_FALSE(journal.ToRedo());
     }
     journal.Undo(&database);
     ASSERT_TRUE(journal.ToRedo());
-    FileBatch(&journal, &database, u"Bann"_s).Add(std::move(FileItem().Ban(u"A - B"_s)));
+    songs.Ban(u"A - B"_s);
     EXPECT_TRUE(database.BannList().Contains(u"A - B"));
     EXPECT_FALSE(journal.ToRedo());
     journal.Undo(&database);
@@ -364,11 +351,10 @@ TEST_F(JournalTest, ABatchIsTakenBackAndDoneAgainUntilAnotherIsDone) {
 
 TEST_F(JournalTest, WhatHasChangedSinceIsLeftAloneAndNamed) {
     Songs songs(3, kRebuild | kRename);
-    TMusicDatabase database;
-    database.OpenDatabase(songs.DatabasePath());
-    Journal journal(songs.JournalPath());
+    TMusicDatabase& database = songs.Database;
+    Journal& journal = songs.OwnJournal;
     StepGate gate;
-    songs.Change(gate, journal, database);
+    songs.Change(gate);
 
     const QString changed = songs.Folder().Put(songs.NewName(1), "of somebody else");
     TID3Tag played = database.Song(database.IndexOf(songs.Folder().Path(songs.NewName(2))));
@@ -385,15 +371,13 @@ TEST_F(JournalTest, WhatHasChangedSinceIsLeftAloneAndNamed) {
 }
 
 TEST_F(JournalTest, OneProgramChangesFilesAtATimeAndOnlyItsOwnDatabase) {
-    const Songs songs(1, kRename);
-    TMusicDatabase database;
-    database.OpenDatabase(songs.DatabasePath());
-    Journal journal(songs.JournalPath());
+    Songs songs(1, kRename);
+    Journal& journal = songs.OwnJournal;
     {
-        FileBatch batch(&journal, &database, u"Bann"_s);
+        FileBatch batch(&journal, &songs.Database, u"Bann"_s);
         batch.Add(std::move(FileItem().Ban(u"A - B"_s)));
         EXPECT_THROW(FileBatch(&journal, nullptr, u"zweiter"_s), EJournalBusy);
-        EXPECT_THROW(Journal(songs.JournalPath()).Undo(&database), EJournalBusy);
+        EXPECT_THROW(Journal(journal.Path()).Undo(&songs.Database), EJournalBusy);
     }
     TMusicDatabase other;
     EXPECT_THROW(journal.Undo(&other), EOtherDatabase);
@@ -402,20 +386,17 @@ TEST_F(JournalTest, OneProgramChangesFilesAtATimeAndOnlyItsOwnDatabase) {
 }
 
 TEST_F(JournalTest, TheOldestBatchesAreDroppedAndATornTailIsNothing) {
-    const Songs songs(1, kRename);
-    TMusicDatabase database;
-    database.OpenDatabase(songs.DatabasePath());
-    Journal journal(songs.JournalPath(), {.Bytes = 1 << 20, .Batches = 3});
+    Songs songs(1, kRename, {.Bytes = 1 << 20, .Batches = 3});
     for (int i = 0; i < 6; ++i)
-        FileBatch(&journal, &database, QString::number(i)).Add(std::move(FileItem().Ban(QString::number(i))));
-    QFile file(songs.JournalPath());
+        songs.Ban(QString::number(i));
+    QFile file(songs.OwnJournal.Path());
     ASSERT_TRUE(file.open(QIODevice::ReadWrite));
     file.resize(file.size() - 5);  // the end of the last batch is not whole
     file.close();
-    FileBatch(&journal, &database, u"6"_s).Add(std::move(FileItem().Ban(u"6"_s)));
+    songs.Ban(u"6"_s);
     QStringList captions;
-    for (const BatchInfo& batch : journal.Batches())
+    for (const BatchInfo& batch : songs.OwnJournal.Batches())
         captions << batch.Caption;
     EXPECT_EQ(captions, (QStringList{u"6"_s, u"5"_s, u"4"_s, u"3"_s}));
-    EXPECT_FALSE(journal.FitsBatch(2 << 20));
+    EXPECT_FALSE(songs.OwnJournal.FitsBatch(2 << 20));
 }

@@ -53,14 +53,14 @@ TEST(NamePattern, ALongNameLosesTheEndOfItsTitle) {
 
 TEST(RenameTarget, FollowsTheSettings) {
     TMusicDatabase database;
-    database.SetMP3MoveRootDir(u"/root"_s);
+    database.SetMP3MoveRootDir(u"/stamm"_s);
     const TID3Tag song = Song();
     const auto target = [&](const TID3Tag& info) { return RenameTarget(database, u"/old/x.mp3"_s, info); };
-    EXPECT_EQ(target(song), u"/root/old/AC-DC - Was ist_.mp3"_s);  // the old folder goes on below the root
+    EXPECT_EQ(target(song), u"/stamm/old/AC-DC - Was ist_.mp3"_s);  // the old folder goes on below the root
     database.SetRenameInPlace(true);
     EXPECT_EQ(target(song), u"/old/AC-DC - Was ist_.mp3"_s);
     database.SetMoveMP3sAfterGenreChange(true);
-    EXPECT_EQ(target(song), u"/root/Rock, Pop/AC-DC - Was ist_.mp3"_s);
+    EXPECT_EQ(target(song), u"/stamm/Rock, Pop/AC-DC - Was ist_.mp3"_s);
     TID3Tag unsorted = song;
     unsorted.MainGenre = 0;
     EXPECT_EQ(target(unsorted), u"/old/AC-DC - Was ist_.mp3"_s);

@@ -6,7 +6,7 @@
 #include <QTemporaryDir>
 #include <filesystem>
 
-#include "CommonRUKTools/ByteWriter.h"
+#include "tests/WaveFile.h"
 
 // A temporary folder for a test, with small WAV files whose names tell artist and title
 // ("Queen - Jealousy.wav") and whatever else it puts there.
@@ -60,19 +60,7 @@ class SongFolder {
     // One channel of 8 bits, 1000 samples a second.
     static QByteArray Wave(std::uint32_t seconds) {
         constexpr std::uint32_t kRate = 1000;
-        ByteWriter file;
-        file.Raw("RIFF");
-        file.U32Le(36 + seconds * kRate);
-        file.Raw("WAVEfmt ");
-        file.U32Le(16);
-        file.U16Le(1);
-        file.U16Le(1);
-        file.U32Le(kRate);
-        file.U32Le(kRate);
-        file.U16Le(1);
-        file.U16Le(8);
-        file.Raw("data");
-        file.U32Le(seconds * kRate);
+        ByteWriter file = WaveHead({.Rate = kRate, .Channels = 1, .Bits = 8}, seconds * kRate);
         file.Zeros(seconds * kRate);
         const auto& bytes = file.Bytes();
         return {reinterpret_cast<const char*>(bytes.data()), static_cast<qsizetype>(bytes.size())};

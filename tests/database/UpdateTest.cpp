@@ -10,6 +10,7 @@
 #include "MusicManagment/database/songfiles/Removal.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
+#include "tests/database/Listing.h"
 #include "tests/database/SongFolder.h"
 
 using namespace Qt::StringLiterals;
@@ -24,12 +25,6 @@ class UpdateTest : public testing::Test {
         AddPaths(database_, {songs_.Path(u"music"_s)}, true);
         database_.SetUpdateFolders({songs_.Path(u"music"_s)});
         database_.SetModified(false);
-    }
-    QStringList Titles() const {
-        QStringList titles;
-        for (const auto& song : database_.Songs())
-            titles << song->Title;
-        return titles;
     }
 
     SongFolder songs_;
@@ -47,7 +42,7 @@ TEST_F(UpdateTest, NewSongsComeInAndGoneOnesLeaveAfterTheQuestion) {
     const UpdateResult result = UpdateDatabase(database_, UpdateTags::Keep);
     EXPECT_EQ(result.Intake.Added, 1);
     EXPECT_EQ(result.Removed, songs_.Paths({u"music/A - one.wav"_s}));
-    EXPECT_EQ(Titles(), (QStringList{u"three"_s, u"two"_s}));
+    EXPECT_EQ(TitlesOf(database_), (QStringList{u"three"_s, u"two"_s}));
     ASSERT_FALSE(dialogs_.Questions.empty());
     EXPECT_TRUE(dialogs_.Questions[0].contains(songs_.Path(u"music/A - one.wav"_s)));
     EXPECT_EQ(database_.Artists().At(0).Number, 2);
@@ -89,7 +84,7 @@ TEST_F(UpdateTest, AFolderThatLostAllItsSongsIsAskedForInOtherWords) {
         << dialogs_.Questions[1].toStdString();
     dialogs_.Answers = {0, 0};
     EXPECT_EQ(UpdateDatabase(database_, UpdateTags::Keep).Removed.size(), 3);
-    EXPECT_EQ(Titles(), QStringList{u"two"_s});
+    EXPECT_EQ(TitlesOf(database_), QStringList{u"two"_s});
 }
 
 TEST_F(UpdateTest, ChangedTagsAreTakenOverAndTheCollectionsFieldsStay) {
@@ -128,11 +123,11 @@ TEST_F(UpdateTest, RemovedSongsComeBackEvenWithoutTheirFiles) {
     const SongList& songs = database_.Songs();
     EXPECT_EQ(RemoveSongs(journal, database_, {songs.HandleOf(2), songs.HandleOf(0), SongHandle()}, u"x"_s),
               2);
-    EXPECT_EQ(Titles(), QStringList{u"three"_s});
+    EXPECT_EQ(TitlesOf(database_), QStringList{u"three"_s});
     EXPECT_EQ(database_.Artists().Count(), 1);
     QFile::remove(songs_.Path(u"music/A - one.wav"_s));
     EXPECT_EQ(journal.Undo(&database_).Songs.size(), 2);
-    EXPECT_EQ(Titles(), (QStringList{u"one"_s, u"three"_s, u"two"_s}));
+    EXPECT_EQ(TitlesOf(database_), (QStringList{u"one"_s, u"three"_s, u"two"_s}));
     EXPECT_EQ(database_.Artists().At(1).Number, 2);
 }
 

@@ -99,7 +99,10 @@ TEST_F(PlayListTest, EntriesQueueAndHistoryFollowTheirSongsToOtherPathsAndBack) 
 
     CollectionEdit edit(database);
     const auto rename = [&](const QString& from, const QString& to) {
-        edit.Rename(database.Songs().HandleOf(*database.Songs().Find(Path(from))), Path(to));
+        TID3Tag renamed = *database.Songs().Find(Path(from));
+        const SongHandle song = database.Songs().HandleOf(*database.Songs().Find(Path(from)));
+        renamed.FileName = Path(to);
+        edit.Change(song, renamed);
     };
     rename(u"b"_s, u"c"_s);  // these two swap
     rename(u"c"_s, u"b"_s);

@@ -120,8 +120,10 @@ TEST_F(ReleaseTest, AFileThatWasMovedWithoutAWordPlaysOnUnderItsNewName) {
     panel.Log.clear();
     const QString path = folder_.Path(u"x.mp3"_s);
     ASSERT_TRUE(QFile::rename(player_.FileName(), path));
+    TID3Tag renamed = *database_.Songs().Find(song_);
+    renamed.FileName = path;
     CollectionEdit edit(database_);
-    edit.Rename(song_, path);
+    edit.Change(song_, renamed);
     edit.Commit();
     EXPECT_EQ(stage_.Log, QStringList());
     EXPECT_TRUE(panel.Log.contains(u"x"_s));
