@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include "tests/ErrorOf.h"
 #include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 #include "tests/playback/Listening.h"
@@ -72,16 +73,6 @@ class FMODPlaySoundTest : public Listening {
         sound.SetBackendFile(Path("a.wav"));
     }
 
-    // The message of the exception that `action` throws; empty when it throws none.
-    template <typename Action>
-    static QString Refusal(Action action) {
-        try {
-            action();
-        } catch (const EFMODException& refusal) {
-            return refusal.Message();
-        }
-        return {};
-    }
     void PlaySong(const char* name) {
         sound.SetBackendFile(Path(name));
         sound.Open();
@@ -129,10 +120,11 @@ TEST_F(FMODPlaySoundTest, FailureToPlayOrPauseIsTold) {
     TFMODPlaySound late(noting, {.SoftChannels = 1});
     late.SetBackendFile(Path("a.wav"));
     late.Open();
-    EXPECT_EQ(Refusal([&] { late.Play(); }), u"Fehler beim Abspielen von "_s + Path("a.wav") +
-                                                 u" in FMOD: Failed to allocate a new channel"_s);
+    EXPECT_EQ(
+        ErrorOf<EFMODException>([&] { late.Play(); }),
+        u"Fehler beim Abspielen von "_s + Path("a.wav") + u" in FMOD: Failed to allocate a new channel"_s);
     noting.pauseWorks = false;
-    EXPECT_EQ(Refusal([&] { only.PauseResume(); }),
+    EXPECT_EQ(ErrorOf<EFMODException>([&] { only.PauseResume(); }),
               u"Fehler beim Pausieren/Fortsetzen von "_s + Path("a.wav") + u" in FMOD: No errors"_s);
     EXPECT_EQ(FMODErrorText(19), u"Unknown error"_s);
 }
@@ -166,30 +158,6 @@ TEST_F(FMODPlaySoundTest, VolumeIsBoundedAndRounded) {
         sound.SetVolume(percent);
         EXPECT_EQ(noting.volume, song) << percent;
     }
-}
-
-TEST_F(FMODPlaySoundTest, FadesEndOnTheTickAfterTheirEnd) {
-    PlaySong("a.wav");
-    noting.volume = -1;
-    sound.StartFadeIn();
-    clock.Milliseconds += 10000;
-    EXPECT_FALSE(sound.FadeStep());
-    EXPECT_EQ(noting.volume, -1);
-    EXPECT_TRUE(sound.IsFadingIn());
-    clock.Milliseconds += 1;
-    EXPECT_FALSE(sound.FadeStep());
-    EXPECT_EQ(noting.volume, 255);
-    EXPECT_FALSE(sound.IsFadingIn());
-
-    sound.StartFadeOut();
-    clock.Milliseconds += 10000;
-    EXPECT_FALSE(sound.FadeStep());
-    EXPECT_EQ(sound.GetStatus(), psPlaying);
-    clock.Milliseconds += 1;
-    EXPECT_TRUE(sound.FadeStep());
-    EXPECT_EQ(sound.GetStatus(), psStopped);
-    EXPECT_EQ(noting.volume, 255);  // silence came from stopping, not from one last loud step
-    EXPECT_FALSE(sound.FadeStep());
 }
 
 TEST_F(FMODPlaySoundTest, PlayingAgainOrCuttingEndsAFadeAtTheNextStep) {

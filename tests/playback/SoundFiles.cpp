@@ -10,7 +10,7 @@
 #include <stdexcept>
 #include <string>
 
-#include "CommonRUKTools/ByteWriter.h"
+#include "tests/WaveFile.h"
 
 extern "C" {
 #include <libavcodec/avcodec.h>
@@ -198,21 +198,9 @@ QByteArray ReadBytes(const QString& path) {
 }
 
 void WriteWav(const QString& path, const Samples& samples, int rate, int channels) {
-    const auto sides = static_cast<std::uint32_t>(channels);
-    const auto size = static_cast<std::uint32_t>(samples.size() / 2 * sides * 2);
-    ByteWriter out;
-    out.Raw("RIFF");
-    out.U32Le(36 + size);
-    out.Raw("WAVEfmt ");
-    out.U32Le(16);
-    out.U16Le(1);
-    out.U16Le(static_cast<std::uint16_t>(sides));
-    out.U32Le(static_cast<std::uint32_t>(rate));
-    out.U32Le(static_cast<std::uint32_t>(rate) * sides * 2);
-    out.U16Le(static_cast<std::uint16_t>(sides * 2));
-    out.U16Le(16);
-    out.Raw("data");
-    out.U32Le(size);
+    const auto sides = static_cast<std::uint16_t>(channels);
+    ByteWriter out = WaveHead({.Rate = static_cast<std::uint32_t>(rate), .Channels = sides, .Bits = 16},
+                              static_cast<std::uint32_t>(samples.size() / 2 * sides * 2));
     for (std::size_t i = 0; i < samples.size(); i += channels == 1 ? 2 : 1)
         out.U16Le(static_cast<std::uint16_t>(Int16(samples[i])));
     WriteBytes(path, {reinterpret_cast<const char*>(out.Bytes().data()), static_cast<qsizetype>(out.Size())});

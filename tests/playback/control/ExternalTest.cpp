@@ -1,3 +1,4 @@
+#include "tests/ErrorOf.h"
 #include "tests/playback/control/PlayerRig.h"
 
 // Playing in a separate player program.
@@ -162,22 +163,12 @@ TEST_F(ExternalTest, SwitchingTakesTheSongAlong) {
 }
 
 TEST_F(ExternalTest, WithoutAPlaceForFeedbackAnExceptionSaysWhy) {
-    const auto messageOfOpening = [this] {
-        try {
-            player_.SetFileName(Add(u"a.mp3"_s));
-        } catch (const EPlaySoundException& error) {
-            return error.Message();
-        }
-        return QString();
-    };
+    const auto open = [this] { player_.SetFileName(Add(u"a.mp3"_s)); };
+    const QString message = u"Fehler beim Erstellen eines Hilfs-Fensters für EPS-FeedBacks "_s;
     script_.Creates = false;
-    EXPECT_EQ(
-        messageOfOpening(),
-        u"Fehler beim Erstellen eines Hilfs-Fensters für EPS-FeedBacks (CreateWindow fehlgeschlagen)"_s);
+    EXPECT_EQ(ErrorOf<EPlaySoundException>(open), message + u"(CreateWindow fehlgeschlagen)"_s);
     script_.Registers = false;
-    EXPECT_EQ(
-        messageOfOpening(),
-        u"Fehler beim Erstellen eines Hilfs-Fensters für EPS-FeedBacks (RegisterClass fehlgeschlagen)"_s);
+    EXPECT_EQ(ErrorOf<EPlaySoundException>(open), message + u"(RegisterClass fehlgeschlagen)"_s);
     EXPECT_TRUE(script_.Take().isEmpty());
 }
 

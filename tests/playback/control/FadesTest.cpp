@@ -117,16 +117,6 @@ TEST_F(FadesTest, ModeIsAskedAnewForEachDecision) {
     EXPECT_EQ(player_.Crossover(), coNone);
 }
 
-TEST_F(FadesTest, ASecondCrossFadeLetsTheFirstSongGo) {
-    PlaySong(u"a.mp3"_s);
-    EXPECT_TRUE(player_.PlayWithCrossFade(Add(u"b.mp3"_s)));
-    Pass(1000);
-    EXPECT_TRUE(player_.PlayWithCrossFade(Add(u"c.mp3"_s)));
-    EXPECT_EQ(Open(), u"FMOD:b FMOD:c"_s);
-    EXPECT_EQ(player_.FileName(), folder_.Path(u"c.mp3"_s));
-    EXPECT_EQ(player_.COFileName(), QString());
-}
-
 TEST_F(FadesTest, PlayDuringACrossFadeCutsTheOldSongShort) {
     PlaySong(u"a.mp3"_s);
     player_.PlayWithCrossFade(Add(u"b.mp3"_s));

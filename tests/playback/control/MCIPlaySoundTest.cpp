@@ -5,6 +5,7 @@
 #include <map>
 
 #include "MusicManagment/playback/backend/EngineErrors.h"
+#include "tests/ErrorOf.h"
 #include "tests/PrintQt.h"
 #include "tests/database/SongFolder.h"
 
@@ -70,12 +71,7 @@ TEST_F(MciTest, DeviceTypeGoesByTheExtensionUnlessASettingNamesOne) {
 TEST_F(MciTest, RefusedCommandsTellTheReason) {
     const auto messageOf = [this](MciCommand command, const std::function<void()>& operation) {
         mci_.Errors = {{command, 263}};
-        QString message;
-        try {
-            operation();
-        } catch (const EMCIException& error) {
-            message = error.Message();
-        }
+        const QString message = ErrorOf<EMCIException>(operation);
         mci_.Errors.clear();
         return message;
     };

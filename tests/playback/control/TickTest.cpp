@@ -74,15 +74,6 @@ TEST_F(TickTest, UnknownLengthIsNoEndWhileTheSongPlays) {
     EXPECT_EQ(ends_ + crossovers_, 0);
 }
 
-TEST_F(TickTest, SongThatBreaksOffEndsAsWell) {
-    List({u"a.mp3"_s, u"b.mp3"_s});
-    list_.PlayNext();
-    Pass(20'000);
-    Any(u"a"_s).Status = psStopped;
-    Pass(1500);
-    EXPECT_EQ(Open(), u"FMOD:b"_s);
-}
-
 TEST_F(TickTest, AfterTheLastSongTheTimersRest) {
     HardChanges();
     length_ = 5000;

@@ -10,6 +10,7 @@
 #include "MusicManagment/playback/eldos/NullPush.h"
 #include "MusicManagment/playback/eldos/PushQueue.h"
 #include "MusicManagment/playback/eldos/SdlPush.h"
+#include "tests/ErrorOf.h"
 #include "tests/HandClock.h"
 #include "tests/PrintQt.h"
 #include "tests/playback/SoundFiles.h"
@@ -215,14 +216,10 @@ TEST_F(EldoSTest, WhateverIsDoneToASongNothingJumps) {
 
 TEST_F(EldoSTest, ModulesAreLookedForInTheirFolders) {
     const auto opens = [this](const QString& path) {
-        try {
-            Sound(path)->Open();
-        } catch (const EEldoSException& error) {
-            EXPECT_EQ(error.Message(),
-                      u"Kann keine zur Datei "_s + path + u" passende EldoS-Sound-DLL finden."_s);
-            return false;
-        }
-        return true;
+        const QString error = ErrorOf<EEldoSException>([&] { Sound(path)->Open(); });
+        if (error.isEmpty()) return true;
+        EXPECT_EQ(error, u"Kann keine zur Datei "_s + path + u" passende EldoS-Sound-DLL finden."_s);
+        return false;
     };
     const QString song = ToneFile(u"mp3"_s);
     EXPECT_FALSE(opens(folder_.filePath(u"song.ogg"_s)));

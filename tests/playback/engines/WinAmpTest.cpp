@@ -5,6 +5,7 @@
 #include <QTemporaryDir>
 
 #include "MusicManagment/playback/winamp/Waiting.h"
+#include "tests/ErrorOf.h"
 #include "tests/PrintQt.h"
 #include "tests/PrivateBus.h"
 #include "tests/playback/control/PlayerRig.h"
@@ -63,15 +64,6 @@ class WinAmpTest : public testing::Test {
                 return sound.GetStatus() == psStopped;
             },
             kPatience));
-    }
-    template <typename Action>
-    static QString ErrorOf(Action action) {
-        try {
-            action();
-        } catch (const EWinAmpException& error) {
-            return error.Message();
-        }
-        return u"no error"_s;
     }
 
     HandClock clock_;
@@ -233,7 +225,7 @@ TEST_F(WinAmpTest, APlayerThatIsGoneForGoodIsAnErrorEachTime) {
     const auto sound = Playing();
     Vanish(*sound);
     for (int i = 0; i < 2; ++i) {
-        EXPECT_EQ(ErrorOf([&] { sound->Play(); }), u"Kann den Player fake nicht finden."_s);
+        EXPECT_EQ(ErrorOf<EWinAmpException>([&] { sound->Play(); }), u"Kann den Player fake nicht finden."_s);
         clock_.Milliseconds += 5000;
         EXPECT_EQ(sound->GetStatus(), psStopped);
     }
@@ -255,15 +247,15 @@ TEST_F(WinAmpTest, APositionThatCannotBeSetIsAnError) {
     const QString message = u"Fehler beim Setzen der neuen Position."_s;
     const auto sound = Playing();
     player_.SeekFails = true;
-    EXPECT_EQ(ErrorOf([&] { sound->SetPosition(1000); }), message);
+    EXPECT_EQ(ErrorOf<EWinAmpException>([&] { sound->SetPosition(1000); }), message);
     player_.SeekFails = false;
     player_.HasTrackId = false;
-    EXPECT_EQ(ErrorOf([&] { sound->SetPosition(1000); }), message);
+    EXPECT_EQ(ErrorOf<EWinAmpException>([&] { sound->SetPosition(1000); }), message);
     // Stopping then falls back to the player's own stop.
     sound->Stop();
     EXPECT_EQ(player_.Calls.last(), u"Stop"_s);
     player_.HasTrackId = true;
-    EXPECT_EQ(ErrorOf([&] { sound->SetPosition(1000); }), u"no error"_s);
+    EXPECT_EQ(ErrorOf<EWinAmpException>([&] { sound->SetPosition(1000); }), QString());
 }
 
 TEST_F(WinAmpTest, OnlyAFittingPlayerIsTaken) {
@@ -300,18 +292,18 @@ TEST_F(WinAmpTest, WhatDoesNotComeInTimeIsAnError) {
     settings_.FileTimeout = 100;
     settings_.AnswerTimeout = 100;
     settings_.ClassName = u"nobody"_s;
-    EXPECT_EQ(ErrorOf([&] { Sound()->Open(); }), u"Kann den Player nobody nicht finden."_s);
+    EXPECT_EQ(ErrorOf<EWinAmpException>([&] { Sound()->Open(); }), u"Kann den Player nobody nicht finden."_s);
     settings_.File = u"/bin/true"_s;
-    EXPECT_EQ(ErrorOf([&] { Sound()->Open(); }),
+    EXPECT_EQ(ErrorOf<EWinAmpException>([&] { Sound()->Open(); }),
               u"Der Player /bin/true hat sich nicht innerhalb von 1 Sekunden gemeldet."_s);
 
     settings_.ClassName = u"fake"_s;
     player_.Appear();
     player_.OpensNothing = true;
-    EXPECT_EQ(ErrorOf([&] { Sound()->Open(); }),
+    EXPECT_EQ(ErrorOf<EWinAmpException>([&] { Sound()->Open(); }),
               u"Der Player fake hat die Datei "_s + song_ + u" nicht innerhalb von 1 Sekunden geöffnet."_s);
     player_.Answers = false;
-    EXPECT_EQ(ErrorOf([&] { Sound()->Open(); }),
+    EXPECT_EQ(ErrorOf<EWinAmpException>([&] { Sound()->Open(); }),
               u"Der Player fake nimmt die Datei "_s + song_ + u" nicht an."_s);
 }
 
