@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include "CommonRUKTools/Errors.h"
+#include "tests/ErrorOf.h"
 #include "tests/PrintQt.h"
 #include "tests/database/SongFolder.h"
 
@@ -17,12 +17,7 @@ class ArrangementTest : public testing::Test {
     QString Path() const { return folder_.Path(kName); }
     bool IsRefused(const QByteArray& text) const {
         folder_.Put(kName, text);
-        try {
-            ReadArrangement(Path());
-            return false;
-        } catch (const EStreamError&) {
-            return true;
-        }
+        return !ErrorOf<EStreamError>([&] { ReadArrangement(Path()); }).isEmpty();
     }
 
     const Arrangement arrangement_{QByteArray("\0\n=a", 4), QByteArray("\xff\xfe"), "columns"};

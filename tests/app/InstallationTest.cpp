@@ -5,10 +5,10 @@
 #include <QDirIterator>
 #include <QRegularExpression>
 
-#include "CommonRUKTools/Errors.h"
 #include "app/desktop/DesktopEntry.h"
 #include "app/desktop/InstallationSteps.h"
 #include "app/desktop/MimeTypes.h"
+#include "tests/ErrorOf.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
 #include "tests/database/RecordingTrash.h"
@@ -186,12 +186,7 @@ TEST_F(InstallationTest, TheUserSaysWhatGoesWithTheProgram) {
 
     dialogs.Questions.clear();
     dialogs.Answers = {kYes, kYes, kNo, kYes};
-    try {
-        steps.Uninstall({});
-        ADD_FAILURE() << "the settings could not be removed";
-    } catch (const ERukException& error) {
-        EXPECT_TRUE(error.Message().contains(settings));
-    }
+    EXPECT_TRUE(ErrorOf([&] { steps.Uninstall({}); }).contains(settings));
     EXPECT_EQ(dialogs.Questions.value(1), u"Soll die Datenbank ebenfalls entfernt werden?"_s);
     EXPECT_EQ(dialogs.Questions.size(), 4);
     EXPECT_EQ(trash.Taken, QStringList{files.Database()});

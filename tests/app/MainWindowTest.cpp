@@ -2,13 +2,11 @@
 
 #include <gtest/gtest.h>
 
-#include <QAction>
 #include <QDockWidget>
 #include <QDropEvent>
 #include <QFile>
 #include <QLabel>
 #include <QLineEdit>
-#include <QMenuBar>
 #include <QMimeData>
 #include <QPushButton>
 #include <QTableView>
@@ -17,13 +15,13 @@
 #include <QUrl>
 
 #include "CommonRUKTools/CommandDispatcher.h"
-#include "CommonRUKTools/Trash.h"
 #include "MusicManagment/database/Command.h"
 #include "app/desktop/Installation.h"
 #include "app/desktop/SingleInstance.h"
 #include "app/dialogs/ProgressWindow.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
+#include "tests/app/Menus.h"
 #include "tests/app/ScriptedBackend.h"
 #include "tests/database/RecordingTrash.h"
 #include "tests/database/SongFolder.h"
@@ -111,12 +109,7 @@ class MainWindowTest : public testing::Test {
         const auto* progress = Child<QWidget>(u"progressWindow"_s);
         return progress != nullptr && progress->isVisible();
     }
-    QAction* Command(const QString& caption) {
-        for (const QAction* menu : window_->menuBar()->actions())
-            for (QAction* action : menu->menu()->actions())
-                if (action->text().remove(u'&') == caption) return action;
-        return nullptr;
-    }
+    QAction* Command(const QString& caption) { return MenuItem(*window_, caption); }
 
     SongFolder folder_;
     BusyDialogs dialogs_;
@@ -427,10 +420,8 @@ TEST_F(MainWindowTest, WhatWasRemovedWithTheProgramDoesNotComeBack) {
     MakeSongs(2);
     Installation installation({u"/opt/tunestead"_s, folder_.Path(u"xdg"_s), folder_.Path(u"xdg"_s)},
                               [](const QString&, const QStringList&) { return QString(); });
-    struct : Trash {
-        bool Take(const QString& path) override { return QFile::remove(path); }
-    } trash;
-    SetTrash(&trash);
+    RecordingTrash trash;
+    trash.Removes = true;
     Start({Music()});
     Database().BannList().Insert(u"A - 1"_s);
     window_->close();
@@ -443,7 +434,6 @@ TEST_F(MainWindowTest, WhatWasRemovedWithTheProgramDoesNotComeBack) {
     EXPECT_FALSE(QFile::exists(StandardDatabase()) ||
                  QFile::exists(folder_.Path(u"data/Tunestead3_BannList.str"_s)) ||
                  QFile::exists(folder_.Path(u"settings.ini"_s)));
-    SetTrash(nullptr);
 }
 
 TEST_F(MainWindowTest, EveryMenuItemHasALetterAndKeysOfItsOwn) {

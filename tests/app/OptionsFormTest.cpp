@@ -123,16 +123,6 @@ TEST_F(OptionsFormTest, RulesAreChosenTogetherOrOneByOne) {
     EXPECT_TRUE(Field<QRadioButton>(u"ModernRules"_s).isChecked());
 }
 
-TEST_F(OptionsFormTest, CancelChangesNothing) {
-    Open();
-    Field<QComboBox>(u"AutoSave"_s).setCurrentIndex(1);
-    QTest::keyClick(form_.get(), Qt::Key_Escape);
-    EXPECT_FALSE(form_->isVisible());
-    EXPECT_EQ(form_->result(), QDialog::Rejected);
-    EXPECT_EQ(database_.AutoSave(), 0);
-    EXPECT_TRUE(dialogs_.Messages.isEmpty());
-}
-
 TEST_F(OptionsFormTest, ApplyStoresAndStaysAndRests) {
     Open();
     Field<QComboBox>(u"AutoSave"_s).setCurrentIndex(1);

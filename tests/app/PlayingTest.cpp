@@ -2,8 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <QMainWindow>
-#include <QMenuBar>
 #include <QTest>
 
 #include "CommonRUKTools/CommandDispatcher.h"
@@ -17,6 +15,7 @@
 #include "app/views/VisPlayList.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
+#include "tests/app/Menus.h"
 #include "tests/app/ScriptedBackend.h"
 #include "tests/database/SongFolder.h"
 
@@ -74,12 +73,10 @@ class PlayingTest : public testing::Test {
     }
     TVisPlayList& View() { return window_.findChild<TPlaylistForm*>()->View(); }
     QString Sounding() const { return QFileInfo(song_.File).completeBaseName(); }
-    void Choose(const QString& menu, const QString& caption) {
-        for (const QAction* top : window_.menuBar()->actions())
-            for (QAction* action : top->menu()->actions())
-                if (top->text().remove(u'&') == menu && action->text().remove(u'&') == caption)
-                    return action->trigger();
-        ADD_FAILURE();
+    void Choose(const QString& caption) {
+        QAction* item = MenuItem(window_, caption, u"Player"_s);
+        ASSERT_NE(item, nullptr);
+        item->trigger();
     }
 
     SongFolder folder_;
@@ -125,7 +122,7 @@ TEST_F(PlayingTest, DoubleClickPlaysTheSongAndWhatFollowsInTheShownList) {
     EXPECT_EQ(Sounding(), u"2"_s);
     EXPECT_TRUE(isBold(2));
     for (const QString& next : {u"3"_s, u"4"_s}) {
-        Choose(u"Player"_s, u"Nächstes"_s);
+        Choose(u"Nächstes"_s);
         EXPECT_EQ(Sounding(), next);
     }
     EXPECT_FALSE(isBold(2));
@@ -166,15 +163,15 @@ TEST_F(PlayingTest, DelWorksInTheListThatHasTheFocus) {
 }
 
 TEST_F(PlayingTest, PlayWithoutASongBeginsWithTheList) {
-    Choose(u"Player"_s, u"Play"_s);
+    Choose(u"Play"_s);
     EXPECT_EQ(dialogs_.Messages, QStringList(u"Keine Lieder in der PlayList zum Abspielen"_s));
     Mark({1, 2}, 1);
     database_.ClickMenuItem(mcAddToPlayList);
-    Choose(u"Player"_s, u"Play"_s);
+    Choose(u"Play"_s);
     EXPECT_EQ(Sounding(), u"1"_s);
-    Choose(u"Player"_s, u"Nächstes"_s);
+    Choose(u"Nächstes"_s);
     EXPECT_EQ(Sounding(), u"2"_s);
-    Choose(u"Player"_s, u"Vorheriges"_s);
+    Choose(u"Vorheriges"_s);
     EXPECT_EQ(Sounding(), u"1"_s);
 }
 
@@ -192,11 +189,11 @@ TEST_F(PlayingTest, TheSongThatPlaysIsFoundInTheCollection) {
     Mark({3}, 3);
     database_.ClickMenuItem(mcPlay);
     Mark({0}, 0);
-    Choose(u"Player"_s, u"Aktuelles Lied markieren"_s);
+    Choose(u"Aktuelles Lied markieren"_s);
     EXPECT_EQ(database_.Song(songs_->FocusedSong()).Title, u"3"_s);
     EXPECT_EQ(songs_->MarkedSongs(), std::vector<SongIndex>({songs_->FocusedSong()}));
     shown_.SetText(u"titel:0"_s);
-    Choose(u"Player"_s, u"Aktuelles Lied markieren"_s);
+    Choose(u"Aktuelles Lied markieren"_s);
     EXPECT_EQ(told_, u"Der Filter zeigt dieses Lied nicht."_s);
 }
 

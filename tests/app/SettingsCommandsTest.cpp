@@ -2,11 +2,8 @@
 
 #include <gtest/gtest.h>
 
-#include <QAction>
 #include <QApplication>
 #include <QCheckBox>
-#include <QMenu>
-#include <QMenuBar>
 #include <QTemporaryDir>
 #include <QTest>
 #include <QTimer>
@@ -21,6 +18,7 @@
 #include "app/views/WindowSettings.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
+#include "tests/app/Menus.h"
 
 using namespace Qt::StringLiterals;
 
@@ -98,12 +96,6 @@ class SettingsCommandsTest : public testing::Test {
             action(*dialog);
         });
     }
-    QAction* ExtrasItem(const QString& caption) {
-        for (QAction* menu : window_->menuBar()->actions())
-            for (QAction* action : menu->menu()->actions())
-                if (QString(action->text()).remove(u'&') == caption) return action;
-        return nullptr;
-    }
     QString SettingsFile() const { return folder_.filePath(u"settings.ini"_s); }
 
     QTemporaryDir folder_;
@@ -146,7 +138,7 @@ TEST_F(SettingsCommandsTest, OkWithoutATouchKeepsEveryAcceptedValue) {
         Start(false);
         Work();
         WithNext<QDialog>([](QDialog& form) { form.accept(); });
-        ExtrasItem(u"Einstellungen..."_s)->trigger();
+        MenuItem(*window_, u"Einstellungen..."_s)->trigger();
         EXPECT_EQ(dialogs_.Messages + dialogs_.Questions, QStringList());
         window_->close();
         const TRWReg settings(kKey, SettingsFile());
@@ -180,10 +172,10 @@ TEST_F(SettingsCommandsTest, ANewInstallationBeginsWithWhatAUserOfTodayWants) {
 TEST_F(SettingsCommandsTest, TheOptionsChangeTheWindowsMenuToo) {
     Start(false);
     Work();
-    QAction* options = ExtrasItem(u"Einstellungen..."_s);
+    QAction* options = MenuItem(*window_, u"Einstellungen..."_s);
     ASSERT_NE(options, nullptr);
     EXPECT_EQ(options->shortcut(), QKeySequence(u"Ctrl+,"_s));
-    QAction* backwards = ExtrasItem(u"Reihenfolge umkehren"_s);
+    QAction* backwards = MenuItem(*window_, u"Reihenfolge umkehren"_s);
     ASSERT_FALSE(backwards->isChecked());
     WithNext<QDialog>([](QDialog& form) {
         form.findChild<QCheckBox*>(u"SortBackwards"_s)->setChecked(true);
@@ -193,15 +185,6 @@ TEST_F(SettingsCommandsTest, TheOptionsChangeTheWindowsMenuToo) {
     EXPECT_EQ(dialogCount_, 1);
     EXPECT_TRUE(window_->Database().SortBackwards());
     EXPECT_TRUE(backwards->isChecked());
-}
-
-TEST_F(SettingsCommandsTest, TheItemsRestDuringARun) {
-    Start(false);
-    Work();
-    window_->Database().StartProgress(u"Test"_s, true);
-    EXPECT_FALSE(ExtrasItem(u"Einstellungen..."_s)->isEnabled());
-    window_->Database().EndProgress(true);
-    EXPECT_TRUE(ExtrasItem(u"Einrichtungsassistent..."_s)->isEnabled());
 }
 
 }  // namespace

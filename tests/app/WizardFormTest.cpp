@@ -150,16 +150,6 @@ TEST_F(WizardFormTest, NothingIsClippedAndEveryKeyIsUniqueInAnyFontSize) {
     });
 }
 
-TEST(WizardChoice, TheFirstStartProposesToLeaveFilesAlone) {
-    TMusicDatabase database;
-    ASSERT_TRUE(database.RenameAndMoveMP3s());
-    EXPECT_FALSE(FirstChoice(database).RenameAndMove);
-    EXPECT_TRUE(CurrentChoice(database).RenameAndMove);
-    database.SetUpdateFolders({u"/musik"_s});
-    EXPECT_EQ(FirstChoice(database).Folders, QStringList{u"/musik"_s});
-    EXPECT_TRUE(FirstChoice(database).ScanNow);
-}
-
 TEST(WizardChoice, IsAppliedToTheDatabase) {
     TMusicDatabase database;
     const QString pattern = database.MP3NamePattern();
