@@ -43,6 +43,7 @@ FileState ReadState(ByteReader& reader) {
 // UTF-16, because a path may hold what is no valid text.
 void WriteText(ByteWriter& writer, const QString& text) {
     writer.U32Le(static_cast<quint32>(text.size()));
+    if (text.isEmpty()) return;  // nor has the vector bytes that could be named
     std::vector<std::uint8_t> units(2 * static_cast<std::size_t>(text.size()));
     qToLittleEndian<char16_t>(text.utf16(), text.size(), units.data());
     writer.Raw(units);
