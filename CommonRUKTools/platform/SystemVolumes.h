@@ -1,0 +1,6 @@
+#pragma once
+
+#include "CommonRUKTools/Volumes.h"
+
+// What the system has mounted.
+VolumeSource& SystemVolumes();
