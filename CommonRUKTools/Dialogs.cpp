@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cstdio>
 
+#include "CommonRUKTools/Volumes.h"
+
 using namespace Qt::StringLiterals;
 
 namespace {
@@ -42,6 +44,21 @@ void Dialogs::ShowReport(const Report& report) {
     constexpr int kDetails = 1;
     const int answer = Ask({.Text = report.Message, .Buttons = {u"OK"_s, u"Details"_s}, .Cancel = kOk});
     if (answer == kDetails && report.OpenAsText) report.OpenAsText();
+}
+
+std::optional<QString> Dialogs::ChooseVolume(const QString& caption, const QString& prompt,
+                                             const QString& preset) {
+    const std::vector<VolumeChoice> volumes = VolumeChoices(preset);
+    QStringList captions;
+    QString chosen;
+    for (const VolumeChoice& volume : volumes) {
+        captions << volume.Caption;
+        if (volume.MountPoint == preset) chosen = volume.Caption;
+    }
+    const auto answer = Input(caption, prompt, captions, chosen.isEmpty() ? captions.front() : chosen);
+    if (!answer) return std::nullopt;
+    const auto found = std::ranges::find(volumes, *answer, &VolumeChoice::Caption);
+    return found != volumes.end() ? found->MountPoint : QString();
 }
 
 Dialogs& UserDialogs() {

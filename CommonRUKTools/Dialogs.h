@@ -59,6 +59,10 @@ class Dialogs {
     // The text entered or chosen; nothing on cancel. With choices the text is one of them.
     virtual std::optional<QString> Input(const QString& caption, const QString& prompt,
                                          const QStringList& choices, const QString& preset) = 0;
+    // Where a medium is: the mount point of a volume, empty while none is chosen; nothing on cancel. Unless
+    // dialogs know better, a choice of what is mounted at this moment.
+    virtual std::optional<QString> ChooseVolume(const QString& caption, const QString& prompt,
+                                                const QString& preset);
     // Nothing (or an empty list) on cancel.
     virtual std::optional<QString> OpenFile(const FileDialogOptions& options) = 0;
     virtual QStringList OpenFiles(const FileDialogOptions& options) = 0;

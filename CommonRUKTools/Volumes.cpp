@@ -5,6 +5,8 @@
 
 #include "CommonRUKTools/platform/SystemVolumes.h"
 
+using namespace Qt::StringLiterals;
+
 namespace {
 
 VolumeSource*& Installed() {
@@ -42,6 +44,20 @@ const Volume* VolumeSource::Holding(const QString& path) {
         if (isCloser && LiesOn(path, volume.MountPoint)) found = &volume;
     }
     return found;
+}
+
+std::vector<VolumeChoice> VolumeChoices(const QString& preset) {
+    std::vector<Volume> volumes = CurrentVolumes().Mounted();
+    std::ranges::stable_partition(volumes, &Volume::CanBeTakenAway);
+    std::vector<VolumeChoice> choices;
+    for (const Volume& volume : volumes) {
+        const QString& place = volume.MountPoint;
+        choices.push_back({volume.Label.isEmpty() ? place : volume.Label + u" ("_s + place + u')', place});
+    }
+    if (!preset.isEmpty() && std::ranges::find(choices, preset, &VolumeChoice::MountPoint) == choices.end())
+        choices.push_back({preset + u" (nichts eingelegt)"_s, preset});
+    if (choices.empty()) choices.push_back({u"(kein Datenträger eingelegt)"_s, {}});
+    return choices;
 }
 
 VolumeSource& CurrentVolumes() {

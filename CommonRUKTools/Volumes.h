@@ -7,13 +7,13 @@
 
 // A file system of a disk or disc that is mounted now.
 struct Volume {
-    QString Device;      // "/dev/sdb1"
-    QString MountPoint;  // without a separator at its end, unless it is the root
-    QString FileSystem;  // as the system names it: "vfat"
-    QString Label;       // empty where it has none
+    QString Device{};      // "/dev/sdb1"
+    QString MountPoint{};  // without a separator at its end, unless it is the root
+    QString FileSystem{};  // as the system names it: "vfat"
+    QString Label{};       // empty where it has none
     // The volume serial numbers by which it may be known, never 0; the first is the one that is stored. Empty
     // where it has none (VolumeSerials.h).
-    std::vector<quint32> Serials;
+    std::vector<quint32> Serials{};
     bool Removable = false;  // the disk or its drive can be taken away
     bool Optical = false;
 
@@ -46,6 +46,15 @@ class VolumeSource {
     // The one on which a clean absolute path lies.
     const Volume* Holding(const QString& path);
 };
+
+// A volume as the user is offered it: "ALBUM (/media/cd)".
+struct VolumeChoice {
+    QString Caption;
+    QString MountPoint;
+};
+// Those that can be taken away first, then the others; `preset` also while nothing is mounted there. Never
+// empty: without any there is one that stands for none.
+std::vector<VolumeChoice> VolumeChoices(const QString& preset);
 
 // The volumes in use; the system's own unless others were set. The caller keeps ownership; nullptr restores
 // them.

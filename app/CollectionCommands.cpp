@@ -8,6 +8,7 @@
 #include "MusicManagment/database/Command.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/intake/Intake.h"
+#include "MusicManagment/database/intake/MediumQuestion.h"
 
 using namespace Qt::StringLiterals;
 
@@ -71,6 +72,7 @@ void CollectionCommands::AddFolder() {
 }
 
 void CollectionCommands::AddPaths(const QStringList& paths) {
+    AskAboutMedia(database_, paths);
     const IntakeResult result = ::AddPaths(database_, paths, true, GivenFolders::Remembered);
     if (OnIntake) OnIntake(result);
 }

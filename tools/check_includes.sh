@@ -7,10 +7,13 @@ build=$(realpath "$1")
 cd "$(dirname "$(realpath "$0")")/.."
 
 # The rooms of the database, from the ground up. Rooms of one line may not see each other.
-floors="core sorting
+floors="sidefile
+core sorting
 journal
 search songfiles tsdb
+media
 batches duplicates intake
+backup
 commands"
 
 links=$(mktemp)

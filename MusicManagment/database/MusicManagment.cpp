@@ -9,6 +9,7 @@
 #include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/FileSource.h"
 #include "CommonRUKTools/MusicFolder.h"
+#include "CommonRUKTools/Volumes.h"
 #include "MusicManagment/database/BannList.h"
 #include "MusicManagment/database/RecycleBin.h"
 
@@ -104,11 +105,6 @@ bool TMusicDatabase::IsBanned(const TID3Tag& record) const {
     return bannList_.Contains(BanEntry(record));
 }
 
-QString TMusicDatabase::ResolveSongPath(const QString& path, const ResolveOptions& options) const {
-    if (!IsCdPath(path)) return path;
-    return OnResolveCdPath ? OnResolveCdPath(path, options) : QString();
-}
-
 void TMusicDatabase::MarkSong(SongIndex index) {
     if (OnMarkSong && index >= 0 && index < Count()) OnMarkSong(*this, index);
 }
@@ -118,7 +114,7 @@ bool TMusicDatabase::Accepts(const TID3Tag& record) {
     const QString path = ResolveSongPath(record.FileName, kOriginalOnly);
     if (!path.isEmpty() && !FileSource::Exists(path)) return false;
     if (!IsBanned(record)) return true;
-    if (autoDelBannedFiles_) MoveToRecycleBin(path, true);
+    if (autoDelBannedFiles_) MoveToRecycleBin(record.FileName, true);
     return false;
 }
 
@@ -209,6 +205,7 @@ void TMusicDatabase::Clear(bool notify, bool keepFileName) {
     songs_.Clear();
     updateFolders_.clear();
     groups_.Clear();
+    side_.Forget();
     maybeUnsorted_ = false;
     SetModified(false);
     groups_.TellRebuilt();
@@ -236,6 +233,7 @@ SongIndex TMusicDatabase::Replace(SongIndex index) {
 
 void TMusicDatabase::Resort() {
     if (Busy()) throw EMusicDatabaseException(u"Umsortieren der Datenbank ist momentan nicht möglich."_s);
+    LookForMedia();
     events_.Reordering.Tell();
     auto entries = songs_.TakeAll();
     SortSongs(order_, entries);
@@ -244,7 +242,20 @@ void TMusicDatabase::Resort() {
     events_.Reordered.Tell();
 }
 
+// The order by the kind of cache changes with what is mounted.
+void TMusicDatabase::LookForMedia() {
+    if (order_.SortType != stCacheType) return;
+    QList<quint32> there;
+    for (const Volume& volume : CurrentVolumes().Mounted())
+        there.append({volume.Serials.begin(), volume.Serials.end()});
+    std::ranges::sort(there);
+    if (order_.MediaThere == there) return;
+    order_.MediaThere = std::move(there);
+    maybeUnsorted_ = true;
+}
+
 void TMusicDatabase::EnsureSorted() {
+    LookForMedia();
     if (!maybeUnsorted_) return;
     if (!IsSorted(order_, songs_)) return Resort();
     maybeUnsorted_ = false;
@@ -413,6 +424,7 @@ void TMusicDatabase::SubscribeSlots() {
         [change](SongIndex index, const TID3Tag&, const TID3Tag&) { change(index, ctChanged); });
     slots_ +=
         events_.Removed.Subscribe([change](SongIndex index, const TID3Tag&) { change(index, ctRemoved); });
+    slots_ += events_.Renamed.Subscribe([this](const PathChanges& changes) { side_.Follow(changes); });
     slots_ += events_.Reordered.Subscribe([change] { change(-1, ctChanged); });
     slots_ += events_.Replaced.Subscribe([change] { change(-1, ctChanged); });
     slots_ += events_.Cleared.Subscribe([this, change] {

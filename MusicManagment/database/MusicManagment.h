@@ -18,6 +18,7 @@
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/SongList.h"
 #include "MusicManagment/database/SongTypes.h"
+#include "MusicManagment/database/sidefile/SideFile.h"
 #include "MusicManagment/database/sorting/Sorting.h"
 #include "ReadMPEGHeader/AudioFile.h"
 
@@ -76,6 +77,13 @@ struct CdName {
     quint32 Serial = 0;  // volume serial number
 };
 
+// Where the database looks for media first.
+struct CdDrive {
+    QString MountPoint;      // empty: none is known yet
+    quint32 LastSerial = 0;  // of the medium that was in it when it was last looked at; 0: none
+    bool Asking = false;     // the user is being asked for a medium
+};
+
 // The collection: song entries in one sort order, the lists that count them, the settings of the collection.
 // Single-threaded. What a capability does with the songs (file format, intake, sorting) lies beside this
 // class.
@@ -117,10 +125,18 @@ class TMusicDatabase : public QObject {
     // Empties the database; does nothing while it is busy.
     void Clear(bool notify = true, bool keepFileName = false);
     bool IsBanned(const TID3Tag& record) const;
+
+    // --- Media that can be taken away (media/) ---
     // The path under which a song's file can be opened now; empty when its medium is not there. An ordinary
-    // path is its own answer, whether or not there is such a file. A path on a catalogued CD goes to
-    // OnResolveCdPath, where the catalogue takes part; without one no CD is ever there.
-    QString ResolveSongPath(const QString& path, const ResolveOptions& options = {}) const;
+    // path is its own answer, whether or not there is such a file.
+    QString ResolveSongPath(const QString& path, const ResolveOptions& options = {});
+    // The name of the medium of a path on one; the path itself where it has none, and of an ordinary path.
+    QString CDNameOf(const QString& path) const;
+    // Whether two paths, of which exactly one is on a medium, are the same but for medium and drive.
+    static bool SameFileIgnoringMedium(const QString& a, const QString& b);
+    // What the record of a song has no field for.
+    SideFile& Side() { return side_; }
+    const SideFile& Side() const { return side_; }
     // Has the views mark a song and show it.
     void MarkSong(SongIndex index);
     // Sorts the whole list anew. Throws EMusicDatabaseException while the database is busy.
@@ -225,6 +241,11 @@ class TMusicDatabase : public QObject {
     // switched on by the programs.
     bool QuietBatches() const { return quietBatches_; }
     void SetQuietBatches(bool value) { quietBatches_ = value; }
+    // Whether a medium is looked for on all mounted volumes before the user is asked for it, and the user is
+    // asked at intake whether one is to be catalogued; off in a new component, which looks at one drive and
+    // asks nothing, switched on by the programs.
+    bool ModernMedia() const { return modernMedia_; }
+    void SetModernMedia(bool value) { modernMedia_ = value; }
 
     // Linked components; each reference clears itself when the other goes.
     QObject* PlayList() const { return playList_; }
@@ -311,8 +332,6 @@ class TMusicDatabase : public QObject {
     TNotifyEvent OnEndProgress;
     TNotifyEvent OnCaptionChanged;
     TMenuItemClickedEvent OnMenuItemClicked;
-    // Finds the file of a path on a CD; see ResolveSongPath.
-    std::function<QString(const QString& path, const ResolveOptions& options)> OnResolveCdPath;
     std::function<void(TMusicDatabase&, SongIndex index)> OnMarkSong;
     // A file is about to be moved or removed: whoever holds it open lets go of it, and returns what takes it
     // up again under the path that it has then. Empty where nobody holds it.
@@ -334,6 +353,9 @@ class TMusicDatabase : public QObject {
     void TellChanged(SongIndex place, const TID3Tag& before);
     TID3Tag RemoveSong(SongIndex index);
     void SubscribeSlots();
+    void NoteDriveSerial(quint32 serial);
+    bool AskForMedium(const QString& path);
+    void LookForMedia();
 
     SongList songs_;
     GroupLists groups_;
@@ -346,6 +368,8 @@ class TMusicDatabase : public QObject {
     QStringList updateFolders_;
     SortedTextList bannList_;
     std::vector<CdName> cdNames_;
+    CdDrive drive_;
+    SideFile side_;
     std::unique_ptr<CommandDispatcher> commands_;
     ConversionSettings conversion_;
     std::vector<SettingsClient*> settingsClients_;
@@ -363,6 +387,7 @@ class TMusicDatabase : public QObject {
     bool renameAndMoveMP3s_ = true;
     bool renameInPlace_ = false;
     bool quietBatches_ = false;
+    bool modernMedia_ = false;
     bool modernTags_ = false;
     bool keepLostSongs_ = false;
     DatabaseLock fileLock_{*this};

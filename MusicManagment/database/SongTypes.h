@@ -4,6 +4,8 @@
 #include <QStringList>
 #include <QtGlobal>
 
+#include "MusicManagment/database/CdPath.h"
+
 // Position of a song in the list, 0 to count - 1; -1 none, or all songs where an event says so.
 using SongIndex = int;
 
@@ -62,10 +64,6 @@ QString SongCountText(std::size_t count);
 // Default names of the genre folders, one for each main genre.
 QStringList DefaultGenreFolderNames();
 
-// A path on a catalogued CD: ':' + 8 hexadecimal digits + ':' + path.
-inline bool IsCdPath(const QString& path) {
-    return path.startsWith(u':');
-}
 // Before the name of the file in a stored path; -1 when it is only a name. A path on a CD keeps its own
 // separators on every system.
 qsizetype LastSeparator(const QString& path);

@@ -1,3 +1,4 @@
+#include "tests/ScriptedVolumes.h"
 #include "tests/playlist/Playing.h"
 
 using namespace Qt::StringLiterals;
@@ -281,15 +282,15 @@ TEST_F(NextTest, PlayingReadsTheRecordAnew) {
 TEST_F(NextTest, ASongOnACdIsPlayedFromWhereTheDatabaseFindsIt) {
     TMusicDatabase database;
     list_.SetMusicDatabase(&database);
-    const QString onCd = u":1A2B3C4D:\\x.mp3"_s;
+    const QString onCd = u":1A2B3C4D:\\x.wav"_s;
+    ScriptedVolumes volumes;
     list_.Insert(0, {.Name = onCd});
     EXPECT_FALSE(list_.PlayEntry(0));
     folder_.Add(u"x.wav"_s);
-    database.OnResolveCdPath = [&](const QString& path, const ResolveOptions& options) {
-        return path == onCd && options.Ask ? Path(u"x"_s) : QString();
-    };
+    volumes.Mount(folder_.Path(), 0x1A2B3C4D, {}, 0);
     EXPECT_TRUE(list_.PlayEntry(0));
     EXPECT_EQ(list_.CurrentSong(), onCd);
     EXPECT_EQ(list_.CurrentFile(), Path(u"x"_s));
+    volumes.Unmount();
     EXPECT_EQ(list_.RemoveUnavailable(), 1);  // which asks nobody for a medium
 }

@@ -60,8 +60,11 @@ inline constexpr PropertySetting kQuietBatches{Setting<bool>{u"QuietBatches", fa
                                                &TMusicDatabase::QuietBatches,
                                                &TMusicDatabase::SetQuietBatches};
 
-inline constexpr std::tuple kRules{kModernTags, kKeepLostSongs, kDerivedGenres, kRenameInPlace,
-                                   kQuietBatches};
+inline constexpr PropertySetting kModernMedia{Setting<bool>{u"ModernMedia", false, true},
+                                              &TMusicDatabase::ModernMedia, &TMusicDatabase::SetModernMedia};
+
+inline constexpr std::tuple kRules{kModernTags,    kKeepLostSongs, kDerivedGenres,
+                                   kRenameInPlace, kQuietBatches,  kModernMedia};
 
 inline constexpr std::tuple kOwn{kAutoSave,
                                  kCompression,

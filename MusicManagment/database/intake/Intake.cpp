@@ -7,12 +7,15 @@
 #include "CommonRUKTools/AbsolutePath.h"
 #include "CommonRUKTools/Clock.h"
 #include "CommonRUKTools/Dialogs.h"
+#include "CommonRUKTools/Volumes.h"
 #include "MusicManagment/database/ListGuards.h"
 #include "MusicManagment/database/intake/FolderWalk.h"
 #include "MusicManagment/database/intake/IntakeReport.h"
 #include "MusicManagment/database/intake/KnownSongs.h"
+#include "MusicManagment/database/intake/MediumQuestion.h"
 #include "MusicManagment/database/intake/ReadAhead.h"
 #include "MusicManagment/database/intake/UpdateFolders.h"
+#include "MusicManagment/database/media/CataloguedMedia.h"
 
 using namespace Qt::StringLiterals;
 
@@ -44,7 +47,7 @@ void RefuseWhenLocked(const TMusicDatabase& database) {
 }
 
 // A file is known under one spelling of its path only.
-QString StoredPath(const QString& path) {
+QString CleanPath(const QString& path) {
     return IsCdPath(path) ? path : AbsolutePath(path);
 }
 
@@ -58,14 +61,16 @@ void NoteUnreadable(const QStringList& reasons, IntakeResult& result) {
     result.UnreadableNames << reasons;
 }
 
-bool TakeIn(TMusicDatabase& database, const QString& path, const SongReading& reading, IntakeResult& result) {
+// `path` is where the file lies.
+bool TakeIn(TMusicDatabase& database, const QString& path, const QString& stored, const SongReading& reading,
+            IntakeResult& result) {
     if (!reading.Succeeded()) {
         NoteUnreadable(reading.Refusal.isEmpty() ? reading.Error : reading.Refusal + u": "_s + path, result);
         return false;
     }
-    if (database.AddEntry(path, reading.Tag) >= 0) {
+    if (database.AddEntry(stored, reading.Tag) >= 0) {
         ++result.Added;
-        result.NewFiles << path;
+        result.NewFiles << stored;
         if (reading.Tag.BitRate == 0) result.DamagedFiles << path;
         return true;
     }
@@ -135,9 +140,9 @@ struct GivenPath {
 std::vector<GivenPath> LookAt(const QStringList& paths) {
     std::vector<GivenPath> given;
     for (const QString& path : paths) {
-        const QString stored = StoredPath(path);
-        const QFileInfo info(stored);
-        given.push_back({stored, info.exists(), info.isDir()});
+        const QString clean = CleanPath(path);
+        const QFileInfo info(clean);
+        given.push_back({clean, info.exists(), info.isDir()});
     }
     return given;
 }
@@ -205,6 +210,7 @@ IntakeResult AddSongsFromDialog(TMusicDatabase& database, const QStringList& fil
     RefuseWhenLocked(database);
     const QStringList chosen = files.isEmpty() ? AskForFiles() : files;
     if (chosen.isEmpty()) return {};
+    AskAboutMedia(database, chosen);
     IntakeResult result = AddChosenFiles(database, chosen);
     database.SaveAfterCommand();
     ReportIntake(result);
@@ -216,6 +222,7 @@ IntakeResult AddFolder(TMusicDatabase& database, const QString& folder, bool wit
     RefuseWhenLocked(database);
     const QString chosen = folder.isEmpty() ? AskForFolder(withSubfolders) : folder;
     if (chosen.isEmpty()) return {};
+    AskAboutMedia(database, {chosen});
     IntakeResult result = AddAndSave(database, {{AbsolutePath(chosen), true, true}}, withSubfolders, folders);
     ReportIntake(result);
     return result;
@@ -234,9 +241,13 @@ int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
     IntakeResult& outcome = result != nullptr ? *result : unasked;
     QStringList candidates = std::exchange(list, {});
     for (QString& path : candidates)
-        path = StoredPath(path);
+        path = CleanPath(path);
+    if (checkExisting) CurrentVolumes().Forget();
+    const CataloguedMedia media(database);
     KnownSongs known(database);
-    const auto isKnown = [&](const QString& path) { return checkExisting && known.Contains(path); };
+    const auto isKnown = [&](const QString& path) {
+        return checkExisting && known.Contains(path, media.StoredPath(path));
+    };
     // A progress point that nobody hears of, for the time in which nothing goes on.
     const auto goOn = [&database] { return !database.Progress(database.LastProgress(), false, false); };
     ReadOptions options = database.AudioReadOptions();
@@ -253,8 +264,9 @@ int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
         if (isKnown(path)) {
             ++outcome.Known;
         } else if (const auto reading = files.Take(goOn)) {
-            if (!TakeIn(database, path, *reading, outcome)) continue;
-            known.Add(path);
+            const QString stored = media.StoredPath(path);
+            if (!TakeIn(database, path, stored, *reading, outcome)) continue;
+            known.Add(path, stored);
             list << path;
         } else {
             outcome.Stopped = true;
@@ -266,7 +278,7 @@ int AddFileList(TMusicDatabase& database, QStringList& list, bool checkExisting,
 
 SongIndex AddSongFile(TMusicDatabase& database, const QString& path, const SongOverrides& overrides) {
     try {
-        return database.AddSong(StoredPath(path), overrides);
+        return database.AddSong(CataloguedMedia(database).StoredPath(CleanPath(path)), overrides);
     } catch (const EStreamError&) {
         return -1;  // the caller learns from the number that the song is not there
     }

@@ -2,8 +2,10 @@
 
 #include <algorithm>
 
+#include "CommonRUKTools/Volumes.h"
 #include "MusicManagment/database/ListGuards.h"
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/media/CachePlace.h"
 
 namespace {
 
@@ -17,19 +19,32 @@ std::size_t Key(const QString& path) {
 
 }  // namespace
 
-bool KnownSongs::Contains(const QString& path) {
-    if (database_.Contains(path)) return true;
+bool KnownSongs::Contains(const QString& path, const QString& stored) {
+    if (database_.Contains(path) || database_.Contains(stored)) return true;
     if (IsCdPath(path)) return false;
     if (!isIndexed_) IndexNames();
     const auto [from, to] = byName_.equal_range(Key(path));
     // A song may have been removed since.
     return std::any_of(from, to, [&](const auto& row) {
-        return IsSameFile(row.second, path) && database_.Contains(row.second);
+        return IsSameFile(row.second.Path, path) && database_.Contains(row.second.Stored);
     });
 }
 
-void KnownSongs::Add(const QString& path) {
-    if (isIndexed_) byName_.emplace(Key(path), path);
+void KnownSongs::Add(const QString& path, const QString& stored) {
+    if (isIndexed_) byName_.emplace(Key(path), Known{path, stored});
+}
+
+void KnownSongs::AddToIndex(const TID3Tag& song) {
+    const QString& stored = song.FileName;
+    if (!IsCdPath(stored)) return Add(stored, stored);
+    const Volume* volume = CurrentVolumes().WithSerial(SerialOfCdPath(stored));
+    if (volume != nullptr) Add(FileAt(volume->MountPoint, stored), stored);
+}
+
+// They lie where songs lie, and are none.
+void KnownSongs::IndexCopies() {
+    for (const auto& [song, copy] : database_.Side().Rows(kCacheSection))
+        Add(copy, song);
 }
 
 // Only once a path is met that is not known as it stands.
@@ -38,9 +53,10 @@ void KnownSongs::IndexNames() {
     const BusyGuard unchanged(database_);
     isIndexed_ = true;
     byName_.reserve(static_cast<std::size_t>(database_.Count()));
+    IndexCopies();
     std::size_t done = 0;
     for (const auto& song : database_.Songs()) {
-        if (!IsCdPath(song->FileName)) byName_.emplace(Key(song->FileName), song->FileName);
+        AddToIndex(*song);
         // A wish to stop is met by whoever goes on.
         if (++done % kSongsPerTurn == 0) database_.Progress({.Type = ptAddSongs}, false, false);
     }

@@ -51,7 +51,10 @@ QStringList AllPaths(const TMusicDatabase& database) {
 }
 
 void RereadSong(TMusicDatabase& database, const QString& path, UpdateResult& result) {
-    SongReading reading = ReadSong(path, database.AudioReadOptions());
+    // Of a song whose medium is not there nothing new can be known.
+    const QString file = database.ResolveSongPath(path, {.Ask = false, .UseCache = false});
+    if (file.isEmpty() || (IsCdPath(path) && !FileSource::Exists(file))) return;
+    SongReading reading = ReadSong(file, database.AudioReadOptions());
     if (!reading.Error.isEmpty()) {
         result.Intake.UnreadableNames << path + u": "_s + reading.Error;
         ++result.Intake.Unreadable;
@@ -72,8 +75,7 @@ void CheckSongs(TMusicDatabase& database, UpdateTags tags, MissingFiles& missing
             result.Stopped = true;
             return;
         }
-        if (missing.IsThere(paths[i]) && tags == UpdateTags::Reread && !IsCdPath(paths[i]))
-            RereadSong(database, paths[i], result);
+        if (missing.IsThere(paths[i]) && tags == UpdateTags::Reread) RereadSong(database, paths[i], result);
     }
 }
 

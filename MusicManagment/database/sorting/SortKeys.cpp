@@ -1,5 +1,6 @@
 #include "MusicManagment/database/sorting/SortKeys.h"
 
+#include <algorithm>
 #include <bit>
 #include <cmath>
 
@@ -8,8 +9,10 @@
 namespace {
 
 // A song on a catalogued CD is there (1) or not (2); any other song needs no medium (0).
-int CacheKind(const TID3Tag& song) {
-    return IsCdPath(song.FileName) ? 2 : 0;
+int CacheKind(const SongOrder& order, const TID3Tag& song) {
+    if (!IsCdPath(song.FileName)) return 0;
+    const quint32 serial = SerialOfCdPath(song.FileName);
+    return serial != 0 && std::ranges::binary_search(order.MediaThere, serial) ? 1 : 2;
 }
 
 quint32 CountedFlags(const SongOrder& order, quint32 flags) {
@@ -58,6 +61,6 @@ quint64 PrimaryNumber(const SongOrder& order, const TID3Tag& song) {
         case stFlags:
             return CountedFlags(order, song.Flags);
         default:
-            return static_cast<quint64>(CacheKind(song));
+            return static_cast<quint64>(CacheKind(order, song));
     }
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QHash>
+#include <QList>
 #include <vector>
 
 #include "MusicManagment/database/SongList.h"
@@ -12,6 +13,8 @@ struct SongOrder {
     TSubSortType SubSortType = sstGATL;
     bool Backwards = false;
     quint32 ShownFlag = 0;  // with stFlags: the only bit that counts; 0 compares the whole flags
+    // With stCacheType: the sorted serial numbers of the media that are mounted. The database keeps them.
+    QList<quint32> MediaThere{};
 
     bool operator==(const SongOrder&) const = default;
 };

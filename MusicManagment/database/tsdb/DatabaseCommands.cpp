@@ -25,6 +25,27 @@ std::optional<QString> AskForTarget(const QString& preset) {
     return UserDialogs().SaveFile(options);
 }
 
+// The songs are what counts: what goes wrong beside them is told and holds up nothing.
+void OpenSideFile(SideFile& side, const QString& database) {
+    try {
+        side.Open(SideFile::PathFor(database));
+    } catch (const EStreamError& error) {
+        UserDialogs().ShowMessage(MessageKind::Warning, error.Message());
+    }
+}
+
+void SaveSideFile(SideFile& side, const QString& database, bool isCopy) {
+    const QString path = SideFile::PathFor(database);
+    try {
+        if (isCopy)
+            side.SaveCopy(path);
+        else
+            side.SaveAs(path);
+    } catch (const EStreamError& error) {
+        UserDialogs().ShowMessage(MessageKind::Warning, error.Message());
+    }
+}
+
 FileSource OpenSource(const QString& fileName) {
     try {
         return FileSource(fileName);
@@ -55,6 +76,7 @@ bool TMusicDatabase::SaveDatabase(const QString& fileName, bool keepName, bool a
         fileName_ = *target;
         fileLock_.Adopt(std::move(lock));
     }
+    SaveSideFile(side_, *target, *target != fileName_);
     return true;
 }
 
@@ -78,6 +100,7 @@ bool TMusicDatabase::OpenDatabase(const QString& fileName, bool keepName) {
         throw EMusicDatabaseException(error.Message());
     }
     if (!keepName) fileName_ = fileName;
+    OpenSideFile(side_, fileName);
     return true;
 }
 

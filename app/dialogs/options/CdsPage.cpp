@@ -18,10 +18,6 @@ namespace {
 enum Column { cName, cSerial };
 constexpr int kShownRows = 9;
 
-QString SerialText(quint32 serial) {
-    return u"%1"_s.arg(serial, 8, 16, QChar(u'0')).toUpper();
-}
-
 // Also in the form "1A2B-3C4D" in which Windows shows it. 0 when it is no serial number.
 quint32 SerialOf(const QString& text) {
     const QString digits = text.trimmed().remove(u'-');

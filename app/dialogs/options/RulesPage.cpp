@@ -35,6 +35,13 @@ RulesPage::RulesPage(const TMusicDatabase& database)
                 u"Neue Songs kommen gleich in die Gruppe, zu der ihr Genre gehört. Klassisch ist das "
                 "Hauptgenre unbekannt, bis Sie es wählen."_s),
         DatabaseSettings::kDerivedGenres);
+    fields_.Bind(
+        AddRule(
+            reading, DatabaseSettings::kModernMedia.Row.Name, u"&Datenträger überall suchen"_s,
+            u"Songs auf CDs und Wechseldatenträgern werden auf jedem eingelegten Datenträger gefunden, und "
+            "beim Aufnehmen von einem neuen fragt das Programm, ob er katalogisiert werden soll. Klassisch "
+            "wird nur in einem Laufwerk nachgesehen."_s),
+        DatabaseSettings::kModernMedia);
     AddText(reading,
             u"Gilt für Dateien, die von nun an gelesen werden. Songs, die schon in der Datenbank sind, "
             "liest „Datenbank updaten (Auch ID3-Tags auf Änderungen prüfen)...“ neu."_s);

@@ -1,0 +1,57 @@
+#include "MusicManagment/database/media/CataloguedMedia.h"
+
+#include <algorithm>
+
+#include "MusicManagment/database/media/CachePlace.h"
+
+using namespace Qt::StringLiterals;
+
+CataloguedMedia::CataloguedMedia(const TMusicDatabase& database) {
+    for (const CdName& name : database.CDNames())
+        named_.insert(name.Serial);
+    for (const auto& song : database.Songs())
+        if (IsCdPath(song->FileName)) ofSongs_.insert(SerialOfCdPath(song->FileName));
+    ofSongs_.remove(0);
+}
+
+quint32 CataloguedMedia::SerialOf(const Volume& volume) const {
+    const auto isKnown = [&](quint32 serial) {
+        return named_.contains(serial) || (volume.CanBeTakenAway() && ofSongs_.contains(serial));
+    };
+    const auto found = std::ranges::find_if(volume.Serials, isKnown);
+    return found != volume.Serials.end() ? *found : 0;
+}
+
+bool CataloguedMedia::IsCatalogued(const Volume& volume) const {
+    return SerialOf(volume) != 0;
+}
+
+QString CataloguedMedia::StoredPath(const QString& path) const {
+    if (IsCdPath(path) || path.contains(u'\\')) return path;
+    const Volume* volume = CurrentVolumes().Holding(path);
+    const quint32 serial = volume != nullptr ? SerialOf(*volume) : 0;
+    if (serial == 0) return path;
+    return MakeCdPath(serial, volume->MountPoint == u"/"_s ? path : path.mid(volume->MountPoint.size()));
+}
+
+QString CatalogueMedium(TMusicDatabase& database, const QString& path, const QString& name) {
+    const Volume* volume = CurrentVolumes().Holding(path);
+    if (volume == nullptr || volume->Serials.empty())
+        throw EMusicDatabaseException(
+            u"Der Datenträger hat keine Seriennummer und kann nicht katalogisiert werden: "_s + path);
+    std::vector<CdName> names = database.CDNames();
+    const auto known =
+        std::ranges::find_if(names, [&](const CdName& cd) { return volume->HasSerial(cd.Serial); });
+    if (known != names.end() && name.isEmpty()) return known->Name;
+    const quint32 serial = known != names.end() ? known->Serial : volume->Serials.front();
+    QString given = name.trimmed();
+    if (given.isEmpty()) given = volume->Label.isEmpty() ? SerialText(serial) : volume->Label;
+    names.push_back({given, serial});  // of one serial number the last counts
+    database.SetCDNames(std::move(names));
+    return given;
+}
+
+bool IsWithinReach(const TMusicDatabase& database, const QString& path) {
+    return !IsCdPath(path) || CurrentVolumes().WithSerial(SerialOfCdPath(path)) != nullptr ||
+           !database.Side().Values(kCacheSection, path).isEmpty();
+}
