@@ -81,5 +81,6 @@ extern const DatabaseCommands kSongFileCommands;
 extern const DatabaseCommands kOrderCommands;
 extern const DatabaseCommands kOverviewCommands;
 extern const DatabaseCommands kBatchCommands;
+extern const DatabaseCommands kMediaCommands;
 extern const DatabaseCommands kPlayCommands;
 extern const DatabaseCommands kLaterCommands;  // still to be built

@@ -10,12 +10,8 @@ constexpr DatabaseCommand kRows[] = {
     {.Id = mcFindDuplicatesOfArtists, .Caption = u"Doppelte Einträge suchen (innerhalb der Artists)"},
     {.Id = mcFindSimilarArtists, .Caption = u"Ähnlich klingende Artists suchen"},
     {.Id = mcReadBackupCd, .Caption = u"Songs von einer Backup-CD wieder einlesen"},
-    {.Id = mcPrepareBurning, .Caption = u"Brennen auf CD vorbereiten"},
     {.Id = mcLoadLyrics, .Caption = u"Lyrikfang downloaden"},
     {.Id = mcConvert, .Caption = u"Song konvertieren"},
-    {.Id = mcCacheCdSongs, .Caption = u"Songs von CD zwischenspeichern"},
-    {.Id = mcDropCaches, .Caption = u"Zwischenspeicherungen entfernen"},
-    {.Id = mcRenameCds, .Caption = u"Namen der CDs anpassen..."},
 };
 
 }  // namespace

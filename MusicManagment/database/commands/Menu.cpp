@@ -65,7 +65,7 @@ CommandDispatcher& TMusicDatabase::Commands() {
                                     void* platformItem) { return TellOfClick(*this, item, platformItem); }});
     for (const DatabaseCommands& capability :
          {kFileCommands, kIntakeCommands, kFindCommands, kSongFileCommands, kOrderCommands, kOverviewCommands,
-          kPlayCommands, kBatchCommands, kLaterCommands})
+          kPlayCommands, kBatchCommands, kMediaCommands, kLaterCommands})
         commands_->Register(*this, capability);
     for (Listeners<>* change :
          {&CurrentOperation().Started, &CurrentOperation().Ended, &Events().ReadOnlyChanged})

@@ -4,15 +4,12 @@
 #include <QFileInfo>
 
 #include "CommonRUKTools/Dialogs.h"
-#include "CommonRUKTools/FileSource.h"
-#include "CommonRUKTools/SafeFile.h"
 #include "MusicManagment/database/Progress.h"
+#include "MusicManagment/database/songfiles/BlockCopy.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
-
-constexpr std::size_t kBlock = 1 << 20;
 
 enum class Existing { Ask, Replace, Skip };
 
@@ -44,10 +41,12 @@ class Copier {
         : database_(database), folder_(folder), total_(total) {}
 
     // False when the user asked to stop.
-    bool Copy(int number, const QString& path, CopyResult& result) {
+    bool Copy(int number, const QString& song, CopyResult& result) {
+        const QString path = database_.ResolveSongPath(song);
         const QString name = QFileInfo(path).fileName();
         const QString target = folder_.filePath(name);
         try {
+            if (path.isEmpty()) throw EStreamError(u"Der Datenträger ist nicht eingelegt"_s);
             FileSource source(path);
             if (QFileInfo(target) == QFileInfo(path))
                 throw EStreamError(u"Quelle und Ziel sind dieselbe Datei"_s);
@@ -57,28 +56,21 @@ class Copier {
             file.Commit();
             ++result.Copied;
         } catch (const EStreamError& error) {
-            result.Failed << path + u": "_s + error.Message();
+            result.Failed << song + u": "_s + error.Message();
         }
         return true;
     }
 
  private:
     bool CopyBytes(int number, const QString& name, ByteSource& source, SafeFile& target) {
-        std::vector<std::uint8_t> block(kBlock);
-        for (std::int64_t done = 0; done < source.Size();) {
-            if (database_.Progress({.Cur = number,
-                                    .Max = total_,
-                                    .CurSub = done,
-                                    .MaxSub = source.Size(),
-                                    .Type = ptCopySongs,
-                                    .Description = name}))
-                return false;
-            const auto count = source.ReadAt(done, block);
-            if (count == 0) throw EStreamError(u"Unerwartetes Ende der Datei"_s);
-            target.Write(ByteSpan(block).first(count));
-            done += static_cast<std::int64_t>(count);
-        }
-        return true;
+        return CopyBlocks(source, target, [&](std::int64_t done) {
+            return database_.Progress({.Cur = number,
+                                       .Max = total_,
+                                       .CurSub = done,
+                                       .MaxSub = source.Size(),
+                                       .Type = ptCopySongs,
+                                       .Description = name});
+        });
     }
 
     TMusicDatabase& database_;

@@ -1,0 +1,12 @@
+#pragma once
+
+#include "MusicManagment/database/batches/BatchSongs.h"
+
+// The commands about songs on media, for the songs that a view has marked or for all. Each asks and tells
+// what there is to ask and to tell.
+void CacheSongsCommand(TMusicDatabase& database, const BatchSongs& songs);
+void DropCachesCommand(TMusicDatabase& database, const BatchSongs& songs);
+void PrepareBurningCommand(TMusicDatabase& database, const BatchSongs& songs);
+// Lets the user choose a medium, of those that have a name, that songs lie on, or that are mounted, and name
+// it.
+void NameMediaCommand(TMusicDatabase& database);
