@@ -5,6 +5,7 @@
 #include "MusicManagment/database/Command.h"
 #include "MusicManagment/database/batches/BatchReport.h"
 #include "MusicManagment/database/batches/FlagBatch.h"
+#include "MusicManagment/database/batches/MediaCommands.h"
 #include "MusicManagment/database/batches/TagBatch.h"
 #include "app/dialogs/BannListDialog.h"
 #include "app/dialogs/RenameDialog.h"
@@ -44,6 +45,16 @@ BatchCommands::BatchCommands(TMusicDatabase& database, SongListWidget& list)
     handle(mcRenameByPattern, [this] { RenameByPattern(); });
     handle(mcTagsFromNames, [this] { TakeTagsFromNames(); });
     handle(mcEditBannList, [this] { EditBannList(); });
+    handle(mcCacheCdSongs, [this] {
+        RunForMedia(u"Zwischenspeichern aller Songs"_s, u"Zwischenspeichern aller markierter Songs"_s,
+                    CacheSongsCommand);
+    });
+    handle(mcDropCaches, [this] {
+        RunForMedia(u"Zwischenspeicherung aller Songs entfernen"_s,
+                    u"Zwischenspeicherung aller markierter Songs entfernen"_s, DropCachesCommand);
+    });
+    handle(mcPrepareBurning,
+           [this] { RunForMedia(u"Alle Songs"_s, u"Markierte Songs"_s, PrepareBurningCommand); });
     for (const int id : {mcSetFlag, mcRemoveFlag})
         handle(id, [this, id] { ChangeFlag(id); });
     for (const int id : {mcRemoveFromDisk, mcBan})
@@ -114,6 +125,21 @@ void BatchCommands::RenameByPattern() {
     const std::vector<SongMove> moves = dialog.Moves();
     if (!moves.empty())
         ReportBatch(MoveSongs(database_, SongCountText(moves.size()) + u" umbenennen"_s, moves));
+}
+
+void BatchCommands::RunForMedia(const QString& all, const QString& marked, MediaCommand command) {
+    enum Answer { Marked, All, Cancel };
+    const auto count = list_.ChosenHandles().size();
+    if (count == 0) return command(database_, AllSongs(database_));
+    const int answer = UserDialogs().Ask({.Text = u"Für welche Songs? Markiert: "_s + SongCountText(count) +
+                                                  u", in der Sammlung: "_s +
+                                                  SongCountText(static_cast<std::size_t>(database_.Count())),
+                                          .Buttons = {marked, all, u"Abbrechen"_s},
+                                          .Cancel = Cancel});
+    if (answer == Marked)
+        command(database_, Chosen());
+    else if (answer == All)
+        command(database_, AllSongs(database_));
 }
 
 void BatchCommands::TakeTagsFromNames() {

@@ -27,6 +27,9 @@ class BatchCommands : public SettingsClient {
     void RenameByPattern();
     void TakeTagsFromNames();
     void EditBannList();
+    // For all songs or for the marked ones, as the user says.
+    using MediaCommand = void (*)(TMusicDatabase& database, const BatchSongs& songs);
+    void RunForMedia(const QString& all, const QString& marked, MediaCommand command);
 
     TMusicDatabase& database_;
     SongListWidget& list_;

@@ -10,6 +10,7 @@
 #include "MusicManagment/playback/ExternalPlayer.h"
 #include "MusicManagment/playback/spectrum/SpectrumFeed.h"
 #include "app/CollectionCommands.h"
+#include "app/MediaWatch.h"
 #include "app/Startup.h"
 #include "app/desktop/InstallationSteps.h"
 #include "app/desktop/ProgressDisplay.h"
@@ -96,6 +97,7 @@ class TTunesteadMainWnd : public QMainWindow {
     CollectionTotals totals_;
     CollectionCommands commands_;
     Journal journal_;
+    MediaWatch media_{database_};
     ProgressDisplay progress_;
     InstallationSteps installation_;
     Startup startup_;

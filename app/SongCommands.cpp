@@ -159,7 +159,8 @@ void SongCommands::CopyChosen() {
 void SongCommands::OpenExternally() {
     const SongIndex song = list_.FocusedSong();
     if (song < 0) return;
-    const QString path = database_.Song(song).FileName;
+    const QString path = database_.ResolveSongPath(database_.Song(song).FileName);
+    if (path.isEmpty()) return;  // the user has no such medium at hand
     if (!CurrentShell().OpenWithDefaultProgram(path))
         throw EMusicDatabaseException(u"Kann kein Programm für diese Datei starten: "_s + path);
 }

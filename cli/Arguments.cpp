@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "CommonRUKTools/FileSource.h"
+
 using namespace Qt::StringLiterals;
 
 namespace {
@@ -14,6 +16,15 @@ const OptionRow* FindOption(std::span<const OptionRow> options, QStringView name
 
 bool TakesValue(const OptionRow& option) {
     return !QStringView(option.Value).isEmpty();
+}
+
+bool MayMissValue(const OptionRow& option) {
+    return QStringView(option.Value).startsWith(u'[');
+}
+
+// Whether a word behind an option that may go without a value is its value all the same.
+bool IsItsValue(const QString& word) {
+    return !word.startsWith(u'-') && !FileSource::Exists(word);
 }
 
 [[noreturn]] void ThrowMissingValue(const QString& name) {
@@ -48,6 +59,10 @@ void Arguments::TakeOption(const QString& word, QStringList& rest, std::span<con
     if (option == nullptr) throw EUsageError(u"Unbekannte Option: "_s + name);
     if (!TakesValue(*option)) {
         if (equals >= 0) throw EUsageError(u"Die Option "_s + name + u" hat keinen Wert."_s);
+        values_[name];
+        return;
+    }
+    if (MayMissValue(*option) && equals < 0 && (rest.isEmpty() || !IsItsValue(rest.front()))) {
         values_[name];
         return;
     }

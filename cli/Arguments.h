@@ -16,7 +16,7 @@ class EUsageError : public ERukException {
 // An option of a command. A row of the help as well.
 struct OptionRow {
     const char16_t* Name;   // with its dashes: "--db"
-    const char16_t* Value;  // what the help calls its value; empty for a switch
+    const char16_t* Value;  // what the help calls its value; empty for a switch, "[NAME]" where it may miss
     const char16_t* Help;
     bool Required = false;
 };
@@ -32,8 +32,8 @@ struct OperandRow {
 // The words behind the command, sorted out.
 class Arguments {
  public:
-    // "--name value", "--name=value" and operands in any order; behind "--" everything is an operand. Throws
-    // EUsageError.
+    // "--name value", "--name=value" and operands in any order; behind "--" everything is an operand. A word
+    // that leads to a file is no value of an option that may go without one. Throws EUsageError.
     Arguments(const QStringList& words, std::span<const OptionRow> options, const OperandRow& operands);
 
     bool Has(QStringView option) const { return values_.contains(option.toString()); }

@@ -1,8 +1,10 @@
 #include <QFileInfo>
 #include <algorithm>
 
+#include "CommonRUKTools/AbsolutePath.h"
 #include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/database/intake/Intake.h"
+#include "MusicManagment/database/media/CataloguedMedia.h"
 #include "cli/CommandLine.h"
 #include "cli/Commands.h"
 #include "cli/JournalSession.h"
@@ -26,6 +28,11 @@ IntakeResult TakeIn(TMusicDatabase& database, const QStringList& paths, bool wit
                     Console& console) {
     const RunWatcher watcher(database, console, StopBy::Interrupt);
     return AddPaths(database, paths, withSubfolders);
+}
+
+void Catalogue(TMusicDatabase& database, const QStringList& paths, const QString& name) {
+    for (const QString& path : paths)
+        if (FileSource::Exists(path)) CatalogueMedium(database, AbsolutePath(path), name);
 }
 
 // Not to be stopped: what was taken in is to be kept.
@@ -64,6 +71,7 @@ int RunScan(const Arguments& arguments, Console& console) {
         CatchUp(database, console);
     }
 
+    if (arguments.Has(u"--medium")) Catalogue(database, paths, arguments.Value(u"--medium"));
     const IntakeResult result = TakeIn(database, paths, !arguments.Has(u"--no-subfolders"), console);
     // A path that was mistyped is no reason to make a database.
     if (isNew ? there > 0 : database.Modified()) Save(database, fileName, console);
@@ -82,6 +90,9 @@ int RunScan(const Arguments& arguments, Console& console) {
 constexpr OptionRow kOptions[] = {
     {u"--db", u"DATENBANK", u"Datei der Sammlung (.tsdb); wird angelegt, wenn sie fehlt", true},
     {u"--no-subfolders", u"", u"durchsucht Ordner ohne ihre Unterordner"},
+    {u"--medium", u"[NAME]",
+     u"katalogisiert den Datenträger der PFADe: seine Songs werden mit dessen Seriennummer gespeichert und\n"
+     u"überall gefunden, wo er eingelegt ist; ohne NAME heißt er nach seiner Bezeichnung"},
     kBannListOption,
     {u"--classic", u"", u"liest die Tags nach den ursprünglichen Regeln des Programms"},
     {u"--json", u"", u"gibt das Ergebnis als ein JSON-Objekt aus"},

@@ -6,8 +6,11 @@
 #include <QInputDialog>
 #include <QMessageBox>
 #include <QPushButton>
+#include <algorithm>
+#include <utility>
 
 #include "CommonRUKTools/MusicFolder.h"
+#include "CommonRUKTools/Volumes.h"
 #include "app/dialogs/FileFilters.h"
 
 using namespace Qt::StringLiterals;
@@ -64,6 +67,15 @@ void SetUpFileDialog(QFileDialog& dialog, const QString& accept) {
     dialog.setLabelText(QFileDialog::FileName, u"Dateiname:"_s);
     dialog.setLabelText(QFileDialog::FileType, u"Dateityp:"_s);
     dialog.setLabelText(QFileDialog::LookIn, u"Suchen in:"_s);
+}
+
+void SetUpInput(QInputDialog& dialog, const QString& caption, const QString& prompt) {
+    dialog.setWindowTitle(caption);
+    dialog.setLabelText(prompt);
+    dialog.setOkButtonText(u"OK"_s);
+    dialog.setCancelButtonText(u"Abbrechen"_s);
+    constexpr int kWidth = 60;  // average characters: room for the caption too
+    dialog.resize(kWidth * dialog.fontMetrics().averageCharWidth(), dialog.sizeHint().height());
 }
 
 // Songs mostly lie there.
@@ -128,19 +140,44 @@ int QtDialogs::Ask(const Question& question) {
 std::optional<QString> QtDialogs::Input(const QString& caption, const QString& prompt,
                                         const QStringList& choices, const QString& preset) {
     QInputDialog dialog(Parent());
-    dialog.setWindowTitle(caption);
-    dialog.setLabelText(prompt);
-    dialog.setOkButtonText(u"OK"_s);
-    dialog.setCancelButtonText(u"Abbrechen"_s);
+    SetUpInput(dialog, caption, prompt);
     if (!choices.isEmpty()) {
         dialog.setComboBoxItems(choices);
         dialog.setComboBoxEditable(false);
     }
     dialog.setTextValue(preset);
-    constexpr int kWidth = 60;  // average characters: room for the caption too
-    dialog.resize(kWidth * dialog.fontMetrics().averageCharWidth(), dialog.sizeHint().height());
     if (dialog.exec() != QDialog::Accepted) return std::nullopt;
     return dialog.textValue();
+}
+
+std::optional<QString> QtDialogs::ChooseVolume(const QString& caption, const QString& prompt,
+                                               const QString& preset) {
+    QInputDialog dialog(Parent());
+    SetUpInput(dialog, caption, prompt);
+    dialog.setComboBoxEditable(false);
+    std::vector<VolumeChoice> shown;
+    // What has come is what the user has just plugged in.
+    const auto show = [&](const QString& chosen) {
+        const std::vector<VolumeChoice> before = std::exchange(shown, VolumeChoices(preset));
+        QStringList captions;
+        QString selected;
+        for (const VolumeChoice& volume : shown) {
+            captions << volume.Caption;
+            const bool isNew =
+                std::ranges::find(before, volume.MountPoint, &VolumeChoice::MountPoint) == before.end();
+            if (volume.MountPoint == chosen || (isNew && !before.empty())) selected = volume.Caption;
+        }
+        dialog.setComboBoxItems(captions);
+        dialog.setTextValue(selected.isEmpty() ? captions.front() : selected);
+    };
+    const auto chosen = [&] {
+        const auto found = std::ranges::find(shown, dialog.textValue(), &VolumeChoice::Caption);
+        return found != shown.end() ? found->MountPoint : QString();
+    };
+    show(preset);
+    const Subscription changes = CurrentVolumes().Changed.Subscribe([&] { show(chosen()); });
+    if (dialog.exec() != QDialog::Accepted) return std::nullopt;
+    return chosen();
 }
 
 std::optional<QString> QtDialogs::OpenFile(const FileDialogOptions& options) {

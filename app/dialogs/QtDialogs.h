@@ -18,6 +18,9 @@ class QtDialogs : public Dialogs {
     void ShowReport(const Report& report) override { reports_.Show(report, mainWindow_); }
     std::optional<QString> Input(const QString& caption, const QString& prompt, const QStringList& choices,
                                  const QString& preset) override;
+    // The choice follows what is plugged in while it stands.
+    std::optional<QString> ChooseVolume(const QString& caption, const QString& prompt,
+                                        const QString& preset) override;
     std::optional<QString> OpenFile(const FileDialogOptions& options) override;
     QStringList OpenFiles(const FileDialogOptions& options) override;
     std::optional<QString> SaveFile(const FileDialogOptions& options) override;

@@ -1,9 +1,12 @@
 #include "app/models/SongListModel.h"
 
 #include <QFont>
+#include <QGuiApplication>
+#include <QPalette>
 #include <algorithm>
 
 #include "CommonRUKTools/Clock.h"
+#include "MusicManagment/database/media/CataloguedMedia.h"
 #include "app/models/SongColumns.h"
 
 using namespace Qt::StringLiterals;
@@ -117,10 +120,22 @@ QVariant SongListModel::data(const QModelIndex& index, int role) const {
         const bool isSet = song != nullptr && (song->Flags & database_.ShownFlag()) != 0;
         return isSet ? Qt::Checked : Qt::Unchecked;
     }
+    if (role == Qt::ForegroundRole || role == Qt::ToolTipRole) return MediumLook(index.row(), role);
     if (role != Qt::DisplayRole && (role != Qt::FontRole || playing_.isEmpty())) return {};
     const TID3Tag* song = SongAt(index.row());
     if (role == Qt::FontRole) return song != nullptr && song->FileName == playing_ ? BoldFont() : QVariant();
     return song != nullptr ? column.Text(*song) : QString();
+}
+
+// A song whose medium is away is grey, and tells which one it is.
+QVariant SongListModel::MediumLook(int row, int role) const {
+    const TID3Tag* song = SongAt(row);
+    if (song == nullptr || !IsCdPath(song->FileName)) return {};
+    const bool isThere = !FileWithinReach(database_, song->FileName).isEmpty();
+    if (role == Qt::ForegroundRole)
+        return isThere ? QVariant() : QGuiApplication::palette().brush(QPalette::Disabled, QPalette::Text);
+    const QString name = database_.CDNameOf(song->FileName);
+    return isThere ? name : name + u" (nicht eingelegt)"_s;
 }
 
 void SongListModel::SetPlaying(const QString& path) {

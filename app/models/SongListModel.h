@@ -47,6 +47,7 @@ class SongListModel : public QAbstractTableModel {
     void SyncRows();
     void PlaceRows();
     bool ShowsMark(const QModelIndex& index) const;
+    QVariant MediumLook(int row, int role) const;
     void ShowFontOf(const QString& path);
 
     TMusicDatabase& database_;

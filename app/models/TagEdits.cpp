@@ -4,6 +4,7 @@
 #include <limits>
 
 #include "CommonRUKTools/Errors.h"
+#include "MusicManagment/database/media/CataloguedMedia.h"
 
 using namespace Qt::StringLiterals;
 
@@ -95,8 +96,12 @@ void TagEdits::ForgetEditsThatChangeNothing() {
 
 QStringList TagEdits::Paths() const {
     QStringList paths;
-    for (const Held& held : songs_)
-        if (const TID3Tag* record = database_.Songs().Find(held.Song)) paths << record->FileName;
+    for (const Held& held : songs_) {
+        const TID3Tag* record = database_.Songs().Find(held.Song);
+        if (record == nullptr) continue;
+        const QString file = FileWithinReach(database_, record->FileName);
+        paths << (file.isEmpty() ? record->FileName : file);
+    }
     return paths;
 }
 

@@ -3,6 +3,7 @@
 #include <QVBoxLayout>
 
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/media/CataloguedMedia.h"
 #include "app/views/CoverView.h"
 #include "app/views/PropertyTree.h"
 
@@ -58,7 +59,9 @@ void TPropertyForm::Refresh() {
 void TPropertyForm::ReadFile() {
     readTimer_.stop();
     if (!song_) return;
-    details_ = ReadFileDetails(song_->FileName, database_.AudioReadOptions());
+    const QString file = FileWithinReach(database_, song_->FileName);
+    // Of one that is away the reader says so.
+    details_ = ReadFileDetails(file.isEmpty() ? song_->FileName : file, database_.AudioReadOptions());
     ShowRows();
 }
 

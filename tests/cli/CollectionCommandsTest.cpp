@@ -5,6 +5,7 @@
 #include "CommonRUKTools/FileLock.h"
 #include "cli/platform/Terminal.h"
 #include "tests/PrintQt.h"
+#include "tests/ScriptedVolumes.h"
 #include "tests/cli/CommandRunner.h"
 
 using namespace Qt::StringLiterals;
@@ -81,6 +82,19 @@ TEST_F(CollectionCommandsTest, APathIsTakenWholeAndAMissingOneIsAFailure) {
     EXPECT_TRUE(result.Err.contains(u"nowhere"_s)) << result.Err.toStdString();
     const QString song = QFileInfo(Path(u"music/Zoe - Beta.wav"_s)).canonicalFilePath();
     EXPECT_EQ(Listed(u"fileName"_s, {}), QStringList{song});
+}
+
+TEST_F(CollectionCommandsTest, AMediumIsCataloguedOnRequestAndKnownFromThenOn) {
+    ScriptedVolumes volumes;
+    volumes.Mount(QFileInfo(Path(u"music"_s)).canonicalFilePath(), 0x1A2B3C4D, u"STICK"_s);
+    const QString beta = u":1A2B3C4D:\\Zoe - Beta.wav"_s;
+    ASSERT_EQ(Scan({u"--no-subfolders"_s, u"--medium"_s, u"Mein Stick"_s}).Status, esDone);
+    EXPECT_EQ(Listed(u"fileName"_s, {u"--sort=stArtist"_s}).last(), beta);
+    const auto again = Scan({u"--json"_s}).Objects().at(0);
+    EXPECT_EQ(again[u"known"_s], 2);
+    EXPECT_EQ(again[u"files"_s].toArray(), QJsonArray{u":1A2B3C4D:\\sub\\Ötzi - Alpha.wav"_s});
+    // A path is no name.
+    EXPECT_EQ(Run(u"scan"_s, {u"--medium"_s, Path(u"music"_s)}).Status, esDone);
 }
 
 TEST_F(CollectionCommandsTest, AnInterruptedScanKeepsWhatItHas) {

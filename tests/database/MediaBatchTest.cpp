@@ -65,8 +65,8 @@ TEST_F(MediaBatchTest, SongsAreCopiedOnceAndOnlyOurCopiesAreRemoved) {
     volumes_.Unmount();
     EXPECT_EQ(PlayedFrom(u"A - two.wav"_s), two);
     EXPECT_EQ(PlayedFrom(u"A - there.wav"_s), disk_.Path(u"root/Unsorted/A - there.wma"_s));
-    EXPECT_TRUE(IsWithinReach(database_, u":00000007:\\A - one.wav"_s));
-    EXPECT_FALSE(IsWithinReach(database_, u":00000007:\\A - gone.wav"_s));
+    EXPECT_EQ(FileWithinReach(database_, u":00000007:\\A - one.wav"_s), one);
+    EXPECT_EQ(FileWithinReach(database_, u":00000007:\\A - gone.wav"_s), QString());
     EXPECT_TRUE(QFileInfo(one).isWritable());
     EXPECT_EQ(AddPaths(database_, {one, two}, true).Known, 2);
 

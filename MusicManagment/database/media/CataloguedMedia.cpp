@@ -9,6 +9,9 @@ using namespace Qt::StringLiterals;
 CataloguedMedia::CataloguedMedia(const TMusicDatabase& database) {
     for (const CdName& name : database.CDNames())
         named_.insert(name.Serial);
+    for (const SideRow& row : database.Side().Rows(kMediumNames))
+        named_.insert(row.Song.toUInt(nullptr, 16));
+    named_.remove(0);
     for (const auto& song : database.Songs())
         if (IsCdPath(song->FileName)) ofSongs_.insert(SerialOfCdPath(song->FileName));
     ofSongs_.remove(0);
@@ -48,10 +51,16 @@ QString CatalogueMedium(TMusicDatabase& database, const QString& path, const QSt
     if (given.isEmpty()) given = volume->Label.isEmpty() ? SerialText(serial) : volume->Label;
     names.push_back({given, serial});  // of one serial number the last counts
     database.SetCDNames(std::move(names));
+    for (const QString& old : database.Side().Values(kMediumNames, SerialText(serial)))
+        database.Side().Remove(kMediumNames, {SerialText(serial), old});
+    database.Side().Add(kMediumNames, {SerialText(serial), given});
+    database.SetModified(true);
     return given;
 }
 
-bool IsWithinReach(const TMusicDatabase& database, const QString& path) {
-    return !IsCdPath(path) || CurrentVolumes().WithSerial(SerialOfCdPath(path)) != nullptr ||
-           !database.Side().Values(kCacheSection, path).isEmpty();
+QString FileWithinReach(const TMusicDatabase& database, const QString& path) {
+    if (!IsCdPath(path)) return path;
+    const Volume* volume = CurrentVolumes().WithSerial(SerialOfCdPath(path));
+    return volume != nullptr ? FileAt(volume->MountPoint, path)
+                             : database.Side().Values(kCacheSection, path).value(0);
 }

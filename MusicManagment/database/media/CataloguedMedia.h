@@ -5,6 +5,10 @@
 #include "CommonRUKTools/Volumes.h"
 #include "MusicManagment/database/MusicManagment.h"
 
+// Section of the side file: names of media, by their serial number in 8 digits. They go with the database
+// where the user's own list of names does not know a medium.
+inline const QString kMediumNames = QStringLiteral("medium-name");
+
 // Which media are catalogued: those that have a name, and those that can be taken away and that songs of the
 // collection lie on. Made for one run; a medium that is catalogued meanwhile is told to it.
 class CataloguedMedia {
@@ -29,6 +33,6 @@ class CataloguedMedia {
 // or its serial number. Returns the name. Throws EMusicDatabaseException where the volume has no serial
 // number or cannot be told.
 QString CatalogueMedium(TMusicDatabase& database, const QString& path, const QString& name = QString());
-// Whether the medium is mounted, or a copy is noted: what views ask for each song that they draw, so that no
-// disk is looked at.
-bool IsWithinReach(const TMusicDatabase& database, const QString& path);
+// What views ask for each song that they draw, so that no disk is looked at: the file on the medium where it
+// is mounted, else the copy that is noted; empty where there is neither. An ordinary path is its own answer.
+QString FileWithinReach(const TMusicDatabase& database, const QString& path);

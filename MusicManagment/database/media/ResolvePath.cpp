@@ -4,6 +4,7 @@
 #include "CommonRUKTools/Volumes.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/media/CachePlace.h"
+#include "MusicManagment/database/media/CataloguedMedia.h"
 
 // Where the files of songs are whose media can be taken away.
 
@@ -85,8 +86,10 @@ bool TMusicDatabase::AskForMedium(const QString& path) {
 
 QString TMusicDatabase::CDNameOf(const QString& path) const {
     const quint32 serial = SerialOfCdPath(path);
+    if (serial == 0) return path;
     const auto found = std::ranges::find(cdNames_, serial, &CdName::Serial);
-    return serial != 0 && found != cdNames_.end() ? found->Name : path;
+    return found != cdNames_.end() ? found->Name
+                                   : side_.Values(kMediumNames, SerialText(serial)).value(0, path);
 }
 
 bool TMusicDatabase::SameFileIgnoringMedium(const QString& a, const QString& b) {
