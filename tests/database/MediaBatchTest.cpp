@@ -4,6 +4,7 @@
 
 #include "MusicManagment/database/batches/BurningBatch.h"
 #include "MusicManagment/database/batches/CacheBatch.h"
+#include "MusicManagment/database/intake/BackupCd.h"
 #include "MusicManagment/database/intake/Intake.h"
 #include "MusicManagment/database/media/CataloguedMedia.h"
 #include "tests/PrintQt.h"
@@ -124,6 +125,28 @@ TEST_F(MediaBatchTest, BurningTakesSongsOfMediaAsTheUserAnswers) {
     EXPECT_EQ(dialogs_.Questions[1],
               u"Die Datei A - 1 befindet sich bereits auf einer CD. Soll sie dennoch in die Liste der zu "
               "brennenden Dateien aufgenommen werden?"_s);
+}
+
+TEST_F(MediaBatchTest, AFileOfABackupCdIsTiedToTheSongThatItIs) {
+    TakeInDisk({u"m/Queen - Jealousy.wav"_s, u"m/Queen - Jealous Guy.wav"_s, u"m/Abba - Fernando.wav"_s});
+    stick_.Add(u"Queen - Jealousy.wav"_s, 10);  // another length
+    stick_.Add({u"Queen - Jealosy.wav"_s, u"Neu - Ganz anders.wav"_s});
+    volumes_.Mount(stick_.Path(), 7, u"BACKUP"_s, 0);
+    const QString own = disk_.Path(u"m/Queen - Jealousy.wav"_s);
+
+    dialogs_.Answers = {0};  // what is like no song is new
+    dialogs_.Inputs = {u"BACKUP ("_s + stick_.Path() + u')', u"Sicherung"_s,
+                       u"093%: Queen - Jealousy (***)"_s, u"Überspringen"_s};
+    const BackupResult result = ReadBackupCd(database_);
+    EXPECT_EQ(result.Tied, 1);
+    EXPECT_EQ(result.Added, 1);
+    EXPECT_FALSE(result.Stopped);
+    const TID3Tag tied = database_.GetEntry(-1, u":00000007:\\Queen - Jealosy.wav"_s);
+    EXPECT_EQ(tied.Title, u"Jealousy"_s);
+    EXPECT_TRUE(QFile::exists(own));
+    EXPECT_FALSE(database_.Contains(own));
+    EXPECT_TRUE(database_.Contains(u":00000007:\\Neu - Ganz anders.wav"_s));
+    EXPECT_EQ(database_.CDNameOf(tied.FileName), u"Sicherung"_s);
 }
 
 TEST_F(MediaBatchTest, NoSongOfABatchReplacesAnotherOrItself) {

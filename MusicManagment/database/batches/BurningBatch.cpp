@@ -54,7 +54,7 @@ class Preparation {
         if (found == nullptr) return;
         const TID3Tag song = *found;  // a question lets time pass
         if (IsCdPath(song.FileName) && !policy_.Takes(song)) return;
-        const QString file = finder_.Find(song.FileName, true);
+        const QString file = finder_.Find(song.FileName);
         if (file.isEmpty()) {
             result_.Missing << song.FileName;
             return;

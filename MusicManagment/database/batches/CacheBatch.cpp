@@ -53,7 +53,7 @@ class Cacher {
         const TID3Tag* found = database_.Songs().Find(handle);
         if (found == nullptr) return true;
         const TID3Tag song = *found;  // a question lets time pass
-        const QString file = finder_.Find(song.FileName, false);
+        const QString file = finder_.Find(song.FileName, {.UseCache = false});
         if (file.isEmpty()) {
             result_.Missing << song.FileName;
             return true;

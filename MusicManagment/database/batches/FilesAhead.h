@@ -2,6 +2,7 @@
 
 #include "CommonRUKTools/WorkAhead.h"
 #include "MusicManagment/database/batches/BatchSongs.h"
+#include "MusicManagment/database/songfiles/SongFinder.h"
 
 // What a batch reads from the files of its songs: by threads, some files ahead of their turn, and handed out
 // in the order of the songs.
@@ -30,15 +31,19 @@ class FilesAhead {
     }
 
  private:
-    std::function<Result()> WorkOf(std::size_t number) const {
+    // Of a medium that is not put in the reader gets the stored path, of which it says what it is.
+    std::function<Result()> WorkOf(std::size_t number) {
         const TID3Tag* song = database_.Songs().Find(songs_.Songs[number]);
         if (song == nullptr) return {};
-        return [read = read_, path = database_.ResolveSongPath(song->FileName)] { return read(path); };
+        const QString stored = song->FileName;  // a question lets time pass
+        const QString found = finder_.Find(stored);
+        return [read = read_, path = found.isEmpty() ? stored : found] { return read(path); };
     }
 
     TMusicDatabase& database_;
     const BatchSongs& songs_;
     Reader read_;
+    SongFinder finder_{database_};
     std::size_t next_ = 0;
     WorkAhead<Result> work_;
 };

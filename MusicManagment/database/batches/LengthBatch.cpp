@@ -6,6 +6,7 @@
 #include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/database/batches/BatchFrame.h"
 #include "MusicManagment/database/batches/FilesAhead.h"
+#include "MusicManagment/database/songfiles/SongFinder.h"
 #include "ReadMPEGHeader/DisplayTexts.h"
 #include "ReadMPEGHeader/LengthCheck.h"
 
@@ -82,8 +83,7 @@ LengthBatchResult CountFrames(TMusicDatabase& database, const BatchSongs& songs)
     return result;
 }
 
-int AskForLength(const TMusicDatabase& database, const TID3Tag& song) {
-    const QString path = database.ResolveSongPath(song.FileName);
+int AskForLength(const TMusicDatabase& database, const QString& path) {
     if (!FileSource::Exists(path)) throw EStreamError(u"Datei nicht gefunden"_s);
     return static_cast<int>(std::min(database.OnMeasureLength(path) / 1000, quint32{kLongestLength}));
 }
@@ -92,9 +92,10 @@ int AskForLength(const TMusicDatabase& database, const TID3Tag& song) {
 LengthBatchResult AskForLengths(TMusicDatabase& database, const BatchSongs& songs) {
     if (!database.OnMeasureLength) throw ENoLengthMeasure(u"Dieses Programm hat keinen Weg dorthin."_s);
     QStringList failed;
+    SongFinder finder(database);
     const auto maker = [&](const TID3Tag& song) -> std::optional<SongUpdate> {
         try {
-            return RecordOnly(song, WithLength(song, AskForLength(database, song)));
+            return RecordOnly(song, WithLength(song, AskForLength(database, finder.Find(song.FileName))));
         } catch (const ENoLengthMeasure&) {
             throw;
         } catch (const EAbort&) {

@@ -9,7 +9,6 @@ constexpr DatabaseCommand kRows[] = {
     {.Id = mcFindDuplicates, .Caption = u"Doppelte Einträge suchen (allgemein)"},
     {.Id = mcFindDuplicatesOfArtists, .Caption = u"Doppelte Einträge suchen (innerhalb der Artists)"},
     {.Id = mcFindSimilarArtists, .Caption = u"Ähnlich klingende Artists suchen"},
-    {.Id = mcReadBackupCd, .Caption = u"Songs von einer Backup-CD wieder einlesen"},
     {.Id = mcLoadLyrics, .Caption = u"Lyrikfang downloaden"},
     {.Id = mcConvert, .Caption = u"Song konvertieren"},
 };

@@ -6,6 +6,7 @@
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/songfiles/BlockCopy.h"
+#include "MusicManagment/database/songfiles/SongFinder.h"
 
 using namespace Qt::StringLiterals;
 
@@ -38,11 +39,11 @@ class CollisionPolicy {
 class Copier {
  public:
     Copier(TMusicDatabase& database, const QString& folder, int total)
-        : database_(database), folder_(folder), total_(total) {}
+        : database_(database), finder_(database), folder_(folder), total_(total) {}
 
     // False when the user asked to stop.
     bool Copy(int number, const QString& song, CopyResult& result) {
-        const QString path = database_.ResolveSongPath(song);
+        const QString path = finder_.Find(song);
         const QString name = QFileInfo(path).fileName();
         const QString target = folder_.filePath(name);
         try {
@@ -74,6 +75,7 @@ class Copier {
     }
 
     TMusicDatabase& database_;
+    SongFinder finder_;
     QDir folder_;
     int total_;
     CollisionPolicy collisions_;

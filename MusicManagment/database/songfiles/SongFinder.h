@@ -10,10 +10,10 @@ class SongFinder {
     explicit SongFinder(TMusicDatabase& database) : database_(database) {}
 
     // Empty when the medium is not there.
-    QString Find(const QString& path, bool useCache) {
+    QString Find(const QString& path, ResolveOptions options = {}) {
         const quint32 serial = SerialOfCdPath(path);
-        QString file =
-            database_.ResolveSongPath(path, {.Ask = !notThere_.contains(serial), .UseCache = useCache});
+        options.Ask = options.Ask && !notThere_.contains(serial);
+        QString file = database_.ResolveSongPath(path, options);
         if (file.isEmpty() && IsCdPath(path)) notThere_.insert(serial);
         return file;
     }
