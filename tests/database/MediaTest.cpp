@@ -3,9 +3,11 @@
 #include <QFile>
 
 #include "MusicManagment/database/CollectionEdit.h"
+#include "MusicManagment/database/batches/BurningBatch.h"
+#include "MusicManagment/database/batches/CacheBatch.h"
+#include "MusicManagment/database/intake/BackupCd.h"
 #include "MusicManagment/database/intake/Intake.h"
 #include "MusicManagment/database/intake/Update.h"
-#include "MusicManagment/database/media/CachePlace.h"
 #include "MusicManagment/database/media/CataloguedMedia.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
@@ -20,12 +22,13 @@ namespace {
 
 constexpr quint32 kSerial = 0x1A2B3C4D;
 
+QString OnStick(const QString& path) {
+    return u":1A2B3C4D:\\"_s + path;
+}
+
 class MediaTest : public testing::Test {
  protected:
-    MediaTest() {
-        database_.SetMP3MoveRootDir(disk_.Path(u"root"_s));
-        changes_ = database_.Events().MediaChanged.Subscribe([this] { ++redraws_; });
-    }
+    MediaTest() { database_.SetMP3MoveRootDir(disk_.Path(u"root"_s)); }
     // Catalogues the stick and takes its songs in.
     void TakeInStick(const QStringList& names) {
         stick_.Add(names);
@@ -33,51 +36,49 @@ class MediaTest : public testing::Test {
         CatalogueMedium(database_, stick_.Path());
         ASSERT_EQ(AddPaths(database_, {stick_.Path()}, true).Added, names.size());
     }
-    QString Found(const QString& path) {
-        return database_.ResolveSongPath(path, {.Ask = false, .UseCache = false});
+    QString Found(const QString& path, bool useCache = false) {
+        return database_.ResolveSongPath(path, {.Ask = false, .UseCache = useCache});
     }
+    IntakeResult AddStick() { return AddFolder(database_, stick_.Path(), true); }
 
     SongFolder stick_, disk_;
     ScriptedVolumes volumes_;
     ScriptedDialogs dialogs_;
     TMusicDatabase database_;
-    Subscription changes_;
-    int redraws_ = 0;
 };
 
-const QString kSong = u":1A2B3C4D:\\a\\Band - Lied.wav"_s;
+const QString kSong = OnStick(u"a\\Band - Lied.wav"_s);
 
 }  // namespace
 
-TEST_F(MediaTest, TheFirstFullDriveIsLookedAt) {
+TEST_F(MediaTest, OneDriveIsLookedAtOrAll) {
+    int redraws = 0;
+    const auto changes = database_.Events().MediaChanged.Subscribe([&] { ++redraws; });
     volumes_.Mount(u"/stick"_s, 7);
     volumes_.Mount(u"/cd"_s, kSerial, {}, 0);
     volumes_.Mount(u"/dvd"_s, 9, {}, 0);
     EXPECT_EQ(Found(kSong), u"/cd/a/Band - Lied.wav"_s);
-    EXPECT_EQ(redraws_, 1);
-    EXPECT_EQ(Found(u":00000009:\\x.mp3"_s), QString());  // only one drive counts
-    volumes_.Now[1].Serials = {7};                        // another disc in the drive
+    EXPECT_EQ(Found(u":00000009:\\x.mp3"_s), QString());
+    EXPECT_EQ(redraws, 1);
+    volumes_.Now[1].Serials = {7};  // another disc in the drive
     EXPECT_EQ(Found(kSong), QString());
     EXPECT_EQ(Found(u":00000007:\\x.mp3"_s), u"/cd/x.mp3"_s);
-    EXPECT_EQ(redraws_, 2);
     database_.SetModernMedia(true);
     EXPECT_EQ(Found(u":00000009:\\x.mp3"_s), u"/dvd/x.mp3"_s);
-    EXPECT_EQ(redraws_, 2);
+    EXPECT_EQ(redraws, 2);
 }
 
 TEST_F(MediaTest, WhatIsNoSerialNumberIsFoundNowhere) {
     database_.SetModernMedia(true);
     volumes_.Mount(u"/cd"_s, kSerial, {}, 0);
-    volumes_.Now.push_back({.MountPoint = u"/ohne"_s, .Optical = true});
     volumes_.Mount(u"/null"_s, 0, {}, 0);
     database_.SetCDNames({{u"Rock"_s, kSerial}});
-    for (const QString& path : {u":1A2B3C4:\\a.mp3"_s, u":+1A2B3C4:\\a.mp3"_s, u":00000000:\\a.mp3"_s,
-                                u":1A2B3CXD:\\a.mp3"_s, u":"_s}) {
+    for (const QString& path :
+         {u":1A2B3C4:\\a.mp3"_s, u":+1A2B3C4:\\a.mp3"_s, u":00000000:\\a.mp3"_s, u":"_s}) {
         EXPECT_EQ(Found(path), QString()) << qPrintable(path);
         EXPECT_EQ(database_.CDNameOf(path), path);
     }
     EXPECT_EQ(Found(u":1a2b3c4d:\\..\\b\\..\\a.mp3"_s), u"/cd/b/a.mp3"_s);
-    EXPECT_EQ(Found(QString()), QString());
     EXPECT_EQ(database_.CDNameOf(kSong), u"Rock"_s);
     EXPECT_EQ(database_.CDNameOf(u"/x.mp3"_s), u"/x.mp3"_s);
 }
@@ -89,56 +90,45 @@ TEST_F(MediaTest, TheUserSaysWhereAMediumIs) {
     EXPECT_EQ(database_.ResolveSongPath(kSong), u"/media/b/a/Band - Lied.wav"_s);
     EXPECT_EQ(dialogs_.Prompts, QStringList(2, u"Bitte legen Sie die passende CD ins CD-Laufwerk:"_s));
     EXPECT_EQ(database_.ResolveSongPath(u":00000008:\\x"_s), QString());  // cancelled
-    volumes_.Unmount();
-    EXPECT_EQ(Found(kSong), QString());
-    volumes_.Mount(u"/media/b"_s, kSerial);  // the drive stays known
-    EXPECT_EQ(Found(kSong), u"/media/b/a/Band - Lied.wav"_s);
+    EXPECT_EQ(Found(kSong), u"/media/b/a/Band - Lied.wav"_s);             // the drive stays known
 }
 
 TEST_F(MediaTest, AnIntakeKnowsTheSongsOfAMediumWhereverItIs) {
     TakeInStick({u"a/Band - Lied.wav"_s, u"Band - Zwei.wav"_s});
-    EXPECT_TRUE(database_.Contains(kSong));
-    EXPECT_EQ(database_.CDNames().front().Name, u"STICK"_s);
-    EXPECT_EQ(database_.Song(0).Artist, u"Band"_s);
-    EXPECT_EQ(AddPaths(database_, {stick_.Path()}, true).Known, 2);
+    EXPECT_EQ(database_.GetEntry(-1, kSong).Artist, u"Band"_s);
     QFile::link(stick_.Path(), disk_.Path(u"link"_s));
-    EXPECT_EQ(AddPaths(database_, {disk_.Path(u"link/a/Band - Lied.wav"_s)}, true).Known, 1);
+    EXPECT_EQ(AddPaths(database_, {disk_.Path(u"link/a/Band - Lied.wav"_s), stick_.Path()}, true).Known, 3);
 
-    // Mounted elsewhere, and without its name it is the same disk.
+    // Mounted elsewhere, and without its name, it is the same disk.
     database_.SetCDNames({});
+    database_.Side().Forget();
     const SongFolder elsewhere;
     elsewhere.Add({u"a/Band - Lied.wav"_s, u"Band - Neu.wav"_s});
     volumes_.Unmount();
     volumes_.Mount(elsewhere.Path(), kSerial);
     EXPECT_EQ(AddPaths(database_, {elsewhere.Path()}, true).NewFiles,
-              QStringList{u":1A2B3C4D:\\Band - Neu.wav"_s});
+              QStringList{OnStick(u"Band - Neu.wav"_s)});
 
-    // Away, it loses nothing.
     volumes_.Unmount();
     database_.SetUpdateFolders({elsewhere.Path(u"fort"_s)});
     EXPECT_TRUE(UpdateDatabase(database_, UpdateTags::Reread).Removed.isEmpty());
-    EXPECT_EQ(database_.Count(), 3);
 }
 
 TEST_F(MediaTest, AMediumIsAskedAboutOnce) {
     database_.SetModernMedia(true);
     stick_.Add(u"Band - Lied.wav"_s);
     volumes_.Mount(stick_.Path(), kSerial, u"STICK"_s);
-    EXPECT_THROW(AddFolder(database_, stick_.Path(), true), EAbort);
-    EXPECT_EQ(database_.Count(), 0);
-
+    EXPECT_THROW(AddStick(), EAbort);
     dialogs_.Answers = {1};
-    EXPECT_EQ(AddFolder(database_, stick_.Path(), true).NewFiles, stick_.Paths({u"Band - Lied.wav"_s}));
-    EXPECT_EQ(AddFolder(database_, stick_.Path(), true).Known, 1);
-    EXPECT_EQ(dialogs_.Asked.size(), 2U);
+    EXPECT_EQ(AddStick().NewFiles, stick_.Paths({u"Band - Lied.wav"_s}));
+    EXPECT_EQ(AddStick().Known, 1);
 
     database_.Clear();
     dialogs_.Answers = {0};
     dialogs_.Inputs = {u"Urlaub"_s};
-    EXPECT_EQ(AddFolder(database_, stick_.Path(), true).NewFiles,
-              QStringList{u":1A2B3C4D:\\Band - Lied.wav"_s});
-    EXPECT_EQ(AddFolder(database_, stick_.Path(), true).Known, 1);
-    EXPECT_EQ(database_.CDNameOf(database_.Song(0).FileName), u"Urlaub"_s);
+    EXPECT_EQ(AddStick().NewFiles, QStringList{OnStick(u"Band - Lied.wav"_s)});
+    EXPECT_EQ(AddStick().Known, 1);
+    EXPECT_EQ(database_.CDNameOf(kSong), u"Urlaub"_s);
     EXPECT_EQ(dialogs_.Asked.size(), 3U);
 }
 
@@ -149,55 +139,133 @@ TEST_F(MediaTest, PathsAreComparedWithoutDriveAndMedium) {
     EXPECT_TRUE(isSame(u"/media/x/a/Band - Lied.wav"_s, kSong));
     EXPECT_FALSE(isSame(kSong, u"D:\\b\\Band - Lied.wav"_s));
     EXPECT_FALSE(isSame(kSong, kSong));
-    EXPECT_FALSE(isSame(u"/media/x/a"_s, u"/media/x/a"_s));
 }
 
 TEST_F(MediaTest, TheOrderByCacheTypeFollowsWhatIsPluggedIn) {
-    TakeInStick({u"B - B.wav"_s});
     volumes_.Mount(u"/cd"_s, 5);
     database_.SetOrder({.SortType = stCacheType});
-    TID3Tag song;
-    for (const QString& path : {u":00000005:\\x"_s, u":00000006:\\x"_s, u"/x"_s}) {
-        song.FileName = path;
-        database_.AddEntry(path, song, AddAs::Returning);
-    }
-    const auto order = [this] {
-        QString kinds;
-        for (const auto& each : database_.Songs())
-            kinds += IsCdPath(each->FileName) ? each->FileName[8] : u'-';
-        return kinds;
-    };
-    EXPECT_EQ(order().left(1) + order().right(1), u"-6"_s);
-    volumes_.Unmount();
-    volumes_.Mount(u"/cd"_s, 6);
+    for (const QString& path : {u":00000006:\\x"_s, u":00000005:\\x"_s, u"/x"_s})
+        database_.AddEntry(path, {}, AddAs::Returning);
+    EXPECT_EQ(database_.IndexOf(u"/x"_s), 0);
+    EXPECT_EQ(database_.IndexOf(u":00000006:\\x"_s), 2);
+    volumes_.Now[0].Serials = {6};
     database_.EnsureSorted();
-    EXPECT_EQ(order().left(2), u"-6"_s);
+    EXPECT_EQ(database_.IndexOf(u":00000006:\\x"_s), 1);
 }
 
 TEST_F(MediaTest, NotesFollowTheSongsAndStayWithTheDatabase) {
-    TID3Tag song;
-    song.FileName = u"/alt\t\\ü.mp3"_s;
-    database_.AddEntry(song.FileName, song, AddAs::Returning);
-    const QString file = disk_.Path(u"x.tsdb"_s);
-    database_.Side().Add(u"pairs"_s, {song.FileName, u"/b.mp3"_s});
-    database_.Side().Add(u"pairs"_s, {u"/b.mp3"_s, song.FileName});
+    const QString old = u"/alt\t\\ü.mp3"_s;
+    const QString renamed = u"/neu\n.mp3"_s;
+    database_.AddEntry(old, {}, AddAs::Returning);
+    database_.Side().Add(u"pairs"_s, {old, u"/b.mp3"_s});
+    database_.Side().Add(u"pairs"_s, {u"/b.mp3"_s, old});
     CollectionEdit edit(database_);
-    edit.Rename(database_.Songs().HandleOf(0), u"/neu\n.mp3"_s);
+    edit.Rename(database_.Songs().HandleOf(0), renamed);
     edit.Commit();
+    const QString file = disk_.Path(u"x.tsdb"_s);
     database_.SaveDatabase(file);
-
     TMusicDatabase loaded;
     loaded.OpenDatabase(file);
-    EXPECT_TRUE(loaded.Side().Contains(u"pairs"_s, {u"/neu\n.mp3"_s, u"/b.mp3"_s}));
-    EXPECT_TRUE(loaded.Side().Contains(u"pairs"_s, {u"/b.mp3"_s, u"/neu\n.mp3"_s}));
-    EXPECT_EQ(loaded.Side().Rows(u"pairs"_s).size(), 2U);
+    EXPECT_EQ(loaded.Side().Values(u"pairs"_s, renamed), QStringList{u"/b.mp3"_s});
+    EXPECT_EQ(loaded.Side().Values(u"pairs"_s, u"/b.mp3"_s), QStringList{renamed});
 
     // What cannot be read is told, holds up nothing, and is not lost.
     disk_.Put(u"x.tsdb.side"_s, QByteArray("Notizen eines Fremden\n"));
     loaded.OpenDatabase(file);
-    EXPECT_EQ(loaded.Count(), 1);
     loaded.Side().Add(u"pairs"_s, {u"/a"_s, u"/b"_s});
     loaded.SaveDatabase();
     EXPECT_EQ(dialogs_.Messages.size(), 2);
     EXPECT_EQ(disk_.Get(u"x.tsdb.side"_s), "Notizen eines Fremden\n");
+}
+
+TEST_F(MediaTest, SongsAreCopiedOnceAndOnlyOurCopiesAreRemoved) {
+    TakeInStick({u"A - gone.wav"_s, u"A - one.wav"_s, u"A - there.wav"_s, u"A - two.wav"_s});
+    const QString one = disk_.Path(u"root/Unsorted/A - one.wav"_s);
+    const QString two = disk_.Path(u"root/Unsorted/A - two.wav"_s);
+    const QString there = disk_.Put(u"root/Unsorted/A - there.wma"_s, QByteArray("mine"));
+    QFile::remove(stick_.Path(u"A - gone.wav"_s));
+    database_.SetModernMedia(true);
+    database_.SaveDatabase(disk_.Path(u"x.tsdb"_s));
+
+    dialogs_.Answers = {0, 0};  // enough room; go on after the one that is gone
+    EXPECT_EQ(CacheSongs(database_, AllSongs(database_)).Done, 2);
+    EXPECT_EQ(dialogs_.Questions.value(1), u"Die Datei "_s + stick_.Path(u"A - gone.wav"_s) +
+                                               u" konnte nicht gecachet werden. Trotzdem fortfahren?"_s);
+    EXPECT_EQ(Found(OnStick(u"A - one.wav"_s), true), one);  // also while the medium is there
+    volumes_.Unmount();
+    EXPECT_EQ(Found(OnStick(u"A - there.wav"_s), true), there);
+    EXPECT_EQ(FileWithinReach(database_, OnStick(u"A - gone.wav"_s)), QString());
+    EXPECT_EQ(AddPaths(database_, {one, two}, true).Known, 2);
+
+    // Noted at once, the copies are known after a restart, and by other tags.
+    TMusicDatabase restarted;
+    restarted.OpenDatabase(disk_.Path(u"x.tsdb"_s));
+    EXPECT_EQ(restarted.ResolveSongPath(OnStick(u"A - two.wav"_s)), two);
+    restarted.AddEntry(one, {});  // a song of its own now
+    EXPECT_EQ(DropCaches(restarted, AllSongs(restarted)).Done, 2);
+    EXPECT_TRUE(QFile::exists(one) && QFile::exists(there));
+    EXPECT_FALSE(QFile::exists(two));
+}
+
+TEST_F(MediaTest, AMediumThatIsNotPutInIsAskedForOnceABatch) {
+    TakeInStick({u"A - one.wav"_s, u"A - two.wav"_s});
+    volumes_.Unmount();
+    dialogs_.Answers = {0};
+    EXPECT_EQ(CacheSongs(database_, AllSongs(database_)).Missing.size(), 2);
+    EXPECT_EQ(dialogs_.Prompts.size(), 1);
+}
+
+TEST_F(MediaTest, BurningTakesSongsOfMediaAsTheUserAnswers) {
+    struct Case {
+        std::deque<int> Answers;  // the first is about the room
+        QStringList Taken;
+    };
+    TakeInStick({u"1.wav"_s, u"2.wav"_s, u"3.wav"_s});
+    AddPaths(database_, {disk_.Add(u"4.wav"_s)}, true);
+    database_.SetModernMedia(true);
+    database_.SetOrder({.SortType = stTitle});
+    const std::vector<Case> cases = {{{0, 0, 2, 0}, {u"1.wav"_s, u"3.wav"_s, u"4.wav"_s}},
+                                     {{0, 2, 1}, {u"2.wav"_s, u"3.wav"_s, u"4.wav"_s}},
+                                     {{0, 0, 3}, {u"1.wav"_s, u"4.wav"_s}},
+                                     {{0, 0, 4}, {u"1.wav"_s}}};
+    for (const Case& each : cases) {
+        const QString folder = disk_.Path(each.Taken.join(u'-'));
+        dialogs_.Questions.clear();
+        dialogs_.Answers = each.Answers;
+        const bool stopped = PrepareBurning(database_, AllSongs(database_), folder).Stopped;
+        EXPECT_EQ(QDir(folder).entryList(QDir::Files, QDir::Name), each.Taken);
+        EXPECT_EQ(stopped, each.Answers.back() == 4);
+        EXPECT_EQ(dialogs_.Questions.size(), each.Answers.size());
+    }
+}
+
+TEST_F(MediaTest, NoSongOfABatchReplacesAnotherOrItself) {
+    const QStringList songs =
+        disk_.Add({u"root/Rap/A - 1.wav"_s, u"x/B - 2.wav"_s, u"y/B - 2.wav"_s, u"burn/C - 3.wav"_s});
+    AddPaths(database_, songs, true);
+    disk_.Put(u"burn/Rap/A - 1.wav"_s, QByteArray("old"));
+    dialogs_.Answers = {0};
+    EXPECT_EQ(PrepareBurning(database_, AllSongs(database_), disk_.Path(u"burn/"_s)).Done, 3);
+    EXPECT_EQ(QDir(disk_.Path(u"burn"_s)).entryList(QDir::Files, QDir::Name),
+              (QStringList{u"B - 2 (2).wav"_s, u"B - 2.wav"_s, u"C - 3.wav"_s}));
+    EXPECT_EQ(disk_.Get(u"burn/Rap/A - 1.wav"_s), disk_.Get(u"root/Rap/A - 1.wav"_s));
+}
+
+TEST_F(MediaTest, AFileOfABackupCdIsTiedToTheSongThatItIs) {
+    const QStringList own =
+        disk_.Add({u"Queen - Jealousy.wav"_s, u"Queen - Jealous Guy.wav"_s, u"Abba - Fernando.wav"_s});
+    AddPaths(database_, own, true);
+    stick_.Add({u"Queen - Jealosy.wav"_s, u"Queen - Jealousy.wav"_s, u"Neu - Ganz anders.wav"_s});
+    volumes_.Mount(stick_.Path(), kSerial, u"BACKUP"_s, 0);
+    dialogs_.Answers = {0};  // what is like no song is new
+    dialogs_.Inputs = {u"BACKUP ("_s + stick_.Path() + u')', u"Sicherung"_s,
+                       u"093%: Queen - Jealousy (***)"_s, u"Überspringen"_s};
+    const BackupResult result = ReadBackupCd(database_);
+    EXPECT_EQ(result.Tied, 1);
+    EXPECT_EQ(result.Added, 1);
+    EXPECT_EQ(database_.GetEntry(-1, OnStick(u"Queen - Jealosy.wav"_s)).Title, u"Jealousy"_s);
+    EXPECT_FALSE(database_.Contains(own[0]));
+    EXPECT_TRUE(QFile::exists(own[0]));
+    EXPECT_TRUE(database_.Contains(OnStick(u"Neu - Ganz anders.wav"_s)));
+    EXPECT_EQ(database_.CDNameOf(kSong), u"Sicherung"_s);
 }
