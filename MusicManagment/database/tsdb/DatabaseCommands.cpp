@@ -1,3 +1,4 @@
+#include <QScopeGuard>
 #include <optional>
 
 #include "CommonRUKTools/Dialogs.h"
@@ -94,13 +95,14 @@ bool TMusicDatabase::OpenDatabase(const QString& fileName, bool keepName) {
     // A part of the songs must not be saved over the file that holds them all, which the automatic save would
     // do; so the name comes last.
     if (!keepName) fileName_.clear();
+    // Also of a database that could be read in part only: it may be saved over the old one.
+    const auto openSideFile = qScopeGuard([&] { OpenSideFile(side_, fileName); });
     try {
         if (!ReadDatabase(*this, source)) return false;
     } catch (const EStreamError& error) {
         throw EMusicDatabaseException(error.Message());
     }
     if (!keepName) fileName_ = fileName;
-    OpenSideFile(side_, fileName);
     return true;
 }
 
