@@ -25,10 +25,6 @@ quint32 CataloguedMedia::SerialOf(const Volume& volume) const {
     return found != volume.Serials.end() ? *found : 0;
 }
 
-bool CataloguedMedia::IsCatalogued(const Volume& volume) const {
-    return SerialOf(volume) != 0;
-}
-
 QString CataloguedMedia::StoredPath(const QString& path) const {
     if (IsCdPath(path) || path.contains(u'\\')) return path;
     const Volume* volume = CurrentVolumes().Holding(path);
@@ -42,13 +38,13 @@ QString CatalogueMedium(TMusicDatabase& database, const QString& path, const QSt
     if (volume == nullptr || volume->Serials.empty())
         throw EMusicDatabaseException(
             u"Der Datenträger hat keine Seriennummer und kann nicht katalogisiert werden: "_s + path);
-    std::vector<CdName> names = database.CDNames();
-    const auto known =
-        std::ranges::find_if(names, [&](const CdName& cd) { return volume->HasSerial(cd.Serial); });
-    if (known != names.end() && name.isEmpty()) return known->Name;
-    const quint32 serial = known != names.end() ? known->Serial : volume->Serials.front();
+    const quint32 known = CataloguedMedia(database).SerialOf(*volume);
+    const quint32 serial = known != 0 ? known : volume->Serials.front();
     QString given = name.trimmed();
+    const QString onMedium = MakeCdPath(serial, u"/"_s);
+    if (given.isEmpty() && database.CDNameOf(onMedium) != onMedium) return database.CDNameOf(onMedium);
     if (given.isEmpty()) given = volume->Label.isEmpty() ? SerialText(serial) : volume->Label;
+    std::vector<CdName> names = database.CDNames();
     names.push_back({given, serial});  // of one serial number the last counts
     database.SetCDNames(std::move(names));
     for (const QString& old : database.Side().Values(kMediumNames, SerialText(serial)))

@@ -10,7 +10,7 @@
 inline const QString kMediumNames = QStringLiteral("medium-name");
 
 // Which media are catalogued: those that have a name, and those that can be taken away and that songs of the
-// collection lie on. Made for one run; a medium that is catalogued meanwhile is told to it.
+// collection lie on. Made for one run: what is catalogued later it does not know.
 class CataloguedMedia {
  public:
     explicit CataloguedMedia(const TMusicDatabase& database);
@@ -18,20 +18,18 @@ class CataloguedMedia {
     // The path under which a song is stored: on a catalogued medium its CD path. One with a backslash in its
     // name, which a CD path cannot hold, keeps its ordinary path.
     QString StoredPath(const QString& path) const;
-    bool IsCatalogued(const Volume& volume) const;
-    bool HasSongs(quint32 serial) const { return ofSongs_.contains(serial); }
+    // The number by which a volume is catalogued; 0: it is not.
+    quint32 SerialOf(const Volume& volume) const;
+    bool IsCatalogued(const Volume& volume) const { return SerialOf(volume) != 0; }
 
  private:
-    // 0: none.
-    quint32 SerialOf(const Volume& volume) const;
-
     QSet<quint32> named_;
     QSet<quint32> ofSongs_;
 };
 
-// Gives the volume on which `path` lies a name, so that songs on it are stored by it; without one its label
-// or its serial number. Returns the name. Throws EMusicDatabaseException where the volume has no serial
-// number or cannot be told.
+// Gives the volume on which `path` lies a name, so that songs on it are stored by it; without one the name
+// that it has, its label or its serial number. Returns the name. Throws EMusicDatabaseException where the
+// volume has no serial number or cannot be told.
 QString CatalogueMedium(TMusicDatabase& database, const QString& path, const QString& name = QString());
 // What views ask for each song that they draw, so that no disk is looked at: the file on the medium where it
 // is mounted, else the copy that is noted; empty where there is neither. An ordinary path is its own answer.
