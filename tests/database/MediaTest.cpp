@@ -157,10 +157,12 @@ TEST_F(MediaTest, NotesFollowTheSongsAndStayWithTheDatabase) {
     const QString old = u"/alt\t\\ü.mp3"_s;
     const QString renamed = u"/neu\n.mp3"_s;
     database_.AddEntry(old, {}, AddAs::Returning);
+    TID3Tag song = database_.Song(0);
+    song.FileName = renamed;
     database_.Side().Add(u"pairs"_s, {old, u"/b.mp3"_s});
     database_.Side().Add(u"pairs"_s, {u"/b.mp3"_s, old});
     CollectionEdit edit(database_);
-    edit.Rename(database_.Songs().HandleOf(0), renamed);
+    edit.Change(database_.Songs().HandleOf(0), song);
     edit.Commit();
     const QString file = disk_.Path(u"x.tsdb"_s);
     database_.SaveDatabase(file);
