@@ -24,6 +24,8 @@ struct CollectionEvents {
     Listeners<SongIndex, const TID3Tag&> Removed;
     // Songs have other paths now. Comes after Changed, once for all that changed together.
     Listeners<const PathChanges&> Renamed;
+    // Songs have gone, and others stand for them: old path to that of the other. Comes after Removed.
+    Listeners<const PathChanges&> Superseded;
     // Around a new order of the same songs.
     Listeners<> Reordering;
     Listeners<> Reordered;

@@ -54,6 +54,7 @@ enum MenuCommand : int {
     mcCacheCdSongs = 512,
     mcDropCaches = 513,
     mcRenameCds = 514,
+    mcFindDuplicatesOfMarked = 515,
     mcTagsSubmenu = 600,
     mcSetFlag = 601,
     mcRemoveFlag = 602,
@@ -82,5 +83,8 @@ extern const DatabaseCommands kOrderCommands;
 extern const DatabaseCommands kOverviewCommands;
 extern const DatabaseCommands kBatchCommands;
 extern const DatabaseCommands kMediaCommands;
+extern const DatabaseCommands kDuplicateCommands;
+extern const DatabaseCommands kArtistCommands;
+extern const DatabaseCommands kBackupCommands;
 extern const DatabaseCommands kPlayCommands;
 extern const DatabaseCommands kLaterCommands;  // still to be built

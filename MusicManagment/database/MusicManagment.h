@@ -241,6 +241,10 @@ class TMusicDatabase : public QObject {
     // switched on by the programs.
     bool QuietBatches() const { return quietBatches_; }
     void SetQuietBatches(bool value) { quietBatches_ = value; }
+    // Whether duplicates are looked for in collections of any size; off in a new component, which compares
+    // kMostComparedSongs at most, switched on by the programs.
+    bool UnlimitedSearch() const { return unlimitedSearch_; }
+    void SetUnlimitedSearch(bool value) { unlimitedSearch_ = value; }
     // Whether a medium is looked for on all mounted volumes before the user is asked for it, and the user is
     // asked at intake whether one is to be catalogued; off in a new component, which looks at one drive and
     // asks nothing, switched on by the programs.
@@ -387,6 +391,7 @@ class TMusicDatabase : public QObject {
     bool renameAndMoveMP3s_ = true;
     bool renameInPlace_ = false;
     bool quietBatches_ = false;
+    bool unlimitedSearch_ = false;
     bool modernMedia_ = false;
     bool modernTags_ = false;
     bool keepLostSongs_ = false;

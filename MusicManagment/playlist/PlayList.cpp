@@ -212,8 +212,9 @@ void TPlayList::SetMusicDatabase(TMusicDatabase* database) {
     if (database == nullptr) return;
     database->SetPlayList(this);
     database->JoinSettings(*this);
-    renaming_ =
-        database->Events().Renamed.Subscribe([this](const PathChanges& renamed) { FollowRenamed(renamed); });
+    const auto follow = [this](const PathChanges& changes) { FollowRenamed(changes); };
+    renaming_ += database->Events().Renamed.Subscribe(follow);
+    renaming_ += database->Events().Superseded.Subscribe(follow);
 }
 
 void TPlayList::SetPlaySound(SongPlayer* player) {

@@ -233,7 +233,7 @@ class TPlayList : public QObject, public SettingsClient {
 
     PlayListEvents events_;
     Subscriptions forwarding_;  // to OnChange
-    Subscription renaming_;     // of the database
+    Subscriptions renaming_;    // of the database
     EntryList entries_;
     std::deque<RememberedEntry> history_;
     QList<EntryId> queue_;

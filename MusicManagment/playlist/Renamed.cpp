@@ -1,7 +1,7 @@
 #include "MusicManagment/playlist/PlayList.h"
 #include "MusicManagment/playlist/SongPlayer.h"
 
-// Songs of the database get other paths, and the list goes along.
+// Songs of the database get other paths, or others stand for them, and the list goes along.
 
 namespace {
 

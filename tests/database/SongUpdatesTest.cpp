@@ -227,6 +227,44 @@ TEST_F(SongUpdatesTest, ALengthIsEnteredAsMinutesOrSeconds) {
     EXPECT_EQ(Song(a).Length, 2);  // what the file really holds
 }
 
+TEST_F(SongUpdatesTest, ASongThatStandsForOthersTakesTheirPlaysAndAllOfItIsTakenBackAsOne) {
+    const auto addPlayed = [this](const QString& name, quint32 plays) {
+        const SongHandle song = Add(name);
+        TID3Tag played = Song(song);
+        played.PlayCount = plays;
+        database_.UpdateEntry(database_.Songs().PositionOf(song), played);
+        return song;
+    };
+    const SongHandle kept = addPlayed(u"Queen - A.wav"_s, 2);
+    const SongHandle b = addPlayed(u"Queen - A (b).wav"_s, 3);
+    const SongHandle c = addPlayed(u"Queen - A (c).wav"_s, 4);
+    const SongHandle lost = addPlayed(u"Queen - Lost.wav"_s, 8);
+    QFile::remove(Song(lost).FileName);
+    QFile::link(Song(kept).FileName, folder_.Path(u"Queen - Link.wav"_s));
+    const SongHandle link =
+        database_.Songs().HandleOf(database_.AddSong(folder_.Path(u"Queen - Link.wav"_s)));
+    const QString keptPath = Song(kept).FileName;
+    const QString bPath = Song(b).FileName;
+    PathChanges told;
+    const Subscription listener =
+        database_.Events().Superseded.Subscribe([&](const PathChanges& changes) { told = changes; });
+    EXPECT_EQ(ReplaceSongs(database_, u"1 doppelter Eintrag"_s, {{lost, kept}}).Failed.size(), 1);
+    EXPECT_TRUE(database_.Count() == 5 && QFile::exists(keptPath)) << "the only one with a file";
+    // The last two are passed over: b goes itself, and a song that stays for others stays.
+    const BatchResult result = ReplaceSongs(database_, u"3 doppelte Einträge"_s,
+                                            {{kept, b}, {kept, c}, {kept, link}, {b, lost}, {c, kept}});
+    EXPECT_EQ(result.Failed, QStringList());
+    EXPECT_EQ(database_.Count(), 2);
+    EXPECT_EQ(Song(kept).PlayCount, 9u);
+    EXPECT_TRUE(told.size() == 3 && told.value(bPath) == keptPath);
+    EXPECT_FALSE(QFile::exists(bPath));
+    EXPECT_TRUE(QFile::exists(folder_.Path(u"Queen - Link.wav"_s))) << "another name of the kept file";
+    EXPECT_EQ(journal_.Undo(&database_).Problems, QStringList());
+    EXPECT_EQ(Song(kept).PlayCount, 2u);
+    EXPECT_EQ(database_.Songs().Find(bPath)->PlayCount, 3u);
+    EXPECT_TRUE(QFile::exists(bPath) && database_.Count() == 5);
+}
+
 TEST_F(SongUpdatesTest, LengthsAreAskedForUntilNobodyIsThereToAsk) {
     const SongHandle a = Add(u"Queen - A.wav"_s);
     const SongHandle b = Add(u"Queen - B.wav"_s);

@@ -60,11 +60,15 @@ inline constexpr PropertySetting kQuietBatches{Setting<bool>{u"QuietBatches", fa
                                                &TMusicDatabase::QuietBatches,
                                                &TMusicDatabase::SetQuietBatches};
 
+inline constexpr PropertySetting kUnlimitedSearch{Setting<bool>{u"UnlimitedSearch", false, true},
+                                                  &TMusicDatabase::UnlimitedSearch,
+                                                  &TMusicDatabase::SetUnlimitedSearch};
+
 inline constexpr PropertySetting kModernMedia{Setting<bool>{u"ModernMedia", false, true},
                                               &TMusicDatabase::ModernMedia, &TMusicDatabase::SetModernMedia};
 
-inline constexpr std::tuple kRules{kModernTags,    kKeepLostSongs, kDerivedGenres,
-                                   kRenameInPlace, kQuietBatches,  kModernMedia};
+inline constexpr std::tuple kRules{kModernTags,   kKeepLostSongs,   kDerivedGenres, kRenameInPlace,
+                                   kQuietBatches, kUnlimitedSearch, kModernMedia};
 
 inline constexpr std::tuple kOwn{kAutoSave,
                                  kCompression,

@@ -6,8 +6,6 @@ namespace {
 
 constexpr DatabaseCommand kRows[] = {
     {.Id = mcFindOnline, .Caption = u"Suchen im Internet...", .Keys = u"Ctrl+Alt+F"},
-    {.Id = mcFindDuplicates, .Caption = u"Doppelte Einträge suchen (allgemein)"},
-    {.Id = mcFindDuplicatesOfArtists, .Caption = u"Doppelte Einträge suchen (innerhalb der Artists)"},
     {.Id = mcFindSimilarArtists, .Caption = u"Ähnlich klingende Artists suchen"},
     {.Id = mcLoadLyrics, .Caption = u"Lyrikfang downloaden"},
     {.Id = mcConvert, .Caption = u"Song konvertieren"},

@@ -28,13 +28,21 @@ constexpr MenuLine kAllSongsLines[] = {mcAdaptAllGenres, mcSetFlagOfAll,  mcRemo
                                        kSeparator,       mcRereadAllTags, mcRemoveAllTags};
 constexpr MenuOutline kAllSongs{
     .Caption = u"Tags und Flags aller Songs", .Lines = kAllSongsLines, .Id = mcAllSongsSubmenu};
-constexpr MenuLine kExtrasLines[] = {mcFindDuplicates,     mcFindDuplicatesOfArtists,
-                                     mcFindSimilarArtists, mcVerifyLengths,
-                                     mcSearchNew,          mcReadBackupCd,
-                                     mcPrepareBurning,     mcLoadLyrics,
-                                     mcEnterLength,        mcConvert,
-                                     &kAllSongs,           kSeparator,
-                                     mcCacheCdSongs,       mcDropCaches,
+constexpr MenuLine kExtrasLines[] = {mcFindDuplicates,
+                                     mcFindDuplicatesOfArtists,
+                                     mcFindDuplicatesOfMarked,
+                                     mcFindSimilarArtists,
+                                     mcVerifyLengths,
+                                     mcSearchNew,
+                                     mcReadBackupCd,
+                                     mcPrepareBurning,
+                                     mcLoadLyrics,
+                                     mcEnterLength,
+                                     mcConvert,
+                                     &kAllSongs,
+                                     kSeparator,
+                                     mcCacheCdSongs,
+                                     mcDropCaches,
                                      mcRenameCds};
 constexpr MenuLine kOverviewLines[] = {301, 302, 303, 304, 305, kWritableSeparator, mcRecount};
 
@@ -65,7 +73,8 @@ CommandDispatcher& TMusicDatabase::Commands() {
                                     void* platformItem) { return TellOfClick(*this, item, platformItem); }});
     for (const DatabaseCommands& capability :
          {kFileCommands, kIntakeCommands, kFindCommands, kSongFileCommands, kOrderCommands, kOverviewCommands,
-          kPlayCommands, kBatchCommands, kMediaCommands, kLaterCommands})
+          kPlayCommands, kBatchCommands, kMediaCommands, kDuplicateCommands, kArtistCommands, kBackupCommands,
+          kLaterCommands})
         commands_->Register(*this, capability);
     for (Listeners<>* change :
          {&CurrentOperation().Started, &CurrentOperation().Ended, &Events().ReadOnlyChanged})

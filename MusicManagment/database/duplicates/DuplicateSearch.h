@@ -30,6 +30,20 @@ class DuplicateRows {
         return {songs_[held.First], songs_[held.Second], percent};
     }
 
+    // The same by the places of the songs in Songs().
+    struct Numbered {
+        std::uint32_t First = 0;
+        std::uint32_t Second = 0;
+        double Percent = 0;
+    };
+    Numbered NumbersAt(std::size_t row) const {
+        return {rows_[row].First, rows_[row].Second, At(row).Percent};
+    }
+    // Those that were compared, in the order of the collection.
+    const std::vector<SongHandle>& Songs() const { return songs_; }
+    // A song that went and has come back is another one.
+    void PutBack(std::uint32_t number, SongHandle song) { songs_[number] = song; }
+
     // For the search: the songs by their numbers, and pairs of these.
     void Begin(std::vector<SongHandle> songs);
     // `length` is that of the longer of the two compared names.

@@ -1,6 +1,8 @@
 #include "MusicManagment/database/songfiles/SongUpdates.h"
 
+#include <QFileInfo>
 #include <QSet>
+#include <algorithm>
 
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/BannList.h"
@@ -86,17 +88,38 @@ class SongChanges {
     void Discard(SongHandle song, bool banned) {
         const TID3Tag* found = database_.Songs().Find(song);
         if (found == nullptr) return;
-        const QString path = found->FileName;
         SongItem item{.Song = song, .Record = *found};
         if (banned) item.Steps.Ban(BanEntry(*found));
-        const auto released = Release(path);
-        if (!IsCdPath(path) && StateOf(path).Exists()) item.Steps.Trash(path, banned);
-        item.Steps.Record(*found, std::nullopt);
-        item.Count = 1;
-        Add(std::move(item));
-        if (!released) return;
-        batch_.Settle();
-        released(path);
+        const bool hasFile = !IsCdPath(found->FileName) && StateOf(found->FileName).Exists();
+        TakeOut(std::move(item), hasFile, banned);
+    }
+
+    void Replace(const SongReplacement& songs) {
+        // What goes stands for nothing, and what stands for another stays.
+        const bool isTaken = dropped_.contains(songs.Kept.Slot) || kept_.contains(songs.Dropped.Slot) ||
+                             dropped_.contains(songs.Dropped.Slot);
+        if (isTaken) return;
+        // The plays of a song count once those before have been added.
+        if (kept_.contains(songs.Kept.Slot)) batch_.Settle();
+        const TID3Tag* kept = database_.Songs().Find(songs.Kept);
+        const TID3Tag* dropped = database_.Songs().Find(songs.Dropped);
+        if (kept == nullptr || dropped == nullptr || kept == dropped) return;
+        if (!IsCdPath(kept->FileName) && !StateOf(kept->FileName).Exists()) {
+            result_.Failed << dropped->FileName + u": Die Datei, die bleiben soll, fehlt: "_s +
+                                  kept->FileName;
+            return;
+        }
+        kept_.insert(songs.Kept.Slot);
+        dropped_.insert(songs.Dropped.Slot);
+        SongItem item{.Song = songs.Dropped, .Record = *dropped, .ReplacedBy = kept->FileName};
+        if (dropped->PlayCount > 0) {
+            TID3Tag played = *kept;
+            played.PlayCount += std::min(dropped->PlayCount, ~quint32{0} - played.PlayCount);
+            item.Gain = {*kept, std::move(played)};
+        }
+        const bool hasFile = !IsCdPath(dropped->FileName) && StateOf(dropped->FileName).Exists() &&
+                             !IsSameFile(dropped->FileName, kept->FileName);
+        TakeOut(std::move(item), hasFile, false);
     }
 
     BatchResult Finish() {
@@ -104,6 +127,7 @@ class SongChanges {
         run_.reset();  // saving is a run of its own
         database_.SaveAfterCommand();
         batch_.Finish();
+        if (!replaced_.isEmpty()) database_.Events().Superseded.Tell(replaced_);
         result_.Changed = static_cast<int>(changed_.size());
         return std::move(result_);
     }
@@ -114,8 +138,10 @@ class SongChanges {
         SongHandle Song{};
         TID3Tag Record{};  // as it is to be
         FileItem Steps{};
-        int Count = 0;     // of the steps before a move
-        QString Target{};  // of the move; empty without one
+        int Count = 0;         // of the steps before a move
+        QString Target{};      // of the move; empty without one
+        QString ReplacedBy{};  // path of the song that stands for one that goes
+        RecordChange Gain{};   // of that song
 
         void ChangeFrom(const TID3Tag& before) {
             Steps.Record(before, Record);
@@ -123,11 +149,31 @@ class SongChanges {
         }
     };
 
+    // The file, where there is one that goes, and the song; the file is let go of before.
+    void TakeOut(SongItem item, bool hasFile, bool banned) {
+        const QString path = item.Record.FileName;
+        const auto released = Release(path);
+        if (hasFile) item.Steps.Trash(path, banned);
+        item.Steps.Record(item.Record, std::nullopt);
+        if (item.Gain.After) item.Steps.Record(item.Gain.Before, item.Gain.After);
+        item.Count = 1;
+        Add(std::move(item));
+        if (!released) return;
+        batch_.Settle();
+        released(path);
+    }
+
+    static bool IsSameFile(const QString& a, const QString& b) {
+        const QString file = QFileInfo(a).canonicalFilePath();
+        return !file.isEmpty() && file == QFileInfo(b).canonicalFilePath();
+    }
+
     void Add(SongItem item) {
         if (item.Count == 0 && item.Target.isEmpty()) return;
         item.Steps.Then([this, song = item.Song, path = item.Record.FileName, target = item.Target,
-                         count = item.Count](const ItemResult& done) {
+                         count = item.Count, by = item.ReplacedBy](const ItemResult& done) {
             if (done.StepsDone > 0) changed_.insert(song.Slot);
+            if (!by.isEmpty() && done.IsComplete()) replaced_.insert(path, by);
             if (!target.isEmpty() && done.IsComplete()) ++result_.Renamed;
             if (done.IsComplete()) return;
             const bool failedToMove = !target.isEmpty() && done.StepsDone >= count;
@@ -211,6 +257,9 @@ class SongChanges {
     BatchResult result_;
     QSet<QString> targets_;
     QSet<quint32> changed_;  // songs, by slot
+    QSet<quint32> kept_;     // instead of others, by slot
+    QSet<quint32> dropped_;
+    PathChanges replaced_;
     std::size_t count_;
     std::size_t taken_ = 0;
     FileBatch batch_;  // the last one: as it goes it tells what came of its items
@@ -249,6 +298,16 @@ BatchResult DiscardSongs(TMusicDatabase& database, const QString& caption,
     for (const SongHandle song : songs) {
         if (!changes.Next()) break;
         changes.Discard(song, banning == Banning::Banned);
+    }
+    return changes.Finish();
+}
+
+BatchResult ReplaceSongs(TMusicDatabase& database, const QString& caption,
+                         const std::vector<SongReplacement>& replacements) {
+    SongChanges changes(database, caption, caption, replacements.size());
+    for (const SongReplacement& songs : replacements) {
+        if (!changes.Next()) break;
+        changes.Replace(songs);
     }
     return changes.Finish();
 }

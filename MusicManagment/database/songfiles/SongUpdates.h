@@ -62,6 +62,17 @@ enum class Banning { NotBanned, Banned };
 BatchResult DiscardSongs(TMusicDatabase& database, const QString& caption,
                          const std::vector<SongHandle>& songs, Banning banning);
 
+// Two songs that hold the same piece of music: one stays, the other goes.
+struct SongReplacement {
+    SongHandle Kept{};
+    SongHandle Dropped{};
+};
+// Moves the files of the dropped songs into the recycle bin and takes them out of the collection. Their plays
+// are added to those of the kept ones, which take their places in the playlist. A song stays where the file
+// of the kept one is not there; of a file that has two paths only the song goes.
+BatchResult ReplaceSongs(TMusicDatabase& database, const QString& caption,
+                         const std::vector<SongReplacement>& replacements);
+
 // The database's operation to replace one song's record, a command of its own: returns the song's place, -1
 // when it has gone.
 SongIndex UpdateSongEntry(TMusicDatabase& database, SongIndex index, const TID3Tag& info, bool rename);

@@ -52,6 +52,12 @@ RulesPage::RulesPage(const TMusicDatabase& database)
                 u"Nur der Name ändert sich. Klassisch kommt die Datei mit ihrem ganzen alten Pfad unter den "
                 "Stammordner. Ein Beispiel zeigt die Seite „Dateien und Ordner“."_s),
         DatabaseSettings::kRenameInPlace);
+    QFormLayout& searching = AddGroup(u"Doppelte Einträge"_s);
+    fields_.Bind(AddRule(searching, DatabaseSettings::kUnlimitedSearch.Row.Name,
+                         u"In Sammlungen &jeder Größe suchen"_s,
+                         u"Wenn es lange dauert, wird vorher gefragt. Klassisch werden höchstens 65536 Songs "
+                         "miteinander verglichen."_s),
+                 DatabaseSettings::kUnlimitedSearch);
     QFormLayout& lists = AddGroup(u"PlayLists lesen"_s);
     fields_.Bind(
         AddRule(lists, PlayListSettings::kModernLists.Row.Name, u"&PlayLists anderer Programme"_s,

@@ -1,0 +1,114 @@
+#include "MusicManagment/database/duplicates/SongQuality.h"
+
+#include <gtest/gtest.h>
+
+#include "MusicManagment/database/duplicates/SearchDuplicates.h"
+#include "tests/PrintQt.h"
+#include "tests/ScriptedDialogs.h"
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+TID3Tag Song(quint16 bitRate, quint16 length = 200, quint32 plays = 0, const QString& album = {}) {
+    TID3Tag song;
+    song.Title = u"T"_s;
+    song.BitRate = bitRate;
+    song.Length = length;
+    song.PlayCount = plays;
+    song.Album = album;
+    return song;
+}
+
+TEST(SongQuality, TheFirstQualityThatDiffersDecides) {
+    using Side = SongVerdict::Side;
+    TID3Tag damaged = Song(320);
+    damaged.Flags = sfDamaged;
+    TID3Tag onCd = Song(320);
+    onCd.FileName = u":00000001:\\A.mp3"_s;
+    const struct {
+        TID3Tag First;
+        TID3Tag Second;
+        Side Better;
+        QString Reason;
+    } cases[] = {
+        {Song(320), Song(320), Side::Neither, u""_s},
+        {damaged, Song(128), Side::Second, u"nicht als beschädigt gekennzeichnet"_s},
+        {Song(128), onCd, Side::First, u"nicht auf einem Medium, das fehlen kann"_s},
+        {Song(320, 100), Song(128, 200), Side::First, u"höhere Bitrate (320 statt 128 kBit/s)"_s},
+        {Song(320, 200), Song(320, 206), Side::Second, u"länger (3:26 statt 3:20)"_s},
+        {Song(320, 200), Song(320, 205, 0, u"A"_s), Side::Second,
+         u"vollständigerer Tag (2 statt 1 Feldern)"_s},
+        {Song(320, 200, 5), Song(320, 205, 1), Side::First, u"öfter gespielt (5 statt 1 Mal)"_s},
+    };
+    for (const auto& [first, second, better, reason] : cases) {
+        const SongVerdict verdict = CompareQuality(first, second);
+        EXPECT_EQ(verdict.Better, better) << reason.toStdString();
+        EXPECT_EQ(verdict.Reason, reason);
+    }
+}
+
+TEST(SongQuality, NoneThatStaysForAnotherGoesAndNoneGoesWithoutABetterPartner) {
+    TMusicDatabase database;
+    std::vector<SongHandle> songs;
+    const auto add = [&](const TID3Tag& record) {
+        TID3Tag song = record;
+        song.FileName = u":00000001:\\%1.mp3"_s.arg(songs.size());
+        songs.push_back(database.Songs().HandleOf(database.AddEntry(QString(), song)));
+    };
+    // 3 is like 2 only; 4 is another recording; 5 and 6 are equally good.
+    for (const TID3Tag& song :
+         {Song(128), Song(320), Song(192), Song(64), Song(320, 300), Song(96), Song(96)})
+        add(song);
+    const std::vector<DuplicatePair> pairs = {{songs[0], songs[1]}, {songs[0], songs[2]},
+                                              {songs[1], songs[2]}, {songs[2], songs[3]},
+                                              {songs[1], songs[4]}, {songs[5], songs[6]}};
+    std::vector<std::pair<SongHandle, SongHandle>> found;
+    for (const KeepSuggestion& suggestion : SuggestKept(database, pairs))
+        found.emplace_back(suggestion.Songs.Kept, suggestion.Songs.Dropped);
+    EXPECT_EQ(found, (std::vector<std::pair<SongHandle, SongHandle>>{
+                         {songs[1], songs[0]}, {songs[1], songs[2]}, {songs[5], songs[6]}}));
+}
+
+// What a search shows, and how it ended.
+class RecordedView : public DuplicateView {
+ public:
+    DuplicateRows& Begin(const DuplicateQuery& query) override {
+        Queries.push_back(query);
+        return Rows;
+    }
+    void ShowNewRows() override {}
+    void End(DuplicateEnd end) override { Ended = end; }
+
+    DuplicateRows Rows;
+    std::vector<DuplicateQuery> Queries;
+    std::optional<DuplicateEnd> Ended;
+};
+
+TEST(SearchDuplicates, TooManySongsAreComparedOnlyWhereTheyAreMarkedOrTheRuleAllowsIt) {
+    TMusicDatabase database;
+    ScriptedDialogs dialogs;
+    RecordedView view;
+    SearchDuplicates(database, {}, {}, view);
+    EXPECT_TRUE(view.Queries.empty());
+    for (std::size_t i = 0; i <= kMostComparedSongs; ++i) {
+        TID3Tag song;
+        song.FileName = u":00000001:\\%1.mp3"_s.arg(i);
+        song.Title = i < 2 ? u"the same"_s : QString::number(i * 7919);
+        database.AddEntry(QString(), song);
+    }
+    const std::vector<SongHandle> marked = {database.Songs().HandleOf(0), database.Songs().HandleOf(1)};
+    SearchDuplicates(database, {.SameArtistOnly = true}, {}, view);
+    EXPECT_TRUE(view.Queries.empty() && dialogs.Messages.size() == 1);
+    dialogs.Answers = {0};
+    SearchDuplicates(database, {.SameArtistOnly = true}, marked, view);
+    ASSERT_EQ(view.Queries.size(), 1u);
+    EXPECT_TRUE(view.Queries[0].AmongReferencesOnly && view.Queries[0].References == marked);
+    EXPECT_EQ(view.Rows.Songs().size(), 2u);
+    database.SetUnlimitedSearch(true);
+    SearchDuplicates(database, {.References = marked, .SameArtistOnly = true, .LeastPercent = 100}, {}, view);
+    EXPECT_EQ(view.Rows.Songs().size(), kMostComparedSongs + 1);
+    EXPECT_EQ(view.Ended, DuplicateEnd::Done);
+}
+
+}  // namespace
