@@ -2,9 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include "MusicManagment/database/duplicates/SearchDuplicates.h"
 #include "tests/PrintQt.h"
-#include "tests/ScriptedDialogs.h"
 
 using namespace Qt::StringLiterals;
 
@@ -68,47 +66,6 @@ TEST(SongQuality, NoneThatStaysForAnotherGoesAndNoneGoesWithoutABetterPartner) {
         found.emplace_back(suggestion.Songs.Kept, suggestion.Songs.Dropped);
     EXPECT_EQ(found, (std::vector<std::pair<SongHandle, SongHandle>>{
                          {songs[1], songs[0]}, {songs[1], songs[2]}, {songs[5], songs[6]}}));
-}
-
-// What a search shows, and how it ended.
-class RecordedView : public DuplicateView {
- public:
-    DuplicateRows& Begin(const DuplicateQuery& query) override {
-        Queries.push_back(query);
-        return Rows;
-    }
-    void ShowNewRows() override {}
-    void End(DuplicateEnd end) override { Ended = end; }
-
-    DuplicateRows Rows;
-    std::vector<DuplicateQuery> Queries;
-    std::optional<DuplicateEnd> Ended;
-};
-
-TEST(SearchDuplicates, TooManySongsAreComparedOnlyWhereTheyAreMarkedOrTheRuleAllowsIt) {
-    TMusicDatabase database;
-    ScriptedDialogs dialogs;
-    RecordedView view;
-    SearchDuplicates(database, {}, {}, view);
-    EXPECT_TRUE(view.Queries.empty());
-    for (std::size_t i = 0; i <= kMostComparedSongs; ++i) {
-        TID3Tag song;
-        song.FileName = u":00000001:\\%1.mp3"_s.arg(i);
-        song.Title = i < 2 ? u"the same"_s : QString::number(i * 7919);
-        database.AddEntry(QString(), song);
-    }
-    const std::vector<SongHandle> marked = {database.Songs().HandleOf(0), database.Songs().HandleOf(1)};
-    SearchDuplicates(database, {.SameArtistOnly = true}, {}, view);
-    EXPECT_TRUE(view.Queries.empty() && dialogs.Messages.size() == 1);
-    dialogs.Answers = {0};
-    SearchDuplicates(database, {.SameArtistOnly = true}, marked, view);
-    ASSERT_EQ(view.Queries.size(), 1u);
-    EXPECT_TRUE(view.Queries[0].AmongReferencesOnly && view.Queries[0].References == marked);
-    EXPECT_EQ(view.Rows.Songs().size(), 2u);
-    database.SetUnlimitedSearch(true);
-    SearchDuplicates(database, {.References = marked, .SameArtistOnly = true, .LeastPercent = 100}, {}, view);
-    EXPECT_EQ(view.Rows.Songs().size(), kMostComparedSongs + 1);
-    EXPECT_EQ(view.Ended, DuplicateEnd::Done);
 }
 
 }  // namespace

@@ -69,7 +69,8 @@ struct SongReplacement {
 };
 // Moves the files of the dropped songs into the recycle bin and takes them out of the collection. Their plays
 // are added to those of the kept ones, which take their places in the playlist. A song stays where the file
-// of the kept one is not there; of a file that has two paths only the song goes.
+// of the kept one is not there, or where one before has decided otherwise; of a file that has two paths only
+// the song goes.
 BatchResult ReplaceSongs(TMusicDatabase& database, const QString& caption,
                          const std::vector<SongReplacement>& replacements);
 
