@@ -27,6 +27,8 @@
 #include "app/ArrangementCommands.h"
 #include "app/BatchCommands.h"
 #include "app/CommandMenu.h"
+#include "app/DuplicateCommands.h"
+#include "app/ExtraCommands.h"
 #include "app/HelpMenu.h"
 #include "app/MainMenu.h"
 #include "app/Playing.h"
@@ -154,6 +156,8 @@ void TTunesteadMainWnd::SetUpStatusBar() {
 void TTunesteadMainWnd::SetUpMenu() {
     songCommands_ = std::make_unique<SongCommands>(database_, *list_, journal_);
     batchCommands_ = std::make_unique<BatchCommands>(database_, *list_);
+    duplicateCommands_ = std::make_unique<DuplicateCommands>(database_, *list_, *playing_);
+    extraCommands_ = std::make_unique<ExtraCommands>(*this, database_);
     songCommands_->OnOpenDatabase = [this](const QString& path) { commands_.OpenFile(path); };
     songCommands_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
     settingsCommands_ =
@@ -166,6 +170,7 @@ void TTunesteadMainWnd::SetUpMenu() {
     QMenu& windows = *menuBar()->addMenu(u"Fe&nster"_s);
     toolWindows_->AddTo(windows);
     playing_->AddTo(windows);
+    duplicateCommands_->AddTo(windows);
     arrangement_ = std::make_unique<ArrangementCommands>(*this, *list_);
     arrangement_->AddTo(windows);
     AddAccessKeys(windows);

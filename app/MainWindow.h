@@ -28,6 +28,7 @@ class QLabel;
 class QStackedWidget;
 class SettingsCommands;
 class BatchCommands;
+class DuplicateCommands;
 class SongCommands;
 class SongListWidget;
 class ToolWindows;
@@ -109,6 +110,7 @@ class TTunesteadMainWnd : public QMainWindow {
     std::unique_ptr<MainMenu> menu_;
     std::unique_ptr<ToolWindows> toolWindows_;
     std::unique_ptr<Playing> playing_;
+    std::unique_ptr<DuplicateCommands> duplicateCommands_;
     QStackedWidget* centre_ = nullptr;
     QWidget* listPage_ = nullptr;
     FilterField* filter_ = nullptr;

@@ -270,6 +270,13 @@ void Playing::OpenSong(const QString& path) {
     if (!player_.AutoPlay()) player_.Play();
 }
 
+void Playing::OpenSongInstead(const QString& path, const QString& instead) {
+    const bool goesOn = player_.GetStatus() != psClosed && player_.FileName() == instead;
+    const quint32 position = goesOn ? player_.GetPosition() : 0;
+    OpenSong(path);
+    if (position > 0 && position < player_.GetLength()) player_.SetPosition(position);
+}
+
 void Playing::Close(bool keepList) {
     player_.SetFileName(QString());
     // An empty list is no reason to make a file, and none to lose what could not be read.

@@ -10,6 +10,7 @@ namespace WindowSettings {
 // A form placement: what Qt makes of the position and size of a window, or of the state of its docks.
 inline constexpr Setting<QByteArray> kMainForm{u"MainForm"};
 inline constexpr Setting<QByteArray> kMainFormState{u"MainFormState"};
+inline constexpr Setting<QByteArray> kDuplicatesForm{u"DuplicatesForm"};
 inline constexpr Setting<QByteArray> kSongListColumns{u"SongListColumns"};
 // The flag that the song list shows as a mark; 0: the names of all flags.
 inline constexpr Setting<int> kSongListFlag{u"SongListFlag", 0, 0, sfRemixed};
