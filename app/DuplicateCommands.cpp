@@ -72,8 +72,12 @@ void DuplicateCommands::SetUpForm() {
     form_->OnSuggest = [this](const std::vector<DuplicatePair>& pairs) { Suggest(pairs); };
     form_->OnListen = [this](SongHandle song, SongHandle instead) { Listen(song, instead); };
     form_->OnSearchAgain = [this] { SearchAgain(); };
-    form_->OnUndo = [this] { database_.ClickMenuItem(scUndo); };
-    form_->OnRedo = [this] { database_.ClickMenuItem(scRedo); };
+    form_->OnUndo = [this] {
+        if (database_.ClickMenuItem(scUndo)) form_->Tell(u"Rückgängig gemacht."_s);
+    };
+    form_->OnRedo = [this] {
+        if (database_.ClickMenuItem(scRedo)) form_->Tell(u"Wiederhergestellt."_s);
+    };
 }
 
 void DuplicateCommands::AddTo(QMenu& menu) {
