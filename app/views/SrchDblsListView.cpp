@@ -103,6 +103,13 @@ std::vector<int> TSrchDblsListView::ChosenRows() const {
     return rows;
 }
 
+// In a list of rows Home and End go to the first and the last row.
+QModelIndex TSrchDblsListView::moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) {
+    if (action == MoveHome) return pairs_.index(0, 0);
+    if (action == MoveEnd) return pairs_.index(pairs_.rowCount() - 1, 0);
+    return QTableView::moveCursor(action, modifiers);
+}
+
 void TSrchDblsListView::keyPressEvent(QKeyEvent* event) {
     const bool isPlain = (event->modifiers() & ~Qt::KeypadModifier) == Qt::NoModifier;
     const auto found = std::ranges::find(kDecisionKeys, event->key(), &DecisionKey::Key);

@@ -25,6 +25,7 @@ class TSrchDblsListView : public QTableView {
     void ShowGroups(bool shown);
 
  protected:
+    QModelIndex moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) override;
     void keyPressEvent(QKeyEvent* event) override;
     void changeEvent(QEvent* event) override;
 
