@@ -7,25 +7,12 @@
 #include <vector>
 
 #include "CommonRUKTools/CompStr.h"
+#include "tests/PlainDistance.h"
 #include "tests/PrintQt.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
-
-// The matrix of the textbook, row by row.
-std::size_t PlainDistance(std::u32string_view a, std::u32string_view b) {
-    std::vector<std::size_t> above(b.size() + 1);
-    for (std::size_t j = 0; j <= b.size(); ++j)
-        above[j] = j;
-    for (std::size_t i = 1; i <= a.size(); ++i) {
-        std::vector<std::size_t> row(b.size() + 1, i);
-        for (std::size_t j = 1; j <= b.size(); ++j)
-            row[j] = std::min({above[j] + 1, row[j - 1] + 1, above[j - 1] + (a[i - 1] == b[j - 1] ? 0 : 1)});
-        above = row;
-    }
-    return above.back();
-}
 
 // Few letters, so that names are alike often; lengths on both sides of a machine word.
 QString RandomName(std::mt19937& random, int longest) {

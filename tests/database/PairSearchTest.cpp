@@ -9,24 +9,13 @@
 #include "CommonRUKTools/ColognePhonetics.h"
 #include "MusicManagment/database/duplicates/DuplicateSearch.h"
 #include "MusicManagment/database/duplicates/SimilarArtists.h"
+#include "tests/PlainDistance.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
 
 using Match = TextBlocks::Match;
-
-// The distance as it is defined, cell by cell.
-std::size_t PlainDistance(std::u32string_view a, std::u32string_view b) {
-    std::vector<std::vector<std::size_t>> cell(a.size() + 1, std::vector<std::size_t>(b.size() + 1));
-    for (std::size_t i = 0; i <= a.size(); ++i)
-        for (std::size_t j = 0; j <= b.size(); ++j)
-            cell[i][j] = i == 0   ? j
-                         : j == 0 ? i
-                                  : std::min({cell[i - 1][j] + 1, cell[i][j - 1] + 1,
-                                              cell[i - 1][j - 1] + (a[i - 1] == b[j - 1] ? 0 : 1)});
-    return cell[a.size()][b.size()];
-}
 
 // Texts of all lengths up to `longest`, one in two made of an earlier one by some edits.
 ComparedTexts MakeTexts(std::size_t count, std::size_t longest, QStringView letters, std::mt19937& random) {
