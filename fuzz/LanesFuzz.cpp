@@ -3,6 +3,7 @@
 //   percentage (8 bit), which letters (8 bit), then texts, ended by line feeds
 // Letters are either the bytes themselves, few of them, so that texts are often alike; or the bytes as UTF-8.
 
+#include <QList>
 #include <QString>
 #include <algorithm>
 #include <cstdlib>
