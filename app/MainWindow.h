@@ -21,6 +21,7 @@
 
 class ArrangementCommands;
 class EmptyState;
+class ExtraCommands;
 class FilterField;
 class MainMenu;
 class Playing;
@@ -106,6 +107,7 @@ class TTunesteadMainWnd : public QMainWindow {
     std::unique_ptr<ArrangementCommands> arrangement_;
     std::unique_ptr<SongCommands> songCommands_;
     std::unique_ptr<BatchCommands> batchCommands_;
+    std::unique_ptr<ExtraCommands> extraCommands_;
     std::unique_ptr<SettingsCommands> settingsCommands_;
     std::unique_ptr<MainMenu> menu_;
     std::unique_ptr<ToolWindows> toolWindows_;

@@ -66,11 +66,11 @@ std::vector<SimilarArtists> FindSimilarArtists(TMusicDatabase& database, bool& s
     return pairs;
 }
 
-BatchResult UnifyArtist(TMusicDatabase& database, const QString& artist, const QString& spelling) {
+BatchResult UnifyArtists(TMusicDatabase& database, const QStringList& artists, const QString& spelling) {
     std::vector<SongUpdate> updates;
     for (SongIndex index = 0; index < database.Count(); ++index) {
         const TID3Tag& song = database.Song(index);
-        if (song.Artist == spelling || song.Artist.compare(artist, Qt::CaseInsensitive) != 0) continue;
+        if (song.Artist == spelling || !artists.contains(song.Artist)) continue;
         SongUpdate update{.Song = database.Songs().HandleOf(index), .Basis = song, .Record = song};
         update.Record.Artist = spelling;
         updates.push_back(std::move(update));

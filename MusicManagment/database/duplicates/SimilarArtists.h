@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QString>
+#include <QStringList>
 #include <vector>
 
 #include "MusicManagment/database/MusicManagment.h"
@@ -21,6 +22,6 @@ struct SimilarArtists {
 // the pairs are then those found so far. Throws EAbort, after telling the user, when another operation runs.
 std::vector<SimilarArtists> FindSimilarArtists(TMusicDatabase& database, bool& stopped);
 
-// Gives all songs of `artist` the spelling `spelling`, in their tags too; one step that can be taken back.
-// Upper and lower case apart, as the artists are listed.
-BatchResult UnifyArtist(TMusicDatabase& database, const QString& artist, const QString& spelling);
+// Gives all songs of these artists, as they are listed, the spelling `spelling`, in their tags too; one step
+// that can be taken back. Throws what UpdateSongs throws.
+BatchResult UnifyArtists(TMusicDatabase& database, const QStringList& artists, const QString& spelling);
