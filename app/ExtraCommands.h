@@ -16,6 +16,7 @@ class ExtraCommands {
 
  private:
     void FindSimilarArtists();
+    void ReadBackup();
 
     QWidget& window_;
     TMusicDatabase& database_;

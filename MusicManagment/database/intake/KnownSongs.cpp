@@ -43,8 +43,9 @@ void KnownSongs::AddToIndex(const TID3Tag& song) {
 
 // They lie where songs lie, and are none.
 void KnownSongs::IndexCopies() {
-    for (const auto& [song, copy] : database_.Side().Rows(kCacheSection))
-        Add(copy, song);
+    for (const auto& notes : {database_.Side().Rows(kCacheSection), OwnFiles(database_)})
+        for (const auto& [song, copy] : notes)
+            Add(copy, song);
 }
 
 // Only once a path is met that is not known as it stands.

@@ -13,3 +13,11 @@ QString CachedCopy(const TMusicDatabase& database, const QString& cdPath);
 
 // The copies that we have made, noted in the side file: song and copy.
 inline const QString kCacheSection = QStringLiteral("cache");
+
+// The user's own files of songs that were tied to a backup medium, noted as well: they are found like copies,
+// and never removed.
+void NoteOwnFile(TMusicDatabase& database, const QString& cdPath, const QString& file);
+std::vector<SideRow> OwnFiles(const TMusicDatabase& database);
+
+// Noted copies and own files of a song.
+QStringList NotedFiles(const TMusicDatabase& database, const QString& cdPath);

@@ -58,5 +58,5 @@ QString FileWithinReach(const TMusicDatabase& database, const QString& path) {
     if (!IsCdPath(path)) return path;
     const Volume* volume = CurrentVolumes().WithSerial(SerialOfCdPath(path));
     return volume != nullptr ? FileAt(volume->MountPoint, path)
-                             : database.Side().Values(kCacheSection, path).value(0);
+                             : NotedFiles(database, path).value(0);
 }
