@@ -16,6 +16,7 @@ TEST(SimilarArtistsForm, AKeyDecidesAndRowsGoAndComeWithTheirArtists) {
     const SongFolder folder;
     ScriptedDialogs dialogs;
     TMusicDatabase database;
+    database.SetModernTags(true);
     database.SetRenameAndMoveMP3s(false);
     database.SetSortType(stPath);
     for (const QString& name : {u"Beatles - 1.wav"_s, u"Meier - 2.wav"_s, u"Meyer - 3.wav"_s,
