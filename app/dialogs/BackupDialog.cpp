@@ -73,7 +73,8 @@ void BackupDialog::SetUpCandidates() {
     candidates_->setAccessibleName(u"Songs, die es sein können"_s);
     candidates_->setUniformItemSizes(true);
     candidates_->setMaximumHeight((kCandidateRows + 1) * fontMetrics().lineSpacing() * 4 / 3);
-    connect(candidates_, &QListWidget::itemActivated, this,
+    candidates_->installEventFilter(this);
+    connect(candidates_, &QListWidget::itemDoubleClicked, this,
             Guarded([this](QListWidgetItem* item) { TieSelected(candidates_->row(item)); }));
 }
 
@@ -158,6 +159,11 @@ bool BackupDialog::eventFilter(QObject* watched, QEvent* event) {
     const auto& press = static_cast<const QKeyEvent&>(*event);
     if ((press.modifiers() & ~Qt::KeypadModifier) != Qt::NoModifier)
         return QDialog::eventFilter(watched, event);
+    // The list would leave the key to the dialog as well, which takes it for agreement.
+    if (watched == candidates_ && (press.key() == Qt::Key_Return || press.key() == Qt::Key_Enter)) {
+        if (candidates_->currentRow() >= 0) TieSelected(candidates_->currentRow());
+        return true;
+    }
     return IsDecision(press.key()) || QDialog::eventFilter(watched, event);
 }
 

@@ -109,6 +109,7 @@ void SimilarArtistsForm::SetUpTable() {
     table_->setSelectionMode(QTableView::SingleSelection);
     table_->installEventFilter(this);
     QHeaderView& header = *table_->horizontalHeader();
+    header.setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
     header.setSectionResizeMode(QHeaderView::ResizeToContents);
     for (const int column : {SimilarArtistsModel::FirstArtist, SimilarArtistsModel::SecondArtist})
         header.setSectionResizeMode(column, QHeaderView::Stretch);
@@ -135,6 +136,7 @@ QSplitter* SimilarArtistsForm::MakeSongLists() {
         SetUpRowList(*list);
         FitRowsToFont(*list);
         list->setAccessibleName(side == 0 ? u"Songs des ersten Artists"_s : u"Songs des zweiten Artists"_s);
+        list->horizontalHeader()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
         list->horizontalHeader()->setSectionResizeMode(QHeaderView::Stretch);
         for (const int narrow : {2, 3})
             list->horizontalHeader()->setSectionResizeMode(narrow, QHeaderView::ResizeToContents);
@@ -298,7 +300,7 @@ void SimilarArtistsForm::Decide(Spelling spelling) {
 void SimilarArtistsForm::Unify(const QStringList& artists, const QString& spelling) {
     const BatchResult result = UnifyArtists(database_, artists, spelling);
     done_->setText(SongCountText(static_cast<std::size_t>(result.Changed)) +
-                   (result.Changed == 1 ? u" heißt jetzt nach "_s : u" heißen jetzt nach "_s) +
+                   (result.Changed == 1 ? u" steht jetzt unter "_s : u" stehen jetzt unter "_s) +
                    Quoted(spelling) + u". Strg+Z nimmt das zurück."_s);
     Refresh();
     ReportBatch(result);
