@@ -5,7 +5,6 @@
 #include "MusicManagment/database/CollectionEdit.h"
 #include "MusicManagment/database/batches/BurningBatch.h"
 #include "MusicManagment/database/batches/CacheBatch.h"
-#include "MusicManagment/database/intake/BackupCd.h"
 #include "MusicManagment/database/intake/Intake.h"
 #include "MusicManagment/database/intake/Update.h"
 #include "MusicManagment/database/media/CataloguedMedia.h"
@@ -251,23 +250,4 @@ TEST_F(MediaTest, NoSongOfABatchReplacesAnotherOrItself) {
     EXPECT_EQ(QDir(disk_.Path(u"burn"_s)).entryList(QDir::Files, QDir::Name),
               (QStringList{u"B - 2 (2).wav"_s, u"B - 2.wav"_s, u"C - 3.wav"_s}));
     EXPECT_EQ(disk_.Get(u"burn/Rap/A - 1.wav"_s), disk_.Get(u"root/Rap/A - 1.wav"_s));
-}
-
-TEST_F(MediaTest, AFileOfABackupCdIsTiedToTheSongThatItIs) {
-    const QStringList own =
-        disk_.Add({u"Queen - Jealousy.wav"_s, u"Queen - Jealous Guy.wav"_s, u"Abba - Fernando.wav"_s});
-    AddPaths(database_, own, true);
-    stick_.Add({u"Queen - Jealosy.wav"_s, u"Queen - Jealousy.wav"_s, u"Neu - Ganz anders.wav"_s});
-    volumes_.Mount(stick_.Path(), kSerial, u"BACKUP"_s, 0);
-    dialogs_.Answers = {0};  // what is like no song is new
-    dialogs_.Inputs = {u"BACKUP ("_s + stick_.Path() + u')', u"Sicherung"_s,
-                       u"093%: Queen - Jealousy (***)"_s, u"Überspringen"_s};
-    const BackupResult result = ReadBackupCd(database_);
-    EXPECT_EQ(result.Tied, 1);
-    EXPECT_EQ(result.Added, 1);
-    EXPECT_EQ(database_.GetEntry(-1, OnStick(u"Queen - Jealosy.wav"_s)).Title, u"Jealousy"_s);
-    EXPECT_FALSE(database_.Contains(own[0]));
-    EXPECT_TRUE(QFile::exists(own[0]));
-    EXPECT_TRUE(database_.Contains(OnStick(u"Neu - Ganz anders.wav"_s)));
-    EXPECT_EQ(database_.CDNameOf(kSong), u"Sicherung"_s);
 }

@@ -63,11 +63,11 @@ TEST(PairSearch, EveryWayOfComparingFindsWhatTheDefinitionTells) {
     for (const std::size_t longest : {14u, 39u, 43u, 81u, 130u, 190u})
         for (const QString& letters : {u"abc"_s, many})
             for (const int percent : {60, 85}) {
-                const ComparedTexts texts = MakeTexts(160, longest, letters, random);
+                const ComparedTexts texts = MakeTexts(96, longest, letters, random);
                 std::vector<std::uint32_t> numbers(texts.Count());
                 std::iota(numbers.begin(), numbers.end(), 0);
                 TextBlocks::OrderForBlocks(texts, numbers);
-                for (std::uint32_t reference = 0; reference < texts.Count(); reference += 9) {
+                for (std::uint32_t reference = 0; reference < texts.Count(); reference += 12) {
                     const auto expected = PlainMatches(texts, reference, percent);
                     for (const LaneKernels& kernels : ProcessorLanes()) {
                         TextBlocks::Workspace workspace;

@@ -16,13 +16,9 @@ using namespace Qt::StringLiterals;
 namespace {
 
 // By the number that the collection has for it already.
-quint32 SerialOf(const TMusicDatabase& database, const CataloguedMedia& media, const Volume& volume) {
-    const auto isKnown = [&](quint32 serial) {
-        return media.HasSongs(serial) ||
-               std::ranges::find(database.CDNames(), serial, &CdName::Serial) != database.CDNames().end();
-    };
-    const auto known = std::ranges::find_if(volume.Serials, isKnown);
-    return known != volume.Serials.end() ? *known : volume.Serials.front();
+quint32 NumberOf(const CataloguedMedia& media, const Volume& volume) {
+    const quint32 known = media.SerialOf(volume);
+    return known != 0 ? known : volume.Serials.front();
 }
 
 class Reader {
@@ -39,7 +35,7 @@ class Reader {
     QStringList Walk(const QString& folder) {
         QStringList files;
         FolderWalk walk({.IsWanted = &IsSongFile, .Progress = [this](const QString& path) {
-                             return database_.Progress({.Type = ptSearchFolders, .Description = path});
+                             return database_.Progress({.Type = ptReadBackupCd, .Description = path});
                          }});
         contents_.Stopped = !walk.Walk(folder, files);
         contents_.Unreadable = walk.Unreadable();
@@ -52,7 +48,7 @@ class Reader {
         ReadAhead files(paths, options, isKnown);
         for (qsizetype i = 0; i < paths.size(); ++i) {
             const ProgressPoint point{
-                .Cur = i, .Max = paths.size(), .Type = ptAddSongs, .Description = paths[i]};
+                .Cur = i, .Max = paths.size(), .Type = ptReadBackupCd, .Description = paths[i]};
             const QString& path = files.Next();
             const bool isThere = isKnown(path);
             const auto reading = isThere ? std::nullopt : files.Take([&] { return GoOn(point); });
@@ -105,12 +101,10 @@ BackupMedium BackupMediumOf(const TMusicDatabase& database, const QString& folde
             u"Das ist kein Datenträger, der entfernt werden kann. Nehmen Sie seine Songs als gewöhnlichen "
             "Ordner auf: "_s +
             folder);
-    return {.MountPoint = volume->MountPoint,
-            .Label = volume->Label,
-            .Serial = SerialOf(database, media, *volume)};
+    return {.MountPoint = volume->MountPoint, .Label = volume->Label, .Serial = NumberOf(media, *volume)};
 }
 
 BackupContents ReadBackup(TMusicDatabase& database, const BackupMedium& medium, const QString& folder) {
-    const ProgressRun run(database, u"Lese Backup-CD ein"_s);
+    const ProgressRun run(database, u"Lese die Songs einer Backup-CD ein"_s);
     return Reader(database, medium).Read(AbsolutePath(folder));
 }

@@ -139,6 +139,6 @@ QString CandidateText(const BackupCandidate& candidate, const TID3Tag& song) {
 }
 
 std::vector<BackupCandidates> MatchBackup(TMusicDatabase& database, const std::vector<BackupFile>& files) {
-    const ProgressRun run(database, u"Lese Backup-CD ein"_s);
+    const ProgressRun run(database, u"Vergleiche mit den Songs der Sammlung"_s);
     return Matcher(database, files).Run();
 }

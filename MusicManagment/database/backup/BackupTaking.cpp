@@ -109,7 +109,7 @@ BackupResult TakeBackup(TMusicDatabase& database, const BackupMedium& medium, co
         decisions, [](const BackupDecision& decision) { return decision.What != Kind::Skip; });
     if (wanted == 0) return {};
     BackupResult result;
-    std::optional<ProgressRun> run(std::in_place, database, u"Lese Backup-CD ein"_s);
+    std::optional<ProgressRun> run(std::in_place, database, u"Lese die Songs einer Backup-CD ein"_s);
     FileBatch batch(CurrentJournal(), &database,
                     u"Backup-CD einlesen ("_s + SongCountText(static_cast<std::size_t>(wanted)) + u')');
     CatalogueMedium(database, medium.MountPoint, name);

@@ -1,6 +1,5 @@
 #include "MusicManagment/database/Command.h"
 #include "MusicManagment/database/MusicManagment.h"
-#include "MusicManagment/database/intake/BackupCd.h"
 #include "MusicManagment/database/intake/Intake.h"
 #include "MusicManagment/database/intake/Update.h"
 
@@ -24,9 +23,6 @@ constexpr DatabaseCommand kRows[] = {
      .Caption = u"Ordner zur Datenbank hinzufügen...",
      .Icon = u"folder-music",
      .Run = [](TMusicDatabase& database, int) { AddFolder(database, QString(), true); }},
-    {.Id = mcReadBackupCd,
-     .Caption = u"Songs von einer Backup-CD wieder einlesen",
-     .Run = [](TMusicDatabase& database, int) { ReportBackupCd(ReadBackupCd(database)); }},
     {.Id = mcSearchNew,
      .Caption = u"Nach neuen Songs suchen",
      .Run = [](TMusicDatabase& database, int) { SearchNewSongs(database); }},

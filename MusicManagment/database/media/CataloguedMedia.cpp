@@ -57,6 +57,5 @@ QString CatalogueMedium(TMusicDatabase& database, const QString& path, const QSt
 QString FileWithinReach(const TMusicDatabase& database, const QString& path) {
     if (!IsCdPath(path)) return path;
     const Volume* volume = CurrentVolumes().WithSerial(SerialOfCdPath(path));
-    return volume != nullptr ? FileAt(volume->MountPoint, path)
-                             : NotedFiles(database, path).value(0);
+    return volume != nullptr ? FileAt(volume->MountPoint, path) : NotedFiles(database, path).value(0);
 }
