@@ -15,7 +15,7 @@ namespace {
 
 constexpr int kSongs = 1'000'000;
 constexpr int kNewSongs = 20'000;
-constexpr SongOrder kOrder{stGenre, sstGATL};
+const SongOrder kOrder{stGenre, sstGATL};
 
 using Entries = std::vector<SongList::Entry>;
 
