@@ -21,7 +21,7 @@ QString LikelyMedium() {
 
 QString ProposedName(const TMusicDatabase& database, const BackupMedium& medium) {
     const QString path = MakeCdPath(medium.Serial, u"/"_s);
-    const QString name = database.CDNameOf(path);
+    QString name = database.CDNameOf(path);
     if (name != path) return name;
     return medium.Label.isEmpty() ? SerialText(medium.Serial) : medium.Label;
 }
