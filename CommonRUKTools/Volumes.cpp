@@ -2,6 +2,7 @@
 
 #include <QStorageInfo>
 #include <algorithm>
+#include <functional>
 
 #include "CommonRUKTools/platform/SystemVolumes.h"
 
@@ -48,7 +49,7 @@ const Volume* VolumeSource::Holding(const QString& path) {
 
 std::vector<VolumeChoice> VolumeChoices(const QString& preset) {
     std::vector<Volume> volumes = CurrentVolumes().Mounted();
-    std::ranges::stable_partition(volumes, &Volume::CanBeTakenAway);
+    std::stable_partition(volumes.begin(), volumes.end(), std::mem_fn(&Volume::CanBeTakenAway));
     std::vector<VolumeChoice> choices;
     for (const Volume& volume : volumes) {
         const QString& place = volume.MountPoint;

@@ -4,7 +4,7 @@
 
 namespace {
 
-struct ShortVectors {
+struct ShortVectors : PlainBits {
     using Word = std::uint16_t;
     using Vector = std::uint16_t __attribute__((vector_size(32)));
     static constexpr int kWidth = 16;
@@ -14,7 +14,6 @@ struct ShortVectors {
             _mm256_load_si256(reinterpret_cast<const __m256i*>(columns.Letters.data() + lane)));
     }
     static Vector Second(Vector letters) { return letters >> 8; }
-    static Vector OrNeither(Vector a, Vector b, Vector c) { return a | ~(b | c); }
     // Sixteen words are looked up as twice eight double words, of which the lower half counts.
     static Vector Find(const LaneRow<Word>& row, Vector letters) {
         const auto* places = reinterpret_cast<const int*>(row.Places.data());
@@ -34,6 +33,13 @@ struct ShortVectors {
             _mm256_cmpeq_epi16(reinterpret_cast<__m256i>(vector & bit), _mm256_setzero_si256());
         return counts - reinterpret_cast<Vector>(unset);
     }
+    static Vector Least(Vector a, Vector b) {
+        return reinterpret_cast<Vector>(
+            _mm256_min_epu16(reinterpret_cast<__m256i>(a), reinterpret_cast<__m256i>(b)));
+    }
+    static void Store(Vector counts, std::uint16_t* distances) {
+        _mm256_storeu_si256(reinterpret_cast<__m256i*>(distances), reinterpret_cast<__m256i>(counts));
+    }
     static std::uint64_t Within(Vector counts, int limit) {
         const __m256i beyond = _mm256_cmpgt_epi16(reinterpret_cast<__m256i>(counts),
                                                   _mm256_set1_epi16(static_cast<short>(limit)));
@@ -44,7 +50,7 @@ struct ShortVectors {
     }
 };
 
-struct LongVectors {
+struct LongVectors : PlainBits {
     using Word = std::uint32_t;
     using Vector = std::uint32_t __attribute__((vector_size(32)));
     static constexpr int kWidth = 8;
@@ -54,7 +60,6 @@ struct LongVectors {
         return reinterpret_cast<Vector>(_mm256_cvtepu16_epi32(_mm_load_si128(words)));
     }
     static Vector Second(Vector letters) { return letters >> 8; }
-    static Vector OrNeither(Vector a, Vector b, Vector c) { return a | ~(b | c); }
     static Vector Find(const LaneRow<Word>& row, Vector letters) {
         const __m256i classes = _mm256_and_si256(reinterpret_cast<__m256i>(letters), _mm256_set1_epi32(31));
         const auto* places = reinterpret_cast<const int*>(row.Places.data());
@@ -67,6 +72,15 @@ struct LongVectors {
         const __m256i unset =
             _mm256_cmpeq_epi32(reinterpret_cast<__m256i>(vector & bit), _mm256_setzero_si256());
         return counts - reinterpret_cast<Vector>(unset);
+    }
+    static Vector Least(Vector a, Vector b) {
+        return reinterpret_cast<Vector>(
+            _mm256_min_epu32(reinterpret_cast<__m256i>(a), reinterpret_cast<__m256i>(b)));
+    }
+    static void Store(Vector counts, std::uint16_t* distances) {
+        const __m256i words = reinterpret_cast<__m256i>(counts);
+        const __m256i packed = _mm256_permute4x64_epi64(_mm256_packus_epi32(words, words), 0xD8);
+        _mm_storeu_si128(reinterpret_cast<__m128i*>(distances), _mm256_castsi256_si128(packed));
     }
     static std::uint64_t Within(Vector counts, int limit) {
         const __m256i beyond =

@@ -7,9 +7,27 @@
 //   Load(columns, first lane): two columns of kWidth texts, the first in the low bytes
 //   Second(letters): the second of them
 //   Find(row, letters): the places of each lane's letter
-//   OrNeither(a, b, c): a | ~(b | c)
+//   Across, Up, Down: those of PlainBits
 //   All(word), CountUp(counts, vector, bit): one more where the bit is not set
-//   Within(counts, limit): a bit a lane
+//   Least(a, b), Within(counts, limit): a bit a lane
+//   Store(counts, distances): those of kWidth texts
+
+// What a step makes of three words, for vectors without an instruction of three operands.
+struct PlainBits {
+    // Where the value differs from the one to the left: it is less where `up` is set, else more.
+    template <typename Vector>
+    static Vector Across(Vector diagonal, Vector up, Vector down) {
+        return (diagonal & up) | ~(up | (diagonal & ~down));
+    }
+    template <typename Vector>
+    static Vector Up(Vector across, Vector up, Vector below) {
+        return (across & up) | ~(across | below);
+    }
+    template <typename Vector>
+    static Vector Down(Vector across, Vector up, Vector below) {
+        return across & ~up & below;
+    }
+};
 
 // Hyyrö's bit-parallel distance within a band (A bit-vector algorithm for computing Levenshtein and Damerau
 // edit distances, 2003): a word holds the differences of neighbouring rows for the band's part of a column,
@@ -35,13 +53,29 @@ struct LaneGroup {
     }
 
     void Step(int i, Vector equal, Vector target) {
-        const Vector diagonal = (((equal & Up[i]) + Up[i]) ^ Up[i]) | equal | Down[i];
-        const Vector right = Vectors::OrNeither(Down[i], diagonal, Up[i]);
-        const Vector left = diagonal & Up[i];
+        const Vector diagonal = (((equal & Up[i]) + Up[i]) ^ Up[i]) | (equal | Down[i]);
+        const Vector across = Vectors::Across(diagonal, Up[i], Down[i]);
         Count[i] = Vectors::CountUp(Count[i], diagonal, target);
         const Vector below = diagonal >> 1;
-        Up[i] = Vectors::OrNeither(left, below, right);
-        Down[i] = below & right;
+        Down[i] = Vectors::Down(across, Up[i], below);
+        Up[i] = Vectors::Up(across, Up[i], below);
+    }
+
+    bool IsAnyWithin(int limit) const {
+        Vector least = Count[0];
+        for (int i = 1; i < kVectors; ++i)
+            least = Vectors::Least(least, Count[i]);
+        return Vectors::Within(least, limit) != 0;
+    }
+
+    // A bit a lane; their distances are stored.
+    std::uint64_t Within(int limit, std::uint16_t* distances) const {
+        std::uint64_t lanes = 0;
+        for (int i = 0; i < kVectors; ++i) {
+            lanes |= Vectors::Within(Count[i], limit) << (i * Vectors::kWidth);
+            Vectors::Store(Count[i], distances + i * Vectors::kWidth);
+        }
+        return lanes;
     }
 };
 
@@ -54,12 +88,6 @@ std::uint64_t LanesWithin(const LaneTask& task, const LaneRow<typename Vectors::
     const auto target = Vectors::All(static_cast<Word>(Word{1} << band.Target));
     LaneGroup<Vectors, kVectors> group;
     group.Begin(band);
-    const auto within = [&] {
-        std::uint64_t lanes = 0;
-        for (int i = 0; i < kVectors; ++i)
-            lanes |= Vectors::Within(group.Count[i], task.Limit) << (i * Vectors::kWidth);
-        return lanes;
-    };
     const LaneRow<Word>* row = rows + (kBits - band.Above);
     const LaneColumns* columns = task.Columns;
     // Before so many columns nothing can be beyond the limit.
@@ -78,9 +106,9 @@ std::uint64_t LanesWithin(const LaneTask& task, const LaneRow<typename Vectors::
         for (int i = 0; i < kVectors; ++i)
             letters[i] = Vectors::Second(letters[i]);
         step();
-        if (left < mostLeft && within() == 0) return 0;
+        if (left < mostLeft && !group.IsAnyWithin(task.Limit)) return 0;
     }
-    return within() << firstLane;
+    return group.Within(task.Limit, task.Distances + firstLane) << firstLane;
 }
 
 template <typename Vectors, int kVectors>

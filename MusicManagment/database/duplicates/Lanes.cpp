@@ -2,7 +2,7 @@
 
 namespace {
 
-struct OneLane {
+struct OneLane : PlainBits {
     using Word = std::uint64_t;
     using Vector = Word;
     static constexpr int kWidth = 1;
@@ -11,13 +11,16 @@ struct OneLane {
         return columns.Letters[static_cast<std::size_t>(lane)];
     }
     static Vector Second(Vector letters) { return letters >> 8; }
-    static Vector OrNeither(Vector a, Vector b, Vector c) { return a | ~(b | c); }
     static Vector Find(const LaneRow<Word>& row, Vector letters) {
         return row.Places[letters % kLetterClasses];
     }
     static Vector All(Word word) { return word; }
     static Vector CountUp(Vector counts, Vector vector, Vector bit) {
         return counts + ((vector & bit) == 0 ? 1 : 0);
+    }
+    static Vector Least(Vector a, Vector b) { return a < b ? a : b; }
+    static void Store(Vector counts, std::uint16_t* distances) {
+        *distances = static_cast<std::uint16_t>(counts);
     }
     static std::uint64_t Within(Vector counts, int limit) {
         return counts <= static_cast<Vector>(limit) ? 1 : 0;

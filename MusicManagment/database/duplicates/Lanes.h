@@ -33,6 +33,7 @@ struct LaneTask {
     int Length = 0;  // of each
     int ReferenceLength = 0;
     int Limit = 0;
+    std::uint16_t* Distances = nullptr;  // kLanes; written for lanes within the limit
 };
 
 // The diagonals that a way of at most `Limit` edits can take, counted from the lowest one.
@@ -50,8 +51,8 @@ constexpr LaneBand BandOf(const LaneTask& task) {
     return {.Above = above, .Target = above + difference, .Width = apart + 2 * spare + 1};
 }
 
-// A bit a lane: whether the distance may be within the limit. The rows are those of the reference, at least
-// Length + bits of a word of them; the band must fit into a word.
+// A bit a lane: whether the distance of the classes is within the limit; then it is in Distances. The rows
+// are those of the reference, at least Length + bits of a word of them; the band must fit into a word.
 struct LaneKernels {
     std::uint64_t (*Short)(const LaneTask& task, const LaneRow<std::uint16_t>* rows) = nullptr;
     std::uint64_t (*Long)(const LaneTask& task, const LaneRow<std::uint32_t>* rows) = nullptr;

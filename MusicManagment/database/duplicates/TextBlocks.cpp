@@ -96,33 +96,36 @@ void TextBlocks::Prepare(std::uint32_t reference, Workspace& workspace) const {
         FillRows(workspace.WideRows, classes, length, longest);
 }
 
-void TextBlocks::CompareBlock(const Block& block, std::uint32_t reference, const Workspace& workspace,
+void TextBlocks::CompareBlock(const Block& block, std::uint32_t reference, Workspace& workspace,
                               std::vector<Match>& matches) const {
     const std::u32string_view text = texts_.Text(reference);
     const std::size_t most = MostEdits(std::max(block.Length, text.size()), percent_);
-    std::uint64_t lanes = LanesAlike(block, text.size(), workspace);
+    const auto alike = LanesAlike(block, text.size(), workspace);
+    std::uint64_t lanes = alike.value_or(~std::uint64_t{0});
     if (block.Count < kLanes) lanes &= (std::uint64_t{1} << block.Count) - 1;
     for (; lanes != 0; lanes &= lanes - 1) {
-        const std::uint32_t number =
-            numbers_[block.First + static_cast<std::size_t>(std::countr_zero(lanes))];
-        const std::size_t distance = EditDistance(text, texts_.Text(number));
+        const auto lane = static_cast<std::size_t>(std::countr_zero(lanes));
+        const std::uint32_t number = numbers_[block.First + lane];
+        const std::size_t distance = alike && texts_.AreTrueToClasses(reference, number)
+                                         ? workspace.Distances[lane]
+                                         : EditDistance(text, texts_.Text(number));
         if (distance <= most) matches.push_back({number, static_cast<std::uint32_t>(distance)});
     }
 }
 
-// Those that may be; all where the vectors cannot tell.
-std::uint64_t TextBlocks::LanesAlike(const Block& block, std::size_t referenceLength,
-                                     const Workspace& workspace) const {
-    constexpr std::uint64_t kAll = ~std::uint64_t{0};
-    if (columns_.empty() || block.Length == 0) return kAll;
+// Those whose classes are alike, with their distances; nothing where the vectors cannot tell.
+std::optional<std::uint64_t> TextBlocks::LanesAlike(const Block& block, std::size_t referenceLength,
+                                                    Workspace& workspace) const {
+    if (columns_.empty() || block.Length == 0) return std::nullopt;
     const LaneTask task{
         .Columns = columns_.data() + block.Columns,
         .Count = static_cast<int>(block.Count),
         .Length = static_cast<int>(block.Length),
         .ReferenceLength = static_cast<int>(referenceLength),
-        .Limit = static_cast<int>(MostEdits(std::max(block.Length, referenceLength), percent_))};
+        .Limit = static_cast<int>(MostEdits(std::max(block.Length, referenceLength), percent_)),
+        .Distances = workspace.Distances.data()};
     const int width = BandOf(task).Width;
-    if (width > kWideBits) return kAll;
+    if (width > kWideBits) return std::nullopt;
     if (kernels_.Short == nullptr || width > kLongBits) return WideLanes(task, workspace.WideRows.data());
     if (width > kShortBits) return kernels_.Long(task, workspace.LongRows.data());
     return kernels_.Short(task, workspace.ShortRows.data());

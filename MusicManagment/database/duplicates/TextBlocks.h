@@ -1,6 +1,8 @@
 #pragma once
 
+#include <array>
 #include <cstdint>
+#include <optional>
 #include <vector>
 
 #include "MusicManagment/database/duplicates/ComparedTexts.h"
@@ -21,6 +23,7 @@ class TextBlocks {
         std::vector<LaneRow<std::uint16_t>> ShortRows;
         std::vector<LaneRow<std::uint32_t>> LongRows;
         std::vector<LaneRow<std::uint64_t>> WideRows;
+        std::array<std::uint16_t, kLanes> Distances{};  // of the block just compared
     };
 
     // The texts with these numbers, in the order of OrderForBlocks; alike means `percent` (1 to 100) or more.
@@ -50,10 +53,10 @@ class TextBlocks {
 
     void Pack(Block& block);
     void Prepare(std::uint32_t reference, Workspace& workspace) const;
-    void CompareBlock(const Block& block, std::uint32_t reference, const Workspace& workspace,
+    void CompareBlock(const Block& block, std::uint32_t reference, Workspace& workspace,
                       std::vector<Match>& matches) const;
-    std::uint64_t LanesAlike(const Block& block, std::size_t referenceLength,
-                             const Workspace& workspace) const;
+    std::optional<std::uint64_t> LanesAlike(const Block& block, std::size_t referenceLength,
+                                            Workspace& workspace) const;
     bool MayBeAlike(std::size_t lengthA, std::size_t lengthB) const;
 
     const ComparedTexts& texts_;
