@@ -4,8 +4,9 @@ find_program(TUNESTEAD_CCACHE ccache)
 if(TUNESTEAD_CCACHE)
   # Without these ccache refuses every source that uses a precompiled header. The compiler crashes when it is to
   # preprocess one alone, so the cache goes by the headers that a compilation names and not by its preprocessed text.
+  # It must look at their times: one that was changed during a compilation would be stored with what it was before.
   set(CMAKE_CXX_COMPILER_LAUNCHER ${CMAKE_COMMAND} -E env CCACHE_DEPEND=1
-    CCACHE_SLOPPINESS=pch_defines,time_macros,include_file_mtime,include_file_ctime ${TUNESTEAD_CCACHE})
+    CCACHE_SLOPPINESS=pch_defines,time_macros ${TUNESTEAD_CCACHE})
 endif()
 
 if(CMAKE_CXX_COMPILER_ID MATCHES "GNU|Clang")
