@@ -21,13 +21,13 @@ constexpr int kHeight = 32;  // lines
 
 class SuggestionDialog::Rows : public QAbstractTableModel {
  public:
-    enum Column { Dropped, Kept, Reason, ColumnCount };
+    enum Column { Dropped, Kept, Similarity, Reason, ColumnCount };
 
     Rows(const TMusicDatabase& database, std::vector<KeepSuggestion> suggestions, QObject* parent)
-        : QAbstractTableModel(parent),
-          database_(database),
-          suggestions_(std::move(suggestions)),
-          isAgreed_(suggestions_.size(), 1) {}
+        : QAbstractTableModel(parent), database_(database), suggestions_(std::move(suggestions)) {
+        for (const KeepSuggestion& suggestion : suggestions_)
+            isAgreed_.push_back(suggestion.IsSafe() ? 1 : 0);
+    }
 
     std::vector<SongReplacement> Agreed() const {
         std::vector<SongReplacement> agreed;
@@ -41,7 +41,8 @@ class SuggestionDialog::Rows : public QAbstractTableModel {
     }
     int columnCount(const QModelIndex& parent) const override { return parent.isValid() ? 0 : ColumnCount; }
     QVariant headerData(int section, Qt::Orientation orientation, int role) const override {
-        constexpr QStringView kCaptions[] = {u"In den Papierkorb", u"Bleibt", u"Warum er besser ist"};
+        constexpr QStringView kCaptions[] = {u"In den Papierkorb", u"Bleibt", u"Warsch.",
+                                             u"Warum er besser ist"};
         if (orientation != Qt::Horizontal || role != Qt::DisplayRole) return {};
         return kCaptions[section].toString();
     }
@@ -56,6 +57,7 @@ class SuggestionDialog::Rows : public QAbstractTableModel {
             return isAgreed_[row] != 0 ? Qt::Checked : Qt::Unchecked;
         if (role != Qt::DisplayRole && role != Qt::ToolTipRole) return {};
         const KeepSuggestion& suggestion = suggestions_[row];
+        if (index.column() == Similarity) return SimilarityText(suggestion.Percent);
         if (index.column() == Reason) return suggestion.Reason;
         const TID3Tag* song = database_.Songs().Find(index.column() == Dropped ? suggestion.Songs.Dropped
                                                                                : suggestion.Songs.Kept);
@@ -88,10 +90,10 @@ void SuggestionDialog::SetUpLayout() {
     auto* explanation = new WrappedLabel(u"explanation"_s, this);
     explanation->setText(
         u"Von den gezeigten Paaren, deren Längen sich um höchstens %1 Sekunden unterscheiden, bleibt der "
-        u"bessere "
-        "Song. Entfernen Sie das Häkchen bei denen, die auch bleiben sollen. Wie oft sie gespielt wurden, "
-        "wird "
-        "dem Song angerechnet, der bleibt, und in der PlayList tritt er an ihre Stelle."_s.arg(kSameLength));
+        "bessere Song. Ein Häkchen haben die, deren Namen zu mindestens %2 % gleich sind; setzen Sie es auch "
+        "bei anderen, die gehen sollen. Wie oft sie gespielt wurden, wird dem Song angerechnet, der bleibt, "
+        "und in der PlayList tritt er an ihre Stelle."_s.arg(kSameLength)
+            .arg(KeepSuggestion::kSafePercent));
     auto* table = new QTableView(this);
     table->setModel(rows_);
     table->setAccessibleName(u"Songs, die gehen"_s);
@@ -101,6 +103,8 @@ void SuggestionDialog::SetUpLayout() {
     table->setSelectionMode(QTableView::SingleSelection);
     table->setTextElideMode(Qt::ElideMiddle);
     table->horizontalHeader()->setSectionResizeMode(QHeaderView::Stretch);
+    table->horizontalHeader()->setSectionResizeMode(Rows::Similarity, QHeaderView::ResizeToContents);
+    table->horizontalHeader()->setSectionResizeMode(Rows::Reason, QHeaderView::ResizeToContents);
     auto* buttons = new QDialogButtonBox(this);
     discard_ = buttons->addButton(QString(), QDialogButtonBox::AcceptRole);
     auto* cancel = buttons->addButton(u"Abbrechen"_s, QDialogButtonBox::RejectRole);

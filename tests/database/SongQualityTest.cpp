@@ -58,14 +58,18 @@ TEST(SongQuality, NoneThatStaysForAnotherGoesAndNoneGoesWithoutABetterPartner) {
     for (const TID3Tag& song :
          {Song(128), Song(320), Song(192), Song(64), Song(320, 300), Song(96), Song(96)})
         add(song);
-    const std::vector<DuplicatePair> pairs = {{songs[0], songs[1]}, {songs[0], songs[2]},
-                                              {songs[1], songs[2]}, {songs[2], songs[3]},
-                                              {songs[1], songs[4]}, {songs[5], songs[6]}};
-    std::vector<std::pair<SongHandle, SongHandle>> found;
-    for (const KeepSuggestion& suggestion : SuggestKept(database, pairs))
-        found.emplace_back(suggestion.Songs.Kept, suggestion.Songs.Dropped);
-    EXPECT_EQ(found, (std::vector<std::pair<SongHandle, SongHandle>>{
-                         {songs[1], songs[0]}, {songs[1], songs[2]}, {songs[5], songs[6]}}));
+    std::vector<DuplicatePair> pairs = {{songs[0], songs[1]}, {songs[0], songs[2]}, {songs[1], songs[2]},
+                                        {songs[2], songs[3]}, {songs[1], songs[4]}, {songs[5], songs[6]}};
+    using Found = std::vector<std::pair<SongHandle, SongHandle>>;
+    const auto suggested = [&] {
+        Found found;
+        for (const KeepSuggestion& suggestion : SuggestKept(database, pairs))
+            found.emplace_back(suggestion.Songs.Kept, suggestion.Songs.Dropped);
+        return found;
+    };
+    EXPECT_EQ(suggested(), (Found{{songs[1], songs[0]}, {songs[1], songs[2]}, {songs[5], songs[6]}}));
+    pairs[3].Percent = 100;  // now 2 stays for its copy, though 1 is better
+    EXPECT_EQ(suggested(), (Found{{songs[2], songs[3]}, {songs[1], songs[0]}, {songs[5], songs[6]}}));
 }
 
 }  // namespace

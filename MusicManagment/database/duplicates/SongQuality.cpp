@@ -75,38 +75,48 @@ class Partners {
             if (first == nullptr || second == nullptr || !IsSameRecording(*first, *second)) continue;
             const std::size_t a = NumberOf(pair.First, *first);
             const std::size_t b = NumberOf(pair.Second, *second);
-            songs_[a].Like.push_back(b);
-            songs_[b].Like.push_back(a);
+            songs_[a].Like.push_back({b, pair.Percent});
+            songs_[b].Like.push_back({a, pair.Percent});
         }
     }
 
+    // The safe ones first: a copy goes in favour of the song that it is one of, not of some other.
     std::vector<KeepSuggestion> Suggest() {
+        const std::vector<std::size_t> order = BestFirst();
         std::vector<KeepSuggestion> suggestions;
-        for (const std::size_t number : BestFirst()) {
-            Song& kept = songs_[number];
-            if (kept.Goes) continue;
-            for (const std::size_t partner : kept.Like) {
-                Song& dropped = songs_[partner];
-                if (dropped.Goes || dropped.Stays) continue;
-                dropped.Goes = true;
-                QString reason = CompareQuality(*kept.Record, *dropped.Record).Reason;
-                suggestions.push_back({{.Kept = kept.Handle, .Dropped = dropped.Handle},
-                                       reason.isEmpty() ? u"gleich gut"_s : std::move(reason)});
-            }
-            kept.Stays = true;
-        }
+        for (const int leastPercent : {KeepSuggestion::kSafePercent, 0})
+            for (const std::size_t number : order)
+                if (!songs_[number].Goes) SuggestFor(songs_[number], leastPercent, suggestions);
         return suggestions;
     }
 
  private:
+    struct Partner {
+        std::size_t Number = 0;
+        double Percent = 0;
+    };
     struct Song {
         SongHandle Handle{};
         const TID3Tag* Record = nullptr;
         SongIndex Place = 0;
-        std::vector<std::size_t> Like{};
+        std::vector<Partner> Like{};
         bool Goes = false;
         bool Stays = false;
     };
+
+    void SuggestFor(Song& kept, int leastPercent, std::vector<KeepSuggestion>& suggestions) {
+        for (const Partner& partner : kept.Like) {
+            Song& dropped = songs_[partner.Number];
+            if (partner.Percent < leastPercent || dropped.Goes || dropped.Stays || IsBefore(dropped, kept))
+                continue;
+            dropped.Goes = true;
+            kept.Stays = true;
+            QString reason = CompareQuality(*kept.Record, *dropped.Record).Reason;
+            suggestions.push_back({{.Kept = kept.Handle, .Dropped = dropped.Handle},
+                                   partner.Percent,
+                                   reason.isEmpty() ? u"gleich gut"_s : std::move(reason)});
+        }
+    }
 
     std::size_t NumberOf(SongHandle song, const TID3Tag& record) {
         const auto [known, isNew] = numbers_.try_emplace(song.Slot, songs_.size());

@@ -25,9 +25,15 @@ SongVerdict CompareQuality(const TID3Tag& first, const TID3Tag& second);
 // A song that may go, since a better one is like it.
 struct KeepSuggestion {
     SongReplacement Songs{};
+    double Percent = 0;  // how alike their names are
     QString Reason{};
+
+    // Names that differ more are often those of two songs.
+    bool IsSafe() const { return Percent >= kSafePercent; }
+    static constexpr int kSafePercent = 90;
 };
 
 // For pairs of the same recording: each song that goes has its better one in a pair of its own, and none that
-// stays for another goes. Ordered by the songs that stay. Pairs whose songs have gone are passed over.
+// stays for another goes. The safe ones first, each kind ordered by the songs that stay. Pairs whose songs
+// have gone are passed over.
 std::vector<KeepSuggestion> SuggestKept(const TMusicDatabase& database, std::span<const DuplicatePair> pairs);
