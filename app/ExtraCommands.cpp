@@ -45,7 +45,7 @@ void ExtraCommands::FindSimilarArtists() {
     if (artists_ == nullptr) {
         artists_ = new SimilarArtistsForm(database_, &window_);
         artists_->setAttribute(Qt::WA_DeleteOnClose);
-        artists_->OnUndo = [this] { database_.Commands().Run(scUndo); };
+        artists_->OnUndo = [this] { return database_.ClickMenuItem(scUndo); };
     }
     artists_->SetPairs(std::move(pairs), stopped);
     artists_->show();

@@ -95,7 +95,7 @@ SimilarArtistsForm::SimilarArtistsForm(TMusicDatabase& database, QWidget* parent
     songsLater_.callOnTimeout(this, Guarded([this] { ShowSongs(); }));
     auto* undo = new QShortcut(QKeySequence::Undo, this);
     connect(undo, &QShortcut::activated, this, Guarded([this] {
-                if (OnUndo) OnUndo();
+                if (OnUndo && OnUndo()) done_->setText(u"Rückgängig gemacht."_s);
             }));
 }
 

@@ -24,8 +24,8 @@ class SimilarArtistsForm : public QDialog {
     // `stopped`: the search was ended before its time.
     void SetPairs(std::vector<SimilarArtists> pairs, bool stopped);
 
-    // Takes back the last step of the user.
-    std::function<void()> OnUndo;
+    // Takes back the last step of the user; false where there was none.
+    std::function<bool()> OnUndo;
 
  protected:
     bool eventFilter(QObject* watched, QEvent* event) override;
