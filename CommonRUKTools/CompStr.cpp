@@ -106,8 +106,5 @@ std::size_t EditDistance(std::u32string_view a, std::u32string_view b) {
 double CompStr(QStringView a, QStringView b) {
     const std::u32string first = CompareKey(a);
     const std::u32string second = CompareKey(b);
-    const std::size_t longer = std::max(first.size(), second.size());
-    if (longer == 0) return 100;
-    const std::size_t distance = EditDistance(first, second);
-    return 100 * static_cast<double>(longer - distance) / static_cast<double>(longer);
+    return Similarity(EditDistance(first, second), std::max(first.size(), second.size()));
 }

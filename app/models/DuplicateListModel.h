@@ -17,7 +17,7 @@
 
 // Which of the pairs are shown.
 struct DuplicateChoice {
-    int LeastPercent = 60;
+    int LeastPercent = kAlikePercent;
     SongFilter Filter{};         // that one of the two songs passes
     bool InGroups = false;       // pairs whose songs hang together come one after the other
     bool WithKeptPairs = false;  // also those of which the user wants to keep both

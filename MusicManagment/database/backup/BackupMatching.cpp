@@ -6,6 +6,7 @@
 #include <numeric>
 #include <tuple>
 
+#include "CommonRUKTools/CompStr.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/duplicates/PairSearch.h"
 
@@ -13,7 +14,6 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr int kAlikePercent = 60;
 // Readers count the last frames differently, and an encoder adds some silence.
 constexpr int kLengthSlack = 5;  // seconds, of songs that may be the same
 constexpr int kSameLength = 1;   // seconds, of songs whose lengths agree
@@ -101,10 +101,7 @@ class Matcher {
         if (song == nullptr) return;
         if (KnowsLengths(*song, file.Tag) && LengthDifference(*song, file.Tag) > kLengthSlack) return;
         const auto longer = std::max(texts_.Length(number), texts_.Length(match.Number));
-        const double percent =
-            longer == 0 ? 100
-                        : 100 * static_cast<double>(longer - match.Distance) / static_cast<double>(longer);
-        candidates.push_back(Rated(handle, *song, file, percent));
+        candidates.push_back(Rated(handle, *song, file, Similarity(match.Distance, longer)));
     }
 
     // The nearest lengths first among those that are equally good.

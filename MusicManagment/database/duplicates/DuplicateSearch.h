@@ -4,6 +4,7 @@
 #include <functional>
 #include <vector>
 
+#include "CommonRUKTools/CompStr.h"
 #include "MusicManagment/database/MusicManagment.h"
 
 // Songs that may hold the same piece of music, because their names are alike.
@@ -26,8 +27,7 @@ class DuplicateRows {
     std::size_t Count() const { return rows_.size(); }
     DuplicatePair At(std::size_t row) const {
         const Row& held = rows_[row];
-        const double percent = held.Length == 0 ? 100 : 100.0 * (held.Length - held.Distance) / held.Length;
-        return {songs_[held.First], songs_[held.Second], percent};
+        return {songs_[held.First], songs_[held.Second], Similarity(held.Distance, held.Length)};
     }
 
     // The same by the places of the songs in Songs().
@@ -66,7 +66,7 @@ struct DuplicateQuery {
     bool AmongReferencesOnly = false;  // not with the others
     // Compares titles, of songs by the same artist only; else artist and title.
     bool SameArtistOnly = false;
-    int LeastPercent = 60;  // 60 to 100
+    int LeastPercent = kAlikePercent;  // from there to 100
 };
 
 enum class DuplicateEnd {

@@ -5,6 +5,7 @@
 #include <span>
 #include <vector>
 
+#include "CommonRUKTools/CompStr.h"
 #include "MusicManagment/database/duplicates/TextBlocks.h"
 
 // Finds all pairs of texts that are alike. The texts are numbered from 0 on.
@@ -14,8 +15,8 @@ struct PairQuery {
     std::vector<std::uint32_t> Groups{};
     // The texts that are compared with all others, in ascending order.
     std::vector<std::uint32_t> References{};
-    int Percent = 60;  // 1 to 100
-    int Threads = 0;   // 0: as many as the processor runs at once
+    int Percent = kAlikePercent;  // 1 to 100
+    int Threads = 0;              // 0: as many as the processor runs at once
 };
 
 // What was found for one reference: of a pair of references it is with the one that comes first.

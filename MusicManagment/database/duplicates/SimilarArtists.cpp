@@ -4,6 +4,7 @@
 #include <numeric>
 
 #include "CommonRUKTools/ColognePhonetics.h"
+#include "CommonRUKTools/CompStr.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/duplicates/PairSearch.h"
 
@@ -11,7 +12,6 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr int kAlikePercent = 60;
 constexpr int kSoundPercent = 40;
 // Codes of fewer digits say too little.
 constexpr qsizetype kShortestCode = 2;
@@ -52,12 +52,10 @@ std::vector<SimilarArtists> FindSimilarArtists(TMusicDatabase& database, bool& s
     const auto found = [&](std::uint32_t first, std::span<const TextBlocks::Match> matches) {
         for (const auto& [second, distance] : matches) {
             const auto longer = std::max(artists.Names.Length(first), artists.Names.Length(second));
-            const bool isAlike = distance <= TextBlocks::MostEdits(longer, kAlikePercent);
-            if (!isAlike && !artists.SoundAlike(first, second)) continue;
-            const double percent = 100 * static_cast<double>(longer - distance) / static_cast<double>(longer);
+            if (!IsAlike(distance, longer) && !artists.SoundAlike(first, second)) continue;
             const auto& [text1, songs1] = artists.Rows[first];
             const auto& [text2, songs2] = artists.Rows[second];
-            pairs.push_back({percent, text1, text2, songs1, songs2});
+            pairs.push_back({Similarity(distance, longer), text1, text2, songs1, songs2});
         }
         return ++done % 64 != 0 || goOn();
     };
