@@ -107,6 +107,18 @@ QString FormatChannelCount(int count) {
     return known.isNull() ? QString::number(count) + u" Kanäle"_s : known;
 }
 
+QString ArtistAndTitle(const QString& artist, const QString& title) {
+    return artist + u" - "_s + title;
+}
+
+QString ArtistAndTitle(const TID3Tag& song) {
+    return ArtistAndTitle(song.Artist, song.Title);
+}
+
+QString TitleBehindArtist(const QString& artist, const QString& title) {
+    return artist.isEmpty() ? title : ArtistAndTitle(artist, title);
+}
+
 QString GenreDisplayText(const TID3Tag& tag) {
     const bool isUnknown = MainGenreGenre(tag.MainGenre) == kNoGenre;
     return isUnknown && tag.Genre != kNoGenre ? GenreName(tag.Genre) : MainGenreLongName(tag.MainGenre);

@@ -6,6 +6,13 @@
 
 // Texts in which the fields of a record are shown.
 
+// "Artist - Title": what a song is called in a message, and what its name is compared by. The dash stays
+// where one of them is missing.
+QString ArtistAndTitle(const QString& artist, const QString& title);
+QString ArtistAndTitle(const TID3Tag& song);
+// The same for the eye: without an artist the title alone.
+QString TitleBehindArtist(const QString& artist, const QString& title);
+
 // "45 s", "3:05", "1:00:00"; with `alwaysClock` "0:45". Seconds, not negative.
 QString FormatLength(int seconds, bool alwaysClock);
 QString FormatBitRate(int kbits);

@@ -7,6 +7,7 @@
 #include "MusicManagment/database/batches/FlagBatch.h"
 #include "MusicManagment/database/batches/MediaCommands.h"
 #include "MusicManagment/database/batches/TagBatch.h"
+#include "ReadMPEGHeader/DisplayTexts.h"
 #include "app/dialogs/BannListDialog.h"
 #include "app/dialogs/RenameDialog.h"
 #include "app/dialogs/TagsFromNamesDialog.h"
@@ -19,8 +20,7 @@ namespace {
 
 QString DiscardQuestion(const TMusicDatabase& database, const std::vector<SongHandle>& songs, bool banned) {
     const TID3Tag* only = songs.size() == 1 ? database.Songs().Find(songs.front()) : nullptr;
-    const QString what =
-        only != nullptr ? u'"' + only->Artist + u" - "_s + only->Title + u'"' : SongCountText(songs.size());
+    const QString what = only != nullptr ? u'"' + ArtistAndTitle(*only) + u'"' : SongCountText(songs.size());
     const QString begin = (songs.size() == 1 ? u"Soll "_s : u"Sollen "_s) + what;
     return begin +
            (banned

@@ -11,6 +11,7 @@
 #include "MusicManagment/database/songfiles/CopySongs.h"
 #include "MusicManagment/database/songfiles/Removal.h"
 #include "MusicManagment/database/sorting/OrderCommands.h"
+#include "ReadMPEGHeader/DisplayTexts.h"
 #include "app/ShellCommands.h"
 #include "app/models/CollectionTotals.h"
 #include "app/views/SongListWidget.h"
@@ -123,7 +124,7 @@ QString SongCommands::RemovalQuestion(const std::vector<SongHandle>& songs) cons
         return u"Sollen "_s + SongCountText(songs.size()) +
                u" aus der Datenbank entfernt werden? Die Dateien bleiben erhalten."_s;
     const TID3Tag& song = *database_.Songs().Find(songs.front());
-    return u"Soll \""_s + song.Artist + u" - "_s + song.Title +
+    return u"Soll \""_s + ArtistAndTitle(song) +
            u"\" aus der Datenbank entfernt werden? Die Datei bleibt erhalten."_s;
 }
 

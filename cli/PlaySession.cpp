@@ -80,7 +80,7 @@ class StatusLine : public PlayerPanel {
         const int index = list_.IndexOf();
         const auto record = index >= 0 ? list_.Entry(index).Record : std::nullopt;
         if (!record || record->Title.isEmpty()) return QFileInfo(fileName).fileName();
-        return record->Artist.isEmpty() ? record->Title : record->Artist + u" - "_s + record->Title;
+        return TitleBehindArtist(record->Artist, record->Title);
     }
 
     const TPlayList& list_;

@@ -7,6 +7,7 @@
 #include "CommonRUKTools/Errors.h"
 #include "CommonRUKTools/FileSource.h"
 #include "CommonRUKTools/SafeFile.h"
+#include "ReadMPEGHeader/DisplayTexts.h"
 
 using namespace Qt::StringLiterals;
 
@@ -31,7 +32,7 @@ ByteSpan WithoutByteOrderMark(ByteSpan bytes) {
 }  // namespace
 
 QString BanEntry(const TID3Tag& record) {
-    QString entry = record.Artist + u" - "_s + record.Title;
+    QString entry = ArtistAndTitle(record);
     return entry.replace(u'\r', u' ').replace(u'\n', u' ');
 }
 

@@ -5,6 +5,7 @@
 
 #include "CommonRUKTools/AbsolutePath.h"
 #include "CommonRUKTools/CodePage.h"
+#include "ReadMPEGHeader/DisplayTexts.h"
 
 using namespace Qt::StringLiterals;
 
@@ -118,5 +119,5 @@ QByteArray PathForList(const QString& name, ListEncoder encode) {
 }
 
 QByteArray TitleForList(const QString& artist, const QString& title, ListEncoder encode) {
-    return encode(OnOneLine(artist + u" - "_s + title));
+    return encode(OnOneLine(ArtistAndTitle(artist, title)));
 }

@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "ReadMPEGHeader/DisplayTexts.h"
+
 using namespace Qt::StringLiterals;
 
 using Kind = BackupDecision::Kind;
@@ -97,7 +99,7 @@ QVariant BackupModel::data(const QModelIndex& index, int role) const {
     if (role != Qt::DisplayRole && role != Qt::ToolTipRole) return {};
     switch (index.column()) {
         case File:
-            return file.Tag.Artist + u" - "_s + file.Tag.Title;
+            return ArtistAndTitle(file.Tag);
         case Candidate:
             return CandidateCell(index.row());
         case OwnFile:

@@ -22,7 +22,7 @@ constexpr const char16_t* kCaptions[kColumns] = {u"Nr.", u"Artist - Titel", u"LÃ
 QString SongText(const PlayListEntry& entry) {
     const QString title = entry.Record ? entry.Record->Title : QString();
     if (title.isEmpty()) return IsAddress(entry.Name) ? entry.Name : QFileInfo(entry.Name).completeBaseName();
-    return entry.Record->Artist.isEmpty() ? title : entry.Record->Artist + u" - "_s + title;
+    return TitleBehindArtist(entry.Record->Artist, title);
 }
 
 Qt::Alignment AlignmentOf(PlayListColumn column) {

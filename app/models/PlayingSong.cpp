@@ -4,6 +4,7 @@
 
 #include "MusicManagment/playback/PlaySound.h"
 #include "MusicManagment/playlist/PlayList.h"
+#include "ReadMPEGHeader/DisplayTexts.h"
 
 using namespace Qt::StringLiterals;
 
@@ -35,5 +36,5 @@ PlayingSong SongOf(const TPlaySound& player, const TPlayList& list) {
 }
 
 QString OneLine(const PlayingSong& song) {
-    return song.Artist.isEmpty() ? song.Title : song.Artist + u" - "_s + song.Title;
+    return TitleBehindArtist(song.Artist, song.Title);
 }

@@ -9,6 +9,7 @@
 #include "CommonRUKTools/CompStr.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/duplicates/PairSearch.h"
+#include "ReadMPEGHeader/DisplayTexts.h"
 
 using namespace Qt::StringLiterals;
 
@@ -18,10 +19,6 @@ namespace {
 constexpr int kLengthSlack = 5;  // seconds, of songs that may be the same
 constexpr int kSameLength = 1;   // seconds, of songs whose lengths agree
 constexpr qint64 kPairsAPoint = 64;
-
-QString KeyOf(const TID3Tag& song) {
-    return song.Artist + u" - "_s + song.Title;
-}
 
 bool KnowsLengths(const TID3Tag& a, const TID3Tag& b) {
     return a.Length > 0 && b.Length > 0;
@@ -68,9 +65,9 @@ class Matcher {
     Matcher(TMusicDatabase& database, const std::vector<BackupFile>& files)
         : database_(database), files_(files) {
         for (const BackupFile& file : files)
-            texts_.Add(KeyOf(file.Tag));
+            texts_.Add(ArtistAndTitle(file.Tag));
         for (const auto& song : database.Songs()) {
-            texts_.Add(KeyOf(*song));
+            texts_.Add(ArtistAndTitle(*song));
             songs_.push_back(database.Songs().HandleOf(*song));
         }
         texts_.Classify();
@@ -131,7 +128,7 @@ QString RatingText(BackupRating rating) {
 QString CandidateText(const BackupCandidate& candidate, const TID3Tag& song) {
     // Below a hundred there is a difference, however small.
     const int percent = static_cast<int>(candidate.Percent);
-    return QString::asprintf("%.3d%%: ", percent) + song.Artist + u" - "_s + song.Title + u' ' +
+    return QString::asprintf("%.3d%%: ", percent) + ArtistAndTitle(song) + u' ' +
            RatingText(candidate.Rating);
 }
 

@@ -5,6 +5,7 @@
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/songfiles/SongFinder.h"
+#include "ReadMPEGHeader/DisplayTexts.h"
 
 using namespace Qt::StringLiterals;
 
@@ -18,7 +19,7 @@ class MediumPolicy {
         enum Answer { Yes, YesToAll, No, NoToAll, Cancel };
         if (forAll_) return *forAll_;
         const int answer = UserDialogs().Ask(
-            {.Text = u"Die Datei "_s + song.Artist + u" - "_s + song.Title +
+            {.Text = u"Die Datei "_s + ArtistAndTitle(song) +
                      u" befindet sich bereits auf einer CD. Soll sie dennoch in die Liste der zu brennenden "
                      "Dateien aufgenommen werden?"_s,
              .Buttons = {u"Ja"_s, u"Ja, alle"_s, u"Nein"_s, u"Nein, alle"_s, u"Abbrechen"_s},

@@ -6,6 +6,7 @@
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/batches/BatchFrame.h"
 #include "MusicManagment/database/batches/GenreDonors.h"
+#include "ReadMPEGHeader/DisplayTexts.h"
 
 using namespace Qt::StringLiterals;
 
@@ -62,7 +63,7 @@ GenreAdaption AdaptGenres(TMusicDatabase& database, const BatchSongs& songs) {
             changed.Artist = donor->Artist;
             return changed;
         }
-        const QString name = song.Artist + u" - "_s + song.Title;
+        const QString name = ArtistAndTitle(song);
         result.WithoutGenre << name;
         if (!database.QuietBatches())
             UserDialogs().ShowMessage(MessageKind::Error,

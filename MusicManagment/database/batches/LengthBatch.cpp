@@ -144,7 +144,7 @@ std::optional<int> ParseLength(const QString& text) {
 BatchResult EnterLength(TMusicDatabase& database, SongHandle song) {
     const TID3Tag* record = database.Songs().Find(song);
     if (record == nullptr) return {};
-    const QString name = record->Artist + u" - "_s + record->Title;
+    const QString name = ArtistAndTitle(*record);
     const auto text = UserDialogs().Input(u"Länge manuell eingeben"_s,
                                           u"Länge von "_s + name + u" (Minuten:Sekunden oder Sekunden):"_s,
                                           {}, FormatLength(record->Length, true));

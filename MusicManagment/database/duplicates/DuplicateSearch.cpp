@@ -9,6 +9,7 @@
 #include "CommonRUKTools/Clock.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/duplicates/PairSearch.h"
+#include "ReadMPEGHeader/DisplayTexts.h"
 
 using namespace Qt::StringLiterals;
 
@@ -19,7 +20,7 @@ constexpr qint64 kProgressEvery = 50;  // milliseconds
 constexpr double kPairsPerSecond = 100e6;
 
 QString KeyOf(const TID3Tag& song, bool sameArtistOnly) {
-    return sameArtistOnly ? song.Title : song.Artist + u" - "_s + song.Title;
+    return sameArtistOnly ? song.Title : ArtistAndTitle(song);
 }
 
 // The songs that take part, numbered in the order of the collection, and what is compared of them. Copies:
