@@ -28,6 +28,15 @@ class SilentDialogs : public Dialogs {
     std::optional<QString> ChooseFolder(const QString&, const QString&) override { return std::nullopt; }
 };
 
+enum Choice { Agree, Decline };
+
+Question Decision(const QString& text, const QString& agree, const QString& decline, ReturnKey returnKey) {
+    return {.Text = text,
+            .Buttons = {agree, decline},
+            .Cancel = Decline,
+            .Default = returnKey == ReturnKey::Agrees ? Agree : Decline};
+}
+
 Dialogs*& Installed() {
     static Dialogs* dialogs = nullptr;
     return dialogs;
@@ -37,6 +46,14 @@ Dialogs*& Installed() {
 
 bool Report::HasComplaints() const {
     return std::ranges::any_of(Sections, &ReportSection::Complaint);
+}
+
+bool Dialogs::Confirm(const QString& question, const QString& action, ReturnKey returnKey) {
+    return Ask(Decision(question, action, u"Abbrechen"_s, returnKey)) == Agree;
+}
+
+bool Dialogs::AskYesNo(const QString& question, ReturnKey returnKey) {
+    return Ask(Decision(question, u"Ja"_s, u"Nein"_s, returnKey)) == Agree;
 }
 
 void Dialogs::ShowReport(const Report& report) {

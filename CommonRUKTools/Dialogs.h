@@ -30,6 +30,9 @@ struct Question {
     int DefaultButton() const { return Default.value_or(Cancel); }
 };
 
+// The answer of the Return key where there are two. Never Agrees to what destroys something.
+enum class ReturnKey { Declines, Agrees };
+
 // One kind of thing that a report tells of: the songs that are new, the files that could not be read.
 struct ReportSection {
     QString Caption;
@@ -54,6 +57,10 @@ class Dialogs {
     virtual void ShowMessage(MessageKind kind, const QString& text) = 0;
     // The place of the chosen button.
     virtual int Ask(const Question& question) = 0;
+    // Whether the user chooses what the button `action` says, and not "Abbrechen".
+    bool Confirm(const QString& question, const QString& action, ReturnKey returnKey = ReturnKey::Declines);
+    // "Ja" or "Nein".
+    bool AskYesNo(const QString& question, ReturnKey returnKey = ReturnKey::Declines);
     // Unless dialogs know better, the message with a button that opens the text.
     virtual void ShowReport(const Report& report);
     // The text entered or chosen; nothing on cancel. With choices the text is one of them.

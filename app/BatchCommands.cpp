@@ -105,9 +105,8 @@ void BatchCommands::Discard(int id) {
     const std::vector<SongHandle> songs = list_.ChosenHandles();
     if (songs.empty()) return;
     const bool banned = id == mcBan;
-    if (UserDialogs().Ask({.Text = DiscardQuestion(database_, songs, banned),
-                           .Buttons = {banned ? u"Verbannen"_s : u"In den Papierkorb"_s, u"Abbrechen"_s},
-                           .Cancel = 1}) != 0)
+    if (!UserDialogs().Confirm(DiscardQuestion(database_, songs, banned),
+                               banned ? u"Verbannen"_s : u"In den Papierkorb"_s))
         return;
     const SongHandle next = list_.NextAfter(songs);
     const QString caption = SongCountText(songs.size()) + (banned ? u" verbannen"_s : u" löschen"_s);

@@ -22,8 +22,7 @@ bool SavedOrGivenUp(const std::function<bool()>& save, const QString& loss) {
         return false;
     } catch (const ERukException& error) {
         const QString question = error.Message() + u"\n\n"_s + loss + u" Trotzdem beenden?"_s;
-        return UserDialogs().Ask(
-                   {.Text = question, .Buttons = {u"Beenden"_s, u"Abbrechen"_s}, .Cancel = 1}) == 0;
+        return UserDialogs().Confirm(question, u"Beenden"_s);
     }
 }
 

@@ -112,14 +112,10 @@ void DuplicateCommands::Decide(PairDecision decision, const std::vector<Duplicat
         replacements.push_back(decision == PairDecision::KeepFirst
                                    ? SongReplacement{.Kept = pair.First, .Dropped = pair.Second}
                                    : SongReplacement{.Kept = pair.Second, .Dropped = pair.First});
+    const QString question =
+        u"Sollen die anderen Songs von %1 Paaren in den Papierkorb gelegt werden?"_s.arg(pairs.size());
     // One key is meant for one pair.
-    if (pairs.size() > 1 &&
-        UserDialogs().Ask(
-            {.Text = u"Sollen die anderen Songs von %1 Paaren in den Papierkorb gelegt werden?"_s.arg(
-                 pairs.size()),
-             .Buttons = {u"In den Papierkorb"_s, u"Abbrechen"_s},
-             .Cancel = 1}) != 0)
-        return;
+    if (pairs.size() > 1 && !UserDialogs().Confirm(question, u"In den Papierkorb"_s)) return;
     Replace(replacements);
 }
 
@@ -154,13 +150,10 @@ void DuplicateCommands::KeepBoth(const std::vector<DuplicatePair>& pairs) {
 
 void DuplicateCommands::Ban(const std::vector<DuplicatePair>& pairs) {
     const std::vector<SongHandle> songs = SongsIn(pairs);
-    if (UserDialogs().Ask(
-            {.Text = u"Sollen %1 in die Bann-Liste aufgenommen, aus der Datenbank entfernt und in den "
-                     "Papierkorb gelegt werden? Verbannte Songs werden nicht wieder aufgenommen."_s.arg(
-                         SongCountText(songs.size())),
-             .Buttons = {u"Verbannen"_s, u"Abbrechen"_s},
-             .Cancel = 1}) != 0)
-        return;
+    const QString question =
+        u"Sollen %1 in die Bann-Liste aufgenommen, aus der Datenbank entfernt und in den Papierkorb gelegt "
+        "werden? Verbannte Songs werden nicht wieder aufgenommen."_s.arg(SongCountText(songs.size()));
+    if (!UserDialogs().Confirm(question, u"Verbannen"_s)) return;
     Tell(DiscardSongs(database_, SongCountText(songs.size()) + u" verbannen"_s, songs, Banning::Banned));
 }
 

@@ -420,10 +420,8 @@ void TTunesteadMainWnd::End() {
 }
 
 void TTunesteadMainWnd::OfferToStop() {
-    const int answer = UserDialogs().Ask(
-        {.Text = u"Es wird noch eine Aktion ausgeführt. Brechen Sie diese zuerst ab, bevor Sie das Programm "
-                 "beenden. Aktion jetzt abbrechen?"_s,
-         .Buttons = {u"Ja"_s, u"Nein"_s},
-         .Cancel = 1});
-    if (answer == 0) database_.RequestAbort();
+    const QString question =
+        u"Es wird noch eine Aktion ausgeführt. Brechen Sie diese zuerst ab, bevor Sie das Programm beenden. "
+        "Aktion jetzt abbrechen?"_s;
+    if (UserDialogs().AskYesNo(question)) database_.RequestAbort();
 }

@@ -102,8 +102,7 @@ void SongCommands::OfferToOpen(const UndoStep& step) const {
     const QString question = u'"' + step.Caption + u"\" gehört zu einer anderen Datenbank:\n"_s +
                              QDir::toNativeSeparators(step.Elsewhere) +
                              u"\n\nSoll sie dafür geöffnet werden?"_s;
-    if (UserDialogs().Ask({.Text = question, .Buttons = {u"Öffnen"_s, u"Abbrechen"_s}, .Cancel = 1}) == 0)
-        OnOpenDatabase(step.Elsewhere);
+    if (UserDialogs().Confirm(question, u"Öffnen"_s)) OnOpenDatabase(step.Elsewhere);
 }
 
 void SongCommands::Show(const UndoResult& result, const QString& done) {
@@ -131,9 +130,7 @@ QString SongCommands::RemovalQuestion(const std::vector<SongHandle>& songs) cons
 void SongCommands::RemoveChosen() {
     const std::vector<SongHandle> songs = list_.ChosenHandles();
     if (songs.empty()) return;
-    if (UserDialogs().Ask(
-            {.Text = RemovalQuestion(songs), .Buttons = {u"Entfernen"_s, u"Abbrechen"_s}, .Cancel = 1}) != 0)
-        return;
+    if (!UserDialogs().Confirm(RemovalQuestion(songs), u"Entfernen"_s)) return;
     const SongHandle next = list_.NextAfter(songs);
     const int removed =
         RemoveSongs(journal_, database_, songs, SongCountText(songs.size()) + u" entfernen"_s);

@@ -54,18 +54,13 @@ bool Startup::ActOn(const QStringList& arguments) {
 bool Startup::OpenStandardDatabase() {
     const QString path = commands_.Files().Database();
     const bool complete = !QFileInfo::exists(path) || ReadStandardDatabase();
-    if (!complete) {
-        const int answer = UserDialogs().Ask(
-            {.Text = u"Die Standard-Datenbank wurde nicht komplett importiert. Wenn Sie nun fortfahren, wird "
-                     "beim Beenden die Standard-Datenbank auf der Festplatte mit der nur halb importierten "
-                     "überschrieben => Die noch nicht importierten Songs gehen (in der Datenbank) verloren. "
-                     "Trotzdem fortfahren?"_s,
-             .Buttons = {u"Ja"_s, u"Nein"_s},
-             .Cancel = 1});
-        if (answer != 0) {
-            database_.Clear();  // so that the half of it is not saved
-            return false;
-        }
+    const QString question =
+        u"Die Standard-Datenbank wurde nicht komplett importiert. Wenn Sie nun fortfahren, wird beim Beenden "
+        "die Standard-Datenbank auf der Festplatte mit der nur halb importierten überschrieben => Die noch "
+        "nicht importierten Songs gehen (in der Datenbank) verloren. Trotzdem fortfahren?"_s;
+    if (!complete && !UserDialogs().AskYesNo(question)) {
+        database_.Clear();  // so that the half of it is not saved
+        return false;
     }
     // Each command saves into it when the user wants that.
     RunCommand([this] { commands_.Files().MakeFolder(); });
@@ -132,8 +127,6 @@ void Startup::OpenFile(FileKind kind, const QString& path) {
 
 void Startup::OfferDatabase(const QString& path) {
     const QString question = u"Soll diese Datenbank nun geladen werden:\r\n"_s + path;
-    const int answer =
-        UserDialogs().Ask({.Text = question, .Buttons = {u"Ja"_s, u"Nein"_s}, .Cancel = 1, .Default = 0});
-    if (answer != 0) return;
+    if (!UserDialogs().AskYesNo(question, ReturnKey::Agrees)) return;
     RunCommand([&] { commands_.OpenFile(path); });
 }

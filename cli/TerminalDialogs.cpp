@@ -78,9 +78,7 @@ QStringList TerminalDialogs::OpenFiles(const FileDialogOptions& options) {
 std::optional<QString> TerminalDialogs::SaveFile(const FileDialogOptions& options) {
     auto path = AskForPath(options.Title, options.Preset);
     if (!path || !options.ConfirmOverwrite || !QFileInfo::exists(*path)) return path;
-    const int answer =
-        Ask({.Text = *path + u" überschreiben?"_s, .Buttons = {u"Ja"_s, u"Nein"_s}, .Cancel = 1});
-    return answer == 0 ? path : std::nullopt;
+    return AskYesNo(*path + u" überschreiben?"_s) ? path : std::nullopt;
 }
 
 std::optional<QString> TerminalDialogs::ChooseFolder(const QString& caption, const QString& startFolder) {

@@ -12,10 +12,6 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-bool Agrees(const QString& question) {
-    return UserDialogs().Ask({.Text = question, .Buttons = {u"Ja"_s, u"Nein"_s}, .Cancel = 1}) == 0;
-}
-
 bool AnyExists(const QStringList& files) {
     return std::ranges::any_of(files, [](const QString& file) { return QFileInfo::exists(file); });
 }
@@ -66,15 +62,15 @@ void InstallationSteps::Uninstall(const QString& linkFolder) {
 // All questions come before anything is removed.
 RemovalChoice InstallationSteps::AskWhatGoes() const {
     RemovalChoice choice;
-    choice.Program = Agrees(
+    choice.Program = UserDialogs().AskYesNo(
         u"Soll Tunestead aus dem Menü und von den Dateitypen Ihres Systems entfernt werden? Ihre Songs "
         u"bleiben, "
         "wo sie sind."_s);
     if (!choice.Program) return choice;
-    choice.Database = Agrees(u"Soll die Datenbank ebenfalls entfernt werden?"_s);
+    choice.Database = UserDialogs().AskYesNo(u"Soll die Datenbank ebenfalls entfernt werden?"_s);
     if (AnyExists({files_.BannList(), files_.PlayList()}))
-        choice.Lists = Agrees(u"Sollen Bann-Liste und PlayList ebenfalls entfernt werden?"_s);
-    choice.Settings = Agrees(u"Sollen die Einstellungen ebenfalls entfernt werden?"_s);
+        choice.Lists = UserDialogs().AskYesNo(u"Sollen Bann-Liste und PlayList ebenfalls entfernt werden?"_s);
+    choice.Settings = UserDialogs().AskYesNo(u"Sollen die Einstellungen ebenfalls entfernt werden?"_s);
     return choice;
 }
 

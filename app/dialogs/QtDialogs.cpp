@@ -210,8 +210,7 @@ std::optional<QString> QtDialogs::SaveFile(const FileDialogOptions& options) {
         if (!options.ConfirmOverwrite || !QFileInfo::exists(files.first())) return files.first();
         const QString question = u"Die Datei "_s + QDir::toNativeSeparators(files.first()) +
                                  u" ist schon vorhanden. Soll sie ersetzt werden?"_s;
-        if (Ask({.Text = question, .Buttons = {u"Ersetzen"_s, u"Abbrechen"_s}, .Cancel = 1}) == 0)
-            return files.first();
+        if (Confirm(question, u"Ersetzen"_s)) return files.first();
     }
 }
 

@@ -49,9 +49,7 @@ std::optional<QString> RootFolderField::Fault() const {
     if (info.isDir()) return std::nullopt;
     if (info.exists()) return shown + u" ist kein Ordner."_s;
     const QString question = u"Der Ordner "_s + shown + u" ist nicht vorhanden. Soll er angelegt werden?"_s;
-    const int answer = UserDialogs().Ask(
-        {.Text = question, .Buttons = {u"Anlegen"_s, u"Abbrechen"_s}, .Cancel = 1, .Default = 0});
-    if (answer != 0) return QString();
+    if (!UserDialogs().Confirm(question, u"Anlegen"_s, ReturnKey::Agrees)) return QString();
     if (QDir().mkpath(folder)) return std::nullopt;
     return u"Kann den Ordner "_s + shown + u" nicht anlegen."_s;
 }

@@ -24,8 +24,7 @@ constexpr BatchTexts kDropping = {.All = u"Zwischenspeicherung aller Songs entfe
 constexpr int kCopiesPerSave = 16;
 
 bool MayGoOn(const TMusicDatabase& database, const QString& question) {
-    if (database.QuietBatches()) return true;
-    return UserDialogs().Ask({.Text = question, .Buttons = {u"Ja"_s, u"Nein"_s}, .Cancel = 1}) == 0;
+    return database.QuietBatches() || UserDialogs().AskYesNo(question);
 }
 
 // Those on media that have no copy, the songs of a medium one after the other.

@@ -19,7 +19,7 @@ constexpr BatchTexts kTexts = {.All = u"Anpassen des Genres aller Songs",
 bool UserTakes(const QString& artist, const GenreDonors::Likeness& like) {
     const QString text = u"Soll für "_s + artist + u" der Artist "_s + like.From.Artist +
                          u" verwendet werden ("_s + QString::number(like.Percent) + u"% Übereinstimmung)"_s;
-    return UserDialogs().Ask({.Text = text, .Buttons = {u"Ja"_s, u"Nein"_s}, .Cancel = 1}) == 0;
+    return UserDialogs().AskYesNo(text);
 }
 
 // Finds donors, and asks where they are not certain.

@@ -46,11 +46,9 @@ bool MayCopy(TMusicDatabase& database, const std::vector<SongHandle>& songs, con
     const QString amount = u"Es werden "_s + SongCountText(songs.size()) + u" mit etwa "_s + Amount(needed) +
                            u" nach "_s + folder + u" kopiert. "_s;
     const QString free = room < 0 ? QString() : u"Dort sind "_s + Amount(room) + u" frei. "_s;
-    return UserDialogs().Ask({.Text = amount + free +
-                                      (fits ? u"Fortfahren?"_s : u"Das reicht nicht. Trotzdem fortfahren?"_s),
-                              .Buttons = {u"Fortfahren"_s, u"Abbrechen"_s},
-                              .Cancel = 1,
-                              .Default = fits ? 0 : 1}) == 0;
+    return UserDialogs().Confirm(
+        amount + free + (fits ? u"Fortfahren?"_s : u"Das reicht nicht. Trotzdem fortfahren?"_s),
+        u"Fortfahren"_s, fits ? ReturnKey::Agrees : ReturnKey::Declines);
 }
 
 bool CopyWhole(const QString& from, const QString& to, const CopyProgress& progress) {

@@ -32,10 +32,6 @@ QString Verb(BatchRange range) {
     return range == BatchRange::One ? u"Soll wirklich "_s : u"Sollen wirklich "_s;
 }
 
-bool Agrees(const QString& text, const QString& action) {
-    return UserDialogs().Ask({.Text = text, .Buttons = {action, u"Abbrechen"_s}, .Cancel = 1}) == 0;
-}
-
 // What stays of a record when its tags are read anew.
 void KeepCollectionFields(const TID3Tag& song, TID3Tag& record) {
     record.FileName = song.FileName;
@@ -63,12 +59,14 @@ TID3Tag WithoutTags(const TMusicDatabase& database, const TID3Tag& song) {
 }  // namespace
 
 bool MayRemoveTags(BatchRange range) {
-    return Agrees(Verb(range) + SongsOf(range) + u" entfernen werden?\n\nAuch die Bilder darin gehen."_s,
-                  u"Entfernen"_s);
+    return UserDialogs().Confirm(
+        Verb(range) + SongsOf(range) + u" entfernen werden?\n\nAuch die Bilder darin gehen."_s,
+        u"Entfernen"_s);
 }
 
 bool MayRereadTags(BatchRange range) {
-    return Agrees(Verb(range) + SongsOf(range) + u" neu eingelesen werden?"_s, u"Neu einlesen"_s);
+    return UserDialogs().Confirm(Verb(range) + SongsOf(range) + u" neu eingelesen werden?"_s,
+                                 u"Neu einlesen"_s);
 }
 
 BatchResult RemoveTags(TMusicDatabase& database, const BatchSongs& songs) {

@@ -11,9 +11,8 @@ namespace {
 constexpr double kLongSearch = 10;  // seconds
 
 // A question that can do no harm.
-bool Agrees(const QString& text, const QString& yes) {
-    return UserDialogs().Ask({.Text = text, .Buttons = {yes, u"Abbrechen"_s}, .Cancel = 1, .Default = 0}) ==
-           0;
+bool Agrees(const QString& text, const QString& action) {
+    return UserDialogs().Confirm(text, action, ReturnKey::Agrees);
 }
 
 // False when there is nothing to search.

@@ -33,12 +33,9 @@ Journal* JournalFor(std::size_t songs) {
     Journal* journal = CurrentJournal();
     if (journal == nullptr || journal->FitsBatch(static_cast<qint64>(songs) * kJournalBytesASong))
         return journal;
-    const int answer = UserDialogs().Ask(
-        {.Text = u"Der Platz reicht nicht, um diesen Vorgang später rückgängig zu machen ("_s +
-                 SongCountText(songs) + u")."_s,
-         .Buttons = {u"Trotzdem ausführen"_s, u"Abbrechen"_s},
-         .Cancel = 1});
-    if (answer != 0) throw EAbort();
+    const QString question = u"Der Platz reicht nicht, um diesen Vorgang später rückgängig zu machen ("_s +
+                             SongCountText(songs) + u")."_s;
+    if (!UserDialogs().Confirm(question, u"Trotzdem ausführen"_s)) throw EAbort();
     return nullptr;
 }
 
