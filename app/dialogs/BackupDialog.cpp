@@ -12,6 +12,7 @@
 #include <QVBoxLayout>
 
 #include "CommonRUKTools/CommandRunner.h"
+#include "app/dialogs/DecisionButtons.h"
 #include "app/views/RowList.h"
 
 using namespace Qt::StringLiterals;
@@ -91,21 +92,17 @@ void BackupDialog::SetUpLayout(const QString& name) {
         "verknüpfter Song liegt für die Sammlung auf dem Datenträger; keine Datei wird verändert."_s,
         this);
     keys->setWordWrap(true);
-    auto* buttons = new QDialogButtonBox(this);
-    agree_ = buttons->addButton(u"&Übernehmen"_s, QDialogButtonBox::AcceptRole);
-    agree_->setObjectName(u"agree"_s);
+    const DecisionButtons buttons = MakeDecisionButtons(*this, u"&Übernehmen"_s);
+    agree_ = buttons.Agree;
     agree_->setAutoDefault(false);
-    auto* cancel = buttons->addButton(u"Abbrechen"_s, QDialogButtonBox::RejectRole);
-    cancel->setAutoDefault(false);
-    connect(buttons, &QDialogButtonBox::accepted, this, &QDialog::accept);
-    connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
+    buttons.Cancel->setAutoDefault(false);
     auto* layout = new QVBoxLayout(this);
     layout->addLayout(form);
     layout->addWidget(table_, 1);
     layout->addWidget(candidates_);
     layout->addWidget(keys);
     layout->addWidget(summary_);
-    layout->addWidget(buttons);
+    layout->addWidget(buttons.Box);
     resize(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
 }
 

@@ -13,6 +13,7 @@
 #include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/BannList.h"
+#include "app/dialogs/DecisionButtons.h"
 
 using namespace Qt::StringLiterals;
 
@@ -70,18 +71,15 @@ void BannListDialog::SetUpLayout() {
     addButton(u"&Importieren..."_s, [this] { Import(); });
     addButton(u"E&xportieren..."_s, [this] { Export(); });
     side->addStretch();
-    auto* buttons = new QDialogButtonBox(this);
-    buttons->addButton(u"&Übernehmen"_s, QDialogButtonBox::AcceptRole)->setDefault(true);
-    buttons->addButton(u"Abbrechen"_s, QDialogButtonBox::RejectRole);
-    connect(buttons, &QDialogButtonBox::accepted, this, &QDialog::accept);
-    connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
+    const DecisionButtons buttons = MakeDecisionButtons(*this, u"&Übernehmen"_s);
+    buttons.Agree->setDefault(true);
     auto* middle = new QHBoxLayout;
     middle->addWidget(view_, 1);
     middle->addLayout(side);
     auto* layout = new QVBoxLayout(this);
     layout->addWidget(filter_);
     layout->addLayout(middle, 1);
-    layout->addWidget(buttons);
+    layout->addWidget(buttons.Box);
     resize(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
 }
 

@@ -11,6 +11,7 @@
 
 #include "CommonRUKTools/CommandRunner.h"
 #include "MusicManagment/database/SongTypes.h"
+#include "app/dialogs/DecisionButtons.h"
 
 using namespace Qt::StringLiterals;
 
@@ -94,14 +95,10 @@ void PatternDialog::SetUpLayout() {
     summary_->setObjectName(u"summary"_s);
     summary_->setTextFormat(Qt::PlainText);
     summary_->setWordWrap(true);
-    auto* buttons = new QDialogButtonBox(this);
-    agree_ = buttons->addButton(texts_.Button, QDialogButtonBox::AcceptRole);
-    auto* cancel = buttons->addButton(u"Abbrechen"_s, QDialogButtonBox::RejectRole);
-    agree_->setObjectName(u"agree"_s);
+    const DecisionButtons buttons = MakeDecisionButtons(*this, texts_.Button);
+    agree_ = buttons.Agree;
     agree_->setAutoDefault(false);
-    cancel->setDefault(true);
-    connect(buttons, &QDialogButtonBox::accepted, this, &QDialog::accept);
-    connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
+    buttons.Cancel->setDefault(true);
     auto* caption = new QLabel(u"&Muster:"_s, this);
     caption->setBuddy(pattern_);
     auto* layout = new QVBoxLayout(this);
@@ -109,7 +106,7 @@ void PatternDialog::SetUpLayout() {
     layout->addWidget(pattern_);
     layout->addWidget(table_, 1);
     layout->addWidget(summary_);
-    layout->addWidget(buttons);
+    layout->addWidget(buttons.Box);
     resize(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
 }
 

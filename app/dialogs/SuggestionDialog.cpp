@@ -7,6 +7,7 @@
 #include <QTableView>
 #include <QVBoxLayout>
 
+#include "app/dialogs/DecisionButtons.h"
 #include "app/views/RowList.h"
 #include "app/views/WrappedLabel.h"
 
@@ -105,17 +106,14 @@ void SuggestionDialog::SetUpLayout() {
     table->horizontalHeader()->setSectionResizeMode(QHeaderView::Stretch);
     table->horizontalHeader()->setSectionResizeMode(Rows::Similarity, QHeaderView::ResizeToContents);
     table->horizontalHeader()->setSectionResizeMode(Rows::Reason, QHeaderView::ResizeToContents);
-    auto* buttons = new QDialogButtonBox(this);
-    discard_ = buttons->addButton(QString(), QDialogButtonBox::AcceptRole);
-    auto* cancel = buttons->addButton(u"Abbrechen"_s, QDialogButtonBox::RejectRole);
+    const DecisionButtons buttons = MakeDecisionButtons(*this, QString());
+    discard_ = buttons.Agree;
     discard_->setAutoDefault(false);
-    cancel->setDefault(true);
-    connect(buttons, &QDialogButtonBox::accepted, this, &QDialog::accept);
-    connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
+    buttons.Cancel->setDefault(true);
     auto* layout = new QVBoxLayout(this);
     layout->addWidget(explanation);
     layout->addWidget(table, 1);
-    layout->addWidget(buttons);
+    layout->addWidget(buttons.Box);
     resize(kWidth * fontMetrics().averageCharWidth(), kHeight * fontMetrics().height());
 }
 
