@@ -58,7 +58,6 @@ void BackupDialog::SetUpTable() {
     table_->setModel(model_);
     table_->setItemDelegate(new RowDelegate(table_));
     SetUpRowList(*table_);
-    FitRowsToFont(*table_);
     table_->installEventFilter(this);
     QHeaderView& header = *table_->horizontalHeader();
     header.setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);

@@ -105,7 +105,6 @@ void SimilarArtistsForm::SetUpTable() {
     table_->setModel(shown_);
     table_->setItemDelegate(new RowDelegate(table_));
     SetUpRowList(*table_);
-    FitRowsToFont(*table_);
     table_->setSelectionMode(QTableView::SingleSelection);
     table_->installEventFilter(this);
     QHeaderView& header = *table_->horizontalHeader();
@@ -134,7 +133,6 @@ QSplitter* SimilarArtistsForm::MakeSongLists() {
         auto* list = new QTableView(page);
         list->setModel(songs_[side]);
         SetUpRowList(*list);
-        FitRowsToFont(*list);
         list->setAccessibleName(side == 0 ? u"Songs des ersten Artists"_s : u"Songs des zweiten Artists"_s);
         list->horizontalHeader()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
         list->horizontalHeader()->setSectionResizeMode(QHeaderView::Stretch);

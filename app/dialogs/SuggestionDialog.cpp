@@ -99,7 +99,6 @@ void SuggestionDialog::SetUpLayout() {
     table->setModel(rows_);
     table->setAccessibleName(u"Songs, die gehen"_s);
     SetUpRowList(*table);
-    FitRowsToFont(*table);
     table->setSelectionBehavior(QTableView::SelectItems);  // so that the space bar reaches the tick
     table->setSelectionMode(QTableView::SingleSelection);
     table->setTextElideMode(Qt::ElideMiddle);

@@ -57,7 +57,6 @@ void TCompFilesForm::SetUpTable() {
     table_->setColumnCount(kColumnCount);
     table_->setHorizontalHeaderLabels({u"Feld"_s, u"Titel 1"_s, u"Titel 2"_s});
     SetUpRowList(*table_);
-    FitRowsToFont(*table_);
     table_->setTextElideMode(Qt::ElideMiddle);
     QHeaderView* header = table_->horizontalHeader();
     header->setSectionResizeMode(kName, QHeaderView::ResizeToContents);

@@ -23,6 +23,7 @@ void SetUpRowList(QTableView& view) {
     view.verticalHeader()->hide();
     view.verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
     view.horizontalHeader()->setHighlightSections(false);
+    FitRowsToFont(view);
 }
 
 void FitRowsToFont(QTableView& view) {

@@ -15,7 +15,7 @@ class RowDelegate : public QStyledItemDelegate {
     void initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const override;
 };
 
-// Makes a table a list of rows of one height, of which any number can be selected.
+// Makes a table a list of rows of one height, that of its font, of which any number can be selected.
 void SetUpRowList(QTableView& view);
-// All rows have the height of the view's font, which the header then need not keep for each.
+// For when the font has changed: all rows have its height, which the header then need not keep for each.
 void FitRowsToFont(QTableView& view);

@@ -33,7 +33,6 @@ SongListWidget::SongListWidget(FilteredSongs& songs, TMusicDatabase& database, Q
     SetUpRowList(*this);
     setDragDropMode(DragOnly);
     SetUpHeader();
-    FitRowsToFont(*this);
     ResetColumns();
     FollowModel();
     ShowSortIndicator();

@@ -38,7 +38,6 @@ TSrchDblsListView::TSrchDblsListView(DuplicateListModel& pairs, QWidget* parent)
     setItemDelegate(new RowDelegate(this));
     SetUpRowList(*this);
     SetUpColumns();
-    FitRowsToFont(*this);
     FollowModel();
 }
 

@@ -37,7 +37,6 @@ TVisPlayList::TVisPlayList(TPlayList& list, QWidget* parent) : QTableView(parent
     setDropIndicatorShown(true);
     setDragDropOverwriteMode(false);
     SetUpColumns();
-    FitRowsToFont(*this);
 
     constexpr int kDelay = 120;  // milliseconds after the last scrolling
     lookTimer_.setSingleShot(true);
