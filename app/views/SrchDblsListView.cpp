@@ -47,15 +47,26 @@ void TSrchDblsListView::SetUpColumns() {
     header->setResizeContentsPrecision(0);
     // A header that knew the selection would look through all rows for columns that are selected whole.
     header->setSelectionModel(new QItemSelectionModel(&pairs_, header));
+    header->setSortIndicatorClearable(true);  // a third click: as they were found
+    sortByColumn(-1, Qt::AscendingOrder);
+    setSortingEnabled(true);
     for (int column = 0; column < DuplicateListModel::ColumnCount; ++column)
         setColumnWidth(column, kWidths[column] * logicalDpiX() / kPlainDpi);
+    FitCaptions();
     header->moveSection(Column::Group, 0);
     header->setSectionResizeMode(Column::Title1, QHeaderView::Stretch);
     header->setSectionResizeMode(Column::Title2, QHeaderView::Stretch);
     ShowGroups(false);
-    header->setSortIndicatorClearable(true);  // a third click: as they were found
-    sortByColumn(-1, Qt::AscendingOrder);
-    setSortingEnabled(true);
+}
+
+// A caption is never cut, also not by the arrow of the column that is sorted by, for which the size hint of a
+// header that can sort leaves room. Columns that the user has made wider stay.
+void TSrchDblsListView::FitCaptions() {
+    ensurePolished();
+    const QHeaderView* header = horizontalHeader();
+    for (int column = 0; column < DuplicateListModel::ColumnCount; ++column)
+        if (const int least = header->sectionSizeHint(column); columnWidth(column) < least)
+            setColumnWidth(column, least);
 }
 
 void TSrchDblsListView::ShowGroups(bool shown) {
@@ -125,5 +136,7 @@ void TSrchDblsListView::keyPressEvent(QKeyEvent* event) {
 
 void TSrchDblsListView::changeEvent(QEvent* event) {
     QTableView::changeEvent(event);
-    if (event->type() == QEvent::FontChange || event->type() == QEvent::StyleChange) FitRowsToFont(*this);
+    if (event->type() != QEvent::FontChange && event->type() != QEvent::StyleChange) return;
+    FitRowsToFont(*this);
+    FitCaptions();
 }

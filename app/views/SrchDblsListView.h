@@ -31,6 +31,7 @@ class TSrchDblsListView : public QTableView {
 
  private:
     void SetUpColumns();
+    void FitCaptions();
     void FollowModel();
     void KeepRow();
     void RestoreRow();
