@@ -108,6 +108,7 @@ void DuplicateCommands::Decide(PairDecision decision, const std::vector<Duplicat
     if (decision == PairDecision::KeepBoth) return KeepBoth(pairs);
     if (decision == PairDecision::Ban) return Ban(pairs);
     std::vector<SongReplacement> replacements;
+    replacements.reserve(pairs.size());
     for (const DuplicatePair& pair : pairs)
         replacements.push_back(decision == PairDecision::KeepFirst
                                    ? SongReplacement{.Kept = pair.First, .Dropped = pair.Second}
