@@ -7,6 +7,7 @@
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/intake/IntakeReport.h"
 #include "MusicManagment/database/intake/MissingFiles.h"
+#include "MusicManagment/database/intake/UpdateFolders.h"
 #include "MusicManagment/database/songfiles/Removal.h"
 
 using namespace Qt::StringLiterals;
@@ -156,7 +157,7 @@ void AppendLines(QString& text, const QString& heading, const QStringList& lines
 
 UpdateResult UpdateDatabase(TMusicDatabase& database, UpdateTags tags) {
     RequireFolders(database);
-    MissingFiles missing(database.UpdateFolders());
+    MissingFiles missing(FoldersToSearch(database));
     UpdateResult result;
     {
         const ProgressRun run(database, u"Datenbank updaten"_s);
@@ -179,7 +180,7 @@ UpdateResult UpdateDatabase(TMusicDatabase& database, UpdateTags tags) {
 
 IntakeResult SearchNewSongs(TMusicDatabase& database) {
     RequireFolders(database);
-    IntakeResult result = AddPaths(database, MissingFiles(database.UpdateFolders()).FoldersThere(), true);
+    IntakeResult result = AddPaths(database, MissingFiles(FoldersToSearch(database)).FoldersThere(), true);
     ReportIntake(result);
     return result;
 }
