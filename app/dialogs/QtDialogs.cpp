@@ -161,12 +161,15 @@ std::optional<QString> QtDialogs::ChooseVolume(const QString& caption, const QSt
         const std::vector<VolumeChoice> before = std::exchange(shown, VolumeChoices(preset));
         QStringList captions;
         QString selected;
+        QString come;
         for (const VolumeChoice& volume : shown) {
             captions << volume.Caption;
             const bool isNew =
                 std::ranges::find(before, volume.MountPoint, &VolumeChoice::MountPoint) == before.end();
-            if (volume.MountPoint == chosen || (isNew && !before.empty())) selected = volume.Caption;
+            if (volume.MountPoint == chosen) selected = volume.Caption;
+            if (isNew && !before.empty()) come = volume.Caption;
         }
+        if (!come.isEmpty()) selected = come;
         dialog.setComboBoxItems(captions);
         dialog.setTextValue(selected.isEmpty() ? captions.front() : selected);
     };

@@ -3,6 +3,7 @@
 #include <QAbstractButton>
 #include <QApplication>
 #include <QFileDialog>
+#include <QInputDialog>
 #include <QMainWindow>
 #include <QMessageBox>
 #include <QPushButton>
@@ -21,6 +22,7 @@
 #include "app/dialogs/ReportDisplay.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
+#include "tests/ScriptedVolumes.h"
 
 using namespace Qt::StringLiterals;
 
@@ -80,6 +82,21 @@ TEST(QtDialogs, EachButtonAnswersWithItsPlaceReturnWithTheDefaultAndEscapeCancel
     question.Default = 1;
     EXPECT_EQ(answerTo(press(Qt::Key_Return)), 1);
     EXPECT_EQ(answerTo(press(Qt::Key_Escape)), 2);
+}
+
+TEST(QtDialogs, TheChoiceOfAVolumeGoesToWhatIsPluggedIn) {
+    ScriptedVolumes volumes;
+    volumes.Mount(u"/"_s, 1);
+    volumes.Now[0].Removable = false;
+    QtDialogs dialogs;
+    WithNextDialog<QInputDialog>([&](QInputDialog& dialog) {
+        EXPECT_EQ(dialog.textValue(), u"/"_s);
+        volumes.Mount(u"/media/a"_s, 2, u"STICK"_s);
+        volumes.Changed.Tell();
+        EXPECT_EQ(dialog.comboBoxItems(), (QStringList{u"STICK (/media/a)"_s, u"/"_s}));
+        dialog.accept();
+    });
+    EXPECT_EQ(dialogs.ChooseVolume(u"Urlaub"_s, {}, {}), u"/media/a"_s);
 }
 
 TEST(QtDialogs, FileDialogsSpeakGerman) {
