@@ -130,20 +130,24 @@ void BackupDialog::ShowSummary() {
 }
 
 void BackupDialog::TieSelected(int candidate) {
-    ForSelected([this, candidate](int row) { model_->Tie(row, static_cast<std::size_t>(candidate)); });
+    ForSelected([this, candidate](int row) { return model_->Tie(row, static_cast<std::size_t>(candidate)); });
 }
 
 void BackupDialog::DecideSelected(Kind kind) {
-    ForSelected([this, kind](int row) { model_->Decide(row, kind); });
+    ForSelected([this, kind](int row) {
+        model_->Decide(row, kind);
+        return true;
+    });
 }
 
-void BackupDialog::ForSelected(const std::function<void(int row)>& decide) {
+void BackupDialog::ForSelected(const std::function<bool(int row)>& decide) {
     const QModelIndexList rows = table_->selectionModel()->selectedRows();
+    bool decided = false;
     for (const QModelIndex& row : rows)
-        decide(row.row());
+        decided |= decide(row.row());
     ShowSummary();
     ShowCandidates();
-    if (rows.size() != 1) return;
+    if (rows.size() != 1 || !decided) return;
     const QModelIndex next = rows.front().siblingAtRow(rows.front().row() + 1);
     if (next.isValid()) table_->setCurrentIndex(next);
 }

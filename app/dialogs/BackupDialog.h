@@ -32,10 +32,11 @@ class BackupDialog : public QDialog {
     void SetUpLayout(const QString& name);
     void ShowCandidates();
     void ShowSummary();
-    // For all selected files; a single one then gives way to the next.
+    // For all selected files; a single one that is decided gives way to the next.
     void TieSelected(int candidate);
     void DecideSelected(BackupDecision::Kind kind);
-    void ForSelected(const std::function<void(int row)>& decide);
+    // `decide` tells whether it could.
+    void ForSelected(const std::function<bool(int row)>& decide);
     bool IsDecision(int key);
 
     const TMusicDatabase& database_;
