@@ -2,7 +2,6 @@
 
 #include <QMainWindow>
 #include <QStatusBar>
-#include <QToolButton>
 
 #include "app/dialogs/ReportWindow.h"
 
@@ -22,21 +21,11 @@ void ReportDisplay::OpenWindow(const Report& report, QWidget* parent) {
     window_->show();
 }
 
-// The button stays as long as its line.
 void ReportDisplay::TellInStatusBar(const Report& report, QMainWindow& window) {
-    QStatusBar& bar = *window.statusBar();
-    bar.clearMessage();  // hides the button of the report before
     told_ = report;
-    if (details_ == nullptr) {
-        details_ = new QToolButton(&window);
-        details_->setObjectName(u"reportDetails"_s);
-        details_->setText(u"Details"_s);
-        details_->setToolTip(u"Zeigt, welche Songs es sind"_s);
-        bar.insertPermanentWidget(0, details_);
-        QObject::connect(details_, &QToolButton::clicked, &window,
-                         [this, &window] { OpenWindow(told_, &window); });
-        QObject::connect(&bar, &QStatusBar::messageChanged, details_, &QToolButton::hide);
-    }
-    bar.showMessage(QString(report.Message).replace(u'\n', u' '));
-    details_->setVisible(!report.Sections.empty());
+    window.statusBar()->clearMessage();  // the same line again counts as a new one
+    window.statusBar()->showMessage(QString(report.Message).replace(u'\n', u' '));
+    if (!report.Sections.empty())
+        details_.Show(window, u"Details"_s, u"Zeigt, welche Songs es sind"_s,
+                      [this, &window] { OpenWindow(told_, &window); });
 }

@@ -3,9 +3,9 @@
 #include <QPointer>
 
 #include "CommonRUKTools/Dialogs.h"
+#include "app/views/StatusAction.h"
 
 class QMainWindow;
-class QToolButton;
 class QWidget;
 class ReportWindow;
 
@@ -21,6 +21,6 @@ class ReportDisplay {
     void TellInStatusBar(const Report& report, QMainWindow& window);
 
     QPointer<ReportWindow> window_;
-    QPointer<QToolButton> details_;
+    StatusAction details_{QStringLiteral("reportDetails")};
     Report told_;  // that the button stands for
 };
