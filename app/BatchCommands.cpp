@@ -1,5 +1,10 @@
 #include "app/BatchCommands.h"
 
+#include <QMainWindow>
+#include <QProcess>
+#include <QStandardPaths>
+
+#include "CommonRUKTools/BurningPrograms.h"
 #include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/Command.h"
@@ -46,15 +51,17 @@ BatchCommands::BatchCommands(TMusicDatabase& database, SongListWidget& list)
     handle(mcTagsFromNames, [this] { TakeTagsFromNames(); });
     handle(mcEditBannList, [this] { EditBannList(); });
     handle(mcCacheCdSongs, [this] {
-        RunForMedia(u"Zwischenspeichern aller Songs"_s, u"Zwischenspeichern aller markierter Songs"_s,
-                    CacheSongsCommand);
+        if (const auto songs = AllOrMarked(u"Zwischenspeichern aller Songs"_s,
+                                           u"Zwischenspeichern aller markierter Songs"_s, Preset::Marked))
+            CacheSongsCommand(database_, *songs);
     });
     handle(mcDropCaches, [this] {
-        RunForMedia(u"Zwischenspeicherung aller Songs entfernen"_s,
-                    u"Zwischenspeicherung aller markierter Songs entfernen"_s, DropCachesCommand);
+        if (const auto songs =
+                AllOrMarked(u"Zwischenspeicherung aller Songs entfernen"_s,
+                            u"Zwischenspeicherung aller markierter Songs entfernen"_s, Preset::Nothing))
+            DropCachesCommand(database_, *songs);
     });
-    handle(mcPrepareBurning,
-           [this] { RunForMedia(u"Alle Songs"_s, u"Markierte Songs"_s, PrepareBurningCommand); });
+    handle(mcPrepareBurning, [this] { PrepareBurning(); });
     for (const int id : {mcSetFlag, mcRemoveFlag})
         handle(id, [this, id] { ChangeFlag(id); });
     for (const int id : {mcRemoveFromDisk, mcBan})
@@ -126,19 +133,37 @@ void BatchCommands::RenameByPattern() {
         ReportBatch(MoveSongs(database_, SongCountText(moves.size()) + u" umbenennen"_s, moves));
 }
 
-void BatchCommands::RunForMedia(const QString& all, const QString& marked, MediaCommand command) {
+std::optional<BatchSongs> BatchCommands::AllOrMarked(const QString& all, const QString& marked,
+                                                     Preset preset) const {
     enum Answer { Marked, All, Cancel };
     const auto count = list_.ChosenHandles().size();
-    if (count == 0) return command(database_, AllSongs(database_));
+    if (count == 0) return AllSongs(database_);
     const int answer = UserDialogs().Ask({.Text = u"Für welche Songs? Markiert: "_s + SongCountText(count) +
                                                   u", in der Sammlung: "_s +
                                                   SongCountText(static_cast<std::size_t>(database_.Count())),
                                           .Buttons = {marked, all, u"Abbrechen"_s},
-                                          .Cancel = Cancel});
-    if (answer == Marked)
-        command(database_, Chosen());
-    else if (answer == All)
-        command(database_, AllSongs(database_));
+                                          .Cancel = Cancel,
+                                          .Default = preset == Preset::Marked ? Marked : Cancel});
+    if (answer == Cancel) return std::nullopt;
+    return answer == Marked ? Chosen() : AllSongs(database_);
+}
+
+void BatchCommands::PrepareBurning() {
+    const auto songs = AllOrMarked(u"Alle Songs"_s, u"Markierte Songs"_s, Preset::Marked);
+    const QString folder = songs ? PrepareBurningCommand(database_, *songs) : QString();
+    if (!folder.isEmpty()) OfferBurning(folder);
+}
+
+void BatchCommands::OfferBurning(const QString& folder) {
+    auto* window = qobject_cast<QMainWindow*>(list_.window());
+    const auto call =
+        FindBurningProgram(folder, [](const QString& name) { return QStandardPaths::findExecutable(name); });
+    if (window == nullptr || !call) return;
+    burn_.Show(*window, u"Mit "_s + call->Name + u" brennen"_s,
+               u"Öffnet "_s + folder + u" in "_s + call->Name, [call] {
+                   if (!QProcess::startDetached(call->Program, call->Arguments))
+                       throw EMusicDatabaseException(call->Name + u" lässt sich nicht starten."_s);
+               });
 }
 
 void BatchCommands::TakeTagsFromNames() {

@@ -3,6 +3,7 @@
 #include "CommonRUKTools/Listeners.h"
 #include "MusicManagment/database/batches/BatchSongs.h"
 #include "MusicManagment/database/commands/Settings.h"
+#include "app/views/StatusAction.h"
 
 class SongListWidget;
 
@@ -27,12 +28,15 @@ class BatchCommands : public SettingsClient {
     void RenameByPattern();
     void TakeTagsFromNames();
     void EditBannList();
-    // For all songs or for the marked ones, as the user says.
-    using MediaCommand = void (*)(TMusicDatabase& database, const BatchSongs& songs);
-    void RunForMedia(const QString& all, const QString& marked, MediaCommand command);
+    // All songs or the marked ones, as the user says; nothing on cancel.
+    enum class Preset { Marked, Nothing };  // the answer of the Return key
+    std::optional<BatchSongs> AllOrMarked(const QString& all, const QString& marked, Preset preset) const;
+    void PrepareBurning();
+    void OfferBurning(const QString& folder);
 
     TMusicDatabase& database_;
     SongListWidget& list_;
     QString tagPattern_;  // of the last time that tags were taken from names
+    StatusAction burn_{QStringLiteral("burn")};
     Subscriptions handlers_;
 };

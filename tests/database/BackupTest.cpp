@@ -35,7 +35,8 @@ class BackupTest : public testing::Test {
         return database_.Songs().HandleOf(database_.AddEntry(song.FileName, song, AddAs::Returning));
     }
     void Read() {
-        contents_ = ReadBackup(database_, BackupMediumOf(database_, cd_.Path()), cd_.Path());
+        medium_ = BackupMediumOf(database_, cd_.Path());
+        contents_ = ReadBackup(database_, medium_, cd_.Path());
         candidates_ = MatchBackup(database_, contents_.Files);
         ASSERT_EQ(candidates_.size(), contents_.Files.size());
     }
@@ -51,8 +52,7 @@ class BackupTest : public testing::Test {
         return lines;
     }
     BackupResult Take(const std::vector<BackupDecision>& decisions) {
-        return TakeBackup(database_, BackupMediumOf(database_, cd_.Path()), u"Backup 1"_s, contents_.Files,
-                          decisions);
+        return TakeBackup(database_, medium_, u"Backup 1"_s, contents_.Files, decisions);
     }
 
     SongFolder cd_, disk_;
@@ -60,6 +60,7 @@ class BackupTest : public testing::Test {
     ScriptedDialogs dialogs_;
     Journal journal_{disk_.Path(u"journal.tsj"_s)};
     TMusicDatabase database_;
+    BackupMedium medium_;
     BackupContents contents_;
     std::vector<BackupCandidates> candidates_;
 };
@@ -90,7 +91,10 @@ TEST_F(BackupTest, FilesAreMatchedByNameLengthAndSize) {
                              {Kind::Tie, exact}, {Kind::Tie, alike}, {}, {}, {Kind::TakeIn, {}}}));
     decisions[2] = {Kind::Tie, there};
     decisions[3] = {Kind::Tie, exact};
+    const auto mounted = std::exchange(volumes_.Now, {});  // nobody needs it any more
+    volumes_.Mount(u"/"_s, 7);
     const BackupResult result = Take(decisions);
+    volumes_.Now = mounted;
     EXPECT_EQ(result.Tied, 3);
     EXPECT_EQ(result.Added, 1);
     EXPECT_EQ(result.Failed.size(), 1);

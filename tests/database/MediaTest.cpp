@@ -5,8 +5,10 @@
 #include "MusicManagment/database/CollectionEdit.h"
 #include "MusicManagment/database/batches/BurningBatch.h"
 #include "MusicManagment/database/batches/CacheBatch.h"
+#include "MusicManagment/database/batches/MediaCommands.h"
 #include "MusicManagment/database/intake/Intake.h"
 #include "MusicManagment/database/intake/Update.h"
+#include "MusicManagment/database/intake/UpdateFolders.h"
 #include "MusicManagment/database/media/CataloguedMedia.h"
 #include "tests/PrintQt.h"
 #include "tests/ScriptedDialogs.h"
@@ -107,10 +109,24 @@ TEST_F(MediaTest, AnIntakeKnowsTheSongsOfAMediumWhereverItIs) {
     volumes_.Mount(elsewhere.Path(), kSerial);
     EXPECT_EQ(AddPaths(database_, {elsewhere.Path()}, true).NewFiles,
               QStringList{OnStick(u"Band - Neu.wav"_s)});
+}
 
+TEST_F(MediaTest, AnUpdateFollowsAFolderToWhereItsMediumIs) {
+    database_.SetModernMedia(true);
+    TakeInStick({u"a/Band - Lied.wav"_s});
+    RememberFolders(database_, {stick_.Path(u"a"_s)});
+    QDir(stick_.Path(u"a"_s)).removeRecursively();
     volumes_.Unmount();
-    database_.SetUpdateFolders({elsewhere.Path(u"fort"_s)});
-    EXPECT_TRUE(UpdateDatabase(database_, UpdateTags::Reread).Removed.isEmpty());
+    EXPECT_EQ(UpdateDatabase(database_, UpdateTags::Reread).MissingFolders, stick_.Paths({u"a"_s}));
+    EXPECT_TRUE(database_.Contains(kSong));
+
+    const SongFolder elsewhere;
+    elsewhere.Add({u"a/Band - Lied.wav"_s, u"a/Band - Neu.wav"_s, u"b/Band - Nicht.wav"_s});
+    volumes_.Mount(elsewhere.Path(), kSerial);
+    const UpdateResult update = UpdateDatabase(database_, UpdateTags::Keep);
+    EXPECT_EQ(update.Intake.NewFiles, QStringList{OnStick(u"a\\Band - Neu.wav"_s)});
+    EXPECT_EQ(update.MissingFolders, QStringList());
+    EXPECT_EQ(database_.UpdateFolders(), stick_.Paths({u"a"_s}));
 }
 
 TEST_F(MediaTest, AMediumIsAskedAboutOnce) {
@@ -129,6 +145,37 @@ TEST_F(MediaTest, AMediumIsAskedAboutOnce) {
     EXPECT_EQ(AddStick().Known, 1);
     EXPECT_EQ(database_.CDNameOf(kSong), u"Urlaub"_s);
     EXPECT_EQ(dialogs_.Asked.size(), 3U);
+}
+
+TEST_F(MediaTest, AMediumThatIsPulledWhileItsNameIsAskedForNamesNoOther) {
+    struct Pulling : ScriptedDialogs {
+        std::optional<QString> Input(const QString&, const QString&, const QStringList&,
+                                     const QString&) override {
+            Pull();
+            return u"Urlaub"_s;
+        }
+        std::function<void()> Pull;
+    } dialogs;
+    dialogs.Answers = {0};
+    dialogs.Pull = [this] { volumes_.Now.pop_back(); };
+    database_.SetModernMedia(true);
+    volumes_.Mount(u"/"_s, 7);
+    volumes_.Mount(stick_.Path(), kSerial, u"STICK"_s);
+    EXPECT_THROW(AddStick(), EMusicDatabaseException);
+    EXPECT_TRUE(database_.CDNames().empty());
+}
+
+TEST_F(MediaTest, MediaOfOneLabelAreNamedApart) {
+    database_.AddEntry(kSong, {}, AddAs::Returning);
+    volumes_.Mount(u"/a"_s, 7, u"ROCK"_s);
+    volumes_.Mount(u"/b"_s, kSerial, u"ROCK"_s);
+    dialogs_.Inputs = {u"ROCK (1A2B3C4D)"_s, u" Urlaub "_s, u"Urlaub (1A2B3C4D)"_s, u" "_s};
+    NameMediaCommand(database_);
+    NameMediaCommand(database_);  // an empty name is none
+    EXPECT_TRUE(dialogs_.Inputs.empty());
+    EXPECT_EQ(database_.CDNameOf(kSong), u"Urlaub"_s);
+    database_.SetCDNames({});  // where the user has no list of his own, the database knows it
+    EXPECT_EQ(database_.CDNameOf(kSong), u"Urlaub"_s);
 }
 
 TEST_F(MediaTest, PathsAreComparedWithoutDriveAndMedium) {
@@ -203,7 +250,16 @@ TEST_F(MediaTest, SongsAreCopiedOnceAndOnlyOurCopiesAreRemoved) {
     restarted.OpenDatabase(disk_.Path(u"x.tsdb"_s));
     EXPECT_EQ(restarted.ResolveSongPath(OnStick(u"A - two.wav"_s)), two);
     restarted.AddEntry(one, {});  // a song of its own now
+    // A player that plays a copy goes on with the song on its medium.
+    volumes_.Mount(stick_.Path(), kSerial);
+    restarted.SetModernMedia(true);
+    QStringList played;
+    restarted.OnReleaseFile = [&](const QString& path) {
+        played << path;
+        return [&](const QString& now) { played << now; };
+    };
     EXPECT_EQ(DropCaches(restarted, AllSongs(restarted)).Done, 2);
+    EXPECT_EQ(played, (QStringList{two, stick_.Path(u"A - two.wav"_s)}));
     EXPECT_TRUE(QFile::exists(one) && QFile::exists(there));
     EXPECT_FALSE(QFile::exists(two));
 }

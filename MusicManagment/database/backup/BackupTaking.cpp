@@ -112,7 +112,7 @@ BackupResult TakeBackup(TMusicDatabase& database, const BackupMedium& medium, co
     std::optional<ProgressRun> run(std::in_place, database, u"Lese die Songs einer Backup-CD ein"_s);
     FileBatch batch(CurrentJournal(), &database,
                     u"Backup-CD einlesen ("_s + SongCountText(static_cast<std::size_t>(wanted)) + u')');
-    CatalogueMedium(database, medium.MountPoint, name);
+    NameMedium(database, medium.Serial, name, medium.Label);
     Taking taking(database, batch, result);
     for (std::size_t i = 0; i < files.size(); ++i) {
         if (decisions[i].What == Kind::Tie) taking.Tie(files[i], decisions[i].Song);

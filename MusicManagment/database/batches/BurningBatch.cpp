@@ -4,6 +4,7 @@
 
 #include "CommonRUKTools/Dialogs.h"
 #include "MusicManagment/database/Progress.h"
+#include "MusicManagment/database/media/CataloguedMedia.h"
 #include "MusicManagment/database/songfiles/SongFinder.h"
 #include "ReadMPEGHeader/DisplayTexts.h"
 
@@ -57,7 +58,7 @@ class Preparation {
         if (IsCdPath(song.FileName) && !policy_.Takes(song)) return;
         const QString file = finder_.Find(song.FileName);
         if (file.isEmpty()) {
-            result_.Missing << song.FileName;
+            result_.Missing << PathForPeople(database_, song.FileName);
             return;
         }
         const QString target = FreeTarget(file);
@@ -66,7 +67,7 @@ class Preparation {
             result_.Stopped = !CopyWhole(file, target, progress_);
             if (!result_.Stopped) ++result_.Done;
         } catch (const EStreamError& error) {
-            result_.Failed << song.FileName + u": "_s + error.Message();
+            result_.Failed << PathForPeople(database_, song.FileName) + u": "_s + error.Message();
         }
     }
     bool Stopped() const { return result_.Stopped; }

@@ -7,6 +7,7 @@
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/batches/BatchFrame.h"
 #include "MusicManagment/database/media/CachePlace.h"
+#include "MusicManagment/database/media/CataloguedMedia.h"
 #include "MusicManagment/database/songfiles/SongFinder.h"
 
 using namespace Qt::StringLiterals;
@@ -54,7 +55,7 @@ class Cacher {
         const TID3Tag song = *found;  // a question lets time pass
         const QString file = finder_.Find(song.FileName, {.UseCache = false});
         if (file.isEmpty()) {
-            result_.Missing << song.FileName;
+            result_.Missing << PathForPeople(database_, song.FileName);
             return true;
         }
         const QString place = CachePlace(database_, song);
@@ -63,7 +64,7 @@ class Cacher {
         try {
             result_.Stopped = !CopyWhole(file, place, progress_);
         } catch (const EStreamError& error) {
-            result_.Failed << song.FileName + u": "_s + error.Message();
+            result_.Failed << PathForPeople(database_, song.FileName) + u": "_s + error.Message();
             result_.Stopped = !MayGoOn(database_, u"Die Datei "_s + file +
                                                       u" konnte nicht gecachet werden. "
                                                       "Trotzdem fortfahren?"_s);
@@ -101,8 +102,8 @@ std::vector<SideRow> NotesOf(const TMusicDatabase& database, const BatchSongs& s
     return notes;
 }
 
-// The player lets go of a copy that it plays.
-void RemoveCopy(const TMusicDatabase& database, const QString& copy) {
+// The player lets go of a copy that it plays, and goes on with what the song is found at then.
+void RemoveCopy(TMusicDatabase& database, const QString& song, const QString& copy) {
     if (!FileSource::Exists(copy)) return;
     const auto takeUp = database.OnReleaseFile ? database.OnReleaseFile(copy) : nullptr;
     try {
@@ -111,6 +112,9 @@ void RemoveCopy(const TMusicDatabase& database, const QString& copy) {
         if (takeUp) takeUp(copy);
         throw;
     }
+    if (!takeUp) return;
+    const QString other = database.ResolveSongPath(song, {.Ask = false});
+    takeUp(other.isEmpty() ? copy : other);
 }
 
 }  // namespace
@@ -145,7 +149,7 @@ MediaBatchResult DropCaches(TMusicDatabase& database, const BatchSongs& songs) {
             result.Stopped = CopyProgress{database, i, total}.Reach(note.Value, 0, 0);
             if (result.Stopped) break;
             try {
-                if (!database.Contains(note.Value)) RemoveCopy(database, note.Value);
+                if (!database.Contains(note.Value)) RemoveCopy(database, note.Song, note.Value);
                 database.Side().Remove(kCacheSection, note);
                 ++result.Done;
             } catch (const EStreamError& error) {

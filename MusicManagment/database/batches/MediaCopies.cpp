@@ -43,8 +43,9 @@ bool MayCopy(TMusicDatabase& database, const std::vector<SongHandle>& songs, con
         if (const TID3Tag* song = database.Songs().Find(handle)) needed += SizeOf(*song);
     const qint64 room = RoomIn(folder);
     const bool fits = room < 0 || needed < room;
-    const QString amount = u"Es werden "_s + SongCountText(songs.size()) + u" mit etwa "_s + Amount(needed) +
-                           u" nach "_s + folder + u" kopiert. "_s;
+    const QString amount = (songs.size() == 1 ? u"Es wird "_s : u"Es werden "_s) +
+                           SongCountText(songs.size()) + u" mit etwa "_s + Amount(needed) + u" nach "_s +
+                           folder + u" kopiert. "_s;
     const QString free = room < 0 ? QString() : u"Dort sind "_s + Amount(room) + u" frei. "_s;
     return UserDialogs().Confirm(
         amount + free + (fits ? u"Fortfahren?"_s : u"Das reicht nicht. Trotzdem fortfahren?"_s),

@@ -38,7 +38,11 @@ void AskAbout(TMusicDatabase& database, const Volume& volume) {
         UserDialogs().Input(u"Datenträger katalogisieren"_s, u"Name des Mediums:"_s, {},
                             volume.Label.isEmpty() ? SerialText(volume.Serials.front()) : volume.Label);
     if (!name) throw EAbort();
-    CatalogueMedium(database, volume.MountPoint, *name);
+    const quint32 serial = volume.Serials.front();
+    if (CurrentVolumes().WithSerial(serial) == nullptr)
+        throw EMusicDatabaseException(u"Der Datenträger "_s + DisplayName(volume) +
+                                      u" ist nicht mehr eingelegt."_s);
+    NameMedium(database, serial, *name, volume.Label);
 }
 
 }  // namespace

@@ -39,11 +39,14 @@ QString CatalogueMedium(TMusicDatabase& database, const QString& path, const QSt
         throw EMusicDatabaseException(
             u"Der Datenträger hat keine Seriennummer und kann nicht katalogisiert werden: "_s + path);
     const quint32 known = CataloguedMedia(database).SerialOf(*volume);
-    const quint32 serial = known != 0 ? known : volume->Serials.front();
+    return NameMedium(database, known != 0 ? known : volume->Serials.front(), name, volume->Label);
+}
+
+QString NameMedium(TMusicDatabase& database, quint32 serial, const QString& name, const QString& label) {
     QString given = name.trimmed();
     const QString onMedium = MakeCdPath(serial, u"/"_s);
     if (given.isEmpty() && database.CDNameOf(onMedium) != onMedium) return database.CDNameOf(onMedium);
-    if (given.isEmpty()) given = volume->Label.isEmpty() ? SerialText(serial) : volume->Label;
+    if (given.isEmpty()) given = label.isEmpty() ? SerialText(serial) : label;
     std::vector<CdName> names = database.CDNames();
     names.push_back({given, serial});  // of one serial number the last counts
     database.SetCDNames(std::move(names));
@@ -52,6 +55,11 @@ QString CatalogueMedium(TMusicDatabase& database, const QString& path, const QSt
     database.Side().Add(kMediumNames, {SerialText(serial), given});
     database.SetModified(true);
     return given;
+}
+
+QString PathForPeople(const TMusicDatabase& database, const QString& path) {
+    const QString name = database.CDNameOf(path);
+    return name != path ? u'[' + name + u"] "_s + PathOnMedium(path) : path;
 }
 
 QString FileWithinReach(const TMusicDatabase& database, const QString& path) {

@@ -31,6 +31,12 @@ class CataloguedMedia {
 // that it has, its label or its serial number. Returns the name. Throws EMusicDatabaseException where the
 // volume has no serial number or cannot be told.
 QString CatalogueMedium(TMusicDatabase& database, const QString& path, const QString& name = QString());
+// The same for a medium that is known by its number and need not be there any more.
+QString NameMedium(TMusicDatabase& database, quint32 serial, const QString& name, const QString& label);
+
+// A stored path as messages show it: "[Urlaub] \Lieder\a.mp3" of a song on a medium that has a name.
+QString PathForPeople(const TMusicDatabase& database, const QString& path);
+
 // What views ask for each song that they draw, so that no disk is looked at: the file on the medium where it
 // is mounted, else the copy that is noted; empty where there is neither. An ordinary path is its own answer.
 QString FileWithinReach(const TMusicDatabase& database, const QString& path);
