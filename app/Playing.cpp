@@ -10,6 +10,7 @@
 #include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/CommandRunner.h"
 #include "MusicManagment/database/Command.h"
+#include "MusicManagment/database/media/CataloguedMedia.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "MusicManagment/playlist/PlayListMenu.h"
 #include "app/MenuIcons.h"
@@ -74,6 +75,8 @@ Playing::Playing(QMainWindow& window, TMusicDatabase& database, SongListWidget& 
     handlers_ += database.Commands().Handle(mcPlay, {.Run = [this] { PlayChosen(); }});
     handlers_ += database.Commands().Handle(mcAddToPlayList, {.Run = [this] { AddChosen(); }});
     handlers_ += player_.Commands().Handle(plPlay, {.Run = [this] { Play(); }});
+    subscriptions_ +=
+        database.Events().MediaChanged.Subscribe([this] { listForm_->View().LookForFilesSoon(); });
     database.OnMarkSong = [this](TMusicDatabase&, SongIndex song) {
         if (!songs_.FocusSong(song) && OnDone) OnDone(u"Der Filter zeigt dieses Lied nicht."_s);
     };
@@ -249,8 +252,11 @@ void Playing::PlayChosenEntry(int index, SongIndex hint) {
 
 void Playing::PlayEntry(int index, SongIndex hint) {
     const QString name = list_.Entry(index).Name;
-    if (!list_.PlayEntry(index, {.Change = player_.ChangeOnDemand(), .DatabaseHint = hint}))
-        throw EPlayListException(u"Die Datei ist nicht verfügbar: "_s + name);
+    if (list_.PlayEntry(index, {.Change = player_.ChangeOnDemand(), .DatabaseHint = hint})) return;
+    // That its medium is not at hand the user has just said himself.
+    const QString file = FileWithinReach(database_, name);
+    if (!file.isEmpty()) throw EPlayListException(u"Die Datei ist nicht verfügbar: "_s + file);
+    if (OnDone) OnDone(u"Der Datenträger ist nicht eingelegt: "_s + PathForPeople(database_, name));
 }
 
 // --- Files ---

@@ -8,6 +8,7 @@
 #include <utility>
 
 #include "MusicManagment/database/MusicManagment.h"
+#include "MusicManagment/database/media/CataloguedMedia.h"
 #include "MusicManagment/playlist/ListNames.h"
 #include "ReadMPEGHeader/DisplayTexts.h"
 #include "app/desktop/Icons.h"
@@ -121,8 +122,11 @@ void PlayListModel::LookForFiles(int first, int last) {
             continue;
         }
         const QString path = list_.MusicDatabase()->ResolveSongPath(name, {.Ask = false});
-        paths_.insert(name, path);
         if (!path.isEmpty()) wanted << path;
+        const auto before = paths_.constFind(name);
+        if (before != paths_.constEnd() && *before == path) continue;
+        paths_.insert(name, path);
+        ShowAgain(row, row);
     }
     files_.LookFor(wanted);
 }
@@ -229,7 +233,8 @@ QVariant PlayListModel::Font(int row) const {
 
 QString PlayListModel::ToolTip(int row) const {
     const QString& name = list_.Entry(row).Name;
-    QStringList lines(name);
+    const TMusicDatabase* database = list_.MusicDatabase();
+    QStringList lines(database != nullptr ? PathForPeople(*database, name) : name);
     if (const int place = QueuePlace(row); place > 0)
         lines << (place == 1 ? u"Wird als Nächstes gespielt"_s
                              : u"Wird als %1. der Warteschlange gespielt"_s.arg(place));

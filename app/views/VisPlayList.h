@@ -26,6 +26,8 @@ class TVisPlayList : public QTableView, public PlayListView {
     // Exchanges the selected entries with the one above or below them.
     void MoveSelected(int step);
     void ShowEntry(int index);
+    // Shows in a moment which of the songs in sight are there now.
+    void LookForFilesSoon();
 
     std::vector<int> SelectedEntries() const override;
     int CurrentEntry() const override { return currentIndex().row(); }
@@ -53,7 +55,6 @@ class TVisPlayList : public QTableView, public PlayListView {
     void SetUpColumns();
     void FitColumns();
     void CountChanged();
-    void LookForFilesSoon();
     void LookForFiles();
     int DropRow(const QPoint& position) const;
     void ChooseAction(QDropEvent& event) const;

@@ -8,6 +8,7 @@
 #include <QUrl>
 
 #include "tests/PrintQt.h"
+#include "tests/ScriptedVolumes.h"
 #include "tests/app/Songs.h"
 #include "tests/database/SongFolder.h"
 #include "tests/playlist/ScriptedPlayer.h"
@@ -109,7 +110,7 @@ TEST_F(PlayListModelTest, QueuedEntriesCarryTheirPlace) {
 
 TEST_F(PlayListModelTest, OnlyFilesThatWereLookedForAndNotFoundAreGrey) {
     list_.Insert(1, {.Name = folder_.Path(u"fehlt.mp3"_s)});
-    list_.Insert(2, {.Name = u":00000001:\\Lied.mp3"_s});
+    list_.Insert(2, {.Name = u":00000001:\\a.mp3"_s});
     list_.Insert(3, {.Name = u"http://radio.example/live.mp3"_s});
     list_.Insert(list_.Count(), {.Name = folder_.Path(u"fehlt auch.mp3"_s)});
     EXPECT_FALSE(IsGrey(1));
@@ -120,6 +121,16 @@ TEST_F(PlayListModelTest, OnlyFilesThatWereLookedForAndNotFoundAreGrey) {
     EXPECT_TRUE(IsGrey(2));
     EXPECT_FALSE(IsGrey(3));
     EXPECT_FALSE(IsGrey(7));
+
+    ScriptedVolumes volumes;
+    volumes.Mount(folder_.Path(), 1);
+    database_.SetModernMedia(true);
+    QStringList shown;
+    QObject::connect(&model_, &PlayListModel::dataChanged, &model_,
+                     [&](const QModelIndex& first) { shown << QString::number(first.row()); });
+    model_.LookForFiles(0, 4);
+    EXPECT_FALSE(IsGrey(2));
+    EXPECT_EQ(shown, QStringList{u"2"_s});
 }
 
 // --- Drag and drop ---

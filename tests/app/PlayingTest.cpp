@@ -181,6 +181,13 @@ TEST_F(PlayingTest, ASongThatIsGoneIsToldAndTheOtherPlaysOn) {
     QFile::remove(Path(1));
     View().OnPlay(1);
     EXPECT_EQ(dialogs_.Messages, QStringList(u"Die Datei ist nicht verfügbar: "_s + Path(1)));
+    // Of one whose medium the user does not want to look for he need not be told with a window.
+    playing_->PlayList().Insert(2, {.Name = u":00000001:\\a.mp3"_s});
+    database_.SetCDNames({{u"Urlaub"_s, 1}});
+    View().OnPlay(2);
+    EXPECT_EQ(dialogs_.Prompts.size(), 1);
+    EXPECT_EQ(dialogs_.Messages.size(), 1);
+    EXPECT_EQ(told_, u"Der Datenträger ist nicht eingelegt: [Urlaub] \\a.mp3"_s);
     EXPECT_EQ(Sounding(), u"0"_s);
     EXPECT_EQ(song_.Status, psPlaying);
 }
