@@ -1,5 +1,6 @@
 #include "MusicManagment/database/batches/CacheBatch.h"
 
+#include <QScopeGuard>
 #include <algorithm>
 
 #include "CommonRUKTools/Dialogs.h"
@@ -102,19 +103,14 @@ std::vector<SideRow> NotesOf(const TMusicDatabase& database, const BatchSongs& s
     return notes;
 }
 
-// The player lets go of a copy that it plays, and goes on with what the song is found at then.
-void RemoveCopy(TMusicDatabase& database, const QString& song, const QString& copy) {
+// The player lets go of a copy that it plays, and stops where that is gone.
+void RemoveCopy(const TMusicDatabase& database, const QString& copy) {
     if (!FileSource::Exists(copy)) return;
     const auto takeUp = database.OnReleaseFile ? database.OnReleaseFile(copy) : nullptr;
-    try {
-        RemoveIfThere(copy);
-    } catch (const EStreamError&) {
+    const auto giveBack = qScopeGuard([&] {
         if (takeUp) takeUp(copy);
-        throw;
-    }
-    if (!takeUp) return;
-    const QString other = database.ResolveSongPath(song, {.Ask = false});
-    takeUp(other.isEmpty() ? copy : other);
+    });
+    RemoveIfThere(copy);
 }
 
 }  // namespace
@@ -149,7 +145,7 @@ MediaBatchResult DropCaches(TMusicDatabase& database, const BatchSongs& songs) {
             result.Stopped = CopyProgress{database, i, total}.Reach(note.Value, 0, 0);
             if (result.Stopped) break;
             try {
-                if (!database.Contains(note.Value)) RemoveCopy(database, note.Song, note.Value);
+                if (!database.Contains(note.Value)) RemoveCopy(database, note.Value);
                 database.Side().Remove(kCacheSection, note);
                 ++result.Done;
             } catch (const EStreamError& error) {
