@@ -96,7 +96,9 @@ class TPlayList::Search {
         const QString song = list_.NameAt(index);
         if (tried_.contains(song)) return false;  // listed twice it would fail twice
         tried_.insert(song);
+        if (refused_.contains(SerialOfCdPath(song)) && IsAway(song)) return false;
         outcome_ = Play(index, song, record);
+        if (outcome_ == Outcome::Failed && IsAway(song)) refused_.insert(SerialOfCdPath(song));
         if (outcome_ == Outcome::Playing) list_.roundIsOver_ = false;
         return outcome_ != Outcome::Failed;
     }
@@ -104,6 +106,10 @@ class TPlayList::Search {
     bool CurrentGoesOn() const { return outcome_ == Outcome::CurrentGoesOn; }
 
  private:
+    bool IsAway(const QString& song) const {
+        return IsCdPath(song) && list_.ResolvedPath(song, {.Ask = false}).isEmpty();
+    }
+
     Outcome Play(int index, const QString& song, bool record) {
         const QScopedValueRollback<bool> searching(list_.searching_, true);
         try {
@@ -120,6 +126,7 @@ class TPlayList::Search {
     TPlayList& list_;
     SongChange change_;
     QSet<QString> tried_;
+    QSet<quint32> refused_;  // serial numbers of media that the user has not put in
     Outcome outcome_ = Outcome::Failed;
 };
 

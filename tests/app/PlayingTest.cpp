@@ -188,6 +188,9 @@ TEST_F(PlayingTest, ASongThatIsGoneIsToldAndTheOtherPlaysOn) {
     EXPECT_EQ(dialogs_.Prompts.size(), 1);
     EXPECT_EQ(dialogs_.Messages.size(), 1);
     EXPECT_EQ(told_, u"Der Datenträger ist nicht eingelegt: [Urlaub] \\a.mp3"_s);
+    playing_->PlayList().Insert(3, {.Name = u":00000001:\\b.mp3"_s});
+    playing_->PlayList().PlayNext();
+    EXPECT_EQ(dialogs_.Prompts.size(), 2);  // once a search, not once a song
     EXPECT_EQ(Sounding(), u"0"_s);
     EXPECT_EQ(song_.Status, psPlaying);
 }
