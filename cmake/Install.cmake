@@ -4,6 +4,7 @@ include(GNUInstallDirs)
 set(data ${PROJECT_SOURCE_DIR}/data)
 
 install(TARGETS tunestead-cli)
+install(PROGRAMS ${data}/tunestead-wma.sh DESTINATION ${CMAKE_INSTALL_PREFIX}/lib/tunestead)
 install(FILES ${data}/man/tunestead-cli.1 DESTINATION ${CMAKE_INSTALL_MANDIR}/man1)
 if(TARGET tunestead)
   install(TARGETS tunestead)

@@ -2,9 +2,9 @@
 
 build_packages=(g++ cmake ninja-build ccache pkg-config qt6-base-dev libgl1-mesa-dev zlib1g-dev
     libsdl2-dev libavformat-dev libavcodec-dev libswresample-dev libavutil-dev libopenmpt-dev libfluidsynth-dev
-    libfftw3-dev libmpg123-dev libsndfile1-dev libgstreamer1.0-dev libgstreamer-plugins-base1.0-dev)
-# What the programs look for only when they run: sounds for MIDI, the system's player and its decoders.
-sound_packages=(timgm6mb-soundfont gstreamer1.0-plugins-base gstreamer1.0-plugins-good gstreamer1.0-plugins-ugly
+    libfftw3-dev libmp3lame-dev libmpg123-dev libsndfile1-dev libgstreamer1.0-dev libgstreamer-plugins-base1.0-dev)
+# What the programs look for only when they run: sounds for MIDI, what makes WMA, the system's player and its decoders.
+sound_packages=(timgm6mb-soundfont ffmpeg gstreamer1.0-plugins-base gstreamer1.0-plugins-good gstreamer1.0-plugins-ugly
     gstreamer1.0-plugins-bad gstreamer1.0-libav gstreamer1.0-alsa)
 desktop_packages=(libqt6svg6 qt6-translations-l10n breeze-icon-theme xdg-utils fonts-dejavu-core "${sound_packages[@]}")
 test_packages=(libgtest-dev libbenchmark-dev libtag1-dev libsqlite3-dev clang-format clang-tidy jq dbus

@@ -86,12 +86,19 @@ inline constexpr std::tuple kOwn{kAutoSave,
 inline constexpr auto kAll = std::tuple_cat(kOwn, kRules);
 
 // Of the format conversion. The records belong to the encoders.
-inline constexpr MemberSetting kWav{Setting<QByteArray>{u"WAVEncoderSettings", 12}, &ConversionSettings::Wav};
-inline constexpr MemberSetting kMp3{Setting<QByteArray>{u"MP3EncoderSettings", 12}, &ConversionSettings::Mp3};
-inline constexpr MemberSetting kWma{Setting<QByteArray>{u"WMAEncoderSettings", 10}, &ConversionSettings::Wma};
+inline constexpr MemberSetting kWav{Setting<QByteArray>{u"WAVEncoderSettings", kWavRecordSize},
+                                    &ConversionSettings::Wav};
+inline constexpr MemberSetting kMp3{Setting<QByteArray>{u"MP3EncoderSettings", kMp3RecordSize},
+                                    &ConversionSettings::Mp3};
+inline constexpr MemberSetting kWma{Setting<QByteArray>{u"WMAEncoderSettings", kWmaRecordSize},
+                                    &ConversionSettings::Wma};
 inline constexpr MemberSetting kLastMusicFormat{Setting<int>{u"LastMusicFormat", 0, 0, 255},
                                                 &ConversionSettings::LastMusicFormat};
-inline constexpr std::tuple kConversion{kWav, kMp3, kWma, kLastMusicFormat};
+inline constexpr MemberSetting kWmaScript{Setting<QString>{u"WMAEncoderScript"},
+                                          &ConversionSettings::WmaScript};
+inline constexpr MemberSetting kWmaArguments{Setting<QString>{u"WMAEncoderArguments"},
+                                             &ConversionSettings::WmaArguments};
+inline constexpr std::tuple kConversion{kWav, kMp3, kWma, kLastMusicFormat, kWmaScript, kWmaArguments};
 
 // Of the remote control: whether other programs may use it.
 inline constexpr Setting<bool> kRCEnabled{u"RCEnabled", true};

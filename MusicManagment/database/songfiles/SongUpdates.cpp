@@ -5,6 +5,7 @@
 #include <algorithm>
 
 #include "CommonRUKTools/Dialogs.h"
+#include "CommonRUKTools/FileWork.h"
 #include "MusicManagment/database/BannList.h"
 #include "MusicManagment/database/Progress.h"
 #include "MusicManagment/database/journal/FileBatch.h"
@@ -119,6 +120,34 @@ class SongChanges {
         TakeOut(std::move(item), hasFile, false);
     }
 
+    void Substitute(const SongSubstitute& other) {
+        const TID3Tag* song = database_.Songs().Find(other.Song);
+        if (song == nullptr || song->FileName != other.Source || !StateOf(other.File).Exists()) return;
+        const TID3Tag before = *song;
+        SongItem item{.Song = other.Song, .Record = RecordWithSound(before, other)};
+        const auto restore = Release(other.Source);
+        item.Steps.Trash(other.Source).Record(before, item.Record);
+        item.Count = 2;
+        Add(std::move(item));
+        // The other file may get the very name that this step has made free.
+        batch_.Settle();
+        const TID3Tag* after = database_.Songs().Find(other.Song);
+        if (after != nullptr && after->FileName == other.File)
+            MoveTo({.Song = other.Song, .Record = *after},
+                   RenameTarget(database_, NameInsteadOf(other), *after));
+        if (!restore) return;
+        batch_.Settle();
+        after = database_.Songs().Find(other.Song);
+        restore(after != nullptr ? after->FileName : other.Source);
+    }
+
+    // When everything is done that was to be: files that no song has got.
+    void RemoveUnused(const std::vector<SongSubstitute>& substitutes) {
+        batch_.Settle();
+        for (const SongSubstitute& other : substitutes)
+            if (StateOf(other.Source).Exists() && !database_.Contains(other.File)) RemoveUnused(other.File);
+    }
+
     BatchResult Finish() {
         batch_.Settle();
         run_.reset();  // saving is a run of its own
@@ -179,6 +208,39 @@ class SongChanges {
                                             : path + u": "_s + done.Message);
         });
         batch_.Add(std::move(item.Steps));
+    }
+
+    static TID3Tag RecordWithSound(const TID3Tag& song, const SongSubstitute& other) {
+        TID3Tag record = song;
+        record.FileName = other.File;
+        record.MPEGLayer = other.Sound.MPEGLayer;
+        record.Length = other.Sound.Length;
+        record.BitRate = other.Sound.BitRate;
+        record.SampleRate = other.Sound.SampleRate;
+        record.ChannelMode = other.Sound.ChannelMode;
+        record.Emphasis = other.Sound.Emphasis;
+        record.Private = other.Sound.Private;
+        record.Protected = other.Sound.Protected;
+        record.Copyrighted = other.Sound.Copyrighted;
+        record.Original = other.Sound.Original;
+        record.Padding = other.Sound.Padding;
+        record.FrameSize = other.Sound.FrameSize;
+        return record;
+    }
+
+    // The name of the song's file with the ending of the other one.
+    static QString NameInsteadOf(const SongSubstitute& other) {
+        const QString ending = other.File.mid(other.File.lastIndexOf(u'.'));
+        const qsizetype dot = other.Source.lastIndexOf(u'.');
+        return (dot > LastSeparator(other.Source) ? other.Source.left(dot) : other.Source) + ending;
+    }
+
+    void RemoveUnused(const QString& file) {
+        try {
+            RemoveIfThere(file);
+        } catch (const EStreamError& error) {
+            result_.Failed << error.Message();
+        }
     }
 
     // Adds the item and what takes the song to its target.
@@ -306,6 +368,17 @@ BatchResult ReplaceSongs(TMusicDatabase& database, const QString& caption,
         if (!changes.Next()) break;
         changes.Replace(songs);
     }
+    return changes.Finish();
+}
+
+BatchResult SubstituteFiles(TMusicDatabase& database, const QString& caption,
+                            const std::vector<SongSubstitute>& substitutes) {
+    SongChanges changes(database, caption, caption, substitutes.size());
+    for (const SongSubstitute& other : substitutes) {
+        if (!changes.Next()) break;
+        changes.Substitute(other);
+    }
+    changes.RemoveUnused(substitutes);
     return changes.Finish();
 }
 

@@ -74,6 +74,18 @@ struct SongReplacement {
 BatchResult ReplaceSongs(TMusicDatabase& database, const QString& caption,
                          const std::vector<SongReplacement>& replacements);
 
+// Another file that holds the piece of music of a song.
+struct SongSubstitute {
+    SongHandle Song{};
+    QString Source{};  // the song's file when the other was made of it
+    QString File{};    // the other one; whole, and no song of the collection
+    TID3Tag Sound{};   // its record, of which what is about the sound counts
+};
+// Moves the songs' files into the recycle bin; the songs then have the others, under the names that theirs
+// would have by the settings. A file whose song stays as it is goes again.
+BatchResult SubstituteFiles(TMusicDatabase& database, const QString& caption,
+                            const std::vector<SongSubstitute>& substitutes);
+
 // The database's operation to replace one song's record, a command of its own: returns the song's place, -1
 // when it has gone.
 SongIndex UpdateSongEntry(TMusicDatabase& database, SongIndex index, const TID3Tag& info, bool rename);

@@ -119,6 +119,11 @@ void FFmpegFile::OpenContainer(const QString& path) {
         options.Set("sample_rate", "44100");
         options.Set("ch_layout", "stereo");
     }
+    // Only where the name says so: whoever plays sound files asks for no pictures.
+    if (path.endsWith(u".avi"_s, Qt::CaseInsensitive)) {
+        forced = av_find_input_format("avi");
+        options.Set("format_whitelist", "avi");
+    }
     AVFormatContext* opened = nullptr;
     // The prefix keeps a name with a colon in it from being taken for another protocol.
     Checked(
@@ -147,6 +152,15 @@ void FFmpegFile::OpenDecoder() {
 
 int FFmpegFile::Rate() const {
     return codec_->sample_rate;
+}
+
+int FFmpegFile::Channels() const {
+    return codec_->ch_layout.nb_channels;
+}
+
+bool FFmpegFile::FitsIn16Bits() const {
+    constexpr int kBytes = 2;
+    return av_get_bytes_per_sample(codec_->sample_fmt) <= kBytes;
 }
 
 // The time stamp of the first sample that is heard.

@@ -21,7 +21,9 @@ class FFmpegFile {
     FFmpegFile(const QString& path, LengthBy lengthBy);
     ~FFmpegFile();
 
-    int Rate() const;                                // Hz, above 0
+    int Rate() const;  // Hz, above 0
+    int Channels() const;
+    bool FitsIn16Bits() const;                       // its samples lose nothing in 16 bits
     std::int64_t Length() const { return length_; }  // samples a channel, at Rate()
 
     // The next decoded frame, good until the next call; nullptr at the end. Damage is passed over.

@@ -27,7 +27,11 @@ void FFmpegSource::ResamplerDeleter::operator()(SwrContext* context) const {
 }
 
 FFmpegSource::FFmpegSource(const QString& path, FFmpegFile::LengthBy lengthBy, int rate)
-    : file_(path, lengthBy), rate_(rate) {
+    : FFmpegSource(path, lengthBy, [rate](int) { return rate; }) {}
+
+FFmpegSource::FFmpegSource(const QString& path, FFmpegFile::LengthBy lengthBy,
+                           const std::function<int(int fileRate)>& rateFor)
+    : file_(path, lengthBy), rate_(rateFor(file_.Rate())) {
     length_ = static_cast<std::uint64_t>(ToMixRate(file_.Length()));
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <memory>
 #include <vector>
 
@@ -13,11 +14,16 @@ class FFmpegSource : public SoundSource {
  public:
     // Throws ESoundFileError. `rate` in Hz.
     FFmpegSource(const QString& path, FFmpegFile::LengthBy lengthBy, int rate);
+    // The rate follows from that of the file.
+    FFmpegSource(const QString& path, FFmpegFile::LengthBy lengthBy,
+                 const std::function<int(int fileRate)>& rateFor);
     ~FFmpegSource() override;
 
     std::size_t Read(float* stereo, std::size_t frames) override;
     std::uint64_t Seek(std::uint64_t frame) override;
     std::uint64_t Length() const override { return length_; }
+    int Rate() const { return rate_; }
+    const FFmpegFile& File() const { return file_; }
 
  private:
     struct ResamplerDeleter {

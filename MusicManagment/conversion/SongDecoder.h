@@ -1,0 +1,28 @@
+#pragma once
+
+#include <QString>
+#include <functional>
+#include <memory>
+
+#include "MusicManagment/playback/fmod/SoundSource.h"
+
+// A song as the stereo samples that it is converted from.
+struct DecodedSong {
+    std::unique_ptr<SoundSource> Source{};
+    int Rate = 0;               // Hz
+    bool IsMono = false;        // both sides are the same
+    bool FitsIn16Bits = false;  // samples of 16 bits hold them as they are
+};
+
+// Opens everything that the player decodes itself: sound files, tracker songs and MIDI. `rateFor` gets the
+// rate of the file, which for songs that are played by notes is 44100, and says at which it is to be decoded.
+// Throws ESoundFileError.
+DecodedSong OpenDecodedSong(const QString& path, const std::function<int(int ownRate)>& rateFor);
+
+// The length of a sound file in samples a channel at its own rate, by all its packets. Throws
+// ESoundFileError.
+struct SoundLength {
+    std::int64_t Samples = 0;
+    int Rate = 0;  // Hz
+};
+SoundLength MeasureSound(const QString& path);
