@@ -12,9 +12,10 @@ using namespace Qt::StringLiterals;
 namespace {
 
 constexpr std::array kCommands = {
-    &kInfoCommand, &kScanCommand,       &kListCommand,           &kGroupsCommand,   &kSaveCommand,
-    &kTagCommand,  &kRenameCommand,     &kBatchCommand,          &kBanCommand,      &kTrashCommand,
-    &kUndoCommand, &kDuplicatesCommand, &kSimilarArtistsCommand, &kPlaylistCommand, &kPlayCommand};
+    &kInfoCommand,   &kScanCommand,       &kListCommand,           &kGroupsCommand,   &kSaveCommand,
+    &kTagCommand,    &kRenameCommand,     &kBatchCommand,          &kBanCommand,      &kTrashCommand,
+    &kUndoCommand,   &kDuplicatesCommand, &kSimilarArtistsCommand, &kPlaylistCommand, &kPlayCommand,
+    &kConvertCommand};
 
 bool IsHelp(const QString& word) {
     return word == u"--help"_s || word == u"-h"_s;

@@ -32,6 +32,7 @@ extern const CommandRow kTrashCommand;
 extern const CommandRow kUndoCommand;
 extern const CommandRow kDuplicatesCommand;
 extern const CommandRow kSimilarArtistsCommand;
+extern const CommandRow kConvertCommand;
 
 // All of them, in the order of the help.
 std::span<const CommandRow* const> AllCommands();

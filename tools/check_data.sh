@@ -28,7 +28,7 @@ pages_lack() {
     done < <(options "$@")
 }
 complaints+=$(pages_lack man/tunestead.1 "$programs/tunestead")
-for command in info scan list groups save playlist play; do
+for command in info scan list groups save playlist play convert; do
     complaints+=$(pages_lack man/tunestead-cli.1 "$programs/tunestead-cli" "$command")
 done
 
