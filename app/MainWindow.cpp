@@ -26,6 +26,7 @@
 #include "MusicManagment/database/intake/IntakeReport.h"
 #include "app/ArrangementCommands.h"
 #include "app/BatchCommands.h"
+#include "app/ConversionCommands.h"
 #include "app/CommandMenu.h"
 #include "app/DuplicateCommands.h"
 #include "app/ExtraCommands.h"
@@ -156,6 +157,7 @@ void TTunesteadMainWnd::SetUpStatusBar() {
 void TTunesteadMainWnd::SetUpMenu() {
     songCommands_ = std::make_unique<SongCommands>(database_, *list_, journal_);
     batchCommands_ = std::make_unique<BatchCommands>(database_, *list_);
+    conversionCommands_ = std::make_unique<ConversionCommands>(database_, *list_);
     duplicateCommands_ = std::make_unique<DuplicateCommands>(database_, *list_, *playing_);
     extraCommands_ = std::make_unique<ExtraCommands>(*this, database_);
     songCommands_->OnOpenDatabase = [this](const QString& path) { commands_.OpenFile(path); };

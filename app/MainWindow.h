@@ -20,6 +20,7 @@
 #include "app/models/SongListModel.h"
 
 class ArrangementCommands;
+class ConversionCommands;
 class EmptyState;
 class ExtraCommands;
 class FilterField;
@@ -107,6 +108,7 @@ class TTunesteadMainWnd : public QMainWindow {
     std::unique_ptr<ArrangementCommands> arrangement_;
     std::unique_ptr<SongCommands> songCommands_;
     std::unique_ptr<BatchCommands> batchCommands_;
+    std::unique_ptr<ConversionCommands> conversionCommands_;
     std::unique_ptr<ExtraCommands> extraCommands_;
     std::unique_ptr<SettingsCommands> settingsCommands_;
     std::unique_ptr<MainMenu> menu_;

@@ -133,6 +133,11 @@ int MpegRate(int rate) {
 
 }  // namespace
 
+MusicFormat FormatOf(int number) {
+    const bool isOne = number >= 0 && number < static_cast<int>(std::size(kMusicFormats));
+    return isOne ? static_cast<MusicFormat>(number) : MusicFormat::Mp3;
+}
+
 QString NameOf(MusicFormat format) {
     return ExtensionOf(format).mid(1).toUpper();
 }

@@ -11,6 +11,8 @@
 enum class MusicFormat : quint8 { Mp3, Wav, Wma };
 inline constexpr MusicFormat kMusicFormats[] = {MusicFormat::Mp3, MusicFormat::Wav, MusicFormat::Wma};
 
+// That of a number; MP3 for a number that is none.
+MusicFormat FormatOf(int number);
 // "MP3", and as the end of a file's name: ".mp3".
 QString NameOf(MusicFormat format);
 QString ExtensionOf(MusicFormat format);

@@ -63,6 +63,7 @@ enum MenuCommand : int {
     mcRenameByPattern = 605,
     mcEditBannList = 606,
     mcTagsFromNames = 607,
+    mcConvertMarked = 608,
     mcAllSongsSubmenu = 610,
     mcAdaptAllGenres = 611,
     mcSetFlagOfAll = 612,

@@ -16,6 +16,9 @@ inline constexpr Setting<QByteArray> kSongListColumns{u"SongListColumns"};
 inline constexpr Setting<int> kSongListFlag{u"SongListFlag", 0, 0, sfRemixed};
 // By which tags were read from the names of files last; empty: that of the files' names.
 inline constexpr Setting<QString> kTagsFromNamesPattern{u"TagsFromNamesPattern"};
+// Where converted songs go: beside their sources, into the folder, in their place.
+inline constexpr Setting<int> kConversionPlace{u"ConversionPlace", 0, 0, 2};
+inline constexpr Setting<QString> kConversionFolder{u"ConversionFolder"};
 inline constexpr Setting<QString> kLinkPath{u"LinkPath"};
 // Absent counts as true.
 inline constexpr Setting<bool> kFirstTime{u"FirstTime", true};

@@ -29,7 +29,7 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr int kTabs = 7;
+constexpr int kTabs = 8;
 
 class OptionsFormTest : public testing::Test {
  protected:

@@ -38,6 +38,8 @@ constexpr DatabaseCommand kRows[] = {
     {.Id = mcRemoveFlag, .Caption = u"Flag entfernen...", .For = kWriting},
     {.Id = mcRereadTags, .Caption = u"ID3-Tags neu einlesen...", .For = kWriting},
     {.Id = mcRemoveTags, .Caption = u"ID3-Tags entfernen...", .For = kWriting},
+    {.Id = mcConvert, .Caption = u"Song konvertieren"},
+    {.Id = mcConvertMarked, .Caption = u"Konvertieren...", .For = kWriting},
     {.Id = mcAdaptAllGenres, .Caption = u"Genre aller Songs anpassen", .Run = AdaptAll},
     {.Id = mcSetFlagOfAll, .Caption = u"Flag für alle Songs setzen...", .Run = ChangeFlagOfAll},
     {.Id = mcRemoveFlagOfAll, .Caption = u"Flag für alle Songs entfernen...", .Run = ChangeFlagOfAll},

@@ -7,7 +7,6 @@ namespace {
 constexpr DatabaseCommand kRows[] = {
     {.Id = mcFindOnline, .Caption = u"Suchen im Internet...", .Keys = u"Ctrl+Alt+F"},
     {.Id = mcLoadLyrics, .Caption = u"Lyrikfang downloaden"},
-    {.Id = mcConvert, .Caption = u"Song konvertieren"},
 };
 
 }  // namespace

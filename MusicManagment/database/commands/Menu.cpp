@@ -21,9 +21,10 @@ constexpr MenuOutline kSubSort{u"Untergeordnet anordnen nach", kSubSortLines, mc
 constexpr MenuLine kTagLines[] = {mcSetFlag, mcRemoveFlag, kSeparator, mcRereadTags, mcRemoveTags};
 constexpr MenuOutline kTags{
     .Caption = u"Tags und Flags", .Lines = kTagLines, .Id = mcTagsSubmenu, .For = kWriting};
-constexpr MenuLine kSongLines[] = {mcPlay, mcAddToPlayList,   mcOpenExternally, mcTakeGenre,
-                                   &kTags, mcRenameByPattern, mcTagsFromNames,  kSeparator,
-                                   &kSort, &kSubSort,         mcReverse,        mcFollowFocus};
+constexpr MenuLine kSongLines[] = {
+    mcPlay,          mcAddToPlayList, mcOpenExternally, mcTakeGenre, &kTags,    mcRenameByPattern,
+    mcTagsFromNames, mcConvertMarked, kSeparator,       &kSort,      &kSubSort, mcReverse,
+    mcFollowFocus};
 constexpr MenuLine kAllSongsLines[] = {mcAdaptAllGenres, mcSetFlagOfAll,  mcRemoveFlagOfAll,
                                        kSeparator,       mcRereadAllTags, mcRemoveAllTags};
 constexpr MenuOutline kAllSongs{

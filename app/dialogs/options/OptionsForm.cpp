@@ -19,6 +19,7 @@
 #include "MusicManagment/database/commands/Settings.h"
 #include "app/dialogs/PageScroller.h"
 #include "app/dialogs/options/CdsPage.h"
+#include "app/dialogs/options/ConversionPage.h"
 #include "app/dialogs/options/DatabasePage.h"
 #include "app/dialogs/options/FilesPage.h"
 #include "app/dialogs/options/GeneralPage.h"
@@ -64,6 +65,7 @@ TOptionsForm::TOptionsForm(TMusicDatabase& database, TRWReg& settings, QWidget* 
     AddPage(new RulesPage(database_));
     AddPage(new PlaybackPage(database_));
     AddPage(new CdsPage);
+    AddPage(new ConversionPage);
     AddPage(new RemoteControlPage(database_));
     LinkTwins();
     SetUpButtons();  // after the pages, as the tab key goes
