@@ -19,6 +19,12 @@
 
 using namespace Qt::StringLiterals;
 
+namespace {
+
+constexpr int kWidth = 75;  // average characters
+
+}  // namespace
+
 ConversionDialog::ConversionDialog(const ConversionChoice& choice, std::size_t marked, std::size_t all,
                                    QWidget* parent)
     : QDialog(parent),
@@ -66,15 +72,15 @@ QGroupBox* ConversionDialog::MakePlaces() {
     auto* box = new QGroupBox(u"Wohin"_s);
     beside_ = new QRadioButton(u"&Neben die Quellen"_s);
     inFolder_ = new QRadioButton(u"In diesen &Ordner:"_s);
-    inPlace_ = new QRadioButton(u"A&nstelle der Quellen, die in den Papierkorb kommen"_s);
+    inPlace_ = new QRadioButton(u"Anst&elle der Quellen, die in den Papierkorb kommen"_s);
     beside_->setObjectName(u"beside"_s);
     inFolder_->setObjectName(u"inFolder"_s);
     inPlace_->setObjectName(u"inPlace"_s);
     auto* note = new WrappedLabel(u"note"_s);
     note->setText(
-        u"Songs auf Datenträgern bekommen, außer im Ordner, eine Kopie auf der Festplatte, von der sie dann "
-        "gespielt werden. An ihrer Stelle behalten Songs, was die Datenbank von ihnen weiß; Rückgängig "
-        "holt die Quellen zurück."_s);
+        u"Songs auf Datenträgern bekommen, außer im Ordner, eine Kopie auf der Festplatte. Rückgängig holt "
+        u"die "
+        "Quellen zurück."_s);
     auto* layout = new QVBoxLayout(box);
     for (QWidget* row : std::initializer_list<QWidget*>{beside_, inFolder_, folder_, inPlace_, note})
         layout->addWidget(row);
@@ -103,6 +109,9 @@ void ConversionDialog::SetUpLayout() {
     layout->addWidget(MakePlaces());
     layout->addStretch();
     layout->addWidget(buttons);
+    // The note needs more lines the narrower it is.
+    const int width = kWidth * fontMetrics().averageCharWidth();
+    resize(width, layout->totalHeightForWidth(width));
 }
 
 void ConversionDialog::ShowFormat() {

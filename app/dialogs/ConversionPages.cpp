@@ -121,7 +121,7 @@ WavPage::WavPage(const WavSettings& settings, QWidget* parent) : QWidget(parent)
                         {u"Mono"_s, number(Channels::Mono)}},
                        number(settings.Sides));
     rate_ = AddRate(*form, settings.Rate);
-    dither_ = new QCheckBox(u"Beim Kürzen auf 16 Bit &dithern"_s);
+    dither_ = new QCheckBox(u"Beim Kürzen auf 16 Bit d&ithern"_s);
     dither_->setObjectName(u"dither"_s);
     dither_->setToolTip(
         u"Ein leises Rauschen statt der Verzerrung leiser Töne. Was schon 16 Bit hat, bleibt, "
