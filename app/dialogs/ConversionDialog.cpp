@@ -14,6 +14,7 @@
 #include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/Dialogs.h"
 #include "app/dialogs/ConversionPages.h"
+#include "app/dialogs/DecisionButtons.h"
 #include "app/dialogs/RootFolderField.h"
 #include "app/views/WrappedLabel.h"
 
@@ -96,19 +97,14 @@ void ConversionDialog::SetUpLayout() {
     auto* form = new QFormLayout;
     form->addRow(u"&Songs:"_s, songs_);
     form->addRow(u"Forma&t:"_s, format_);
-    auto* buttons = new QDialogButtonBox;
-    auto* convert = buttons->addButton(u"&Konvertieren"_s, QDialogButtonBox::AcceptRole);
-    convert->setObjectName(u"convert"_s);
-    convert->setDefault(true);
-    buttons->addButton(u"Abbrechen"_s, QDialogButtonBox::RejectRole);
-    connect(buttons, &QDialogButtonBox::accepted, this, &QDialog::accept);
-    connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
+    const DecisionButtons buttons = MakeDecisionButtons(*this, u"&Konvertieren"_s);
+    buttons.Agree->setDefault(true);
     auto* layout = new QVBoxLayout(this);
     layout->addLayout(form);
     layout->addWidget(MakePages());
     layout->addWidget(MakePlaces());
     layout->addStretch();
-    layout->addWidget(buttons);
+    layout->addWidget(buttons.Box);
     // The note needs more lines the narrower it is.
     const int width = kWidth * fontMetrics().averageCharWidth();
     resize(width, layout->totalHeightForWidth(width));

@@ -5,6 +5,7 @@
 #include "CommonRUKTools/FileChange.h"
 #include "MusicManagment/conversion/ConversionTargets.h"
 #include "MusicManagment/conversion/PartialFile.h"
+#include "MusicManagment/conversion/SongEncoder.h"
 #include "ReadMPEGHeader/TagWriting.h"
 #include "ReadMPEGHeader/id3v2/CoverArt.h"
 #include "tests/StepGate.h"
@@ -103,6 +104,16 @@ TEST_F(ConvertSongTest, ChosenRatesSidesAndBitsAreThoseOfTheTarget) {
     const TID3Tag constant = Convert(job);
     EXPECT_EQ(constant.SampleRate, 32000);
     EXPECT_EQ(constant.BitRate, 128);
+}
+
+TEST_F(ConvertSongTest, WhatIsQuieterThanAStepOfASampleIsStillHeardInTheNoise) {
+    const double amplitude = 0.4 / 32768;
+    const QString path = folder_.Path(u"leise.wav"_s);
+    const Samples quiet = Sine({.amplitude = amplitude}, 1);
+    const auto encoder = MakeWaveEncoder(path, {}, {.Rate = 44100});
+    encoder->Write(quiet.data(), quiet.size() / 2);
+    encoder->Finish();
+    EXPECT_NEAR(AmplitudeOf(440, Decoded(path), 0, 44100), amplitude, 0.2 * amplitude);
 }
 
 TEST_F(ConvertSongTest, JoinedTracksStayJoined) {
