@@ -24,6 +24,7 @@
 #include "MusicManagment/database/batches/FlagBatch.h"
 #include "MusicManagment/database/commands/Settings.h"
 #include "MusicManagment/database/intake/IntakeReport.h"
+#include "MusicManagmentRemoteControl/RemoteControl.h"
 #include "app/ArrangementCommands.h"
 #include "app/BatchCommands.h"
 #include "app/ConversionCommands.h"
@@ -87,6 +88,7 @@ TTunesteadMainWnd::TTunesteadMainWnd(MainWindowOptions options)
     SetUpCentre();
     SetUpStatusBar();
     SetUpToolWindows();
+    SetUpRemoteControl();
     SetUpMenu();
     LoadSettings();
     SetUpPlacement();
@@ -194,6 +196,27 @@ void TTunesteadMainWnd::SetUpToolWindows() {
                                                         options_.Spectrum, options_.MakeExternalPlayer});
     toolWindows_->LieBehind(playing_->ListForm());
     playing_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
+}
+
+// Without it everything else works.
+void TTunesteadMainWnd::SetUpRemoteControl() {
+    if (!options_.MakeRemoteChannel) return;
+    try {
+        remote_ = std::make_unique<TRemoteControl>(options_.MakeRemoteChannel());
+    } catch (const ERemoteControlException& error) {
+        statusBar()->showMessage(error.Message());
+        return;
+    }
+    remote_->SetMusicDatabase(&database_);
+    remote_->SetPlayList(&playing_->PlayList());
+    remote_->SetPlaySound(&playing_->Player());
+    remote_->OnFailure = [this](const QString& reason) { statusBar()->showMessage(reason.simplified()); };
+    remote_->OnCloseProgram = [this] { QTimer::singleShot(0, this, Guarded([this] { CloseForRemote(); })); };
+}
+
+// Like its user, another program cannot close a window that waits for an answer.
+void TTunesteadMainWnd::CloseForRemote() {
+    if (QApplication::activeModalWidget() == nullptr) close();
 }
 
 void TTunesteadMainWnd::SetUpTagForm() {

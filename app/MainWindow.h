@@ -26,6 +26,7 @@ class ExtraCommands;
 class FilterField;
 class MainMenu;
 class Playing;
+class RemoteChannel;
 class QLabel;
 class QStackedWidget;
 class SettingsCommands;
@@ -33,6 +34,7 @@ class BatchCommands;
 class DuplicateCommands;
 class SongCommands;
 class SongListWidget;
+class TRemoteControl;
 class ToolWindows;
 enum class FlagChange;
 struct StartRequest;
@@ -48,6 +50,8 @@ struct MainWindowOptions {
     SpectrumSource Spectrum{};      // of what they play
     // Makes the way to a separate player program; none where it is empty.
     std::function<std::unique_ptr<ExternalPlayer>()> MakeExternalPlayer{};
+    // Makes the way on which other programs reach this one; none where it is empty.
+    std::function<std::unique_ptr<RemoteChannel>()> MakeRemoteChannel{};
 };
 
 // The program's main window: owns the collection and brings together what shows it and what works on it.
@@ -79,6 +83,8 @@ class TTunesteadMainWnd : public QMainWindow {
     void SetUpMenu();
     void SetUpToolWindows();
     void SetUpTagForm();
+    void SetUpRemoteControl();
+    void CloseForRemote();
     void ShowChosenTags();
     void ChangeShownFlag(SongHandle song, FlagChange change);
     void StepTags(int rows);
@@ -114,6 +120,7 @@ class TTunesteadMainWnd : public QMainWindow {
     std::unique_ptr<MainMenu> menu_;
     std::unique_ptr<ToolWindows> toolWindows_;
     std::unique_ptr<Playing> playing_;
+    std::unique_ptr<TRemoteControl> remote_;
     std::unique_ptr<DuplicateCommands> duplicateCommands_;
     QStackedWidget* centre_ = nullptr;
     QWidget* listPage_ = nullptr;

@@ -9,6 +9,7 @@
 
 #include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/CommandRunner.h"
+#include "CommonRUKTools/MusicFolder.h"
 #include "MusicManagment/database/Command.h"
 #include "MusicManagment/database/media/CataloguedMedia.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
@@ -16,6 +17,7 @@
 #include "app/MenuIcons.h"
 #include "app/ShellCommands.h"
 #include "app/desktop/Icons.h"
+#include "app/desktop/MimeTypes.h"
 #include "app/desktop/RaiseWindow.h"
 #include "app/models/CollectionTotals.h"
 #include "app/views/DSPDraw.h"
@@ -132,11 +134,12 @@ void Playing::SetUpSpectrum(QMainWindow& window, SpectrumSource source) {
 void Playing::JoinDesktop(QMainWindow& window) {
     mpris_ = std::make_unique<Mpris>(
         player_, list_,
-        Mpris::Hooks{.OpenSong = [this](const QString& path) { OpenSong(path); },
+        Mpris::Hooks{.OpenFile = [this](const QString& path) { OpenFile(path); },
                      .Raise = [&window] { RaiseWindow(window, QString()); },
                      .Quit = [this] { database_.ClickMenuItem(scExit); },
                      .Volume = [this] { return playerForm_->Panel().Volume().Part(); },
-                     .SetVolume = [this](double volume) { playerForm_->Panel().Volume().SetPart(volume); }});
+                     .SetVolume = [this](double volume) { playerForm_->Panel().Volume().SetPart(volume); },
+                     .MusicFolder = [] { return MusicFolder(); }});
     mpris_->Register(QDBusConnection::sessionBus());
     awake_ = std::make_unique<StayAwake>(QDBusConnection::sessionBus());
 }
@@ -274,6 +277,18 @@ void Playing::OpenPlayList(const QString& path) {
 void Playing::OpenSong(const QString& path) {
     player_.SetFileName(path);
     if (!player_.AutoPlay()) player_.Play();
+}
+
+void Playing::OpenFile(const QString& path) {
+    if (KindOfFile(path) == FileKind::Song && !QFileInfo(path).isDir()) return OpenSong(path);
+    if (KindOfFile(path) == FileKind::PlayList) {
+        OpenPlayList(path);
+        if (list_.PlayListFileName() == path) list_.PlayNext(player_.ChangeOnDemand());
+        return;
+    }
+    if (!QFileInfo(path).isDir()) return;
+    const int first = list_.Count();
+    if (list_.InsertFiles(first, {path}) > 0) PlayChosenEntry(first);
 }
 
 void Playing::OpenSongInstead(const QString& path, const QString& instead) {

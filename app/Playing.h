@@ -52,7 +52,10 @@ class Playing {
     void OpenStandardList();
     void OpenPlayList(const QString& path);
     void OpenSong(const QString& path);
-    // The same, from the place where the file `instead` is, if that is open.
+    // What another program names: a song, a list or a folder. Its songs join the list, but a list takes its
+    // place; the first of them plays.
+    void OpenFile(const QString& path);
+    // Like OpenSong, from the place where the file `instead` is, if that is open.
     void OpenSongInstead(const QString& path, const QString& instead);
     // Stops playing and keeps the list for the next run if that is wanted. Throws EStreamError.
     void Close(bool keepList);

@@ -12,6 +12,7 @@
 #include "MusicManagment/playback/extern/LocalExternalPlayer.h"
 #include "MusicManagment/playback/fmod/SoundLibrary.h"
 #include "MusicManagment/playback/mci/GstMci.h"
+#include "MusicManagmentRemoteControl/bus/BusChannel.h"
 #include "app/MainWindow.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/Installation.h"
@@ -122,15 +123,17 @@ int Start(QtDialogs& dialogs, const StartRequest& request) {
     const auto sound = std::make_shared<SoundLibrary>();
     EngineTable engines = MakeEngines(sound, std::make_shared<GstMci>());
     engines.SetSharedGain = [sound](float gain) { sound->SetMasterVolume(gain); };
-    return RunWindow(dialogs, instance,
-                     {.Files = files,
-                      .SettingsFile = TRWReg::DefaultFile(),
-                      .Arguments = request.Arguments,
-                      .Setup = setup,
-                      .OfferWizard = true,
-                      .Engines = std::move(engines),
-                      .Spectrum = SpectrumOf(sound),
-                      .MakeExternalPlayer = [] { return std::make_unique<LocalExternalPlayer>(); }});
+    return RunWindow(
+        dialogs, instance,
+        {.Files = files,
+         .SettingsFile = TRWReg::DefaultFile(),
+         .Arguments = request.Arguments,
+         .Setup = setup,
+         .OfferWizard = true,
+         .Engines = std::move(engines),
+         .Spectrum = SpectrumOf(sound),
+         .MakeExternalPlayer = [] { return std::make_unique<LocalExternalPlayer>(); },
+         .MakeRemoteChannel = [] { return std::make_unique<BusChannel>(QDBusConnection::sessionBus()); }});
 }
 
 }  // namespace

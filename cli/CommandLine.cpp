@@ -15,7 +15,7 @@ constexpr std::array kCommands = {
     &kInfoCommand,   &kScanCommand,       &kListCommand,           &kGroupsCommand,   &kSaveCommand,
     &kTagCommand,    &kRenameCommand,     &kBatchCommand,          &kBanCommand,      &kTrashCommand,
     &kUndoCommand,   &kDuplicatesCommand, &kSimilarArtistsCommand, &kPlaylistCommand, &kPlayCommand,
-    &kConvertCommand};
+    &kConvertCommand, &kRemoteCommand};
 
 bool IsHelp(const QString& word) {
     return word == u"--help"_s || word == u"-h"_s;

@@ -24,6 +24,7 @@ extern const CommandRow kGroupsCommand;
 extern const CommandRow kSaveCommand;
 extern const CommandRow kPlaylistCommand;
 extern const CommandRow kPlayCommand;
+extern const CommandRow kRemoteCommand;
 extern const CommandRow kTagCommand;
 extern const CommandRow kRenameCommand;
 extern const CommandRow kBatchCommand;

@@ -291,7 +291,7 @@ void TPlaySound::MarkSong() {
     if (database_) database_->MarkSong(SongInDatabase());
 }
 
-// The song that plays; -1 when the collection does not have it. What plays can be a copy of what is listed.
+// What plays can be a copy of what is listed.
 SongIndex TPlaySound::SongInDatabase() const {
     if (!database_) return -1;
     const SongIndex song = database_->IndexOf(fileName_);

@@ -67,7 +67,9 @@ class TPlaySound : public TPlaySoundContainer,
     TPSStatus GetStatus() override;
     // Does what leads to this status; psOpening and psSeeking are ignored.
     void SetStatus(TPSStatus status);
-    // Has the database mark the song that plays.
+    // The song that plays; -1 when the collection does not have it.
+    SongIndex SongInDatabase() const;
+    // Has the database mark it.
     void MarkSong();
     // Returns when the song has ended or was stopped.
     enum class WaitMode { Block, KeepInterfaceAlive };
@@ -203,7 +205,6 @@ class TPlaySound : public TPlaySoundContainer,
     void StartTimers();
     void StopTimers();
     void RestartAutoStop();
-    SongIndex SongInDatabase() const;
     quint32 MeasureLength(const QString& path) const;
 
     // PlaySoundFades.cpp

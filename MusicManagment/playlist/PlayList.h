@@ -45,6 +45,9 @@ class TPlayList : public QObject, public SettingsClient {
     const PlayListEntry& Entry(int index) const { return entries_.At(index); }
     // The first entry with this name; an empty name means the entry that plays. -1 when it is not listed.
     int IndexOf(const QString& name = QString()) const;
+    // The entry itself, wherever it stands later. -1 when it is not listed any more.
+    EntryId IdAt(int index) const { return entries_.IdAt(index); }
+    int IndexOfId(EntryId id) const { return entries_.Find(id); }
     // Playing time of all entries with a record, in seconds.
     qint64 TotalSeconds() const { return entries_.TotalSeconds(); }
 

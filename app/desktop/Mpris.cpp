@@ -4,14 +4,15 @@
 #include <QDBusConnectionInterface>
 #include <QDBusMessage>
 #include <QDBusObjectPath>
-#include <QDBusVariant>
 #include <QUrl>
 #include <algorithm>
 
 #include "CommonRUKTools/CommandRunner.h"
 #include "MusicManagment/playback/PlaySound.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
+#include "MusicManagmentRemoteControl/bus/BusProperties.h"
 #include "app/desktop/MprisInterfaces.h"
+#include "app/desktop/MprisMetadata.h"
 
 using namespace Qt::StringLiterals;
 
@@ -23,7 +24,8 @@ const QString kPath = u"/org/mpris/MediaPlayer2"_s;
 const QString kService = u"org.mpris.MediaPlayer2.tunestead"_s;
 const QString kRoot = u"org.mpris.MediaPlayer2"_s;
 const QString kPlayer = u"org.mpris.MediaPlayer2.Player"_s;
-const QString kProperties = u"org.freedesktop.DBus.Properties"_s;
+const QString kTrackList = u"org.mpris.MediaPlayer2.TrackList"_s;
+const QString kPlaylists = u"org.mpris.MediaPlayer2.Playlists"_s;
 
 QString StatusText(TPSStatus status) {
     if (status == psPlaying) return u"Playing"_s;
@@ -41,30 +43,46 @@ constexpr PlayerCall kCalls[] = {
 }  // namespace
 
 Mpris::Mpris(TPlaySound& player, TPlayList& list, Hooks hooks)
-    : player_(player), list_(list), hooks_(std::move(hooks)), bus_(QString()) {
+    : player_(player),
+      list_(list),
+      hooks_(std::move(hooks)),
+      bus_(QString()),
+      door_([this](const QDBusMessage& call, const QDBusConnection& from) { return Handle(call, from); },
+            MprisInterfaces()),
+      tracks_(player, list),
+      playlists_(list, hooks_.MusicFolder, [this](const QString& path) { hooks_.OpenFile(path); }) {
     updateTimer_.setSingleShot(true);
     updateTimer_.setInterval(0);
     connect(&updateTimer_, &QTimer::timeout, this, [this] { RunCommand([this] { TellChanges(); }); });
+    cover_.OnFound = [this] { Update(); };
+    Follow();
+}
+
+void Mpris::Follow() {
     PlayerEvents& events = player_.Events();
     PlayListEvents& listEvents = list_.Events();
     const auto update = [this] { Update(); };
     subscriptions_ += events.Changed.Subscribe(update);
-    for (Listeners<int>* changed : {&listEvents.Inserted, &listEvents.Removed})
+    for (Listeners<int>* changed : {&listEvents.Inserted, &listEvents.Removed, &listEvents.Changed})
         subscriptions_ += changed->Subscribe([this](int) { Update(); });
-    for (Listeners<>* changed :
-         {&listEvents.Cleared, &listEvents.Loaded, &listEvents.CurrentChanged, &listEvents.OptionsChanged})
+    subscriptions_ += listEvents.Moved.Subscribe([this](const std::vector<int>&) { Update(); });
+    for (Listeners<>* changed : {&listEvents.Cleared, &listEvents.Loaded, &listEvents.CurrentChanged,
+                                 &listEvents.NameChanged, &listEvents.OptionsChanged})
         subscriptions_ += changed->Subscribe(update);
     subscriptions_ += events.Seeked.Subscribe([this](quint32 position) { TellSeeked(position); });
+    if (TMusicDatabase* database = list_.MusicDatabase())
+        subscriptions_ += database->Events().Changed.Subscribe(
+            [this](SongIndex, const TID3Tag&, const TID3Tag&) { Update(); });
 }
 
 Mpris::~Mpris() {
     if (serviceName_.isEmpty()) return;
     bus_.unregisterService(serviceName_);
-    bus_.unregisterObject(kPath);
+    door_.Close();
 }
 
 bool Mpris::Register(QDBusConnection bus) {
-    if (!bus.isConnected() || !bus.registerVirtualObject(kPath, this)) return false;
+    if (!door_.Open(bus, kPath)) return false;
     bus_ = bus;
     for (const QString& name :
          {kService, kService + u".instance%1"_s.arg(QCoreApplication::applicationPid())}) {
@@ -73,45 +91,36 @@ bool Mpris::Register(QDBusConnection bus) {
         told_ = PlayerProperties();
         return true;
     }
-    bus_.unregisterObject(kPath);
+    door_.Close();
     return false;
 }
 
 // --- What the bus asks ---
 
-QString Mpris::introspect(const QString&) const {
-    return MprisInterfaces();
-}
-
-bool Mpris::handleMessage(const QDBusMessage& message, const QDBusConnection& connection) {
-    if (message.type() != QDBusMessage::MethodCallMessage) return false;
-    if (message.interface() == kProperties) return HandleProperties(message, connection);
-    return HandleCall(message, connection);
+bool Mpris::Handle(const QDBusMessage& message, const QDBusConnection& connection) {
+    if (message.interface() != PropertiesInterface()) return HandleCall(message, connection);
+    return AnswerProperties(
+        {.Of = [this](const QString& interface) { return PropertiesOf(interface); },
+         .Set = [this](const QString& name, const QVariant& value) { SetProperty(name, value); }},
+        message, connection);
 }
 
 // A command that fails is known as well: the user is told, not the bus.
 bool Mpris::HandleCall(const QDBusMessage& message, const QDBusConnection& connection) {
-    bool known = true;
-    RunCommand([&] {
-        known = (message.interface() == kRoot && CallRoot(message.member())) ||
-                (message.interface() == kPlayer && CallPlayer(message.member(), message.arguments()));
-    });
-    return known && (!message.isReplyRequired() || connection.send(message.createReply()));
+    std::optional<QVariantList> answer = QVariantList();
+    RunCommand([&] { answer = Call(message); });
+    if (answer) Reply(connection, message, *answer);
+    return answer.has_value();
 }
 
-bool Mpris::HandleProperties(const QDBusMessage& message, const QDBusConnection& connection) {
-    const QVariantList arguments = message.arguments();
-    const QVariantMap properties = PropertiesOf(arguments.value(0).toString());
-    const QString name = arguments.value(1).toString();
-    if (message.member() == u"GetAll"_s) return connection.send(message.createReply(properties));
-    if (!properties.contains(name))
-        return connection.send(message.createErrorReply(QDBusError::UnknownProperty, name));
-    if (message.member() == u"Get"_s)
-        return connection.send(
-            message.createReply(QVariant::fromValue(QDBusVariant(properties.value(name)))));
-    if (message.member() != u"Set"_s) return false;
-    RunCommand([&] { SetProperty(name, arguments.value(2).value<QDBusVariant>().variant()); });
-    return connection.send(message.createReply());
+std::optional<QVariantList> Mpris::Call(const QDBusMessage& message) {
+    const QString interface = message.interface();
+    if (interface == kTrackList) return tracks_.Call(message.member(), message.arguments());
+    if (interface == kPlaylists) return playlists_.Call(message.member(), message.arguments());
+    const bool known = interface == kRoot
+                           ? CallRoot(message.member())
+                           : interface == kPlayer && CallPlayer(message.member(), message.arguments());
+    return known ? std::optional(QVariantList()) : std::nullopt;
 }
 
 // The rate can be set only to what it is.
@@ -149,12 +158,18 @@ bool Mpris::CallPlayer(const QString& method, const QVariantList& arguments) {
     else if (method == u"SetPosition"_s) {
         const qint64 place = arguments.value(1).toLongLong();
         const bool isThere = place >= 0 && place <= player_.GetLength() * kMicroseconds;
-        if (isThere && arguments.value(0).value<QDBusObjectPath>().path() == TrackId()) Seek(place);
+        if (isThere && arguments.value(0).value<QDBusObjectPath>() == Track()) Seek(place);
     } else if (method == u"OpenUri"_s)
-        hooks_.OpenSong(QUrl(arguments.value(0).toString()).toLocalFile());
+        Open(arguments.value(0).toString());
     else
         return false;
     return true;
+}
+
+// Nothing is fetched from elsewhere.
+void Mpris::Open(const QString& uri) {
+    const QString path = QUrl(uri).toLocalFile();
+    if (!path.isEmpty()) hooks_.OpenFile(path);
 }
 
 // Behind the end the next song begins.
@@ -171,6 +186,8 @@ void Mpris::Seek(qint64 microseconds) {
 
 QVariantMap Mpris::PropertiesOf(const QString& interface) const {
     if (interface == kRoot) return RootProperties();
+    if (interface == kTrackList) return tracks_.Properties();
+    if (interface == kPlaylists) return playlists_.Properties();
     if (interface != kPlayer) return {};
     QVariantMap properties = PlayerProperties();
     properties[u"Position"_s] = qint64{const_cast<TPlaySound&>(player_).GetPosition()} * kMicroseconds;
@@ -181,7 +198,7 @@ QVariantMap Mpris::RootProperties() const {
     return {
         {u"CanQuit"_s, true},
         {u"CanRaise"_s, true},
-        {u"HasTrackList"_s, false},
+        {u"HasTrackList"_s, true},
         {u"Identity"_s, u"Tunestead"_s},
         {u"DesktopEntry"_s, u"tunestead"_s},
         {u"SupportedUriSchemes"_s, QStringList(u"file"_s)},
@@ -212,37 +229,43 @@ QVariantMap Mpris::PlayerProperties() const {
     };
 }
 
-QString Mpris::TrackId() const {
-    if (song_.FileName.isEmpty()) return u"/org/mpris/MediaPlayer2/TrackList/NoTrack"_s;
-    return u"/tunestead/track/%1"_s.arg(track_);
+// A song that plays without being in the list has a number of its own.
+QDBusObjectPath Mpris::Track() const {
+    if (song_.FileName.isEmpty()) return TrackOfEntry(0);
+    const int entry = player_.FileName() == list_.CurrentFile() ? list_.IndexOf() : -1;
+    return entry >= 0 ? TrackOfEntry(list_.IdAt(entry))
+                      : QDBusObjectPath(u"/tunestead/track/%1"_s.arg(track_));
 }
 
 QVariantMap Mpris::Metadata() const {
-    QVariantMap data{{u"mpris:trackid"_s, QVariant::fromValue(QDBusObjectPath(TrackId()))}};
-    if (song_.FileName.isEmpty()) return data;
-    data[u"xesam:title"_s] = song_.Title;
-    if (!song_.Artist.isEmpty()) data[u"xesam:artist"_s] = QStringList(song_.Artist);
-    if (!song_.Album.isEmpty()) data[u"xesam:album"_s] = song_.Album;
-    if (song_.Track > 0) data[u"xesam:trackNumber"_s] = song_.Track;
-    if (const quint32 length = const_cast<TPlaySound&>(player_).GetLength(); length > 0)
-        data[u"mpris:length"_s] = qint64{length} * kMicroseconds;
-    data[u"xesam:url"_s] = QString::fromLatin1(QUrl::fromLocalFile(song_.FileName).toEncoded());
-    return data;
+    return MprisMetadata(Track(), song_, const_cast<TPlaySound&>(player_).GetLength(), cover_.Url());
 }
 
 // --- What the bus is told ---
 
 void Mpris::TellChanges() {
     PlayingSong song = player_.GetStatus() == psClosed ? PlayingSong() : SongOf(player_, list_);
-    if (song != song_) ++track_;
+    if (song.FileName != song_.FileName) ++track_;
     song_ = std::move(song);
     if (serviceName_.isEmpty()) return;
+    cover_.Show(song_.FileName.isEmpty() ? QString() : player_.FileName());
     const QVariantMap now = PlayerProperties();
     QVariantMap changed;
     for (auto property = now.cbegin(); property != now.cend(); ++property)
         if (told_.value(property.key()) != property.value()) changed.insert(property.key(), property.value());
     told_ = now;
-    if (!changed.isEmpty()) Signal(kProperties, u"PropertiesChanged"_s, {kPlayer, changed, QStringList()});
+    if (!changed.isEmpty()) TellProperties(kPlayer, changed);
+    if (tracks_.TellChanges([this](const QString& name, const QVariantList& arguments) {
+            Signal(kTrackList, name, arguments);
+        }))
+        TellProperties(kTrackList, {}, {u"Tracks"_s});
+    if (const QString file = list_.PlayListFileName(); std::exchange(toldList_, file) != file)
+        TellProperties(kPlaylists, {{u"ActivePlaylist"_s, playlists_.Active()}}, {u"PlaylistCount"_s});
+}
+
+// `others` have changed as well; who wants to know asks.
+void Mpris::TellProperties(const QString& interface, const QVariantMap& changed, const QStringList& others) {
+    Signal(PropertiesInterface(), u"PropertiesChanged"_s, {interface, changed, others});
 }
 
 void Mpris::TellSeeked(quint32 position) {

@@ -1,5 +1,7 @@
 #include "app/desktop/MprisInterfaces.h"
 
+#include "MusicManagmentRemoteControl/bus/BusProperties.h"
+
 QString MprisInterfaces() {
     return QStringLiteral(R"(
 <interface name="org.mpris.MediaPlayer2">
@@ -47,26 +49,5 @@ QString MprisInterfaces() {
     <annotation name="org.freedesktop.DBus.Property.EmitsChangedSignal" value="false"/>
   </property>
 </interface>
-<interface name="org.freedesktop.DBus.Properties">
-  <method name="Get">
-    <arg direction="in" name="interface" type="s"/>
-    <arg direction="in" name="property" type="s"/>
-    <arg direction="out" name="value" type="v"/>
-  </method>
-  <method name="GetAll">
-    <arg direction="in" name="interface" type="s"/>
-    <arg direction="out" name="properties" type="a{sv}"/>
-  </method>
-  <method name="Set">
-    <arg direction="in" name="interface" type="s"/>
-    <arg direction="in" name="property" type="s"/>
-    <arg direction="in" name="value" type="v"/>
-  </method>
-  <signal name="PropertiesChanged">
-    <arg name="interface" type="s"/>
-    <arg name="changed" type="a{sv}"/>
-    <arg name="invalidated" type="as"/>
-  </signal>
-</interface>
-)");
+)") + PropertiesDescription();
 }

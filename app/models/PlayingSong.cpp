@@ -8,31 +8,31 @@
 
 using namespace Qt::StringLiterals;
 
-namespace {
-
-std::optional<TID3Tag> RecordOf(const QString& name, const TPlayList& list) {
-    const int entry = list.IndexOf(name);
-    if (entry >= 0 && list.Entry(entry).Record) return list.Entry(entry).Record;
+PlayingSong SongNamed(const QString& name, const TPlayList& list) {
+    PlayingSong song{.FileName = name};
+    const auto take = [&song](const TID3Tag& record) {
+        song.Title = record.Title;
+        song.Artist = record.Artist;
+        song.Album = record.Album;
+        song.Track = record.Track;
+        song.PlayCount = record.PlayCount;
+        song.Seconds = record.Length;
+    };
     const TMusicDatabase* database = list.MusicDatabase();
-    const SongIndex song = database != nullptr ? database->IndexOf(name) : -1;
-    if (song < 0) return std::nullopt;
-    return database->Song(song);
+    const SongIndex known = database != nullptr ? database->IndexOf(name) : -1;
+    if (known >= 0) take(database->Song(known));
+    if (const int entry = list.IndexOf(name); entry >= 0 && list.Entry(entry).Record) {
+        const qint64 counted = song.PlayCount;
+        take(*list.Entry(entry).Record);
+        if (known >= 0) song.PlayCount = counted;
+    }
+    if (song.Title.isEmpty()) song.Title = QFileInfo(name).completeBaseName();
+    return song;
 }
-
-}  // namespace
 
 PlayingSong SongOf(const TPlaySound& player, const TPlayList& list) {
     if (player.FileName().isEmpty()) return {};
-    const bool listed = player.FileName() == list.CurrentFile();
-    PlayingSong song{.FileName = listed ? list.CurrentSong() : player.FileName()};
-    if (const auto record = RecordOf(song.FileName, list)) {
-        song.Title = record->Title;
-        song.Artist = record->Artist;
-        song.Album = record->Album;
-        song.Track = record->Track;
-    }
-    if (song.Title.isEmpty()) song.Title = QFileInfo(song.FileName).completeBaseName();
-    return song;
+    return SongNamed(player.FileName() == list.CurrentFile() ? list.CurrentSong() : player.FileName(), list);
 }
 
 QString OneLine(const PlayingSong& song) {

@@ -72,7 +72,7 @@ class MprisTest : public testing::Test {
     double volume_ = 0.75;
     Mpris mpris_{player_,
                  list_,
-                 {.OpenSong = [this](const QString& path) { opened_ = path; },
+                 {.OpenFile = [this](const QString& path) { opened_ = path; },
                   .Raise = [this] { ++raised_; },
                   .Quit = [] {},
                   .Volume = [this] { return volume_; },

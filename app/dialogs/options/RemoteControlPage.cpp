@@ -15,6 +15,7 @@ RemoteControlPage::RemoteControlPage(const TMusicDatabase& database)
         AddCheck(group, u"RCEnabled"_s, u"Andere Programme &dürfen Tunestead steuern"_s,
                  u"Andere Programme Ihres Rechners können dann den Player und die PlayList bedienen."_s);
     fields_.Bind(enabled, DatabaseSettings::kRCEnabled);
-    SetAvailable(group, database.RemoteControl() != nullptr,
-                 u"Wird mit der Fernsteuerung wirksam, die mit einer der nächsten Versionen kommt."_s);
+    SetAvailable(
+        group, database.RemoteControl() != nullptr,
+        u"Hier gibt es keinen Nachrichten-Bus der Sitzung (D-Bus), über den andere Programme es könnten."_s);
 }

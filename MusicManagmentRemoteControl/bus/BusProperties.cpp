@@ -1,0 +1,53 @@
+#include "MusicManagmentRemoteControl/bus/BusProperties.h"
+
+#include <QDBusVariant>
+
+#include "CommonRUKTools/CommandRunner.h"
+#include "MusicManagmentRemoteControl/bus/BusDoor.h"
+
+using namespace Qt::StringLiterals;
+
+QString PropertiesInterface() {
+    return u"org.freedesktop.DBus.Properties"_s;
+}
+
+QString PropertiesDescription() {
+    return QStringLiteral(R"(
+<interface name="org.freedesktop.DBus.Properties">
+  <method name="Get">
+    <arg direction="in" name="interface" type="s"/>
+    <arg direction="in" name="property" type="s"/>
+    <arg direction="out" name="value" type="v"/>
+  </method>
+  <method name="GetAll">
+    <arg direction="in" name="interface" type="s"/>
+    <arg direction="out" name="properties" type="a{sv}"/>
+  </method>
+  <method name="Set">
+    <arg direction="in" name="interface" type="s"/>
+    <arg direction="in" name="property" type="s"/>
+    <arg direction="in" name="value" type="v"/>
+  </method>
+  <signal name="PropertiesChanged">
+    <arg name="interface" type="s"/>
+    <arg name="changed" type="a{sv}"/>
+    <arg name="invalidated" type="as"/>
+  </signal>
+</interface>
+)");
+}
+
+bool AnswerProperties(const BusProperties& properties, const QDBusMessage& call, const QDBusConnection& bus) {
+    const QVariantList arguments = call.arguments();
+    const QVariantMap values = properties.Of(arguments.value(0).toString());
+    const QString name = arguments.value(1).toString();
+    if (call.member() == u"GetAll"_s) return Reply(bus, call, {values}), true;
+    const bool isGet = call.member() == u"Get"_s;
+    if (!isGet && call.member() != u"Set"_s) return false;
+    if (!values.contains(name)) return Refuse(bus, call, QDBusError::UnknownProperty, name), true;
+    if (isGet) return Reply(bus, call, {QVariant::fromValue(QDBusVariant(values.value(name)))}), true;
+    if (!properties.Set) return Refuse(bus, call, QDBusError::PropertyReadOnly, name), true;
+    RunCommand([&] { properties.Set(name, arguments.value(2).value<QDBusVariant>().variant()); });
+    Reply(bus, call);
+    return true;
+}
