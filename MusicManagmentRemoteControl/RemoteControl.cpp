@@ -7,6 +7,7 @@
 #include "MusicManagment/database/commands/DatabaseSettings.h"
 #include "MusicManagment/playback/PlaySound.h"
 #include "MusicManagment/playlist/PlayList.h"
+#include "MusicManagmentRemoteControl/LineDialogs.h"
 #include "MusicManagmentRemoteControl/MessageTable.h"
 
 TRemoteControl::TRemoteControl(std::unique_ptr<RemoteChannel> channel, QObject* parent)
@@ -72,16 +73,9 @@ void TRemoteControl::SaveSettings(TRWReg& settings) const {
 
 template <typename Action>
 void TRemoteControl::Carry(Action&& action) {
-    RunCommand([&] {
-        try {
-            action();
-        } catch (const EAbort&) {
-            // The user has been told, or somebody else has chosen another song meanwhile.
-        } catch (const ERukException& error) {
-            if (!OnFailure) throw;
-            OnFailure(error.Message());
-        }
-    });
+    std::optional<LineDialogs> lines;
+    if (OnTell) lines.emplace(OnTell);
+    RunCommand(action);
 }
 
 std::optional<qint32> TRemoteControl::Receive(quint32 message, quint32 p, quint32 l) {

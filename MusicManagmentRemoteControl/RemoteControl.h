@@ -40,8 +40,8 @@ class TRemoteControl : public QObject, public SettingsClient, private RemoteRece
     std::function<void(TRemoteControl&)> OnEventFired;
     // Closes the program; the answer to who asked for it is still to be sent.
     std::function<void()> OnCloseProgram;
-    // Why a message could not be carried out, for a place that needs no answer. Unset: a message box.
-    std::function<void(const QString& reason)> OnFailure;
+    // What the user is told of a message, for a place that needs no answer. Unset: message boxes.
+    std::function<void(const QString& text)> OnTell;
 
  private:
     std::optional<qint32> Receive(quint32 message, quint32 p, quint32 l) override;

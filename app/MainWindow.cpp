@@ -210,7 +210,7 @@ void TTunesteadMainWnd::SetUpRemoteControl() {
     remote_->SetMusicDatabase(&database_);
     remote_->SetPlayList(&playing_->PlayList());
     remote_->SetPlaySound(&playing_->Player());
-    remote_->OnFailure = [this](const QString& reason) { statusBar()->showMessage(reason.simplified()); };
+    remote_->OnTell = [this](const QString& text) { statusBar()->showMessage(text.simplified()); };
     remote_->OnCloseProgram = [this] { QTimer::singleShot(0, this, Guarded([this] { CloseForRemote(); })); };
 }
 

@@ -139,7 +139,8 @@ void Playing::JoinDesktop(QMainWindow& window) {
                      .Quit = [this] { database_.ClickMenuItem(scExit); },
                      .Volume = [this] { return playerForm_->Panel().Volume().Part(); },
                      .SetVolume = [this](double volume) { playerForm_->Panel().Volume().SetPart(volume); },
-                     .MusicFolder = [] { return MusicFolder(); }});
+                     .MusicFolder = [] { return MusicFolder(); },
+                     .StandardList = standardList_});
     mpris_->Register(QDBusConnection::sessionBus());
     awake_ = std::make_unique<StayAwake>(QDBusConnection::sessionBus());
 }

@@ -15,7 +15,8 @@ namespace {
 
 class ERemoteRefused : public ERukException {
  public:
-    ERemoteRefused() : ERukException(u"Tunestead hat den Befehl nicht ausgeführt."_s) {}
+    ERemoteRefused()
+        : ERukException(u"Tunestead hat das nicht ausgeführt; seine Statuszeile nennt den Grund."_s) {}
 };
 
 // What a command has to work with.
@@ -89,8 +90,9 @@ void Setting(const RemoteRun& run) {
 
 // Without a song it begins with the playlist, as the button in the window does.
 void Play(const RemoteRun& run) {
-    if (run.Client.Send(rmStatus) == psClosed) return DoQuietly<rmNext>(run);
-    Do<rmPlay>(run);
+    if (run.Client.Send(rmStatus) != psClosed) return Do<rmPlay>(run);
+    run.Client.Send(rmNext);
+    ShowDone(run, run.Client.Send(rmStatus) == psClosed ? 0 : 1);
 }
 
 void Seek(const RemoteRun& run) {
@@ -120,7 +122,9 @@ void ShowSong(const RemoteRun& run) {
 // The answer tells only that the player has got it.
 void OpenFile(const RemoteRun& run) {
     const qint32 answer = run.Client.OpenFile(AbsolutePath(run.Words.first()));
-    ShowDone(run, run.Client.Send(rmStatus) == psClosed ? 0 : answer);
+    if (answer == 0 || run.Client.Send(rmStatus) == psClosed)
+        throw ERukException(u"Tunestead konnte die Datei nicht öffnen: "_s + run.Words.first());
+    ShowDone(run, answer);
 }
 
 void SendMessage(const RemoteRun& run) {

@@ -45,8 +45,7 @@ QString Interfaces() {
   <property name="Window" type="u" access="read"/>
 </interface>
 )")
-               .arg(kRemoteInterface) +
-           PropertiesDescription();
+        .arg(kRemoteInterface);
 }
 
 QVariantMap Properties(const QString& interface) {

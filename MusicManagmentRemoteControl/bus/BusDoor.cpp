@@ -1,7 +1,9 @@
 #include "MusicManagmentRemoteControl/bus/BusDoor.h"
 
+#include <QDBusPendingCallWatcher>
 #include <QDBusVirtualObject>
 #include <QScopedValueRollback>
+#include <utility>
 
 #include "CommonRUKTools/Clock.h"
 #include "CommonRUKTools/CommandRunner.h"
@@ -15,6 +17,10 @@ constexpr int kRest = 5;      // ms in which everything else has its turn
 // A call may wait in an event loop of its own, for an answer of the user for example. Others are handled
 // meanwhile, so that questions have their answers, but not so many that each could open a message.
 constexpr int kDeepest = 3;
+// Then the bus is asked whether it has taken them. Refusals beyond are not told: who sends so much does not
+// wait for each.
+constexpr int kMostSent = 64;
+constexpr int kMostRefused = 256;
 
 // What the toolkit answers by itself.
 bool IsOfToolkit(const QString& interface) {
@@ -27,35 +33,41 @@ bool IsOfToolkit(const QString& interface) {
 // The object that the bus sees, in a thread of its own.
 class BusDoor::Porter : public QDBusVirtualObject {
  public:
-    Porter(CallQueue& queue, QTimer& wake, const QString& interfaces)
-        : queue_(queue), wake_(wake), interfaces_(interfaces) {}
+    Porter(BusDoor& door, const QString& interfaces) : door_(door), interfaces_(interfaces) {}
 
     bool handleMessage(const QDBusMessage& call, const QDBusConnection& bus) override {
         if (call.type() != QDBusMessage::MethodCallMessage || IsOfToolkit(call.interface())) return false;
-        switch (queue_.Add(call)) {
+        switch (door_.queue_.Add(call)) {
             case CallQueue::Put::First:
-                QMetaObject::invokeMethod(
-                    &wake_, [wake = &wake_] { wake->start(0); }, Qt::QueuedConnection);
+                InDoorsThread([](BusDoor& door) { door.serveTimer_.start(0); });
                 break;
             case CallQueue::Put::Behind:
                 break;
             case CallQueue::Put::Refused:
-                Refuse(bus, call, QDBusError::LimitsExceeded, u"too much at a time"_s);
+                RefuseMore(call, bus);
         }
         return true;
     }
     QString introspect(const QString&) const override { return interfaces_; }
 
  private:
-    CallQueue& queue_;
-    QTimer& wake_;
+    void InDoorsThread(void (*action)(BusDoor&)) {
+        QMetaObject::invokeMethod(
+            &door_.serveTimer_, [action, door = &door_] { action(*door); }, Qt::QueuedConnection);
+    }
+    void RefuseMore(const QDBusMessage& call, const QDBusConnection& bus) {
+        const int before = door_.refused_++;
+        if (before >= kMostRefused) return;
+        Refuse(bus, call, QDBusError::LimitsExceeded, u"too much at a time"_s);
+        if (before == 0) InDoorsThread([](BusDoor& door) { door.WaitForBus(); });
+    }
+
+    BusDoor& door_;
     const QString interfaces_;
 };
 
 BusDoor::BusDoor(Handler handler, const QString& interfaces)
-    : handler_(std::move(handler)),
-      bus_(QString()),
-      porter_(std::make_unique<Porter>(queue_, serveTimer_, interfaces)) {
+    : handler_(std::move(handler)), bus_(QString()), porter_(std::make_unique<Porter>(*this, interfaces)) {
     serveTimer_.setSingleShot(true);
     QObject::connect(&serveTimer_, &QTimer::timeout, &serveTimer_, Guarded([this] { Serve(); }));
     thread_.setObjectName(u"BusDoor"_s);
@@ -87,12 +99,30 @@ void BusDoor::Serve() {
     if (depth_ >= kDeepest) return;  // whoever is being served goes on here
     const QScopedValueRollback deeper(depth_, depth_ + 1);
     const qint64 begin = CurrentClock().Ticks();
-    while (const auto call = queue_.Take()) {
+    while (sent_ < kMostSent) {
+        const auto call = queue_.Take();
+        if (!call) return;
         Handle(*call);
-        if (CurrentClock().Ticks() - begin < kSlice) continue;
-        serveTimer_.start(kRest);
-        return;
+        ++sent_;
+        if (CurrentClock().Ticks() - begin >= kSlice) return serveTimer_.start(kRest);
     }
+    WaitForBus();
+}
+
+// It answers when it has taken what was sent before.
+void BusDoor::WaitForBus() {
+    if (std::exchange(waitsForBus_, true)) return;
+    auto* answer = new QDBusPendingCallWatcher(
+        bus_.asyncCall(QDBusMessage::createMethodCall(u"org.freedesktop.DBus"_s, u"/org/freedesktop/DBus"_s,
+                                                      u"org.freedesktop.DBus.Peer"_s, u"Ping"_s)),
+        &serveTimer_);
+    QObject::connect(answer, &QDBusPendingCallWatcher::finished, &serveTimer_, [this, answer] {
+        answer->deleteLater();
+        waitsForBus_ = false;
+        sent_ = 0;
+        refused_ = 0;
+        serveTimer_.start(0);
+    });
 }
 
 // Some may come even after it was closed: they were on their way through the other thread.

@@ -11,32 +11,6 @@ QString PropertiesInterface() {
     return u"org.freedesktop.DBus.Properties"_s;
 }
 
-QString PropertiesDescription() {
-    return QStringLiteral(R"(
-<interface name="org.freedesktop.DBus.Properties">
-  <method name="Get">
-    <arg direction="in" name="interface" type="s"/>
-    <arg direction="in" name="property" type="s"/>
-    <arg direction="out" name="value" type="v"/>
-  </method>
-  <method name="GetAll">
-    <arg direction="in" name="interface" type="s"/>
-    <arg direction="out" name="properties" type="a{sv}"/>
-  </method>
-  <method name="Set">
-    <arg direction="in" name="interface" type="s"/>
-    <arg direction="in" name="property" type="s"/>
-    <arg direction="in" name="value" type="v"/>
-  </method>
-  <signal name="PropertiesChanged">
-    <arg name="interface" type="s"/>
-    <arg name="changed" type="a{sv}"/>
-    <arg name="invalidated" type="as"/>
-  </signal>
-</interface>
-)");
-}
-
 bool AnswerProperties(const BusProperties& properties, const QDBusMessage& call, const QDBusConnection& bus) {
     const QVariantList arguments = call.arguments();
     const QVariantMap values = properties.Of(arguments.value(0).toString());

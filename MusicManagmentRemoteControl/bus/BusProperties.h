@@ -7,8 +7,6 @@
 
 // The interface by which the bus asks for properties.
 QString PropertiesInterface();
-// As the bus describes it, in its own notation.
-QString PropertiesDescription();
 
 struct BusProperties {
     std::function<QVariantMap(const QString& interface)> Of;

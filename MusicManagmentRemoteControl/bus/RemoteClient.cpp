@@ -1,5 +1,6 @@
 #include "MusicManagmentRemoteControl/bus/RemoteClient.h"
 
+#include <QCoreApplication>
 #include <QDBusMessage>
 #include <limits>
 
@@ -35,6 +36,8 @@ RemoteClient::RemoteClient(const QDBusConnection& bus) : bus_(bus), copied_(bus)
     if (!bus.isConnected())
         throw ERemoteControlException(
             u"Tunestead ist nicht erreichbar: Es gibt hier keinen Nachrichten-Bus der Sitzung (D-Bus)."_s);
+    // Until the event loop has run once the bus hands nothing over but answers.
+    QCoreApplication::processEvents();
 }
 
 qint32 RemoteClient::Send(quint32 message, quint32 p, quint32 l) {

@@ -50,7 +50,7 @@ Mpris::Mpris(TPlaySound& player, TPlayList& list, Hooks hooks)
       door_([this](const QDBusMessage& call, const QDBusConnection& from) { return Handle(call, from); },
             MprisInterfaces()),
       tracks_(player, list),
-      playlists_(list, hooks_.MusicFolder, [this](const QString& path) { hooks_.OpenFile(path); }) {
+      playlists_(list, {hooks_.MusicFolder, hooks_.StandardList, hooks_.OpenFile}) {
     updateTimer_.setSingleShot(true);
     updateTimer_.setInterval(0);
     connect(&updateTimer_, &QTimer::timeout, this, [this] { RunCommand([this] { TellChanges(); }); });

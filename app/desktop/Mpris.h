@@ -29,6 +29,7 @@ class Mpris : public QObject {
         std::function<double()> Volume = [] { return 1.0; };  // 0 to 1, as on a slider
         std::function<void(double volume)> SetVolume;
         std::function<QString()> MusicFolder{};  // whose playlists are offered; may be unset
+        QString StandardList{};                  // is no playlist to choose
     };
 
     Mpris(TPlaySound& player, TPlayList& list, Hooks hooks);

@@ -1,9 +1,7 @@
 #include "app/desktop/MprisInterfaces.h"
 
-#include "MusicManagmentRemoteControl/bus/BusProperties.h"
-
 QString MprisInterfaces() {
-    return QStringLiteral(R"(
+    return QStringLiteral(R"xml(
 <interface name="org.mpris.MediaPlayer2">
   <method name="Raise"/>
   <method name="Quit"/>
@@ -49,5 +47,49 @@ QString MprisInterfaces() {
     <annotation name="org.freedesktop.DBus.Property.EmitsChangedSignal" value="false"/>
   </property>
 </interface>
-)") + PropertiesDescription();
+<interface name="org.mpris.MediaPlayer2.TrackList">
+  <method name="GetTracksMetadata">
+    <arg direction="in" name="TrackIds" type="ao"/>
+    <arg direction="out" name="Metadata" type="aa{sv}"/>
+  </method>
+  <method name="AddTrack">
+    <arg direction="in" name="Uri" type="s"/>
+    <arg direction="in" name="AfterTrack" type="o"/>
+    <arg direction="in" name="SetAsCurrent" type="b"/>
+  </method>
+  <method name="RemoveTrack"><arg direction="in" name="TrackId" type="o"/></method>
+  <method name="GoTo"><arg direction="in" name="TrackId" type="o"/></method>
+  <signal name="TrackListReplaced">
+    <arg name="Tracks" type="ao"/>
+    <arg name="CurrentTrack" type="o"/>
+  </signal>
+  <signal name="TrackAdded">
+    <arg name="Metadata" type="a{sv}"/>
+    <arg name="AfterTrack" type="o"/>
+  </signal>
+  <signal name="TrackRemoved"><arg name="TrackId" type="o"/></signal>
+  <signal name="TrackMetadataChanged">
+    <arg name="TrackId" type="o"/>
+    <arg name="Metadata" type="a{sv}"/>
+  </signal>
+  <property name="Tracks" type="ao" access="read">
+    <annotation name="org.freedesktop.DBus.Property.EmitsChangedSignal" value="invalidates"/>
+  </property>
+  <property name="CanEditTracks" type="b" access="read"/>
+</interface>
+<interface name="org.mpris.MediaPlayer2.Playlists">
+  <method name="ActivatePlaylist"><arg direction="in" name="PlaylistId" type="o"/></method>
+  <method name="GetPlaylists">
+    <arg direction="in" name="Index" type="u"/>
+    <arg direction="in" name="MaxCount" type="u"/>
+    <arg direction="in" name="Order" type="s"/>
+    <arg direction="in" name="ReverseOrder" type="b"/>
+    <arg direction="out" name="Playlists" type="a(oss)"/>
+  </method>
+  <signal name="PlaylistChanged"><arg name="Playlist" type="(oss)"/></signal>
+  <property name="PlaylistCount" type="u" access="read"/>
+  <property name="Orderings" type="as" access="read"/>
+  <property name="ActivePlaylist" type="(b(oss))" access="read"/>
+</interface>
+)xml");
 }

@@ -77,21 +77,24 @@ void AddListsIn(const QString& folder, QStringList& files) {
 
 }  // namespace
 
-MprisPlaylists::MprisPlaylists(const TPlayList& list, std::function<QString()> musicFolder,
-                               std::function<void(const QString& path)> play)
-    : list_(list), musicFolder_(std::move(musicFolder)), play_(std::move(play)) {
+MprisPlaylists::MprisPlaylists(const TPlayList& list, Options options)
+    : list_(list), options_(std::move(options)) {
     qDBusRegisterMetaType<MprisPlaylist>();
     qDBusRegisterMetaType<QList<MprisPlaylist>>();
     qDBusRegisterMetaType<MaybePlaylist>();
 }
 
+QString MprisPlaylists::Open() const {
+    return list_.PlayListFileName() == options_.StandardList ? QString() : list_.PlayListFileName();
+}
+
 QStringList MprisPlaylists::Files() const {
     QStringList files;
-    if (const QString& open = list_.PlayListFileName(); !open.isEmpty()) {
+    if (const QString open = Open(); !open.isEmpty()) {
         files << open;
         AddListsIn(QFileInfo(open).path(), files);
     }
-    if (musicFolder_) AddListsIn(musicFolder_(), files);
+    if (options_.MusicFolder) AddListsIn(options_.MusicFolder(), files);
     return files;
 }
 
@@ -102,7 +105,7 @@ QVariantMap MprisPlaylists::Properties() const {
 }
 
 QVariant MprisPlaylists::Active() const {
-    const QString& path = list_.PlayListFileName();
+    const QString path = Open();
     MaybePlaylist active{.IsThere = !path.isEmpty()};
     if (active.IsThere) active.Playlist = DescriptionOf(path);
     return QVariant::fromValue(active);
@@ -134,5 +137,5 @@ QVariantList MprisPlaylists::Listed(const QVariantList& arguments) const {
 void MprisPlaylists::Activate(const QDBusObjectPath& id) {
     const QStringList files = Files();
     const auto wanted = std::ranges::find_if(files, [&](const QString& path) { return IdOf(path) == id; });
-    if (wanted != files.end()) play_(*wanted);
+    if (wanted != files.end()) options_.Play(*wanted);
 }

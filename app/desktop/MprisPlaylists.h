@@ -15,22 +15,26 @@ class MprisPlaylists {
  public:
     static constexpr int kMost = 500;
 
-    // `play` opens a list and plays it; `musicFolder` may be unset.
-    MprisPlaylists(const TPlayList& list, std::function<QString()> musicFolder,
-                   std::function<void(const QString& path)> play);
+    struct Options {
+        std::function<QString()> MusicFolder{};  // may be unset
+        QString StandardList{};                  // keeps whatever is open between two runs: no list to choose
+        std::function<void(const QString& path)> Play{};  // opens a list and plays it
+    };
+
+    MprisPlaylists(const TPlayList& list, Options options);
 
     QVariantMap Properties() const;
     // Of the properties the one whose changes the bus is told.
     QVariant Active() const;
-    // The answer to a call; nothing when there is no such method. Throws what `play` throws.
+    // The answer to a call; nothing when there is no such method. Throws what `Play` throws.
     std::optional<QVariantList> Call(const QString& method, const QVariantList& arguments);
 
  private:
+    QString Open() const;
     QStringList Files() const;
     QVariantList Listed(const QVariantList& arguments) const;
     void Activate(const QDBusObjectPath& id);
 
     const TPlayList& list_;
-    std::function<QString()> musicFolder_;
-    std::function<void(const QString& path)> play_;
+    const Options options_;
 };

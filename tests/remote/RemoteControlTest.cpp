@@ -37,7 +37,7 @@ class ScriptedChannel : public RemoteChannel {
 struct Rig : PlayingProgram {
     Rig() {
         Remote.OnCloseProgram = [this] { Closed = true; };
-        Remote.OnFailure = [this](const QString& reason) { Failures << reason; };
+        Remote.OnTell = [this](const QString& text) { Told << text; };
         for (const TPlayOrder order : {poRandom, poUpwards})
             List.SetPlayOrder(order);
     }
@@ -57,7 +57,7 @@ struct Rig : PlayingProgram {
     ScriptedChannel* Channel = new ScriptedChannel;
     TRemoteControl Remote{std::unique_ptr<RemoteChannel>(Channel)};
     bool Closed = false;
-    QStringList Failures;
+    QStringList Told;
 };
 
 struct Case {
@@ -117,7 +117,7 @@ TEST(RemoteControl, AnswersEachMessageWithAndWithoutTheComponentsAndNoneWhileItI
         rig.Remote.SetEnabled(true);
         EXPECT_EQ(rig.Send(test.Message, test.P), test.There);
         EXPECT_TRUE(!test.Effect || test.Effect(rig));
-        EXPECT_EQ(rig.Failures, QStringList());
+        EXPECT_EQ(rig.Told, QStringList());
     }
 }
 
@@ -137,7 +137,10 @@ TEST(RemoteControl, PreviousGoesBackAndFilesAreOpenedByName) {
     EXPECT_EQ(rig.Copy(kRemoteOpenFile, umlauts.toLatin1()), 1);
     EXPECT_EQ(rig.Song.File, umlauts);
     EXPECT_EQ(rig.Copy(kRemoteOpenFile, rig.Folder.Add(u"a.xyz"_s).toUtf8()), 0);
-    EXPECT_EQ(rig.Failures.size(), 1);
+    EXPECT_EQ(rig.Told.size(), 1);
+    rig.List.Clear();
+    rig.Send(rmNext);
+    EXPECT_EQ(rig.Told.size(), 2);
     EXPECT_EQ(rig.Dialogs.Messages, QStringList());
 }
 
