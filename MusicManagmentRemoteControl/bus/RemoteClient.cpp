@@ -51,7 +51,6 @@ qint32 RemoteClient::OpenFile(const QString& path) {
 QVariant RemoteClient::Call(const QString& method, const QVariantList& arguments) {
     QDBusMessage call = QDBusMessage::createMethodCall(kRemoteService, kRemotePath, kRemoteInterface, method);
     call.setArguments(arguments);
-    call.setAutoStartService(false);
     const QDBusMessage reply = bus_.call(call, QDBus::Block, kWithoutLimit);
     if (reply.type() != QDBusMessage::ReplyMessage)
         throw ERemoteControlException(ReasonOf(QDBusError(reply)));

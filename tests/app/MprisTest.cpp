@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <QDBusArgument>
 #include <QDBusMessage>
 #include <QDBusObjectPath>
 #include <QDBusReply>
@@ -13,6 +14,7 @@
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "tests/PrintQt.h"
 #include "tests/PrivateBus.h"
+#include "tests/ReadMPEGHeader/Builders.h"
 #include "tests/app/ScriptedBackend.h"
 #include "tests/database/SongFolder.h"
 
@@ -42,6 +44,14 @@ class MprisTest : public testing::Test {
     void TearDown() override {
         QDBusConnection::disconnectFromBus(u"player"_s);
         QDBusConnection::disconnectFromBus(u"desktop"_s);
+    }
+
+    // The answer of an interface to the playlist.
+    QDBusMessage AskList(const QString& interface, const QString& method, const QVariantList& arguments) {
+        return Ask(kRoot + interface, method, arguments);
+    }
+    QList<QDBusObjectPath> Tracks() {
+        return qdbus_cast<QList<QDBusObjectPath>>(Property(u"Tracks"_s, kRoot + u".TrackList"_s));
     }
 
     // The player answers in this thread, so the desktop may not block.
@@ -112,6 +122,7 @@ TEST_F(MprisTest, MediaKeysBecomeCommandsOfThePlayer) {
     Ask(kRoot, u"Raise"_s);
     EXPECT_EQ(raised_, 1);
     Ask(kPlayer, u"OpenUri"_s, {u"file:///Musik/a%20b.mp3"_s});
+    Ask(kPlayer, u"OpenUri"_s, {u"http://a/b.mp3"_s});
     EXPECT_EQ(opened_, u"/Musik/a b.mp3"_s);
     EXPECT_EQ(Ask(kPlayer, u"Dance"_s).type(), QDBusMessage::ErrorMessage);
 }
@@ -150,6 +161,94 @@ TEST_F(MprisTest, OrderAndRepeatAreSetFromOutside) {
     set(u"Volume"_s, 7.0);
     EXPECT_EQ(volume_, 1);
     EXPECT_EQ(set(u"Nonsense"_s, true), QDBusMessage::ErrorMessage);
+}
+
+TEST_F(MprisTest, TheTrackListIsServedAndEdited) {
+    const QString trackList = u".TrackList"_s;
+    const QList<QDBusObjectPath> tracks = Tracks();
+    ASSERT_EQ(tracks.size(), 2);
+    QList<QDBusObjectPath> asked = tracks;
+    asked << QDBusObjectPath(u"/tunestead/entry/99"_s) << tracks;
+    const QDBusMessage known = AskList(trackList, u"GetTracksMetadata"_s, {QVariant::fromValue(asked)});
+    EXPECT_EQ(known.signature(), u"aa{sv}"_s);
+    const auto data = qdbus_cast<QList<QVariantMap>>(known.arguments().value(0));
+    ASSERT_EQ(data.size(), 2);
+    EXPECT_EQ(data[1].value(u"xesam:title"_s), u"B"_s);
+
+    AskList(trackList, u"GoTo"_s, {QVariant::fromValue(tracks[1])});
+    EXPECT_EQ(song_.Status, psPlaying);
+    QApplication::processEvents();
+    EXPECT_EQ(Metadata().value(u"mpris:trackid"_s).value<QDBusObjectPath>(), tracks[1]);
+    AskList(trackList, u"RemoveTrack"_s, {QVariant::fromValue(tracks[0])});
+    EXPECT_EQ(Tracks(), QList{tracks[1]});
+    const QString url = u"file://"_s + folder_.Path(u"a.mp3"_s);
+    AskList(trackList, u"AddTrack"_s, {url, QVariant::fromValue(tracks[1]), false});
+    AskList(trackList, u"AddTrack"_s, {u"http://a/b.mp3"_s, QVariant::fromValue(tracks[1]), true});
+    EXPECT_EQ(list_.Count(), 2);
+    EXPECT_EQ(list_.Entry(1).Name, folder_.Path(u"a.mp3"_s));
+}
+
+TEST_F(MprisTest, TellsWhichTracksHaveComeAndGone) {
+    MprisTrackList tracks(player_, list_);
+    const auto told = [&tracks] {
+        QStringList names;
+        tracks.TellChanges([&](const QString& name, const QVariantList&) { names << name; });
+        return names;
+    };
+    EXPECT_EQ(told(), QStringList());
+    list_.Insert(1, {.Name = u"/new.mp3"_s});
+    EXPECT_EQ(told(), QStringList(u"TrackAdded"_s));
+    list_.RefreshRecord(0);
+    EXPECT_EQ(told(), QStringList(u"TrackMetadataChanged"_s));
+    list_.Remove(2);
+    EXPECT_EQ(told(), QStringList(u"TrackRemoved"_s));
+    list_.Move({1}, 0);
+    EXPECT_EQ(told(), QStringList(u"TrackListReplaced"_s));
+    for (int i = 0; i < 400; ++i)
+        list_.Insert(list_.Count(), {.Name = u"/%1.mp3"_s.arg(i)});
+    EXPECT_EQ(told(), QStringList(u"TrackListReplaced"_s));
+    EXPECT_EQ(Tracks().size(), MprisTrackList::kMost);
+    list_.Remove(300);  // out of sight
+    EXPECT_EQ(told(), QStringList());
+}
+
+TEST_F(MprisTest, PlaylistsBesideTheOpenOneAreOffered) {
+    for (const QString& name : {u"b.m3u"_s, u"A.rukpl"_s, u"c.pls"_s})
+        list_.Save(folder_.Path(name));
+    list_.SetPlayListFileName(folder_.Path(u"b.m3u"_s));
+    const QString playlists = u".Playlists"_s;
+    EXPECT_EQ(Property(u"PlaylistCount"_s, kRoot + playlists), 3u);
+    EXPECT_EQ(Property(u"ActivePlaylist"_s, kRoot + playlists).value<QDBusArgument>().currentSignature(),
+              u"(b(oss))"_s);
+    const QDBusMessage listed = AskList(playlists, u"GetPlaylists"_s, {0u, 1u, u"Alphabetical"_s, false});
+    EXPECT_EQ(listed.signature(), u"a(oss)"_s);
+    const auto first = listed.arguments().value(0).value<QDBusArgument>();
+    QDBusObjectPath id;
+    first.beginArray();
+    first.beginStructure();
+    first >> id;
+    AskList(playlists, u"ActivatePlaylist"_s, {QVariant::fromValue(id)});
+    EXPECT_EQ(opened_, folder_.Path(u"A.rukpl"_s));
+}
+
+TEST_F(MprisTest, TheCoverOfTheSongIsAFileWhileItPlays) {
+    auto tag = TitledTag("Lied", "Band");
+    tag.Frame("APIC", std::string("\0image/jpeg\0\3\0\xff\xd8\xff picture", 25));
+    list_.Insert(0, {.Name = folder_.Put(u"c.mp3"_s, tag.Build())});
+    ASSERT_TRUE(list_.PlayEntry(0));
+    mpris_.Update();
+    const auto picture = [this] {
+        return QUrl(Metadata().value(u"mpris:artUrl"_s).toString()).toLocalFile();
+    };
+    ASSERT_TRUE(QTest::qWaitFor([&] { return !picture().isEmpty(); }));
+    QFile file(picture());
+    ASSERT_TRUE(file.open(QIODevice::ReadOnly));
+    EXPECT_EQ(file.readAll(), "\xff\xd8\xff picture");
+    ASSERT_TRUE(list_.PlayEntry(1));
+    mpris_.Update();
+    QApplication::processEvents();
+    EXPECT_EQ(picture(), QString());
+    EXPECT_FALSE(file.exists());
 }
 
 TEST_F(MprisTest, ASecondProgramTakesANameOfItsOwn) {

@@ -245,4 +245,19 @@ TEST_F(PlayingTest, FilesFromTheCommandLinePlayOrBecomeTheList) {
     EXPECT_EQ(song_.Status, psPlaying);
 }
 
+TEST_F(PlayingTest, AnotherProgramOpensFoldersAndLists) {
+    folder_.Add({u"album/x.wav"_s, u"album/y.wav"_s});
+    playing_->PlayList().Insert(0, {.Name = Path(1)});
+    playing_->OpenFile(folder_.Path(u"album"_s));
+    EXPECT_EQ(Listed(), u"1xy"_s);
+    EXPECT_EQ(Sounding(), u"x"_s);
+    playing_->PlayList().Save(folder_.Path(u"saved.m3u"_s));
+    playing_->PlayList().Clear();
+    playing_->OpenFile(folder_.Path(u"saved.m3u"_s));
+    EXPECT_EQ(Listed(), u"1xy"_s);
+    EXPECT_EQ(Sounding(), u"1"_s);
+    playing_->OpenFile(folder_.Put(u"notes.txt"_s, QByteArray("x")));
+    EXPECT_EQ(Sounding(), u"1"_s);
+}
+
 }  // namespace
