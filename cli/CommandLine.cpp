@@ -12,9 +12,9 @@ using namespace Qt::StringLiterals;
 namespace {
 
 constexpr std::array kCommands = {
-    &kInfoCommand,   &kScanCommand,       &kListCommand,           &kGroupsCommand,   &kSaveCommand,
-    &kTagCommand,    &kRenameCommand,     &kBatchCommand,          &kBanCommand,      &kTrashCommand,
-    &kUndoCommand,   &kDuplicatesCommand, &kSimilarArtistsCommand, &kPlaylistCommand, &kPlayCommand,
+    &kInfoCommand,    &kScanCommand,       &kListCommand,           &kGroupsCommand,   &kSaveCommand,
+    &kTagCommand,     &kRenameCommand,     &kBatchCommand,          &kBanCommand,      &kTrashCommand,
+    &kUndoCommand,    &kDuplicatesCommand, &kSimilarArtistsCommand, &kPlaylistCommand, &kPlayCommand,
     &kConvertCommand, &kRemoteCommand};
 
 bool IsHelp(const QString& word) {
