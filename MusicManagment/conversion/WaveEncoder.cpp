@@ -74,7 +74,7 @@ class WaveEncoder : public SongEncoder {
         cut_.resize(frames * kWidest);
         const int count = cutter_.Cut(stereo, frames, cut_.data());
         if (count < 0) throw ERukException(u"Die Samples lassen sich nicht umwandeln."_s);
-        Append(static_cast<std::size_t>(count * sides_));
+        Append(static_cast<std::size_t>(count) * static_cast<std::size_t>(sides_));
     }
 
     void Finish() override {
