@@ -1,5 +1,6 @@
 #include "MusicManagmentRemoteControl/bus/CallQueue.h"
 
+#include <QDBusObjectPath>
 #include <QDBusVariant>
 #include <QMutexLocker>
 
@@ -10,6 +11,8 @@ namespace {
 qint64 BytesOf(const QVariant& argument) {
     if (argument.userType() == qMetaTypeId<QDBusVariant>())
         return BytesOf(argument.value<QDBusVariant>().variant());
+    if (argument.userType() == qMetaTypeId<QDBusObjectPath>())
+        return BytesOf(argument.value<QDBusObjectPath>().path());
     switch (argument.userType()) {
         case QMetaType::QString:
             return argument.toString().size() * qint64{sizeof(QChar)};

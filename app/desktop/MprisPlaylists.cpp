@@ -8,6 +8,7 @@
 #include <QFileInfo>
 #include <algorithm>
 
+#include "CommonRUKTools/Clock.h"
 #include "CommonRUKTools/Collation.h"
 #include "MusicManagment/playlist/PlayList.h"
 #include "app/desktop/MimeTypes.h"
@@ -56,6 +57,7 @@ namespace {
 
 // A folder that is full of other things costs no more than that.
 constexpr int kMostLookedAt = 10'000;
+constexpr qint64 kFresh = 1000;  // ms
 
 QDBusObjectPath IdOf(const QString& path) {
     const QByteArray digest = QCryptographicHash::hash(path.toUtf8(), QCryptographicHash::Sha1).toHex();
@@ -88,14 +90,19 @@ QString MprisPlaylists::Open() const {
     return list_.PlayListFileName() == options_.StandardList ? QString() : list_.PlayListFileName();
 }
 
-QStringList MprisPlaylists::Files() const {
-    QStringList files;
-    if (const QString open = Open(); !open.isEmpty()) {
-        files << open;
-        AddListsIn(QFileInfo(open).path(), files);
+const QStringList& MprisPlaylists::Files() const {
+    const QString open = Open();
+    const qint64 now = CurrentClock().Ticks();
+    if (filesTime_ && now - *filesTime_ < kFresh && filesBeside_ == open) return files_;
+    files_.clear();
+    if (!open.isEmpty()) {
+        files_ << open;
+        AddListsIn(QFileInfo(open).path(), files_);
     }
-    if (options_.MusicFolder) AddListsIn(options_.MusicFolder(), files);
-    return files;
+    if (options_.MusicFolder) AddListsIn(options_.MusicFolder(), files_);
+    filesBeside_ = open;
+    filesTime_ = now;
+    return files_;
 }
 
 QVariantMap MprisPlaylists::Properties() const {
@@ -135,7 +142,9 @@ QVariantList MprisPlaylists::Listed(const QVariantList& arguments) const {
 }
 
 void MprisPlaylists::Activate(const QDBusObjectPath& id) {
-    const QStringList files = Files();
+    const QStringList& files = Files();
     const auto wanted = std::ranges::find_if(files, [&](const QString& path) { return IdOf(path) == id; });
-    if (wanted != files.end()) options_.Play(*wanted);
+    if (wanted == files.end()) return;
+    const QString path = *wanted;  // the files may be listed anew meanwhile
+    options_.Play(path);
 }

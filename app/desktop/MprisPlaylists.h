@@ -31,10 +31,14 @@ class MprisPlaylists {
 
  private:
     QString Open() const;
-    QStringList Files() const;
+    const QStringList& Files() const;
     QVariantList Listed(const QVariantList& arguments) const;
     void Activate(const QDBusObjectPath& id);
 
     const TPlayList& list_;
     const Options options_;
+    // Folders are not looked through for each question.
+    mutable QStringList files_;
+    mutable QString filesBeside_;              // the open list of then
+    mutable std::optional<qint64> filesTime_;  // ticks of the clock
 };

@@ -73,15 +73,19 @@ QVariantMap MprisTrackList::MetadataAt(int index) const {
     return MprisMetadata(TrackOfEntry(list_.IdAt(index)), song, song.Seconds * 1000);
 }
 
-// Of those that are shown, and of each once.
+// Of those that are shown, and of each once. A list of many others is not read to its end.
 QVariantList MprisTrackList::MetadataOf(const QVariant& tracks) const {
-    const auto paths = qdbus_cast<QList<QDBusObjectPath>>(tracks);
     QList<EntryId> open = Shown();
     QList<QVariantMap> data;
-    for (const QDBusObjectPath& path : paths) {
-        if (open.isEmpty()) break;
-        const EntryId entry = EntryOfTrack(path);
-        if (open.removeOne(entry)) data << MetadataAt(list_.IndexOfId(entry));
+    const auto paths = tracks.value<QDBusArgument>();
+    if (paths.currentSignature() == u"ao"_s) {
+        paths.beginArray();
+        for (int i = 0; i < 2 * kMost && !open.isEmpty() && !paths.atEnd(); ++i) {
+            QDBusObjectPath path;
+            paths >> path;
+            const EntryId entry = EntryOfTrack(path);
+            if (open.removeOne(entry)) data << MetadataAt(list_.IndexOfId(entry));
+        }
     }
     return {QVariant::fromValue(data)};
 }

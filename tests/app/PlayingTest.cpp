@@ -252,7 +252,7 @@ TEST_F(PlayingTest, AnotherProgramOpensFoldersAndLists) {
     EXPECT_EQ(Listed(), u"1xy"_s);
     EXPECT_EQ(Sounding(), u"x"_s);
     playing_->PlayList().Save(folder_.Path(u"saved.m3u"_s));
-    playing_->PlayList().Clear();
+    playing_->PlayList().SetPlayListFileName({});
     playing_->OpenFile(folder_.Path(u"saved.m3u"_s));
     EXPECT_EQ(Listed(), u"1xy"_s);
     EXPECT_EQ(Sounding(), u"1"_s);

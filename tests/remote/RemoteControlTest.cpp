@@ -38,8 +38,7 @@ struct Rig : PlayingProgram {
     Rig() {
         Remote.OnCloseProgram = [this] { Closed = true; };
         Remote.OnTell = [this](const QString& text) { Told << text; };
-        for (const TPlayOrder order : {poRandom, poUpwards})
-            List.SetPlayOrder(order);
+        List.SetPlayOrder(poUpwards);
     }
     void Wire() {
         Remote.SetMusicDatabase(&Database);
