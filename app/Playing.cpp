@@ -284,12 +284,19 @@ void Playing::OpenFile(const QString& path) {
     if (KindOfFile(path) == FileKind::Song && !QFileInfo(path).isDir()) return OpenSong(path);
     if (KindOfFile(path) == FileKind::PlayList) {
         OpenPlayList(path);
-        if (list_.PlayListFileName() == path) list_.PlayNext(player_.ChangeOnDemand());
-        return;
+        return PlayFromStart(path);
     }
     if (!QFileInfo(path).isDir()) return;
     const int first = list_.Count();
     if (list_.InsertFiles(first, {path}) > 0) PlayChosenEntry(first);
+}
+
+// Unless the user has kept the former list. What cannot be played is passed over.
+void Playing::PlayFromStart(const QString& list) {
+    if (list_.PlayListFileName() != list || list_.Count() == 0) return;
+    followers_.End();
+    const SongChange change = player_.ChangeOnDemand();
+    if (!list_.PlayEntry(0, {.Change = change})) list_.PlayNext(change);
 }
 
 void Playing::OpenSongInstead(const QString& path, const QString& instead) {

@@ -68,6 +68,7 @@ class Playing {
     void FollowPlayer();
     void FollowSong();
     void PlayFromFocus();
+    void PlayFromStart(const QString& list);
     int Append(const std::vector<SongIndex>& songs);
     void PlayChosen();
     void AddChosen();
