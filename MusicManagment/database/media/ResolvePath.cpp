@@ -43,7 +43,7 @@ QString WithoutDrive(const QString& path) {
 QString TMusicDatabase::ResolveSongPath(const QString& path, const ResolveOptions& options) {
     if (!IsCdPath(path)) return path;
     if (options.UseCache)
-        if (const QString copy = CachedCopy(*this, path); !copy.isEmpty()) return copy;
+        if (QString copy = CachedCopy(*this, path); !copy.isEmpty()) return copy;
     const quint32 serial = SerialOfCdPath(path);
     while (true) {
         if (drive_.MountPoint.isEmpty()) drive_.MountPoint = FullDrive();
