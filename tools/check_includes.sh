@@ -36,7 +36,8 @@ targets() {
             }
             /\)/ && !/\(/ { target = "" }' "$list"
     done < <(git ls-files 'CommonRUKTools/*CMakeLists.txt' 'ReadMPEGHeader/*CMakeLists.txt' \
-        'MusicManagment/*CMakeLists.txt' 'MusicManagmentRemoteControl/*CMakeLists.txt' 'app/*CMakeLists.txt' 'cli/*CMakeLists.txt' 'tsplayer/*CMakeLists.txt')
+        'HTTPRetrieval/*CMakeLists.txt' 'MusicManagment/*CMakeLists.txt' 'MusicManagmentRemoteControl/*CMakeLists.txt' \
+        'app/*CMakeLists.txt' 'cli/*CMakeLists.txt' 'tsplayer/*CMakeLists.txt')
 }
 
 git ls-files '*.h' '*.cpp' | grep -vE '^(tests|bench|fuzz|cmake)/' | xargs grep -nE '^#include "' |

@@ -7,7 +7,7 @@ build_packages=(g++ cmake ninja-build ccache pkg-config qt6-base-dev libgl1-mesa
 sound_packages=(timgm6mb-soundfont ffmpeg gstreamer1.0-plugins-base gstreamer1.0-plugins-good gstreamer1.0-plugins-ugly
     gstreamer1.0-plugins-bad gstreamer1.0-libav gstreamer1.0-alsa)
 desktop_packages=(libqt6svg6 qt6-translations-l10n breeze-icon-theme xdg-utils fonts-dejavu-core "${sound_packages[@]}")
-test_packages=(libgtest-dev libbenchmark-dev libtag1-dev libsqlite3-dev clang-format clang-tidy jq dbus
+test_packages=(libgtest-dev libbenchmark-dev libtag1-dev libsqlite3-dev clang-format clang-tidy jq dbus openssl
     sox pipewire pipewire-pulse wireplumber pulseaudio-utils audacious audacious-plugins
     desktop-file-utils appstream shared-mime-info man-db)
 
