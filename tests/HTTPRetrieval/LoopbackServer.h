@@ -4,15 +4,18 @@
 #include <QDeadlineTimer>
 #include <QTcpServer>
 #include <QTcpSocket>
+#include <QTimer>
 #include <functional>
 #include <memory>
 
 // Lets the event loop run until the condition holds; false when that does not come about.
 inline bool Comes(const std::function<bool()>& condition) {
     const QDeadlineTimer patience(20'000);  // ms; only a failing test waits so long
+    QTimer beat;                            // so that the patience can end
+    beat.start(50);
     while (!condition()) {
         if (patience.hasExpired()) return false;
-        QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents | QEventLoop::AllEvents, 50);
+        QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents);
     }
     return true;
 }
