@@ -16,6 +16,9 @@ class DesktopShell : public Shell {
         return QProcess::startDetached(u"xdg-open"_s, {path});
 #endif
     }
+    bool StartProgram(const QString& program, const QStringList& arguments) override {
+        return QProcess::startDetached(program, arguments);
+    }
 };
 
 Shell*& Installed() {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QString>
+#include <QStringList>
 
 // What the engine asks of the desktop around it.
 class Shell {
@@ -8,6 +9,9 @@ class Shell {
     virtual ~Shell() = default;
     // Opens a file with the program that the user has chosen for its type; false when none could be started.
     virtual bool OpenWithDefaultProgram(const QString& path) = 0;
+    // Starts a program that then goes its own way; false when that could not be done. The arguments reach it
+    // as they are: no command interpreter sees them.
+    virtual bool StartProgram(const QString& program, const QStringList& arguments) = 0;
 };
 
 // The shell in use; by default the desktop's own opener is started.

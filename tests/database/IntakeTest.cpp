@@ -59,6 +59,7 @@ class RecordingShell : public Shell {
         Text = QString::fromUtf8(file.readAll());
         return true;
     }
+    bool StartProgram(const QString&, const QStringList&) override { return false; }
     QStringList Opened;
     QString Text;
 };
