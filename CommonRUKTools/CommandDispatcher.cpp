@@ -3,6 +3,8 @@
 #include <QScopeGuard>
 #include <algorithm>
 
+#include "CommonRUKTools/Errors.h"
+
 using namespace Qt::StringLiterals;
 
 namespace {
@@ -140,6 +142,84 @@ TMenuExItem& CommandDispatcher::MenuOf(const ShellCommand& command) const {
         if (chosen == nullptr) chosen = menu.get();
     }
     return chosen != nullptr ? *chosen : *menu_;
+}
+
+// --- The menu as a user has arranged it ---
+
+void CommandDispatcher::Arrange(std::vector<MenuFileItem> arrangement) {
+    std::map<int, int> lines;
+    CheckArrangement(arrangement, 0, lines);
+    arrangement_ = std::move(arrangement);
+    menu_.reset();
+    Changed.Tell();
+}
+
+// `lines`: where the commands stand. A component whose menu has several levels shows nothing but menus in its
+// first.
+void CommandDispatcher::CheckArrangement(const std::vector<MenuFileItem>& items, int depth,
+                                         std::map<int, int>& lines) const {
+    const bool takesCommands = depth > 0 || std::ranges::any_of(outline_.Lines, [](const MenuLine& line) {
+                                   return line.index() == 0;
+                               });
+    for (const MenuFileItem& item : items) {
+        const auto refuse = [&item](const QString& what) {
+            throw ERukException(MenuFileFault(item.Line, what));
+        };
+        if (item.What == MenuFileItem::Kind::Submenu)
+            CheckArrangement(item.Items, depth + 1, lines);
+        else if (!takesCommands)
+            refuse(u"Das steht in keinem Menü."_s);
+        if (item.What != MenuFileItem::Kind::Command) continue;
+        if (EntryOf(item.Id) == nullptr && ShellCommandOf(item.Id) == nullptr)
+            refuse(u"Den Befehl %1 gibt es nicht."_s.arg(item.Id));
+        if (const auto [first, isNew] = lines.emplace(item.Id, item.Line); !isNew)
+            refuse(u"Der Befehl %1 steht schon in Zeile %2."_s.arg(item.Id).arg(first->second));
+    }
+}
+
+TMenuExItem& CommandDispatcher::ShownMenu() {
+    TMenuExItem& whole = Menu();
+    if (arrangement_.empty()) return whole;
+    if (std::exchange(arrangedRevision_, revision_) != revision_) {
+        arranged_ = std::make_unique<TMenuExItem>(Kind::Submenu, whole.Caption(), whole.Id());
+        AddArranged(*arranged_, arrangement_);
+    }
+    Refresh(*arranged_);
+    return *arranged_;
+}
+
+// Menus and lines that nothing is left of, where a component is read-only, are left out.
+void CommandDispatcher::AddArranged(TMenuExItem& menu, const std::vector<MenuFileItem>& items) const {
+    bool lineIsDue = false;
+    for (const MenuFileItem& wanted : items) {
+        if (wanted.What == MenuFileItem::Kind::Separator) {
+            lineIsDue = !menu.Items().empty();
+            continue;
+        }
+        if (!HoldsCommands(wanted)) continue;
+        if (std::exchange(lineIsDue, false)) menu.Add(Kind::Separator, QString());
+        if (wanted.What == MenuFileItem::Kind::Submenu)
+            AddArranged(menu.Add(Kind::Submenu, wanted.Caption), wanted.Items);
+        else
+            AddArrangedCommand(menu, wanted);
+    }
+}
+
+bool CommandDispatcher::HoldsCommands(const MenuFileItem& wanted) const {
+    if (wanted.What == MenuFileItem::Kind::Command) return menu_->Find(wanted.Id) != nullptr;
+    return std::ranges::any_of(wanted.Items,
+                               [this](const MenuFileItem& item) { return HoldsCommands(item); });
+}
+
+void CommandDispatcher::AddArrangedCommand(TMenuExItem& menu, const MenuFileItem& wanted) const {
+    const TMenuExItem& item = *menu_->Find(wanted.Id);
+    const QString caption = wanted.Caption.isEmpty() ? item.Caption() : wanted.Caption;
+    TMenuExItem& shown = menu.Add(item.Kind(), caption, item.Id(), item.Shortcut());
+    shown.SetIcon(item.Icon());
+    shown.SetImageIndex(item.ImageIndex());
+    shown.SetCheckable(item.Checkable());
+    shown.SetDefault(item.IsDefault());
+    if (caption.contains(item.Letter(), Qt::CaseInsensitive)) shown.SetLetter(item.Letter());
 }
 
 void CommandDispatcher::Refresh(TMenuExItem& item) const {

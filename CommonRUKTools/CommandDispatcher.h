@@ -9,6 +9,7 @@
 
 #include "CommonRUKTools/Command.h"
 #include "CommonRUKTools/Listeners.h"
+#include "CommonRUKTools/MenuFile.h"
 #include "CommonRUKTools/MenuItem.h"
 
 // What the shell does for a command. What is left out is the engine's, or always so.
@@ -77,6 +78,12 @@ class CommandDispatcher {
 
     // Built at the first call and kept until it has to be another; the items show the state of the component.
     TMenuExItem& Menu();
+    // Shows the commands as a user has arranged them, for as long as this lives; what is not in it cannot be
+    // chosen from the menu, but runs as ever. Throws ERukException, which names the line, for a command that
+    // is unknown or stands twice; all stays as it was then.
+    void Arrange(std::vector<MenuFileItem> arrangement);
+    // The menu as it is shown: as the user has arranged it, else Menu().
+    TMenuExItem& ShownMenu();
     // Another number for each menu that is built.
     int Revision() const { return revision_; }
     // Asks the component whether the command may run and then runs it. False when it is unknown, rests, or
@@ -105,6 +112,10 @@ class CommandDispatcher {
     void AddLine(TMenuExItem& menu, int id) const;
     void AddSubmenu(TMenuExItem& menu, const MenuOutline& outline) const;
     void AddShellCommands();
+    void CheckArrangement(const std::vector<MenuFileItem>& items, int depth, std::map<int, int>& lines) const;
+    void AddArranged(TMenuExItem& menu, const std::vector<MenuFileItem>& items) const;
+    bool HoldsCommands(const MenuFileItem& wanted) const;
+    void AddArrangedCommand(TMenuExItem& menu, const MenuFileItem& wanted) const;
     TMenuExItem& MenuOf(const ShellCommand& command) const;
     void Refresh(TMenuExItem& item) const;
     bool IsReadOnly() const { return conditions_.IsReadOnly && conditions_.IsReadOnly(); }
@@ -121,6 +132,9 @@ class CommandDispatcher {
     QHash<int, std::weak_ptr<CommandHandler>> handlers_;
     std::vector<ShellCommand> shellCommands_;
     std::unique_ptr<TMenuExItem> menu_;
-    bool readOnly_ = false;  // as the menu was built for
+    std::vector<MenuFileItem> arrangement_;  // empty: as the outline has it
+    std::unique_ptr<TMenuExItem> arranged_;  // made of menu_
+    int arrangedRevision_ = -1;              // of the menu that it was made of
+    bool readOnly_ = false;                  // as the menu was built for
     int revision_ = 0;
 };
