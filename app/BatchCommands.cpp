@@ -13,6 +13,7 @@
 #include "MusicManagment/database/batches/MediaCommands.h"
 #include "MusicManagment/database/batches/TagBatch.h"
 #include "ReadMPEGHeader/DisplayTexts.h"
+#include "app/SongChoice.h"
 #include "app/dialogs/BannListDialog.h"
 #include "app/dialogs/RenameDialog.h"
 #include "app/dialogs/TagsFromNamesDialog.h"
@@ -51,14 +52,14 @@ BatchCommands::BatchCommands(TMusicDatabase& database, SongListWidget& list)
     handle(mcTagsFromNames, [this] { TakeTagsFromNames(); });
     handle(mcEditBannList, [this] { EditBannList(); });
     handle(mcCacheCdSongs, [this] {
-        if (const auto songs = AllOrMarked(u"Zwischenspeichern aller Songs"_s,
-                                           u"Zwischenspeichern aller markierter Songs"_s, Preset::Marked))
+        if (const auto songs = AskForSongs(database_, list_, u"Zwischenspeichern aller Songs"_s,
+                                           u"Zwischenspeichern aller markierter Songs"_s, SongPreset::Marked))
             CacheSongsCommand(database_, *songs);
     });
     handle(mcDropCaches, [this] {
         if (const auto songs =
-                AllOrMarked(u"Zwischenspeicherung aller Songs entfernen"_s,
-                            u"Zwischenspeicherung aller markierter Songs entfernen"_s, Preset::Nothing))
+                AskForSongs(database_, list_, u"Zwischenspeicherung aller Songs entfernen"_s,
+                            u"Zwischenspeicherung aller markierter Songs entfernen"_s, SongPreset::Nothing))
             DropCachesCommand(database_, *songs);
     });
     handle(mcPrepareBurning, [this] { PrepareBurning(); });
@@ -69,13 +70,7 @@ BatchCommands::BatchCommands(TMusicDatabase& database, SongListWidget& list)
 }
 
 BatchSongs BatchCommands::Chosen() const {
-    ViewSelection selection{.Marked = list_.ChosenHandles()};
-    if (const SongIndex focused = list_.FocusedSong(); focused >= 0)
-        selection.Selected = database_.Songs().HandleOf(focused);
-    if (selection.Marked.empty()) return {};
-    BatchSongs songs = MarkedSongs(selection);
-    TellOfPassedMarks(songs);
-    return songs;
+    return ChosenSongs(database_, list_);
 }
 
 void BatchCommands::AdaptGenre() {
@@ -133,23 +128,9 @@ void BatchCommands::RenameByPattern() {
         ReportBatch(MoveSongs(database_, SongCountText(moves.size()) + u" umbenennen"_s, moves));
 }
 
-std::optional<BatchSongs> BatchCommands::AllOrMarked(const QString& all, const QString& marked,
-                                                     Preset preset) const {
-    enum Answer { Marked, All, Cancel };
-    const auto count = list_.ChosenHandles().size();
-    if (count == 0) return AllSongs(database_);
-    const int answer = UserDialogs().Ask({.Text = u"Für welche Songs? Markiert: "_s + SongCountText(count) +
-                                                  u", in der Sammlung: "_s +
-                                                  SongCountText(static_cast<std::size_t>(database_.Count())),
-                                          .Buttons = {marked, all, u"Abbrechen"_s},
-                                          .Cancel = Cancel,
-                                          .Default = preset == Preset::Marked ? Marked : Cancel});
-    if (answer == Cancel) return std::nullopt;
-    return answer == Marked ? Chosen() : AllSongs(database_);
-}
-
 void BatchCommands::PrepareBurning() {
-    const auto songs = AllOrMarked(u"Alle Songs"_s, u"Markierte Songs"_s, Preset::Marked);
+    const auto songs =
+        AskForSongs(database_, list_, u"Alle Songs"_s, u"Markierte Songs"_s, SongPreset::Marked);
     const QString folder = songs ? PrepareBurningCommand(database_, *songs) : QString();
     if (!folder.isEmpty()) OfferBurning(folder);
 }

@@ -28,9 +28,6 @@ class BatchCommands : public SettingsClient {
     void RenameByPattern();
     void TakeTagsFromNames();
     void EditBannList();
-    // All songs or the marked ones, as the user says; nothing on cancel.
-    enum class Preset { Marked, Nothing };  // the answer of the Return key
-    std::optional<BatchSongs> AllOrMarked(const QString& all, const QString& marked, Preset preset) const;
     void PrepareBurning();
     void OfferBurning(const QString& folder);
 

@@ -111,7 +111,7 @@ void CommandMenu::BindAction(QAction& action, int id) {
 }
 
 void CommandMenu::Update() {
-    const TMenuExItem& root = commands_.Menu();
+    const TMenuExItem& root = commands_.ShownMenu();
     for (auto action = actions_.cbegin(); action != actions_.cend(); ++action) {
         const TMenuExItem* item = root.Find(action.key());
         if (item == nullptr) continue;

@@ -45,6 +45,7 @@ void ExtraCommands::FindSimilarArtists() {
     if (artists_ == nullptr) {
         artists_ = new SimilarArtistsForm(database_, &window_);
         artists_->setAttribute(Qt::WA_DeleteOnClose);
+        artists_->OnCorrect = [this] { database_.ClickMenuItem(mcCorrectAll); };
         artists_->OnUndo = [this] { return database_.ClickMenuItem(scUndo); };
     }
     artists_->SetPairs(std::move(pairs), stopped);

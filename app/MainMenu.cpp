@@ -29,9 +29,10 @@ void MainMenu::Build() {
         bar_.removeAction(old->menuAction());
         old->deleteLater();
     }
+    songMenu_ = nullptr;
     QAction* next = bar_.actions().value(0);
     QString letters;
-    for (const auto& item : commands_.Menu().Items()) {
+    for (const auto& item : commands_.ShownMenu().Items()) {
         auto* menu = new QMenu(WithAccessKey(item->Caption(), letters), &bar_);
         bar_.insertMenu(next, menu);
         menus_ << menu;

@@ -14,8 +14,9 @@ class MainMenu {
 
     // The keys of commands that are about single songs then work only in their list.
     void BindTo(QWidget& songList);
-    // Chosen for a song, from its context menu. The caller shows it.
-    QMenu& SongMenu() const { return *songMenu_; }
+    // The one with "Abspielen", for the context menu of a song; nullptr where the user has arranged the menu
+    // without. The caller shows it.
+    QMenu* SongMenu() const { return songMenu_; }
 
  private:
     void Build();

@@ -3,6 +3,7 @@
 #include <QApplication>
 #include <QCloseEvent>
 #include <QDragEnterEvent>
+#include <QFileInfo>
 #include <QLabel>
 #include <QMenu>
 #include <QMenuBar>
@@ -29,16 +30,20 @@
 #include "app/BatchCommands.h"
 #include "app/CommandMenu.h"
 #include "app/ConversionCommands.h"
+#include "app/CorrectionCommands.h"
 #include "app/DuplicateCommands.h"
 #include "app/ExtraCommands.h"
 #include "app/HelpMenu.h"
 #include "app/MainMenu.h"
+#include "app/OnlineCommands.h"
 #include "app/Playing.h"
+#include "app/ProgramCommands.h"
 #include "app/SettingsCommands.h"
 #include "app/ShellCommands.h"
 #include "app/SongCommands.h"
 #include "app/ToolWindows.h"
 #include "app/desktop/Icons.h"
+#include "app/desktop/MenuFiles.h"
 #include "app/desktop/NewInstallation.h"
 #include "app/desktop/RaiseWindow.h"
 #include "app/desktop/SingleInstance.h"
@@ -161,13 +166,16 @@ void TTunesteadMainWnd::SetUpMenu() {
     batchCommands_ = std::make_unique<BatchCommands>(database_, *list_);
     conversionCommands_ = std::make_unique<ConversionCommands>(database_, *list_);
     duplicateCommands_ = std::make_unique<DuplicateCommands>(database_, *list_, *playing_);
+    correctionCommands_ = std::make_unique<CorrectionCommands>(database_, *list_);
     extraCommands_ = std::make_unique<ExtraCommands>(*this, database_);
+    SetUpOtherPrograms();
     songCommands_->OnOpenDatabase = [this](const QString& path) { commands_.OpenFile(path); };
     songCommands_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
     settingsCommands_ =
         std::make_unique<SettingsCommands>(*this, database_, kSettingsKey.toString(), options_.SettingsFile);
     settingsCommands_->OnApplied = [this] { database_.Commands().Changed.Tell(); };
     HandleCommands();
+    ArrangeMenus();
     menu_ = std::make_unique<MainMenu>(*menuBar(), database_.Commands());
     menu_->BindTo(*list_);
     playing_->AddMenusTo(*menuBar());
@@ -179,7 +187,18 @@ void TTunesteadMainWnd::SetUpMenu() {
     arrangement_->AddTo(windows);
     AddAccessKeys(windows);
     AddHelpMenu(*menuBar(), *this);
-    list_->OnContextMenu = [this](const QPoint& place) { menu_->SongMenu().popup(place); };
+    list_->OnContextMenu = [this](const QPoint& place) {
+        if (QMenu* menu = menu_->SongMenu()) menu->popup(place);
+    };
+}
+
+// When all commands are known.
+void TTunesteadMainWnd::ArrangeMenus() {
+    const QString folder = QFileInfo(options_.SettingsFile).path();
+    menuFaults_ = {ArrangeMenu(database_.Commands(), folder, u"Database"_s),
+                   ArrangeMenu(playing_->PlayList().Commands(), folder, u"PlayList"_s),
+                   ArrangeMenu(playing_->Player().Commands(), folder, u"Player"_s)};
+    menuFaults_.removeAll(QString());
 }
 
 void TTunesteadMainWnd::SetUpToolWindows() {
@@ -237,6 +256,14 @@ void TTunesteadMainWnd::SetUpTagForm() {
         const auto change = on ? FlagChange::Set : FlagChange::Remove;
         QTimer::singleShot(0, this, Guarded([this, song, change] { ChangeShownFlag(song, change); }));
     };
+}
+
+void TTunesteadMainWnd::SetUpOtherPrograms() {
+    programCommands_ = std::make_unique<ProgramCommands>(database_, *list_, options_.SettingsFile);
+    programCommands_->OnDone = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
+    onlineCommands_ = std::make_unique<OnlineCommands>(*this, database_, toolWindows_->TagForm());
+    onlineCommands_->OnNotice = [this](const QString& sentence) { statusBar()->showMessage(sentence); };
+    onlineCommands_->OnNeedChoice = [this] { ShowChosenTags(); };
 }
 
 void TTunesteadMainWnd::ChangeShownFlag(SongHandle song, FlagChange change) {
@@ -357,6 +384,7 @@ void TTunesteadMainWnd::StartOnce() {
         close();
         return;
     }
+    if (!menuFaults_.isEmpty()) statusBar()->showMessage(menuFaults_.join(u' '));
     if (firstTime_ && options_.OfferWizard) RunCommand([this] { settingsCommands_->OfferWizard(); });
 }
 

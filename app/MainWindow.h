@@ -25,12 +25,15 @@ class EmptyState;
 class ExtraCommands;
 class FilterField;
 class MainMenu;
+class OnlineCommands;
 class Playing;
+class ProgramCommands;
 class RemoteChannel;
 class QLabel;
 class QStackedWidget;
 class SettingsCommands;
 class BatchCommands;
+class CorrectionCommands;
 class DuplicateCommands;
 class SongCommands;
 class SongListWidget;
@@ -83,6 +86,8 @@ class TTunesteadMainWnd : public QMainWindow {
     void SetUpMenu();
     void SetUpToolWindows();
     void SetUpTagForm();
+    void SetUpOtherPrograms();
+    void ArrangeMenus();
     void SetUpRemoteControl();
     void CloseForRemote();
     void ShowChosenTags();
@@ -114,8 +119,11 @@ class TTunesteadMainWnd : public QMainWindow {
     std::unique_ptr<ArrangementCommands> arrangement_;
     std::unique_ptr<SongCommands> songCommands_;
     std::unique_ptr<BatchCommands> batchCommands_;
+    std::unique_ptr<CorrectionCommands> correctionCommands_;
     std::unique_ptr<ConversionCommands> conversionCommands_;
     std::unique_ptr<ExtraCommands> extraCommands_;
+    std::unique_ptr<OnlineCommands> onlineCommands_;
+    std::unique_ptr<ProgramCommands> programCommands_;
     std::unique_ptr<SettingsCommands> settingsCommands_;
     std::unique_ptr<MainMenu> menu_;
     std::unique_ptr<ToolWindows> toolWindows_;
@@ -133,6 +141,7 @@ class TTunesteadMainWnd : public QMainWindow {
     bool ending_ = false;     // as soon as the long operation has stopped
     QByteArray dockState_;    // of the last run, until the window is shown
     QString linkPath_;        // folder of the program's shortcuts
+    QStringList menuFaults_;  // of the user's menu files
     bool firstTime_ = false;  // this is the program's first start
     bool started_ = false;    // the standard files are open and the command line is done
     Subscriptions handlers_;

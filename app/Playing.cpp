@@ -170,8 +170,9 @@ void Playing::AddMenusTo(QMenuBar& bar) {
     QString taken = u"dbseüfh"_s;  // by the menus of others
     QMenu* list = bar.addMenu(WithAccessKey(list_.Menu().Caption(), taken));
     listMenu_.Bind(pcRemoveSelected, listForm_->View());
-    listMenu_.Fill(*list, list_.Menu());
-    playerMenu_.Fill(*bar.addMenu(WithAccessKey(player_.Menu().Caption(), taken)), player_.Menu());
+    listMenu_.Fill(*list, list_.Commands().ShownMenu());
+    playerMenu_.Fill(*bar.addMenu(WithAccessKey(player_.Menu().Caption(), taken)),
+                     player_.Commands().ShownMenu());
     contextMenu_->addActions(list->actions());
 }
 

@@ -5,7 +5,6 @@
 
 #include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/Dialogs.h"
-#include "CommonRUKTools/Shell.h"
 #include "MusicManagment/database/Command.h"
 #include "MusicManagment/database/MusicManagment.h"
 #include "MusicManagment/database/songfiles/CopySongs.h"
@@ -61,7 +60,6 @@ void SongCommands::HandleCommands() {
     handle(mcMarkByFilter, [this] { list_.MarkByFilter(); });
     handle(mcRemoveFromDatabase, [this] { RemoveChosen(); });
     handle(mcCopyTo, [this] { CopyChosen(); });
-    handle(mcOpenExternally, [this] { OpenExternally(); });
 }
 
 // --- Undo ---
@@ -152,15 +150,6 @@ void SongCommands::CopyChosen() {
     if (!result.Failed.isEmpty())
         UserDialogs().ShowMessage(MessageKind::Warning, u"Diese Dateien konnten nicht kopiert werden:\n"_s +
                                                             result.Failed.join(u'\n'));
-}
-
-void SongCommands::OpenExternally() {
-    const SongIndex song = list_.FocusedSong();
-    if (song < 0) return;
-    const QString path = database_.ResolveSongPath(database_.Song(song).FileName);
-    if (path.isEmpty()) return;  // the user has no such medium at hand
-    if (!CurrentShell().OpenWithDefaultProgram(path))
-        throw EMusicDatabaseException(u"Kann kein Programm für diese Datei starten: "_s + path);
 }
 
 void SongCommands::Tell(const QString& sentence) const {

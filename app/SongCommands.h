@@ -33,7 +33,6 @@ class SongCommands {
     void Show(const UndoResult& result, const QString& done);
     void RemoveChosen();
     void CopyChosen();
-    void OpenExternally();
     QString RemovalQuestion(const std::vector<SongHandle>& songs) const;
     void Tell(const QString& sentence) const;
 

@@ -64,12 +64,14 @@ enum MenuCommand : int {
     mcEditBannList = 606,
     mcTagsFromNames = 607,
     mcConvertMarked = 608,
+    mcCorrect = 609,
     mcAllSongsSubmenu = 610,
     mcAdaptAllGenres = 611,
     mcSetFlagOfAll = 612,
     mcRemoveFlagOfAll = 613,
     mcRemoveAllTags = 614,
     mcRereadAllTags = 615,
+    mcCorrectAll = 616,
 };
 
 using DatabaseCommand = ComponentCommand<TMusicDatabase>;
@@ -88,4 +90,3 @@ extern const DatabaseCommands kDuplicateCommands;
 extern const DatabaseCommands kArtistCommands;
 extern const DatabaseCommands kBackupCommands;
 extern const DatabaseCommands kPlayCommands;
-extern const DatabaseCommands kLaterCommands;  // still to be built

@@ -1,6 +1,7 @@
 #include "app/desktop/NewInstallation.h"
 
 #include "CommonRUKTools/RWReg.h"
+#include "HTTPRetrieval/OnlineSearch.h"
 #include "MusicManagment/database/commands/DatabaseSettings.h"
 #include "MusicManagment/playback/PlayerSettings.h"
 #include "MusicManagment/playlist/PlayListSettings.h"
@@ -11,4 +12,5 @@ void BeginInstallation(TRWReg& settings) {
     StoreNewValues(PlayListSettings::kAll, settings);
     StoreNewValues(PlayerSettings::kEngines, settings);
     StoreNewValues(PlayerSettings::kOwn, settings);
+    StoreNewValues(OnlineSettings::kAll, settings);
 }

@@ -161,6 +161,14 @@ QWidget* SimilarArtistsForm::MakeButtons() {
     decisions_[2]->setText(u"&3: Andere Schreibweise..."_s);
     decisions_[3]->setText(u"&4: Es sind zwei"_s);
     layout->addStretch();
+    auto* correct = new QPushButton(u"&Korrekturdatei..."_s, bar);
+    correct->setObjectName(u"correct"_s);
+    correct->setToolTip(u"Ändert alle Songs, wie eine Datei mit richtigen Schreibweisen es sagt"_s);
+    correct->setAutoDefault(false);
+    connect(correct, &QPushButton::clicked, this, Guarded([this] {
+                if (OnCorrect) OnCorrect();
+            }));
+    layout->addWidget(correct);
     auto* close = new QPushButton(u"S&chließen"_s, bar);
     close->setAutoDefault(false);
     connect(close, &QPushButton::clicked, this, &QDialog::close);

@@ -26,6 +26,8 @@ class SimilarArtistsForm : public QDialog {
 
     // Takes back the last step of the user; false where there was none.
     std::function<bool()> OnUndo;
+    // Offers to correct all songs as a file of corrections says.
+    std::function<void()> OnCorrect;
 
  protected:
     bool eventFilter(QObject* watched, QEvent* event) override;

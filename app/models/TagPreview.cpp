@@ -81,12 +81,12 @@ QString PreviewLine(const TagPreviewRow& row) {
     return row.Field + u": "_s + Quoted(row.Old) + u" → "_s + Quoted(row.New);
 }
 
-QString PreviewSummary(const TagPreview& preview) {
-    if (preview.Songs == 0) return u"„Anwenden“ ändert nichts."_s;
+QString PreviewSummary(const TagPreview& preview, const QString& button) {
+    if (preview.Songs == 0) return u"„%1“ ändert nichts."_s.arg(button);
     const QString songs = preview.Songs == 1 ? u"1 Song"_s : u"%1 Songs"_s.arg(preview.Songs);
-    if (preview.Renamed == 0) return u"„Anwenden“ ändert %1 und benennt keine Datei um."_s.arg(songs);
+    if (preview.Renamed == 0) return u"„%1“ ändert %2 und benennt keine Datei um."_s.arg(button, songs);
     if (preview.Renamed > 1)
-        return u"„Anwenden“ ändert %1 und benennt %2 Dateien um."_s.arg(songs).arg(preview.Renamed);
-    return u"„Anwenden“ ändert %1 und benennt eine Datei um. Neuer Name: %2"_s.arg(songs,
-                                                                                   NameOf(preview.NewPath));
+        return u"„%1“ ändert %2 und benennt %3 Dateien um."_s.arg(button, songs).arg(preview.Renamed);
+    return u"„%1“ ändert %2 und benennt eine Datei um. Neuer Name: %3"_s.arg(button, songs,
+                                                                             NameOf(preview.NewPath));
 }

@@ -31,5 +31,5 @@ TagPreview PreviewOf(const TMusicDatabase& database, const std::vector<SongUpdat
 
 // "Album: Sommer → Winter"
 QString PreviewLine(const TagPreviewRow& row);
-// What all of it is, in a sentence.
-QString PreviewSummary(const TagPreview& preview);
+// What all of it is, in a sentence that names the button which does it.
+QString PreviewSummary(const TagPreview& preview, const QString& button);

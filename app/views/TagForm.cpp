@@ -242,6 +242,28 @@ void TID3TagForm::LookAgain() {
     ShowAll();
 }
 
+// --- Proposals ---
+
+SongHandle TID3TagForm::SongToProposeTo() const {
+    if (chosen_.size() != 1)
+        throw ERukException(u"Markieren Sie in der Liste zuerst den einen Song, um den es geht."_s);
+    return chosen_.front();
+}
+
+void TID3TagForm::Propose(const TagProposal& proposal) {
+    const SongHandle song = SongToProposeTo();
+    if (edits_.Songs() != std::vector{song} && !MayLeave()) throw EAbort();
+    if (!edits_.Touched()) Take({song});
+    if (!IsEditable()) throw ERukException(u"Der Tag lässt sich im Augenblick nicht bearbeiten."_s);
+    for (const auto& [field, text] : proposal.Fields)
+        edits_.Edit(field, text);
+    if (proposal.Cover) edits_.SetCover(*proposal.Cover);
+    show();
+    raise();
+    tabs_->setCurrentIndex(proposal.Cover ? 1 : 0);
+    Edited();
+}
+
 // --- Edits that are not applied ---
 
 void TID3TagForm::Edited() {
@@ -374,7 +396,7 @@ void TID3TagForm::ShowPreview() {
         preview =
             PreviewOf(database_, edits_.Updates(), [this](SongHandle song) { return edits_.TotalOf(song); });
     }
-    summary_->setText(fault ? *fault : edits_.Touched() ? PreviewSummary(preview) : QString());
+    summary_->setText(fault ? *fault : edits_.Touched() ? PreviewSummary(preview, u"Anwenden"_s) : QString());
     tabs_->setTabText(2, preview.Songs > 0 ? u"V&orschau (%1)"_s.arg(preview.Songs) : u"V&orschau"_s);
     preview_->SetRows(std::move(preview.Rows));
 }

@@ -18,6 +18,12 @@ class QTabWidget;
 class TagFields;
 class TagPreviewList;
 
+// What might stand in a song's tag.
+struct TagProposal {
+    std::vector<std::pair<SongFieldId, QString>> Fields{};
+    std::optional<CoverPicture> Cover{};
+};
+
 // The tool window that edits the tags of the focused or the marked songs. What was edited stays, whatever the
 // list shows meanwhile, until it is applied or the user gives it up.
 class TID3TagForm : public QDockWidget {
@@ -34,6 +40,11 @@ class TID3TagForm : public QDockWidget {
     SongHandle EditedSong(int end) const;
     // Comes to the front and lets the user type.
     void Edit();
+    // The one song that a proposal would be for; throws ERukException, for the user, unless there is one.
+    SongHandle SongToProposeTo() const;
+    // Brings suggestions from elsewhere as edits that are not applied, and comes to the front. May ask about
+    // edits of other songs; EAbort where these stay.
+    void Propose(const TagProposal& proposal);
     // Asks about edits that are not applied. False when they are to stay; never two questions at once.
     bool MayLeave();
 

@@ -16,6 +16,10 @@ inline constexpr Setting<QByteArray> kSongListColumns{u"SongListColumns"};
 inline constexpr Setting<int> kSongListFlag{u"SongListFlag", 0, 0, sfRemixed};
 // By which tags were read from the names of files last; empty: that of the files' names.
 inline constexpr Setting<QString> kTagsFromNamesPattern{u"TagsFromNamesPattern"};
+// The file by which artists and titles were corrected last.
+inline constexpr Setting<QString> kCorrectionFile{u"CorrectionFile"};
+// That songs are opened with; empty: the desktop's program for them.
+inline constexpr Setting<QString> kExternalProgram{u"ExternalProgram"};
 // Where converted songs go: beside their sources, into the folder, in their place.
 inline constexpr Setting<int> kConversionPlace{u"ConversionPlace", 0, 0, 2};
 inline constexpr Setting<QString> kConversionFolder{u"ConversionFolder"};

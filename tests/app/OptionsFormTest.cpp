@@ -29,7 +29,7 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr int kTabs = 8;
+constexpr int kTabs = 9;
 
 class OptionsFormTest : public testing::Test {
  protected:

@@ -4,6 +4,7 @@
 
 #include <QDir>
 #include <QFile>
+#include <QScopeGuard>
 #include <QTemporaryDir>
 
 #include "CommonRUKTools/Shell.h"
@@ -50,6 +51,7 @@ TEST(LyricsTool, TheArtistsOfTheSongsAreItsArguments) {
     }
     const LyricsToolPlaces places{.ProgramFolder = folder.filePath(u"bin"_s),
                                   .StoredFolder = folder.filePath(u"stored"_s)};
+    const auto restore = qScopeGuard([path = qgetenv("PATH")] { qputenv("PATH", path); });
     qputenv("PATH", folder.filePath(u"path"_s).toLocal8Bit());
     EXPECT_EQ(LoadLyrics(database, AllSongs(database), places), QString());
     EXPECT_EQ(dialogs.Messages,

@@ -18,15 +18,15 @@ constexpr MenuLine kSortLines[] = {411, 412, 413, 414, 415, 416, 417, 418, 419, 
 constexpr MenuOutline kSort{u"Anordnen nach", kSortLines, mcSortSubmenu};
 constexpr MenuLine kSubSortLines[] = {431, 432, 433};
 constexpr MenuOutline kSubSort{u"Untergeordnet anordnen nach", kSubSortLines, mcSubSortSubmenu};
-constexpr MenuLine kTagLines[] = {mcSetFlag, mcRemoveFlag, kSeparator, mcRereadTags, mcRemoveTags};
+constexpr MenuLine kTagLines[] = {mcSetFlag, mcRemoveFlag, kSeparator, mcCorrect, mcRereadTags, mcRemoveTags};
 constexpr MenuOutline kTags{
     .Caption = u"Tags und Flags", .Lines = kTagLines, .Id = mcTagsSubmenu, .For = kWriting};
 constexpr MenuLine kSongLines[] = {
     mcPlay,          mcAddToPlayList, mcOpenExternally, mcTakeGenre, &kTags,    mcRenameByPattern,
     mcTagsFromNames, mcConvertMarked, kSeparator,       &kSort,      &kSubSort, mcReverse,
     mcFollowFocus};
-constexpr MenuLine kAllSongsLines[] = {mcAdaptAllGenres, mcSetFlagOfAll,  mcRemoveFlagOfAll,
-                                       kSeparator,       mcRereadAllTags, mcRemoveAllTags};
+constexpr MenuLine kAllSongsLines[] = {mcAdaptAllGenres, mcSetFlagOfAll,  mcRemoveFlagOfAll, kSeparator,
+                                       mcCorrectAll,     mcRereadAllTags, mcRemoveAllTags};
 constexpr MenuOutline kAllSongs{
     .Caption = u"Tags und Flags aller Songs", .Lines = kAllSongsLines, .Id = mcAllSongsSubmenu};
 constexpr MenuLine kExtrasLines[] = {mcFindDuplicates,
@@ -74,8 +74,8 @@ CommandDispatcher& TMusicDatabase::Commands() {
                                     void* platformItem) { return TellOfClick(*this, item, platformItem); }});
     for (const DatabaseCommands& capability :
          {kFileCommands, kIntakeCommands, kFindCommands, kSongFileCommands, kOrderCommands, kOverviewCommands,
-          kPlayCommands, kBatchCommands, kMediaCommands, kDuplicateCommands, kArtistCommands, kBackupCommands,
-          kLaterCommands})
+          kPlayCommands, kBatchCommands, kMediaCommands, kDuplicateCommands, kArtistCommands,
+          kBackupCommands})
         commands_->Register(*this, capability);
     for (Listeners<>* change :
          {&CurrentOperation().Started, &CurrentOperation().Ended, &Events().ReadOnlyChanged})

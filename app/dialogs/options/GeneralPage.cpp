@@ -3,9 +3,12 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QFormLayout>
+#include <QLineEdit>
+#include <QStandardPaths>
 
 #include "MusicManagment/database/commands/DatabaseSettings.h"
 #include "app/desktop/Icons.h"
+#include "app/views/WindowSettings.h"
 
 using namespace Qt::StringLiterals;
 
@@ -31,6 +34,7 @@ GeneralPage::GeneralPage()
     fields_.Bind(AddCheck(use, u"Asynchronous"_s, u"O&berfläche während langer Vorgänge bedienbar halten"_s,
                           u"Ohne diese Option lässt sich ein Vorgang nicht anhalten, bis er fertig ist."_s),
                  DatabaseSettings::kAsynchronous);
+    AddProgram(use);
     QFormLayout& list = AddGroup(u"Liste"_s);
     sortType_ = AddField(list, u"SortType"_s, u"Songs an&ordnen nach"_s, new QComboBox);
     sortType_->addItems(SortTypes());
@@ -44,6 +48,20 @@ GeneralPage::GeneralPage()
     fields_.Bind(AddCheck(list, u"FollowFocus"_s, u"&Markierung verfolgen"_s,
                           u"Der gewählte Song bleibt im Blick, wenn die Liste neu sortiert wird."_s),
                  DatabaseSettings::kFollowFocus);
+}
+
+void GeneralPage::AddProgram(QFormLayout& group) {
+    program_ =
+        AddField(group, WindowSettings::kExternalProgram.Name.toString(), u"&Externes Programm für Songs"_s,
+                 new QLineEdit, u"Für „Mit externem Programm öffnen“: ein Name oder Pfad"_s);
+    program_->setPlaceholderText(u"das Programm des Desktops"_s);
+    fields_.Bind(program_, WindowSettings::kExternalProgram);
+}
+
+std::optional<OptionsFault> GeneralPage::Check() {
+    const QString program = program_->text();
+    if (program.isEmpty() || !QStandardPaths::findExecutable(program).isEmpty()) return std::nullopt;
+    return OptionsFault{u"Das Programm %1 ist nicht zu finden."_s.arg(program), program_};
 }
 
 // What the order consists of is set at once, which sorts once.

@@ -23,6 +23,7 @@
 #include "app/dialogs/options/DatabasePage.h"
 #include "app/dialogs/options/FilesPage.h"
 #include "app/dialogs/options/GeneralPage.h"
+#include "app/dialogs/options/InternetPage.h"
 #include "app/dialogs/options/PlaybackPage.h"
 #include "app/dialogs/options/RemoteControlPage.h"
 #include "app/dialogs/options/RulesPage.h"
@@ -67,6 +68,7 @@ TOptionsForm::TOptionsForm(TMusicDatabase& database, TRWReg& settings, QWidget* 
     AddPage(new CdsPage);
     AddPage(new ConversionPage);
     AddPage(new RemoteControlPage(database_));
+    AddPage(new InternetPage);
     LinkTwins();
     SetUpButtons();  // after the pages, as the tab key goes
     SetUpLayout();

@@ -13,7 +13,7 @@ class TMusicDatabase;
 class TRWReg;
 
 // The pages of the options, in the order of the list.
-enum class OptionsTab { General, Database, Files, Rules, Playback, Cds, Conversion, RemoteControl };
+enum class OptionsTab { General, Database, Files, Rules, Playback, Cds, Conversion, RemoteControl, Internet };
 
 // The options of the program: settings of the database, and in the settings store those of the components
 // that work with it.
