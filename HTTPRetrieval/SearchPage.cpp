@@ -52,9 +52,11 @@ bool SearchPage::Pass(QStringView mark) {
 }
 
 std::optional<QString> SearchPage::TextOfLink() const {
-    const qsizetype end = page_.indexOf(u"</a>"_s, place_);
+    constexpr QStringView kEnd = u"</a>";
+    const QStringView near = QStringView(page_).mid(place_, kLongestLink + kEnd.size());
+    const qsizetype end = near.indexOf(kEnd);
     if (end < 0) return std::nullopt;
-    QString text = page_.mid(place_, end - place_);
+    QString text = near.left(end).toString();
     for (const QStringView mark : kMarks)
         text.remove(mark.toString());
     return text;

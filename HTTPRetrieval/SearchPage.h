@@ -9,11 +9,14 @@
 // nothing else is.
 QString SearchPageUrl(const QString& host, const QString& query);
 
-// Reads the hits of a page from its beginning to its end. Whatever the page is, its work grows with its
-// length only.
+// Reads the hits of a page from its beginning to its end. Artist and title may lie within each other where
+// links are not closed; a link of more than 500 characters is none, so that what a page can cost grows with
+// its length only.
 class SearchPage {
  public:
     explicit SearchPage(QString page) : page_(std::move(page)) {}
+
+    static constexpr qsizetype kLongestLink = 500;
 
     std::optional<SearchHit> Next();
 

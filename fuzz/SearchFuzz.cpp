@@ -1,4 +1,4 @@
-// What search services may answer: a page, or with 'J' in front JSON. Hits must be within the answer.
+// What search services may answer: a page, or with 'J' in front JSON.
 
 #include <cstdlib>
 
@@ -7,12 +7,16 @@
 
 namespace {
 
+// Of the marks that Next goes by.
+constexpr qsizetype kShortestHit = sizeof("/list/artistInfo.php\">/list/song.phpg=>") - 1;
+
 void ReadPage(const QByteArray& bytes) {
     SearchPage page(QString::fromUtf8(bytes));
-    qsizetype length = 0;
-    while (const auto hit = page.Next())
-        length += hit->Artist.size() + hit->Title.size() + 1;
-    if (length > bytes.size()) std::abort();
+    qsizetype hits = 0;
+    while (const auto hit = page.Next()) {
+        const auto longest = std::max(hit->Artist.size(), hit->Title.size());
+        if (longest > SearchPage::kLongestLink || ++hits * kShortestHit > bytes.size()) std::abort();
+    }
 }
 
 void ReadJson(const QByteArray& bytes) {

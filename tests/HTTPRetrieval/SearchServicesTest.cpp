@@ -51,6 +51,9 @@ TEST(SearchPageTest, EveryHitIsReadAndAnIncompleteOneEndsIt) {
         {song.arg(u"1"_s) + one, {u"Die Band|Das Lied"_s}},
         // Between the two nothing is looked at.
         {artist.arg(u"A"_s) + artist.arg(u"B"_s) + song.arg(u"1"_s), {u"A|1"_s}},
+        // A link that is not closed ends with the next one, unless that is too far away.
+        {u"/list/artistInfo.php\">A /list/song.php?g=1>T</a>"_s, {u"A /list/song.php?g=1>T|T"_s}},
+        {artist.arg(QString(501, u'x')) + song.arg(u"1"_s), {}},
         {u"/list/artistInfo.php\">A</a>/list/song.php?g=1>no end"_s, {}},
         {u"/list/artistInfo.php no quote</a>/list/song.php?g=1>x</a>"_s, {}},
         {u"/list/artistInfo.php\">A</a>/list/song.php?x=1>t</a>"_s, {}},
