@@ -103,7 +103,7 @@ void THTTPGet::Cancel() {
     if (thread_) thread_->Drop();
 }
 
-void THTTPGet::Start(Wanted wanted, HTTPRequest request) {
+void THTTPGet::Start(Wanted wanted, const HTTPRequest& request) {
     wanted_ = wanted;
     running_ = true;
     const quint64 run = ++run_;

@@ -54,7 +54,7 @@ class THTTPGet : public QObject {
  private:
     enum class Wanted { Text, Bytes };
 
-    void Start(Wanted wanted, HTTPRequest request);
+    void Start(Wanted wanted, const HTTPRequest& request);
     void Take(quint64 run, const HTTPAnswer& answer);
     void Tell(const HTTPAnswer& answer);
 
