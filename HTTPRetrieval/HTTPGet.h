@@ -19,7 +19,8 @@ struct HTTPLimits {
 
 // Asks a server, one request at a time. The work is done in a thread of its own; the events are raised in the
 // thread of this object, from its event loop. Certificates are checked, the system's proxy is used, nothing
-// is kept of an answer (neither cookies nor a cache).
+// is kept of an answer (neither cookies nor a cache). An answer that is cut off is an error, but for one in
+// chunks: Qt 6.4 now and then takes its last chunk for whole.
 class THTTPGet : public QObject {
  public:
     THTTPGet();
