@@ -1,5 +1,6 @@
 #include "MusicManagment/database/batches/LyricsTool.h"
 
+#include <QDir>
 #include <QFileInfo>
 #include <QStandardPaths>
 
@@ -37,7 +38,7 @@ QString FindLyricsTool(const LyricsToolPlaces& places) {
         }
     }
     for (const QString& name : names)
-        if (const QString path = QStandardPaths::findExecutable(name); !path.isEmpty()) return path;
+        if (QString path = QStandardPaths::findExecutable(name); !path.isEmpty()) return path;
     return {};
 }
 
