@@ -13,12 +13,12 @@ cmake --preset release -DTUNESTEAD_TESTS=ON -DTUNESTEAD_BENCH=ON >/dev/null
 cmake --build --preset release
 tools/check_includes.sh build/release
 tools/check_data.sh build/release/bin
-ctest --preset release
+ctest --preset release --parallel "$(nproc)"
 
 echo "== Tests under the address and undefined-behaviour sanitizers"
 cmake --preset asan >/dev/null
 cmake --build --preset asan
-ctest --preset asan
+ctest --preset asan --parallel "$(nproc)"
 
 echo "== Lint"
 tools/lint.sh

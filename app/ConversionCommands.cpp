@@ -7,6 +7,8 @@
 #include "app/views/SongListWidget.h"
 #include "app/views/WindowSettings.h"
 
+using namespace Qt::StringLiterals;
+
 ConversionCommands::ConversionCommands(TMusicDatabase& database, SongListWidget& list)
     : database_(database), list_(list) {
     database_.JoinSettings(*this);
@@ -38,8 +40,9 @@ void ConversionCommands::Convert() {
     place_ = choice.Order.Place;
     folder_ = choice.Order.Folder;
     if (choice.Range == BatchRange::Marked) TellOfPassedMarks(marked);
-    ReportConversion(ConvertSongs(database_, choice.Range == BatchRange::All ? AllSongs(database_) : marked,
-                                  choice.Order));
+    ReportMediaBatch(
+        ConvertSongs(database_, choice.Range == BatchRange::All ? AllSongs(database_) : marked, choice.Order),
+        u"konvertiert"_s);
 }
 
 void ConversionCommands::LoadSettings(const TRWReg& settings) {

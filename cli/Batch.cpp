@@ -92,7 +92,8 @@ int RunBatchCommand(const Arguments& arguments, Console& console) {
     const BatchSongs songs{.Range = BatchRange::Marked, .Songs = chosen.Songs};
     const JournalSession journal(console);
     const RunWatcher watcher(database, console, StopBy::Interrupt);
-    const AgreeingDialogs agreeing(arguments.Has(u"--yes"));
+    std::optional<AgreeingDialogs> agreeing;
+    if (arguments.Has(u"--yes")) agreeing.emplace();
     const Outcome outcome = deed(database, songs);
     WriteOutcome(outcome, arguments.Has(u"--json"), console);
     for (const QString& remark : outcome.Remarks)

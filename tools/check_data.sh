@@ -28,7 +28,8 @@ pages_lack() {
     done < <(options "$@")
 }
 complaints+=$(pages_lack man/tunestead.1 "$programs/tunestead")
-for command in info scan list groups save playlist play convert; do
+commands=$("$programs/tunestead-cli" --help | sed -nE 's/^  ([a-z][a-z-]*) .*/\1/p')
+for command in ${commands:?the help names none}; do
     complaints+=$(pages_lack man/tunestead-cli.1 "$programs/tunestead-cli" "$command")
 done
 

@@ -1,6 +1,5 @@
 #include "MusicManagment/conversion/ConvertSongs.h"
 
-#include "CommonRUKTools/Dialogs.h"
 #include "CommonRUKTools/FileWork.h"
 #include "MusicManagment/conversion/ConversionRun.h"
 #include "MusicManagment/conversion/ConversionTargets.h"
@@ -79,7 +78,7 @@ class SongConversion {
         for (std::size_t i = 0; i < ways_.size(); ++i) {
             ways_[i].Outcome = std::move(outcomes[i]);
             const ConversionOutcome& outcome = ways_[i].Outcome;
-            if (outcome.Done) ++result_.Converted;
+            if (outcome.Done) ++result_.Done;
             if (!outcome.Error.isEmpty())
                 result_.Failed << ways_[i].Record.FileName + u": "_s + outcome.Error;
         }
@@ -137,15 +136,4 @@ ConversionResult ConvertSongs(TMusicDatabase& database, const BatchSongs& songs,
                               const ConversionOrder& order) {
     if (songs.IsEmpty()) return {};
     return SongConversion(database, order).Run(songs);
-}
-
-void ReportConversion(const ConversionResult& result) {
-    QString text = SongCountText(static_cast<std::size_t>(result.Converted)) + u" konvertiert"_s;
-    if (!result.Failed.isEmpty())
-        text += u", bei "_s + QString::number(result.Failed.size()) + u" ging es nicht"_s;
-    text += result.Stopped ? u". Abgebrochen; was bis dahin fertig war, bleibt."_s : u"."_s;
-    std::vector<ReportSection> sections = {{u"Nicht gelungen"_s, result.Failed, true},
-                                           {u"Datenträger nicht eingelegt"_s, result.Missing, true}};
-    std::erase_if(sections, [](const ReportSection& section) { return section.Lines.isEmpty(); });
-    UserDialogs().ShowReport({.Message = text, .Sections = std::move(sections), .OpenAsText = {}});
 }

@@ -2,6 +2,7 @@
 
 #include "MusicManagment/conversion/EncoderSettings.h"
 #include "MusicManagment/database/batches/BatchSongs.h"
+#include "MusicManagment/database/batches/MediaCopies.h"
 
 // Songs of the collection become files of another format, by its encoder settings.
 
@@ -17,12 +18,8 @@ struct ConversionOrder {
     QString Folder{};
 };
 
-struct ConversionResult {
-    int Converted = 0;
-    int Replaced = 0;       // of these, songs that have the new file now
-    QStringList Failed{};   // path and reason
-    QStringList Missing{};  // songs whose medium was not put in
-    bool Stopped = false;
+struct ConversionResult : MediaBatchResult {
+    int Replaced = 0;  // of those done, songs that have the new file now
 };
 
 // A long operation. Beside and in the folder the new files are no songs of the collection. A song on a medium
@@ -32,6 +29,3 @@ struct ConversionResult {
 // EAbort, after telling the user, when another operation runs.
 ConversionResult ConvertSongs(TMusicDatabase& database, const BatchSongs& songs,
                               const ConversionOrder& order);
-
-// Tells the user what came of it.
-void ReportConversion(const ConversionResult& result);

@@ -79,9 +79,8 @@ QGroupBox* ConversionDialog::MakePlaces() {
     inPlace_->setObjectName(u"inPlace"_s);
     auto* note = new WrappedLabel(u"note"_s);
     note->setText(
-        u"Songs auf Datenträgern bekommen, außer im Ordner, eine Kopie auf der Festplatte. Rückgängig holt "
-        u"die "
-        "Quellen zurück."_s);
+        u"Songs auf Datenträgern bekommen, außer im Ordner, eine Kopie auf der Festplatte. "
+        "Rückgängig holt die Quellen zurück."_s);
     auto* layout = new QVBoxLayout(box);
     for (QWidget* row : std::initializer_list<QWidget*>{beside_, inFolder_, folder_, inPlace_, note})
         layout->addWidget(row);

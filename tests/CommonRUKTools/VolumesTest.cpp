@@ -1,5 +1,7 @@
 #include <gtest/gtest.h>
 
+#include <QStringList>
+
 #include "CommonRUKTools/MountTable.h"
 #include "CommonRUKTools/VolumeSerials.h"
 #include "CommonRUKTools/Volumes.h"

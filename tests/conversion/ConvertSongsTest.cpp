@@ -71,7 +71,7 @@ TEST_F(ConvertSongsTest, InPlaceTheSongGoesOnWithItsNewFileAndIsTakenBack) {
 
     const ConversionResult result = ConvertSongs(
         database_, AllSongs(database_), {.Format = MusicFormat::Mp3, .Place = ConversionPlace::InPlace});
-    EXPECT_EQ(result.Converted, 2);
+    EXPECT_EQ(result.Done, 2);
     EXPECT_EQ(result.Replaced, 2);
     ASSERT_EQ(result.Failed.size(), 1);
     EXPECT_TRUE(result.Failed[0].startsWith(folder_.Path(u"drei.wav"_s)));
@@ -99,10 +99,10 @@ TEST_F(ConvertSongsTest, InPlaceTheSongGoesOnWithItsNewFileAndIsTakenBack) {
 TEST_F(ConvertSongsTest, BesideAndInAFolderTheCollectionStaysAsItIs) {
     const SongHandle a = Add(u"a.wav"_s);
     const TID3Tag before = Song(a);
-    EXPECT_EQ(ConvertSongs(database_, OneSong(a), {.Format = MusicFormat::Wma}).Converted, 1);
+    EXPECT_EQ(ConvertSongs(database_, OneSong(a), {.Format = MusicFormat::Wma}).Done, 1);
     EXPECT_EQ(ConvertSongs(database_, OneSong(a),
                            {.Place = ConversionPlace::Folder, .Folder = folder_.Path(u"neu/hier"_s)})
-                  .Converted,
+                  .Done,
               1);
     EXPECT_TRUE(QFile::exists(folder_.Path(u"a.wma"_s)) && QFile::exists(folder_.Path(u"neu/hier/a.mp3"_s)));
     EXPECT_EQ(Song(a), before);
@@ -121,7 +121,7 @@ TEST_F(ConvertSongsTest, ASongOnAMediumGetsACopyThatIsPlayedAndDropped) {
     const QString song = database_.Song(0).FileName;
     const ConversionResult result = ConvertSongs(
         database_, AllSongs(database_), {.Format = MusicFormat::Wma, .Place = ConversionPlace::InPlace});
-    EXPECT_EQ(result.Converted, 1);
+    EXPECT_EQ(result.Done, 1);
     EXPECT_EQ(database_.Song(0).FileName, song);
     volumes_.Now.clear();
     const QString copy = database_.ResolveSongPath(song, {.Ask = false});

@@ -238,18 +238,17 @@ struct Case {
     const char* Name;
     int Songs;
     unsigned Doing;
+    int Moments = 40;  // at which a process is ended, or all of them
 };
 
 class KilledTest : public JournalTest, public testing::WithParamInterface<Case> {
  protected:
-    // Returns how far apart the moments lie at which a process is ended: all of them, or as many evenly
-    // spread ones.
+    // Returns how far apart the moments lie at which a process is ended, evenly spread.
     static int ChangeAll(Songs& songs) {
-        constexpr int kMoments = 40;
         StepGate gate;
         songs.Change(gate);
         EXPECT_EQ(songs.Failures(), QStringList());
-        return std::max(1, gate.Steps / kMoments);
+        return std::max(1, gate.Steps / GetParam().Moments);
     }
     // After any end: whole files, an agreeing collection, and everything can be taken back.
     static void CheckAfter(Songs& songs) {
@@ -267,7 +266,7 @@ INSTANTIATE_TEST_SUITE_P(Journal, KilledTest,
                                          Case{"Rename", 4, kRename}, Case{"Across", 2, kAcross},
                                          Case{"RebuildAndMove", 2, kRebuild | kAcross},
                                          Case{"Trash", 3, kTrash},
-                                         Case{"FiftySongs", 50, kRebuild | kRename}),
+                                         Case{"FiftySongs", 50, kRebuild | kRename, 10}),
                          [](const auto& test) { return std::string(test.param.Name); });
 #endif
 

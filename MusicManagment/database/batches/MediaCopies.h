@@ -2,7 +2,7 @@
 
 #include "MusicManagment/database/MusicManagment.h"
 
-// What the batches that copy songs have in common.
+// What the batches that make files of songs have in common.
 
 // What came of them.
 struct MediaBatchResult {

@@ -9,12 +9,11 @@
 #include "MusicManagment/playback/winamp/Waiting.h"
 #include "tests/PrintQt.h"
 #include "tests/playback/engines/OtherProgram.h"
+#include "tests/playback/engines/Patience.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
-
-constexpr int kPatience = 10000;  // ms; only a failing test waits so long
 
 TEST(FrameTest, AFrameComesOutAsItWentIn) {
     const Frame frames[] = {

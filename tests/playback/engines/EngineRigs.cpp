@@ -16,13 +16,13 @@
 #include "tests/PrivateBus.h"
 #include "tests/playback/control/PlayerRig.h"
 #include "tests/playback/engines/FakePlayer.h"
+#include "tests/playback/engines/Patience.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
 
 constexpr int kStep = 20;  // ms
-constexpr int kPatience = 30'000;
 
 template <typename Exception>
 QString OpenErrorOf(TPlaySoundContainer& sound) {

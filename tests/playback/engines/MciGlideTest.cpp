@@ -9,6 +9,7 @@
 #include "MusicManagment/playback/mci/MCIPlaySound.h"
 #include "MusicManagment/playback/winamp/Waiting.h"
 #include "tests/playback/SoundFiles.h"
+#include "tests/playback/engines/Patience.h"
 
 using namespace Qt::StringLiterals;
 
@@ -16,7 +17,6 @@ namespace {
 
 constexpr Tone kLoud = {.frequency = 100, .amplitude = 0.999};
 constexpr int kRate = 44100;
-constexpr int kPatience = 30'000;  // ms; only a failing test waits so long
 
 // What a device would have been given, written down by the threads of GStreamer.
 class Heard {

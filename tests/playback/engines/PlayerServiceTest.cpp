@@ -7,12 +7,11 @@
 #include "MusicManagment/playback/winamp/Waiting.h"
 #include "tests/playback/control/PlayerRig.h"
 #include "tests/playback/engines/OtherProgram.h"
+#include "tests/playback/engines/Patience.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
-
-constexpr int kPatience = 10000;  // ms; only a failing test waits so long
 
 // The player program with scripted engines.
 struct PlayerProgram {

@@ -6,12 +6,11 @@
 #include "MusicManagment/playback/winamp/Waiting.h"
 #include "tests/playback/SoundFiles.h"
 #include "tests/playback/control/PlayerRig.h"
+#include "tests/playback/engines/Patience.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
-
-constexpr int kPatience = 20000;  // ms; only a failing test waits so long
 
 TEST(TSPlayerTest, IsStartedPlaysASongToItsEndAndEndsWithItsController) {
     const QTemporaryDir folder;

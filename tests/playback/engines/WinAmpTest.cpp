@@ -10,12 +10,11 @@
 #include "tests/PrivateBus.h"
 #include "tests/playback/control/PlayerRig.h"
 #include "tests/playback/engines/FakePlayer.h"
+#include "tests/playback/engines/Patience.h"
 
 using namespace Qt::StringLiterals;
 
 namespace {
-
-constexpr int kPatience = 10000;  // ms; only a failing test waits so long
 
 class WinAmpTest : public testing::Test {
  protected:
