@@ -4,11 +4,14 @@
 
 #include "CommonRUKTools/CodePage.h"
 #include "CommonRUKTools/CommandRunner.h"
+#include "CommonRUKTools/FileSource.h"
 #include "MusicManagment/database/commands/DatabaseSettings.h"
 #include "MusicManagment/playback/PlaySound.h"
 #include "MusicManagment/playlist/PlayList.h"
 #include "MusicManagmentRemoteControl/LineDialogs.h"
 #include "MusicManagmentRemoteControl/MessageTable.h"
+
+using namespace Qt::StringLiterals;
 
 TRemoteControl::TRemoteControl(std::unique_ptr<RemoteChannel> channel, QObject* parent)
     : QObject(parent), channel_(std::move(channel)) {
@@ -122,8 +125,12 @@ qint32 TRemoteControl::ReceiveCopyData(quint32 code, const QByteArray& bytes) {
     qint32 answer = 0;
     Carry([&] {
         const QByteArray text = bytes.split('\0').first();
-        playSound_->SetFileName(CodePage::FromLegacy({reinterpret_cast<const std::uint8_t*>(text.constData()),
-                                                      static_cast<std::size_t>(text.size())}));
+        const QString name = CodePage::FromLegacy(
+            {reinterpret_cast<const std::uint8_t*>(text.constData()), static_cast<std::size_t>(text.size())});
+        playSound_->SetFileName(name);
+        // The player passes over it without a word.
+        if (!name.isEmpty() && !FileSource::Exists(name))
+            throw ERemoteControlException(u"Datei nicht gefunden: "_s + name);
         answer = 1;
         if (OnEventFired) OnEventFired(*this);
     });

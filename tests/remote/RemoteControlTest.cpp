@@ -136,10 +136,11 @@ TEST(RemoteControl, PreviousGoesBackAndFilesAreOpenedByName) {
     EXPECT_EQ(rig.Copy(kRemoteOpenFile, umlauts.toLatin1()), 1);
     EXPECT_EQ(rig.Song.File, umlauts);
     EXPECT_EQ(rig.Copy(kRemoteOpenFile, rig.Folder.Add(u"a.xyz"_s).toUtf8()), 0);
-    EXPECT_EQ(rig.Told.size(), 1);
+    EXPECT_EQ(rig.Copy(kRemoteOpenFile, "/missing.wav"), 0);
+    EXPECT_EQ(rig.Told.size(), 2);
     rig.List.Clear();
     rig.Send(rmNext);
-    EXPECT_EQ(rig.Told.size(), 2);
+    EXPECT_EQ(rig.Told.size(), 3);
     EXPECT_EQ(rig.Dialogs.Messages, QStringList());
 }
 
