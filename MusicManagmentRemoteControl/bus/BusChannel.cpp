@@ -4,6 +4,7 @@
 #include <QDBusConnectionInterface>
 #include <QDBusPendingCallWatcher>
 #include <QDBusPendingReply>
+#include <QDBusReply>
 #include <algorithm>
 #include <limits>
 
@@ -81,27 +82,29 @@ BusChannel::~BusChannel() {
     Close();
 }
 
-// A second program of the same user stands beside the first.
+// A second program of the same user stands beside the first, and takes its place when it has gone.
 void BusChannel::Open(RemoteReceiver& receiver) {
     receiver_ = &receiver;
     if (!door_.Open(bus_, kRemotePath))
         throw ERemoteControlException(
             u"Fehler beim Erstellen eines Hilfs-Fensters für TRemoteControl (CreateWindow fehlgeschlagen)"_s);
     const QString own = kRemoteService + u".instance%1"_s.arg(QCoreApplication::applicationPid());
-    for (const QString& name : {kRemoteService, own}) {
-        if (!bus_.registerService(name)) continue;
-        serviceName_ = name;
-        return;
-    }
+    const QDBusConnectionInterface::RegisterServiceReply place =
+        bus_.interface()->registerService(kRemoteService, QDBusConnectionInterface::QueueService);
+    if (place != QDBusConnectionInterface::ServiceNotRegistered) serviceNames_ << kRemoteService;
+    if (place == QDBusConnectionInterface::ServiceRegistered) return;
+    if (bus_.registerService(own)) serviceNames_ << own;
+    if (!serviceNames_.isEmpty()) return;
     door_.Close();
     throw ERemoteControlException(
         u"Fehler beim Erstellen eines Hilfs-Fensters für TRemoteControl (RegisterClass fehlgeschlagen)"_s);
 }
 
 void BusChannel::Close() {
-    if (serviceName_.isEmpty()) return;
+    if (serviceNames_.isEmpty()) return;
     AnswerWaiting(0);
-    bus_.unregisterService(std::exchange(serviceName_, {}));
+    for (const QString& name : std::exchange(serviceNames_, {}))
+        bus_.unregisterService(name);
     door_.Close();
     clients_.clear();
     watcher_.setWatchedServices({});

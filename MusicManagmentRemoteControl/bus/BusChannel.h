@@ -3,6 +3,7 @@
 #include <QDBusConnection>
 #include <QDBusServiceWatcher>
 #include <QMap>
+#include <QStringList>
 #include <vector>
 
 #include "MusicManagmentRemoteControl/RemoteChannel.h"
@@ -32,7 +33,7 @@ class BusChannel : public RemoteChannel {
     QDBusConnection bus_;
     BusDoor door_;
     RemoteReceiver* receiver_ = nullptr;
-    QString serviceName_;
+    QStringList serviceNames_;        // held or waited for
     QMap<quint32, QString> clients_;  // those who have registered, by handle
     quint32 lastHandle_;
     std::vector<QDBusMessage> waiting_;  // for the end of the song

@@ -91,7 +91,11 @@ TEST_F(BusChannelTest, ForgetsProgramsThatHaveGone) {
     EXPECT_TRUE(QTest::qWaitFor([&] { return Ask(u"Send"_s, {2327u, window, 1}) == 0; }));
 }
 
-TEST_F(BusChannelTest, IsGoneForOthersAfterACloseMessage) {
+TEST_F(BusChannelTest, ASecondProgramTakesThePlaceOfOneThatIsClosed) {
+    TRemoteControl second(std::make_unique<BusChannel>(bus_.Connect(u"other"_s)));
+    EXPECT_EQ(Ask(u"Send"_s, {2126u, 0, 0}), 10'000);
+    EXPECT_EQ(Ask(u"Send"_s, {1026u, 0, 0}), 0);
+    EXPECT_EQ(Ask(u"Send"_s, {2126u, 0, 0}), -1);  // it has no player
     EXPECT_EQ(Ask(u"Send"_s, {1026u, 0, 0}), 0);
     EXPECT_EQ(ErrorOf(u"Send"_s, {1025u, 0, 0}), QDBusError::ServiceUnknown);
 }
