@@ -5,7 +5,9 @@
 #include <QMenu>
 #include <QMenuBar>
 #include <QSet>
+#include <QTimer>
 #include <algorithm>
+#include <utility>
 
 #include "CommonRUKTools/CommandDispatcher.h"
 #include "CommonRUKTools/CommandRunner.h"
@@ -14,6 +16,7 @@
 #include "MusicManagment/database/media/CataloguedMedia.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
 #include "MusicManagment/playlist/PlayListMenu.h"
+#include "MusicManagmentRemoteControl/LineDialogs.h"
 #include "app/MenuIcons.h"
 #include "app/ShellCommands.h"
 #include "app/desktop/Icons.h"
@@ -137,6 +140,7 @@ void Playing::JoinDesktop(QMainWindow& window) {
         Mpris::Hooks{.OpenFile = [this](const QString& path) { OpenFile(path); },
                      .Raise = [&window] { RaiseWindow(window, QString()); },
                      .Quit = [this] { database_.ClickMenuItem(scExit); },
+                     .Tell = [this](const QString& text) { Tell(text); },
                      .Volume = [this] { return playerForm_->Panel().Volume().Part(); },
                      .SetVolume = [this](double volume) { playerForm_->Panel().Volume().SetPart(volume); },
                      .MusicFolder = [] { return MusicFolder(); },
@@ -149,9 +153,11 @@ void Playing::FollowPlayer() {
     PlayerEvents& events = player_.Events();
     subscriptions_ += events.Changed.Subscribe([this] { FollowSong(); });
     subscriptions_ += events.Started.Subscribe([this] { followers_.FollowSong(); });
-    subscriptions_ += events.Notice.Subscribe([this](const QString& text) {
-        if (OnDone) OnDone(InOneLine(text));
-    });
+    subscriptions_ += events.Notice.Subscribe([this](const QString& text) { Tell(InOneLine(text)); });
+}
+
+void Playing::Tell(const QString& sentence) {
+    if (OnDone) OnDone(sentence);
 }
 
 // The lists go along with the songs that are played.
@@ -246,7 +252,7 @@ void Playing::AddChosen() {
     QString sentence = SongCountText(added) + u" zur PlayList hinzugefügt"_s;
     if (const std::size_t known = songs.size() - added; known > 0)
         sentence += u", %1 schon darin"_s.arg(known == 1 ? u"1 war"_s : u"%1 waren"_s.arg(known));
-    if (OnDone) OnDone(sentence + u'.');
+    Tell(sentence + u'.');
 }
 
 // What the user has chosen ends what he chose before.
@@ -261,7 +267,7 @@ void Playing::PlayEntry(int index, SongIndex hint) {
     // That its medium is not at hand the user has just said himself.
     const QString file = FileWithinReach(database_, name);
     if (!file.isEmpty()) throw EPlayListException(u"Die Datei ist nicht verfügbar: "_s + file);
-    if (OnDone) OnDone(u"Der Datenträger ist nicht eingelegt: "_s + PathForPeople(database_, name));
+    Tell(u"Der Datenträger ist nicht eingelegt: "_s + PathForPeople(database_, name));
 }
 
 // --- Files ---
@@ -282,14 +288,41 @@ void Playing::OpenSong(const QString& path) {
 }
 
 void Playing::OpenFile(const QString& path) {
-    if (KindOfFile(path) == FileKind::Song && !QFileInfo(path).isDir()) return OpenSong(path);
-    if (KindOfFile(path) == FileKind::PlayList) {
-        OpenPlayList(path);
-        return PlayFromStart(path);
-    }
-    if (!QFileInfo(path).isDir()) return;
+    const QFileInfo file(path);
+    if (!file.exists()) throw EPlayListException(u"Datei nicht gefunden: "_s + path);
+    if (file.isDir()) return OpenFolder(path);
+    const FileKind kind = KindOfFile(path);
+    if (kind == FileKind::Song) return OpenSong(path);
+    if (kind == FileKind::PlayList) return OpenPlayListLater(path);
+    throw EPlayListException(u"Unbekannter Dateityp: "_s + FileExtension(path));
+}
+
+void Playing::OpenFolder(const QString& path) {
     const int first = list_.Count();
-    if (list_.InsertFiles(first, {path}) > 0) PlayChosenEntry(first);
+    if (list_.InsertFiles(first, {path}) == 0)
+        throw EPlayListException(u"In diesem Ordner sind keine Songs: "_s + path);
+    PlayChosenEntry(first);
+}
+
+// The other program has its answer first: the user may be asked what becomes of the open list. One question
+// at a time.
+void Playing::OpenPlayListLater(const QString& path) {
+    if (std::exchange(opensList_, true))
+        throw EPlayListException(u"Tunestead wartet noch auf eine Antwort zur PlayList."_s);
+    QTimer::singleShot(0, listForm_, [this, path] {
+        const std::function<void(const QString&)> tell = [this](const QString& text) {
+            Tell(InOneLine(text));
+        };
+        const LineDialogs lines(tell);
+        RunCommand([&] {
+            const bool mayBe = list_.MayBeReplaced();
+            Tell({});  // that somebody else wants an answer
+            if (!mayBe) return;
+            list_.SetPlayListFileName(path);
+            PlayFromStart(path);
+        });
+        opensList_ = false;
+    });
 }
 
 // Unless the user has kept the former list. What cannot be played is passed over.

@@ -53,7 +53,7 @@ class Playing {
     void OpenPlayList(const QString& path);
     void OpenSong(const QString& path);
     // What another program names: a song, a list or a folder. Its songs join the list, but a list takes its
-    // place; the first of them plays.
+    // place, a moment later because the user may have to be asked; the first of them plays.
     void OpenFile(const QString& path);
     // Like OpenSong, from the place where the file `instead` is, if that is open.
     void OpenSongInstead(const QString& path, const QString& instead);
@@ -67,6 +67,9 @@ class Playing {
     void JoinDesktop(QMainWindow& window);
     void FollowPlayer();
     void FollowSong();
+    void Tell(const QString& sentence);
+    void OpenFolder(const QString& path);
+    void OpenPlayListLater(const QString& path);
     void PlayFromFocus();
     void PlayFromStart(const QString& list);
     int Append(const std::vector<SongIndex>& songs);
@@ -80,6 +83,7 @@ class Playing {
     SongListWidget& songs_;
     const QString standardList_;
     bool standardListIsUnread_ = true;
+    bool opensList_ = false;  // for another program
     TPlayList list_;
     TPlaySound player_;
     ShownFollowers followers_{list_};

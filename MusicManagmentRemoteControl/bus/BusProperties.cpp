@@ -20,8 +20,14 @@ bool AnswerProperties(const BusProperties& properties, const QDBusMessage& call,
     if (!isGet && call.member() != u"Set"_s) return false;
     if (!values.contains(name)) return Refuse(bus, call, QDBusError::UnknownProperty, name), true;
     if (isGet) return Reply(bus, call, {QVariant::fromValue(QDBusVariant(values.value(name)))}), true;
-    if (!properties.Set) return Refuse(bus, call, QDBusError::PropertyReadOnly, name), true;
-    RunCommand([&] { properties.Set(name, arguments.value(2).value<QDBusVariant>().variant()); });
-    Reply(bus, call);
+    const QVariant value = arguments.value(2).value<QDBusVariant>().variant();
+    if (value.userType() != values.value(name).userType())
+        return Refuse(bus, call, QDBusError::InvalidArgs, name), true;
+    bool canBeSet = properties.Set != nullptr;
+    if (canBeSet) RunCommand([&] { canBeSet = properties.Set(name, value); });
+    if (canBeSet)
+        Reply(bus, call);
+    else
+        Refuse(bus, call, QDBusError::PropertyReadOnly, name);
     return true;
 }

@@ -10,8 +10,8 @@ QString PropertiesInterface();
 
 struct BusProperties {
     std::function<QVariantMap(const QString& interface)> Of;
-    // Unset: none can be set.
-    std::function<void(const QString& name, const QVariant& value)> Set{};
+    // Gets a value of the property's own type; false for a property that cannot be set. Unset: none can be.
+    std::function<bool(const QString& name, const QVariant& value)> Set{};
 };
 
 // Answers a call of that interface; false when it has no such method.

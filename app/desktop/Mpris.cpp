@@ -10,7 +10,9 @@
 #include "CommonRUKTools/CommandRunner.h"
 #include "MusicManagment/playback/PlaySound.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
+#include "MusicManagmentRemoteControl/LineDialogs.h"
 #include "MusicManagmentRemoteControl/bus/BusProperties.h"
+#include "app/desktop/MimeTypes.h"
 #include "app/desktop/MprisInterfaces.h"
 #include "app/desktop/MprisMetadata.h"
 
@@ -36,6 +38,14 @@ struct PlayerCall {
     QStringView Method;
     int Command;
 };
+
+QStringList MimeTypesToPlay() {
+    QStringList types{u"audio/mpeg"_s,     u"audio/mp2"_s,       u"video/mpeg"_s,   u"audio/x-wav"_s,
+                      u"audio/x-ms-wma"_s, u"audio/x-mpegurl"_s, u"audio/x-scpls"_s};
+    for (const FileType& type : OwnFileTypes())
+        if (type.Kind == FileKind::PlayList) types << type.MimeType.toString();
+    return types;
+}
 
 constexpr PlayerCall kCalls[] = {
     {u"Next", plNext}, {u"Previous", plPrevious}, {u"Stop", plStop}, {u"Play", plPlay}};
@@ -101,14 +111,26 @@ bool Mpris::Handle(const QDBusMessage& message, const QDBusConnection& connectio
     if (message.interface() != PropertiesInterface()) return HandleCall(message, connection);
     return AnswerProperties(
         {.Of = [this](const QString& interface) { return PropertiesOf(interface); },
-         .Set = [this](const QString& name, const QVariant& value) { SetProperty(name, value); }},
+         .Set = [this](const QString& name, const QVariant& value) { return SetProperty(name, value); }},
         message, connection);
 }
 
-// A command that fails is known as well: the user is told, not the bus.
+// Why a call has failed is told to the caller, and to the user in a place that needs no answer: the caller
+// waits.
 bool Mpris::HandleCall(const QDBusMessage& message, const QDBusConnection& connection) {
     std::optional<QVariantList> answer = QVariantList();
-    RunCommand([&] { answer = Call(message); });
+    QString told;
+    bool failed = true;
+    const std::function<void(const QString&)> tell = [&](const QString& text) {
+        told = text.simplified();
+        if (hooks_.Tell) hooks_.Tell(told);
+    };
+    const LineDialogs lines(tell);
+    RunCommand([&] {
+        answer = Call(message);
+        failed = false;
+    });
+    if (failed && !told.isEmpty()) return Refuse(connection, message, QDBusError::Failed, told), true;
     if (answer) Reply(connection, message, *answer);
     return answer.has_value();
 }
@@ -124,15 +146,18 @@ std::optional<QVariantList> Mpris::Call(const QDBusMessage& message) {
 }
 
 // The rate can be set only to what it is.
-void Mpris::SetProperty(const QString& name, const QVariant& value) {
+bool Mpris::SetProperty(const QString& name, const QVariant& value) {
     if (name == u"Shuffle"_s)
         list_.SetPlayOrder(value.toBool() ? poRandom : poDownwards);
     else if (name == u"LoopStatus"_s)
-        list_.SetRepeatAll(value.toString() != u"None"_s);
+        list_.SetRepeatAll(value.toString() == u"Playlist"_s || value.toString() == u"Track"_s);
     else if (name == u"Volume"_s)
         hooks_.SetVolume(std::clamp(value.toDouble(), 0.0, 1.0));
+    else if (name != u"Rate"_s)
+        return false;
     list_.RedrawView();
     Update();
+    return true;
 }
 
 bool Mpris::CallRoot(const QString& method) {
@@ -169,7 +194,8 @@ bool Mpris::CallPlayer(const QString& method, const QVariantList& arguments) {
 // Nothing is fetched from elsewhere.
 void Mpris::Open(const QString& uri) {
     const QString path = QUrl(uri).toLocalFile();
-    if (!path.isEmpty()) hooks_.OpenFile(path);
+    if (path.isEmpty()) throw ERukException(u"Nur Dateien können geöffnet werden: "_s + uri);
+    hooks_.OpenFile(path);
 }
 
 // Behind the end the next song begins.
@@ -202,7 +228,7 @@ QVariantMap Mpris::RootProperties() const {
         {u"Identity"_s, u"Tunestead"_s},
         {u"DesktopEntry"_s, u"tunestead"_s},
         {u"SupportedUriSchemes"_s, QStringList(u"file"_s)},
-        {u"SupportedMimeTypes"_s, QStringList({u"audio/mpeg"_s, u"audio/x-wav"_s, u"audio/x-ms-wma"_s})},
+        {u"SupportedMimeTypes"_s, MimeTypesToPlay()},
     };
 }
 

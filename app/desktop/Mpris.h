@@ -22,10 +22,12 @@ class Mpris : public QObject {
  public:
     // What other parts of the program do for the desktop.
     struct Hooks {
-        // Plays a song, a list or the songs of a folder.
+        // Plays a song, a list or the songs of a folder. Throws when it cannot.
         std::function<void(const QString& path)> OpenFile;
         std::function<void()> Raise;
         std::function<void()> Quit;
+        // What the user is told of a call, for a place that needs no answer; may be unset.
+        std::function<void(const QString& text)> Tell{};
         std::function<double()> Volume = [] { return 1.0; };  // 0 to 1, as on a slider
         std::function<void(double volume)> SetVolume;
         std::function<QString()> MusicFolder{};  // whose playlists are offered; may be unset
@@ -52,7 +54,7 @@ class Mpris : public QObject {
 
     bool Handle(const QDBusMessage& message, const QDBusConnection& connection);
     bool HandleCall(const QDBusMessage& message, const QDBusConnection& connection);
-    void SetProperty(const QString& name, const QVariant& value);
+    bool SetProperty(const QString& name, const QVariant& value);
     QVariantMap PropertiesOf(const QString& interface) const;
     QVariantMap RootProperties() const;
     QVariantMap PlayerProperties() const;

@@ -62,7 +62,8 @@ std::optional<QVariantList> MprisTrackList::Call(const QString& method, const QV
              method == u"RemoveTrack"_s) {
         if (index >= 0) list_.Remove(index);
     } else if (method == u"GoTo"_s) {
-        if (index >= 0) list_.PlayEntry(index, {.Change = player_.ChangeOnDemand()});
+        if (index >= 0 && !list_.PlayEntry(index, {.Change = player_.ChangeOnDemand()}))
+            throw EPlayListException(u"Die Datei ist nicht verfügbar: "_s + list_.Entry(index).Name);
     } else
         return std::nullopt;
     return QVariantList();
@@ -92,12 +93,12 @@ QVariantList MprisTrackList::MetadataOf(const QVariant& tracks) const {
 
 // Behind an entry, or in front of all.
 void MprisTrackList::Add(const QVariantList& arguments) {
-    const QString path = QUrl(arguments.value(0).toString()).toLocalFile();
-    if (path.isEmpty()) return;
+    const QString address = arguments.value(0).toString();
+    const QString path = QUrl(address).toLocalFile();
     const int position = list_.IndexOfId(EntryOfTrack(TrackIn(arguments, 1))) + 1;
-    const int added = list_.InsertFiles(position, {path});
-    if (added > 0 && arguments.value(2).toBool())
-        list_.PlayEntry(position, {.Change = player_.ChangeOnDemand()});
+    const int added = path.isEmpty() ? 0 : list_.InsertFiles(position, {path});
+    if (added == 0) throw EPlayListException(u"Das kann nicht in die PlayList: "_s + address);
+    if (arguments.value(2).toBool()) list_.PlayEntry(position, {.Change = player_.ChangeOnDemand()});
 }
 
 // --- What the bus is told ---

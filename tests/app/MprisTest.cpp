@@ -122,7 +122,8 @@ TEST_F(MprisTest, MediaKeysBecomeCommandsOfThePlayer) {
     Ask(kRoot, u"Raise"_s);
     EXPECT_EQ(raised_, 1);
     Ask(kPlayer, u"OpenUri"_s, {u"file:///Musik/a%20b.mp3"_s});
-    Ask(kPlayer, u"OpenUri"_s, {u"http://a/b.mp3"_s});
+    EXPECT_EQ(Ask(kPlayer, u"OpenUri"_s, {u"http://a/b.mp3"_s}).errorMessage(),
+              u"Nur Dateien können geöffnet werden: http://a/b.mp3"_s);
     EXPECT_EQ(opened_, u"/Musik/a b.mp3"_s);
     EXPECT_EQ(Ask(kPlayer, u"Dance"_s).type(), QDBusMessage::ErrorMessage);
 }
@@ -160,6 +161,9 @@ TEST_F(MprisTest, OrderAndRepeatAreSetFromOutside) {
     EXPECT_EQ(Property(u"Volume"_s).toDouble(), 0.5);
     set(u"Volume"_s, 7.0);
     EXPECT_EQ(volume_, 1);
+    EXPECT_EQ(set(u"Volume"_s, u"leise"_s), QDBusMessage::ErrorMessage);
+    EXPECT_EQ(volume_, 1);
+    EXPECT_EQ(set(u"CanPlay"_s, true), QDBusMessage::ErrorMessage);
     EXPECT_EQ(set(u"Nonsense"_s, true), QDBusMessage::ErrorMessage);
 }
 

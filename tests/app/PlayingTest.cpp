@@ -253,10 +253,16 @@ TEST_F(PlayingTest, AnotherProgramOpensFoldersAndLists) {
     EXPECT_EQ(Sounding(), u"x"_s);
     playing_->PlayList().Save(folder_.Path(u"saved.m3u"_s));
     playing_->PlayList().SetPlayListFileName({});
-    playing_->OpenFile(folder_.Path(u"saved.m3u"_s));
+    const auto open = [this](const QString& name) { playing_->OpenFile(folder_.Path(name)); };
+    open(u"saved.m3u"_s);
+    EXPECT_EQ(Listed(), QString());  // it may have to ask, and whoever called does not wait for that
+    EXPECT_THROW(open(u"saved.m3u"_s), EPlayListException);
+    QApplication::processEvents();
     EXPECT_EQ(Listed(), u"1xy"_s);
     EXPECT_EQ(Sounding(), u"1"_s);
-    playing_->OpenFile(folder_.Put(u"notes.txt"_s, QByteArray("x")));
+    folder_.Put(u"notes.txt"_s, QByteArray("x"));
+    EXPECT_THROW(open(u"notes.txt"_s), EPlayListException);
+    EXPECT_THROW(open(u"missing.wav"_s), EPlayListException);
     EXPECT_EQ(Sounding(), u"1"_s);
 }
 
