@@ -1,3 +1,4 @@
+#include <QFileInfo>
 #include <algorithm>
 #include <limits>
 
@@ -119,9 +120,11 @@ void ShowSong(const RemoteRun& run) {
     run.Out.WriteLine(texts.join(u'\t'));
 }
 
-// The answer tells only that the player has got it.
+// A name that is mistyped does not stop what plays.
 void OpenFile(const RemoteRun& run) {
-    const qint32 answer = run.Client.OpenFile(AbsolutePath(run.Words.first()));
+    const QString path = AbsolutePath(run.Words.first());
+    if (!QFileInfo::exists(path)) throw ERukException(u"Datei nicht gefunden: "_s + run.Words.first());
+    const qint32 answer = run.Client.OpenFile(path);
     if (answer == 0 || run.Client.Send(rmStatus) == psClosed)
         throw ERukException(u"Tunestead konnte die Datei nicht öffnen: "_s + run.Words.first());
     ShowDone(run, answer);

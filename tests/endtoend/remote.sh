@@ -38,8 +38,9 @@ expect '{"answer":0}' --json order
 remote order 1
 expect 1 message 4027
 fails_with "Die Sammlung hat keinen Song mit der Nummer 7." song 7
-fails_with "Tunestead konnte die Datei nicht öffnen: /nix.mp3" open /nix.mp3
 remote open "$song"
+fails_with "Datei nicht gefunden: /nix.mp3" open /nix.mp3
+expect 3 status
 [ "$(remote --json song | jq -r '"\(.artist): \(.title), \(.length)"')" = "Band: Käse Ж, 3" ]
 remote play
 expect 2 status
