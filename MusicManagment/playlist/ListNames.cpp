@@ -39,10 +39,21 @@ QByteArray PercentDecoded(const QByteArray& text) {
     return bytes;
 }
 
-// The path of a file: address on this computer (RFC 8089); empty for anything else.
-QString LocalPath(const QString& text) {
-    if (!text.startsWith("file:/"_L1, Qt::CaseInsensitive)) return {};
-    QString rest = text.sliced(5);
+bool ReadsBack(const QString& name) {
+    if (std::ranges::any_of(name, IsLineEnd)) return false;
+    return !name.startsWith(u'/') || !name.back().isSpace();
+}
+
+QString OnOneLine(QString text) {
+    std::ranges::replace_if(text, IsLineEnd, QChar(u' '));
+    return text;
+}
+
+}  // namespace
+
+QString LocalPath(const QString& address) {
+    if (!address.startsWith("file:/"_L1, Qt::CaseInsensitive)) return {};
+    QString rest = address.sliced(5);
     if (rest.startsWith("//"_L1)) {
         const qsizetype path = rest.indexOf(u'/', 2);
         if (path < 0) return {};
@@ -58,18 +69,6 @@ QString LocalPath(const QString& text) {
     const bool namesDrive = path.size() > 1 && path[1] != u'/' && path[1] != u':';
     return namesDrive && QDir::isAbsolutePath(path.sliced(1)) ? path.sliced(1) : path;
 }
-
-bool ReadsBack(const QString& name) {
-    if (std::ranges::any_of(name, IsLineEnd)) return false;
-    return !name.startsWith(u'/') || !name.back().isSpace();
-}
-
-QString OnOneLine(QString text) {
-    std::ranges::replace_if(text, IsLineEnd, QChar(u' '));
-    return text;
-}
-
-}  // namespace
 
 bool IsAddress(const QString& text) {
     const qsizetype colon = text.indexOf("://"_L1);

@@ -20,6 +20,9 @@ class LineReader {
     ByteSpan rest_;
 };
 
+// The path of a file: address on this computer (RFC 8089); empty for anything else.
+QString LocalPath(const QString& address);
+
 // "http://..." and its like.
 bool IsAddress(const QString& text);
 

@@ -4,12 +4,12 @@
 #include <QDBusConnectionInterface>
 #include <QDBusMessage>
 #include <QDBusObjectPath>
-#include <QUrl>
 #include <algorithm>
 
 #include "CommonRUKTools/CommandRunner.h"
 #include "MusicManagment/playback/PlaySound.h"
 #include "MusicManagment/playback/PlaySoundMenu.h"
+#include "MusicManagment/playlist/ListNames.h"
 #include "MusicManagmentRemoteControl/LineDialogs.h"
 #include "MusicManagmentRemoteControl/bus/BusProperties.h"
 #include "app/desktop/MimeTypes.h"
@@ -193,7 +193,7 @@ bool Mpris::CallPlayer(const QString& method, const QVariantList& arguments) {
 
 // Nothing is fetched from elsewhere.
 void Mpris::Open(const QString& uri) {
-    const QString path = QUrl(uri).toLocalFile();
+    const QString path = LocalPath(uri);
     if (path.isEmpty()) throw ERukException(u"Nur Dateien können geöffnet werden: "_s + uri);
     hooks_.OpenFile(path);
 }

@@ -2,10 +2,10 @@
 
 #include <QDBusArgument>
 #include <QDBusMetaType>
-#include <QUrl>
 #include <algorithm>
 
 #include "MusicManagment/playback/PlaySound.h"
+#include "MusicManagment/playlist/ListNames.h"
 #include "MusicManagment/playlist/PlayList.h"
 #include "app/desktop/MprisMetadata.h"
 
@@ -94,7 +94,7 @@ QVariantList MprisTrackList::MetadataOf(const QVariant& tracks) const {
 // Behind an entry, or in front of all.
 void MprisTrackList::Add(const QVariantList& arguments) {
     const QString address = arguments.value(0).toString();
-    const QString path = QUrl(address).toLocalFile();
+    const QString path = LocalPath(address);
     const int position = list_.IndexOfId(EntryOfTrack(TrackIn(arguments, 1))) + 1;
     const int added = path.isEmpty() ? 0 : list_.InsertFiles(position, {path});
     if (added == 0) throw EPlayListException(u"Das kann nicht in die PlayList: "_s + address);

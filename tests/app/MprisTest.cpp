@@ -121,7 +121,7 @@ TEST_F(MprisTest, MediaKeysBecomeCommandsOfThePlayer) {
     EXPECT_EQ(commands_, QList<int>({plPause, plPause, plPause}));
     Ask(kRoot, u"Raise"_s);
     EXPECT_EQ(raised_, 1);
-    Ask(kPlayer, u"OpenUri"_s, {u"file:///Musik/a%20b.mp3"_s});
+    Ask(kPlayer, u"OpenUri"_s, {u"file://localhost/Musik/a%20b.mp3"_s});
     EXPECT_EQ(Ask(kPlayer, u"OpenUri"_s, {u"http://a/b.mp3"_s}).errorMessage(),
               u"Nur Dateien können geöffnet werden: http://a/b.mp3"_s);
     EXPECT_EQ(opened_, u"/Musik/a b.mp3"_s);
