@@ -91,7 +91,7 @@ Mpris::~Mpris() {
     door_.Close();
 }
 
-bool Mpris::Register(QDBusConnection bus) {
+bool Mpris::Register(const QDBusConnection& bus) {
     if (!door_.Open(bus, kPath)) return false;
     bus_ = bus;
     for (const QString& name :

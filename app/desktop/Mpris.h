@@ -39,7 +39,7 @@ class Mpris : public QObject {
 
     // Takes the name "org.mpris.MediaPlayer2.tunestead", or one of its own where that is taken. False without
     // a bus, which is no error: there is nobody then who would want to know.
-    bool Register(QDBusConnection bus);
+    bool Register(const QDBusConnection& bus);
     // The name that was taken; empty for none.
     const QString& ServiceName() const { return serviceName_; }
 

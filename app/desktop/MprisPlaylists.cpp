@@ -145,6 +145,5 @@ void MprisPlaylists::Activate(const QDBusObjectPath& id) {
     const QStringList& files = Files();
     const auto wanted = std::ranges::find_if(files, [&](const QString& path) { return IdOf(path) == id; });
     if (wanted == files.end()) throw EPlayListException(u"Diese PlayList gibt es nicht mehr."_s);
-    const QString path = *wanted;  // the files may be listed anew meanwhile
-    options_.Play(path);
+    options_.Play(QString(*wanted));  // the files may be listed anew meanwhile
 }
