@@ -5,6 +5,7 @@
 #include "CommonRUKTools/CodePage.h"
 #include "CommonRUKTools/CommandRunner.h"
 #include "CommonRUKTools/FileSource.h"
+#include "MusicManagment/database/CdPath.h"
 #include "MusicManagment/database/commands/DatabaseSettings.h"
 #include "MusicManagment/playback/PlaySound.h"
 #include "MusicManagment/playlist/PlayList.h"
@@ -129,7 +130,7 @@ qint32 TRemoteControl::ReceiveCopyData(quint32 code, const QByteArray& bytes) {
             {reinterpret_cast<const std::uint8_t*>(text.constData()), static_cast<std::size_t>(text.size())});
         playSound_->SetFileName(name);
         // The player passes over it without a word.
-        if (!name.isEmpty() && !FileSource::Exists(name))
+        if (!name.isEmpty() && !IsCdPath(name) && !FileSource::Exists(name))
             throw ERemoteControlException(u"Datei nicht gefunden: "_s + name);
         answer = 1;
         if (OnEventFired) OnEventFired(*this);
