@@ -2,6 +2,7 @@
 
 #include <QMutex>
 #include <QMutexLocker>
+#include <QRegularExpression>
 #include <QThread>
 #include <utility>
 
@@ -36,6 +37,12 @@ class Mailbox {
     QMutex mutex_;
     QObject* receiver_;
 };
+
+// A "%" that begins no escape would make Qt escape every "%" of the address once more.
+QUrl UrlOf(QString address) {
+    static const QRegularExpression loose(u"%(?![0-9A-Fa-f]{2})"_s);
+    return QUrl(address.replace(loose, u"%25"_s));
+}
 
 bool IsWebAddress(const QUrl& url) {
     return url.isValid() && !url.host().isEmpty() &&
@@ -84,16 +91,16 @@ THTTPGet::THTTPGet() = default;
 THTTPGet::~THTTPGet() = default;
 
 void THTTPGet::GetString() {
-    Start(Wanted::Text, {.Url = QUrl(url_), .Agent = agent_, .Limits = limits_});
+    Start(Wanted::Text, {.Url = UrlOf(url_), .Agent = agent_, .Limits = limits_});
 }
 
 void THTTPGet::GetBytes() {
-    Start(Wanted::Bytes, {.Url = QUrl(url_), .Agent = agent_, .Limits = limits_});
+    Start(Wanted::Bytes, {.Url = UrlOf(url_), .Agent = agent_, .Limits = limits_});
 }
 
 void THTTPGet::PostString(const QByteArray& body, const QString& type) {
     Start(Wanted::Text,
-          {.Url = QUrl(url_), .Agent = agent_, .Limits = limits_, .Body = body, .BodyType = type});
+          {.Url = UrlOf(url_), .Agent = agent_, .Limits = limits_, .Body = body, .BodyType = type});
 }
 
 void THTTPGet::Cancel() {

@@ -6,6 +6,7 @@
 #include <QUrl>
 
 #include "HTTPRetrieval/OnlineSearch.h"
+#include "HTTPRetrieval/SearchPage.h"
 #include "app/desktop/Icons.h"
 
 using namespace Qt::StringLiterals;
@@ -39,6 +40,12 @@ InternetPage::InternetPage()
 }
 
 std::optional<OptionsFault> InternetPage::Check() {
+    const QString host = host_->text().trimmed();
+    if (!host.isEmpty() && !IsWebAddress(SearchPageUrl(host, {})))
+        return OptionsFault{
+            u"\"%1\" ist kein Rechner im Internet; erwartet wird ein Name wie musik.example."_s.arg(
+                host_->text()),
+            host_};
     for (QLineEdit* field : {musicBrainz_, coverArt_})
         if (!IsWebAddress(field->text()))
             return OptionsFault{
