@@ -8,8 +8,9 @@
 // The search of MusicBrainz for recordings, as its documentation describes it, and the covers that the Cover
 // Art Archive has for its albums.
 
-// Between two requests, milliseconds: the service answers nobody more than once a second.
-inline constexpr qint64 kMusicBrainzPause = 1000;
+// Between two requests, milliseconds: the service answers nobody more than once a second, and the second
+// request may be faster on its way than the first.
+inline constexpr qint64 kMusicBrainzPause = 1100;
 
 // `address` as "https://musicbrainz.org". A query "Artist - Title" looks for that title by that artist, any
 // other for its words.

@@ -39,6 +39,7 @@ OnlineSearch::OnlineSearch() {
         if (OnError) OnError(reason);
     };
     later_.setSingleShot(true);
+    later_.setTimerType(Qt::PreciseTimer);  // another may be early
     later_.callOnTimeout(&get_, Guarded([this] { Fetch(); }));
 }
 

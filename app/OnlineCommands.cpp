@@ -48,7 +48,8 @@ OnlineCommands::OnlineCommands(QWidget& window, TMusicDatabase& database, TID3Ta
     };
     cover_.SetAgent(OnlineAgent());
     cover_.OnDoneBytes = [this](const QByteArray& picture) { TakeCover(picture); };
-    cover_.OnError = [](const QString& reason) {
+    cover_.OnError = [this](const QString& reason) {
+        Notice(QString());
         UserDialogs().ShowMessage(MessageKind::Warning, u"Das Cover lässt sich nicht holen. "_s + reason);
     };
 }
@@ -103,11 +104,11 @@ void OnlineCommands::FetchCover(const SearchHit& hit) {
 
 // The user may have gone to another song meanwhile.
 void OnlineCommands::TakeCover(const QByteArray& picture) {
+    Notice(QString());
     const CoverPicture cover = PictureOf(picture);
     if (OnNeedChoice) OnNeedChoice();
     if (tags_.SongToProposeTo() != coverSong_)
         return Notice(u"Inzwischen ist ein anderer Song gewählt; das Cover wurde nicht übernommen."_s);
-    Notice(QString());
     tags_.Propose({.Fields = {}, .Cover = cover});
 }
 

@@ -29,7 +29,7 @@ OnlineSearchForm::OnlineSearchForm(HitSource source, Details details, QWidget* p
       table_(new QTableView(this)),
       count_(new QLabel(this)),
       take_(new QPushButton(u"In den &Tag übernehmen"_s, this)),
-      cover_(new QPushButton(u"&Cover übernehmen"_s, this)) {
+      cover_(new QPushButton(u"C&over übernehmen"_s, this)) {
     setObjectName(u"onlineSearchForm"_s);
     setWindowTitle(u"Such-Ergebnisse im Internet"_s);
     SetUpTable();
@@ -49,12 +49,17 @@ void OnlineSearchForm::SetUpTable() {
     QHeaderView& header = *table_->horizontalHeader();
     header.setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
     header.setSectionResizeMode(QHeaderView::Stretch);
-    for (int column = SearchHitsModel::Year; column < SearchHitsModel::ColumnCount; ++column)
-        header.setSectionResizeMode(column, QHeaderView::ResizeToContents);
+    FitColumns();
     for (int column = SearchHitsModel::Album; column < SearchHitsModel::ColumnCount; ++column)
         table_->setColumnHidden(column, details_ == Details::ArtistAndTitle);
     connect(table_->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
             Guarded([this] { ShowState(); }));
+}
+
+// Rows that come later widen no column by themselves.
+void OnlineSearchForm::FitColumns() {
+    for (int column = SearchHitsModel::Year; column < SearchHitsModel::ColumnCount; ++column)
+        table_->horizontalHeader()->setSectionResizeMode(column, QHeaderView::ResizeToContents);
 }
 
 void OnlineSearchForm::SetUpLayout() {
@@ -97,6 +102,7 @@ void OnlineSearchForm::ReadOn() {
         more.push_back(std::move(*hit));
     }
     hits_->Append(more);
+    if (!readOn_.isActive()) FitColumns();
     if (!table_->currentIndex().isValid()) table_->setCurrentIndex(hits_->index(0, 0));
     ShowState();
 }

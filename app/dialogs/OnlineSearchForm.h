@@ -24,6 +24,7 @@ class OnlineSearchForm : public QDialog {
 
  private:
     void SetUpTable();
+    void FitColumns();
     void SetUpLayout();
     void ReadOn();
     void ShowState();

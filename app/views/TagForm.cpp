@@ -255,13 +255,21 @@ void TID3TagForm::Propose(const TagProposal& proposal) {
     if (edits_.Songs() != std::vector{song} && !MayLeave()) throw EAbort();
     if (!edits_.Touched()) Take({song});
     if (!IsEditable()) throw ERukException(u"Der Tag lässt sich im Augenblick nicht bearbeiten."_s);
-    for (const auto& [field, text] : proposal.Fields)
-        edits_.Edit(field, text);
+    if (!proposal.Fields.empty()) TakeProposed(proposal.Fields);
     if (proposal.Cover) edits_.SetCover(*proposal.Cover);
     show();
     raise();
     tabs_->setCurrentIndex(proposal.Cover ? 1 : 0);
     Edited();
+}
+
+// What an earlier proposal says, and this one does not, is of no use beside it.
+void TID3TagForm::TakeProposed(const FieldTexts& fields) {
+    for (const auto& [field, text] : proposed_)
+        if (edits_.Touched(field) && edits_.Shown(field) == text) edits_.Restore(field);
+    for (const auto& [field, text] : fields)
+        edits_.Edit(field, text);
+    proposed_ = fields;
 }
 
 // --- Edits that are not applied ---

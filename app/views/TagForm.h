@@ -18,9 +18,11 @@ class QTabWidget;
 class TagFields;
 class TagPreviewList;
 
+using FieldTexts = std::vector<std::pair<SongFieldId, QString>>;
+
 // What might stand in a song's tag.
 struct TagProposal {
-    std::vector<std::pair<SongFieldId, QString>> Fields{};
+    FieldTexts Fields{};
     std::optional<CoverPicture> Cover{};
 };
 
@@ -74,6 +76,7 @@ class TID3TagForm : public QDockWidget {
     void FollowDatabase();
 
     void Take(const std::vector<SongHandle>& songs);
+    void TakeProposed(const FieldTexts& fields);
     void AskToLeave();
     void ReadFiles();
     void RecordsChanged();
@@ -102,6 +105,7 @@ class TID3TagForm : public QDockWidget {
     QPushButton* discard_;
     std::vector<SongHandle> chosen_;  // in the list, which may be other songs than those edited
     std::vector<SongHandle> kept_;    // chosen when the user decided to go on editing
+    FieldTexts proposed_;             // the last proposal
     bool stale_ = false;              // other songs were chosen while it could not be seen
     bool tooMany_ = false;
     bool asking_ = false;

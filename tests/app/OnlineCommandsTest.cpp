@@ -68,7 +68,7 @@ class OnlineCommandsTest : public testing::Test {
         if (request.startsWith("GET /ws/2/"))
             return SendAnswer(socket, R"({"recordings": [{"title": "Neu", "length": 2000,
                 "artist-credit": [{"name": "Wir"}], "releases": [{"id": "r", "title": "Album",
-                "date": "1999", "media": [{"track": [{"number": "300"}]}]}]}]})");
+                "date": "1999", "media": [{"track": [{"number": "300"}]}]}]}, {"title": "Anders"}]})");
         if (request.startsWith("GET /release/r/front-500 ")) return SendAnswer(socket, Picture());
         SendAnswer(socket, "<html>nothing</html>");
     }};
@@ -85,7 +85,7 @@ TEST_F(OnlineCommandsTest, AHitAndItsCoverBecomeEditsThatAreNotApplied) {
     OnlineSearchForm* form = Search(u"neu"_s);
     ASSERT_NE(form, nullptr);
     EXPECT_EQ(form->windowTitle(), u"Such-Ergebnisse im Internet"_s);
-    EXPECT_EQ(Count(*form), u"1 Treffer"_s);
+    EXPECT_EQ(Count(*form), u"2 Treffer"_s);
     auto& take = *form->findChild<QPushButton*>(u"take"_s);
     auto& takeCover = *form->findChild<QPushButton*>(u"takeCover"_s);
 
@@ -94,7 +94,13 @@ TEST_F(OnlineCommandsTest, AHitAndItsCoverBecomeEditsThatAreNotApplied) {
               QStringList{u"Markieren Sie in der Liste zuerst den einen Song, um den es geht."_s});
     chosen_ = {database_.Songs().HandleOf(0)};
     take.click();
-    EXPECT_EQ(Line(u"title"_s), u"Neu"_s);
+    EXPECT_EQ(Line(u"title"_s) + u'|' + Line(u"album"_s), u"Neu|Album"_s);
+    auto& table = *form->findChild<QTableView*>(u"hits"_s);
+    table.selectRow(1);
+    take.click();  // nothing of the first hit is left beside it
+    EXPECT_EQ(Line(u"title"_s) + u'|' + Line(u"album"_s), u"Anders|"_s);
+    table.selectRow(0);
+    take.click();
     EXPECT_EQ(database_.Song(0).Title, u"Eins"_s);
 
     takeCover.click();
