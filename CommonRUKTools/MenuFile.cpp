@@ -7,6 +7,7 @@ using namespace Qt::StringLiterals;
 namespace {
 
 constexpr std::size_t kDeepest = 8;
+constexpr qsizetype kMostQuoted = 40;  // characters of a line, in a message
 
 using Kind = MenuFileItem::Kind;
 
@@ -22,8 +23,9 @@ MenuFileItem CommandIn(QStringView line, int number) {
     const int id = line.left(digits).toInt(&fits);
     const bool ends = digits == line.size() || line[digits].isSpace();
     if (digits == 0 || !ends || !fits)
-        throw ERukException(
-            MenuFileFault(number, u"\"%1\" ist weder die Nummer eines Befehls noch ein Menü."_s.arg(line)));
+        throw ERukException(MenuFileFault(
+            number,
+            u"\"%1\" ist weder die Nummer eines Befehls noch ein Menü."_s.arg(line.left(kMostQuoted))));
     return {.Line = number, .Id = id, .Caption = line.mid(digits).trimmed().toString()};
 }
 

@@ -3,6 +3,7 @@
 #include <QCoreApplication>
 
 #include "CommonRUKTools/CommandDispatcher.h"
+#include "CommonRUKTools/FileSource.h"
 #include "CommonRUKTools/RWReg.h"
 #include "CommonRUKTools/Shell.h"
 #include "MusicManagment/database/Command.h"
@@ -42,6 +43,8 @@ void ProgramCommands::OpenSong() {
     if (song < 0) return;
     const QString path = database_.ResolveSongPath(database_.Song(song).FileName);
     if (path.isEmpty()) return;  // the user has no such medium at hand
+    // The desktop's starter would find that out where nobody hears of it.
+    if (!FileSource::Exists(path)) throw EMusicDatabaseException(u"Datei nicht gefunden: "_s + path);
     if (program_.isEmpty()) {
         if (!CurrentShell().OpenWithDefaultProgram(path))
             throw EMusicDatabaseException(u"Kann kein Programm für diese Datei starten: "_s + path);

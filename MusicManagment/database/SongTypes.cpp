@@ -1,5 +1,6 @@
 #include "MusicManagment/database/SongTypes.h"
 
+#include <QLocale>
 #include <algorithm>
 
 using namespace Qt::StringLiterals;
@@ -18,7 +19,7 @@ QStringList SongFlagNames() {
 }
 
 QString SongCountText(std::size_t count) {
-    return count == 1 ? u"1 Song"_s : QString::number(count) + u" Songs"_s;
+    return count == 1 ? u"1 Song"_s : QLocale(QLocale::German).toString(count) + u" Songs"_s;
 }
 
 QStringList DefaultGenreFolderNames() {

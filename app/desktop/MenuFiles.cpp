@@ -18,9 +18,10 @@ constexpr qint64 kMostBytes = 256 * 1024;
 }  // namespace
 
 QString ArrangeMenu(CommandDispatcher& commands, const QString& folder, const QString& name) {
-    QFile file(QDir(folder).filePath(u"Tunestead3_%1_Menu.menu"_s.arg(name)));
+    const QString fileName = u"Tunestead3_%1_Menu.menu"_s.arg(name);
+    QFile file(QDir(folder).filePath(fileName));
     if (!file.exists()) return {};
-    const QString fault = u"%1 gilt nicht. "_s.arg(file.fileName());
+    const QString fault = fileName + u" gilt nicht. "_s;
     if (!file.open(QIODevice::ReadOnly)) return fault + file.errorString();
     if (file.size() > kMostBytes) return fault + u"Die Datei ist zu groß."_s;
     try {
