@@ -16,6 +16,7 @@
 #include "app/MainWindow.h"
 #include "app/desktop/Icons.h"
 #include "app/desktop/Installation.h"
+#include "app/desktop/PlaceholderColor.h"
 #include "app/desktop/SingleInstance.h"
 #include "app/desktop/Termination.h"
 #include "app/desktop/Translations.h"
@@ -152,6 +153,7 @@ int main(int argc, char** argv) {
     const QStringList arguments = ArgumentsOf(application);
 
     ChooseIconTheme();
+    KeepPlaceholdersLegible();
     QtDialogs dialogs;
     SetUserDialogs(&dialogs);
     const int result = Start(dialogs, {arguments, token});
