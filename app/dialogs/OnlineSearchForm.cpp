@@ -54,6 +54,7 @@ void OnlineSearchForm::SetUpTable() {
         table_->setColumnHidden(column, details_ == Details::ArtistAndTitle);
     connect(table_->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
             Guarded([this] { ShowState(); }));
+    connect(table_, &QTableView::activated, take_, &QPushButton::click);
 }
 
 // Rows that come later widen no column by themselves.

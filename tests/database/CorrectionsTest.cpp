@@ -39,7 +39,7 @@ TEST(Corrections, AFaultIsToldWithItsLine) {
         {u"[Artist]\na = b = c"_s, u"Zeile 2: Erwartet wird \"falsch = richtig\"."_s},
         {u"[Artist]\na = b\n[Titel]\na = b\n[Artist]\nA = c"_s,
          u"Zeile 6: Für diesen Text steht schon in Zeile 2 eine Korrektur."_s},
-        {u"[Titel]\na = a2\na2 = a"_s, u"führt im Kreis"_s},
+        {u"[Titel]\na = a2\na2 = a"_s, u"Zeile 2: Diese Korrektur führt im Kreis"_s},
     };
     for (const auto& [file, fault] : cases) {
         const QString told = ErrorOf([&] { Corrections::FromText(file); });

@@ -1,6 +1,7 @@
 #include "MusicManagment/database/batches/Corrections.h"
 
 #include <QFile>
+#include <algorithm>
 
 #include "CommonRUKTools/ByteReader.h"
 #include "CommonRUKTools/CodePage.h"
@@ -61,15 +62,19 @@ void Corrections::Add(Replacements& replacements, QStringView line, int number) 
 // What a replacement leads to may be wrong itself.
 void Corrections::FollowChains(Replacements& replacements) {
     const Replacements asWritten = replacements;
+    int endless = 0;  // the first line that leads nowhere; the replacements have no order
     for (Replacement& replacement : replacements) {
         for (int steps = 0;; ++steps) {
             const auto next = asWritten.constFind(replacement.Right.toCaseFolded());
             if (next == asWritten.constEnd() || next->Right == replacement.Right) break;
-            if (steps == kLongestChain)
-                Refuse(replacement.Line, u"Diese Korrektur führt im Kreis oder über zu viele andere."_s);
+            if (steps == kLongestChain) {
+                endless = endless == 0 ? replacement.Line : std::min(endless, replacement.Line);
+                break;
+            }
             replacement.Right = next->Right;
         }
     }
+    if (endless != 0) Refuse(endless, u"Diese Korrektur führt im Kreis oder über zu viele andere."_s);
 }
 
 std::optional<TID3Tag> Corrections::Corrected(const TID3Tag& song) const {
