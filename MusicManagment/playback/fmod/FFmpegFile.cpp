@@ -82,6 +82,11 @@ std::int64_t SamplesOf(const AVPacket& packet, std::int64_t duration, int frameS
     return std::min(duration, frameSize - std::int64_t{reader.U32Le()});
 }
 
+std::int64_t StampOf(const AVPacket& packet, std::int64_t without) {
+    if (packet.pts != AV_NOPTS_VALUE) return packet.pts;
+    return packet.dts != AV_NOPTS_VALUE ? packet.dts : without;
+}
+
 }  // namespace
 
 void FFmpegFile::FreeFormat(AVFormatContext** context) {
@@ -191,7 +196,10 @@ bool FFmpegFile::ReadPacket() {
     for (int bad = 0; bad < kMostBadReads;) {
         av_packet_unref(packet_.get());
         const int result = av_read_frame(format_.get(), packet_.get());
-        if (result >= 0 && packet_->stream_index == stream_->index) return true;
+        if (result >= 0 && packet_->stream_index == stream_->index) {
+            if (!firstStamp_) firstStamp_ = std::min(Origin(), StampOf(*packet_, Origin()));
+            return true;
+        }
         if (result >= 0) continue;
         if (result != AVERROR_INVALIDDATA && result != AVERROR(EAGAIN)) return false;
         ++bad;
@@ -203,7 +211,7 @@ void FFmpegFile::CountPackets() {
     const AVRational sample = {1, Rate()};
     std::int64_t end = AV_NOPTS_VALUE;
     while (ReadPacket()) {
-        const std::int64_t start = packet_->pts != AV_NOPTS_VALUE ? packet_->pts : packet_->dts;
+        const std::int64_t start = StampOf(*packet_, AV_NOPTS_VALUE);
         if (start == AV_NOPTS_VALUE) continue;
         const std::int64_t from = av_rescale_q(start - Origin(), stream_->time_base, sample);
         const std::int64_t duration = av_rescale_q(packet_->duration, stream_->time_base, sample);
@@ -239,8 +247,15 @@ std::int64_t FFmpegFile::SampleOf(const AVFrame& frame) const {
     return std::max<std::int64_t>(0, av_rescale_q(since, stream_->time_base, {1, Rate()}) - firstSample_);
 }
 
+bool FFmpegFile::ReadingFailed() const {
+    return format_->pb != nullptr && format_->pb->error < 0;
+}
+
 bool FFmpegFile::SeekBefore(std::int64_t sample) {
-    const std::int64_t stamp = av_rescale_q(sample, {1, Rate()}, stream_->time_base) + Origin();
+    // The beginning is the first packet, even where all of it is left out: it says how much else is, and
+    // where frames are short (MPEG-2) the first sample that is heard lies in the second.
+    const std::int64_t stamp = sample <= 0 ? firstStamp_.value_or(Origin())
+                                           : av_rescale_q(sample, {1, Rate()}, stream_->time_base) + Origin();
     keepFrame_ = false;
     if (av_seek_frame(format_.get(), stream_->index, stamp, AVSEEK_FLAG_BACKWARD) < 0) return false;
     avcodec_flush_buffers(codec_.get());

@@ -3,6 +3,7 @@
 #include <QString>
 #include <cstdint>
 #include <memory>
+#include <optional>
 
 struct AVCodecContext;
 struct AVFormatContext;
@@ -28,6 +29,8 @@ class FFmpegFile {
 
     // The next decoded frame, good until the next call; nullptr at the end. Damage is passed over.
     const AVFrame* Next();
+    // Whether the end that Next told is none of the file's: the medium has gone, or cannot be read.
+    bool ReadingFailed() const;
     // The place of a frame's first sample; -1 when the file does not tell.
     std::int64_t SampleOf(const AVFrame& frame) const;
     // Next goes on somewhere before the sample or at it, as near as the file's index allows. False when the
@@ -63,6 +66,7 @@ class FFmpegFile {
     AVStream* stream_ = nullptr;  // the format's
     std::int64_t length_ = 0;
     std::int64_t firstSample_ = 0;
-    bool keepFrame_ = false;  // the next frame is in frame_ already
+    std::optional<std::int64_t> firstStamp_;  // of the first packet, in the stream's time
+    bool keepFrame_ = false;                  // the next frame is in frame_ already
     bool drained_ = false;
 };
