@@ -8,6 +8,7 @@
 #include "MusicManagment/conversion/PartialFile.h"
 #include "MusicManagment/conversion/SongDecoder.h"
 #include "MusicManagment/conversion/SongEncoder.h"
+#include "MusicManagment/playback/fmod/FFmpegFile.h"
 #include "ReadMPEGHeader/TagWriting.h"
 #include "ReadMPEGHeader/id3v2/CoverArt.h"
 
@@ -60,6 +61,9 @@ class Conversion {
             made_.Frames += static_cast<std::int64_t>(frames);
             GoOn(share * std::min(1.0, static_cast<double>(made_.Frames) / length));
         }
+        // Not the first half of a song for the whole, of a disk that was pulled out.
+        if (song.File != nullptr && song.File->ReadingFailed())
+            throw EStreamError(u"Die Datei lässt sich nicht bis zu ihrem Ende lesen."_s);
         if (made_.Frames == 0) throw ERukException(u"Die Datei enthält keinen Ton."_s);
         encoder.Finish();
     }
@@ -89,7 +93,8 @@ class Conversion {
 
 std::int64_t ToleratedFrames(MusicFormat format) {
     constexpr std::int64_t kMpegFrame = 1152;
-    constexpr std::int64_t kWmaFrame = 2048;  // the longest
+    // Two of the longest: one that decoders leave out, and what fills up the last.
+    constexpr std::int64_t kWmaFrames = 2 * 2048;
     switch (format) {
         case MusicFormat::Mp3:
             return kMpegFrame;
@@ -98,11 +103,19 @@ std::int64_t ToleratedFrames(MusicFormat format) {
         case MusicFormat::Wma:
             break;
     }
-    return kWmaFrame;
+    return kWmaFrames;
+}
+
+SoundLength LengthOfNew(const QString& file) {
+    try {
+        return MeasureSound(file);
+    } catch (const ESoundFileError&) {
+        throw ERukException(u"Was entstanden ist, ist keine Musikdatei, die sich lesen lässt."_s);
+    }
 }
 
 void CheckLength(const QString& file, MusicFormat format, const Sound& wanted) {
-    const SoundLength found = MeasureSound(file);
+    const SoundLength found = LengthOfNew(file);
     // At another rate, which a script may have chosen, as long in time.
     const std::int64_t frames = found.Samples * wanted.Rate / found.Rate;
     const std::int64_t difference = std::abs(frames - wanted.Frames);
@@ -155,7 +168,11 @@ TID3Tag ConvertSong(const ConversionJob& job, const EncoderSettings& settings,
     if (StateOf(job.Target).Exists()) throw EStreamError(u"Diese Datei gibt es schon: "_s + job.Target);
     PartialFile file(job.Target);
     Conversion conversion(job, settings, goOn);
-    conversion.Run(file.Path());
+    try {
+        conversion.Run(file.Path());
+    } catch (const ESoundFileError& error) {
+        throw ERukException(ReasonOf(error));
+    }
     CheckLength(file.Path(), job.Format, conversion.Made());
     WriteTags(job, file.Path());
     file.TakeName();

@@ -21,7 +21,7 @@ DecodedSong OpenNotes(const QString& path, const RateFor& rateFor) {
 DecodedSong OpenSound(const QString& path, const RateFor& rateFor) {
     auto source = std::make_unique<FFmpegSource>(path, FFmpegFile::LengthBy::Header, rateFor);
     const FFmpegFile& file = source->File();
-    DecodedSong song{.Rate = source->Rate(), .IsMono = file.Channels() == 1};
+    DecodedSong song{.File = &file, .Rate = source->Rate(), .IsMono = file.Channels() == 1};
     song.FitsIn16Bits = file.FitsIn16Bits() && file.Rate() == song.Rate && file.Channels() <= 2;
     song.Source = std::move(source);
     return song;
@@ -48,4 +48,19 @@ DecodedSong OpenDecodedSong(const QString& path, const RateFor& rateFor) {
 SoundLength MeasureSound(const QString& path) {
     const FFmpegFile file(path, FFmpegFile::LengthBy::Counting);
     return {file.Length(), file.Rate()};
+}
+
+QString ReasonOf(const ESoundFileError& error) {
+    switch (error.code) {
+        case FMOD_ERR_FILE_NOTFOUND:
+            return u"Die Datei ist nicht da."_s;
+        case FMOD_ERR_FILE_FORMAT:
+            return u"Die Datei ist beschädigt oder hat ein Format, das Tunestead nicht dekodiert."_s;
+        case FMOD_ERR_MEDIAPLAYER:
+            return u"Zum Dekodieren fehlt ein Decoder oder, für MIDI, ein SoundFont."_s;
+        case FMOD_ERR_MEMORY:
+            return u"Der Speicher reicht nicht aus."_s;
+        default:
+            return u"Die Datei lässt sich nicht lesen."_s;
+    }
 }

@@ -6,12 +6,15 @@
 
 #include "MusicManagment/playback/fmod/SoundSource.h"
 
+class FFmpegFile;
+
 // A song as the stereo samples that it is converted from.
 struct DecodedSong {
     std::unique_ptr<SoundSource> Source{};
-    int Rate = 0;               // Hz
-    bool IsMono = false;        // both sides are the same
-    bool FitsIn16Bits = false;  // samples of 16 bits hold them as they are
+    const FFmpegFile* File = nullptr;  // that the source reads, where it is a sound file
+    int Rate = 0;                      // Hz
+    bool IsMono = false;               // both sides are the same
+    bool FitsIn16Bits = false;         // samples of 16 bits hold them as they are
 };
 
 // Opens everything that the player decodes itself: sound files, tracker songs and MIDI. `rateFor` gets the
@@ -26,3 +29,6 @@ struct SoundLength {
     int Rate = 0;  // Hz
 };
 SoundLength MeasureSound(const QString& path);
+
+// Why a file cannot be decoded, in words for the user: those of the error itself are the sound library's.
+QString ReasonOf(const ESoundFileError& error);

@@ -116,19 +116,48 @@ TEST_F(ConvertSongTest, WhatIsQuieterThanAStepOfASampleIsStillHeardInTheNoise) {
     EXPECT_NEAR(AmplitudeOf(440, Decoded(path), 0, 44100), amplitude, 0.2 * amplitude);
 }
 
-TEST_F(ConvertSongTest, JoinedTracksStayJoined) {
-    const Tone tone{.frequency = 441};  // 100 samples a turn: each track begins where the other ends
-    WriteWav(folder_.Path(u"a.wav"_s), Sine(tone, 0.5));
-    Samples joined;
-    for (int track = 0; track < 2; ++track) {
-        ConversionJob job = Job(u"a.wav"_s, MusicFormat::Mp3);
-        job.Target = folder_.Path(QString::number(track) + u".mp3"_s);
+TEST_F(ConvertSongTest, JoinedTracksStayJoinedAndAsLoud) {
+    using Method = Mp3Settings::Method;
+    const struct {
+        Mp3Settings Settings;
+        int Rate;
+    } cases[] = {{{}, 44100},
+                 {{}, 24000},
+                 {{.Bits = Method::Constant, .BitRate = 192}, 44100},
+                 // Frames without room for what the first one tells.
+                 {{.Bits = Method::Constant, .BitRate = 32}, 44100},
+                 {{.Bits = Method::Average, .BitRate = 128}, 44100}};
+    for (const auto& one : cases) {
+        SCOPED_TRACE(testing::Message() << one.Rate << " Hz, " << one.Settings.BitRate << " kbit/s");
+        // Each track begins where the other ends.
+        const Tone tone{.frequency = one.Rate / 100.0};
+        const Samples track = Sine(tone, 0.5, one.Rate);
+        WriteWav(folder_.Path(u"a.wav"_s), track, one.Rate);
+        settings_.Mp3 = one.Settings;
+        const ConversionJob job = Job(u"a.wav"_s, MusicFormat::Mp3);
         Convert(job);
         const Samples heard = Decoded(job.Target);
-        EXPECT_EQ(heard.size(), Sine(tone, 0.5).size());
+        QFile::remove(job.Target);
+        ASSERT_EQ(heard.size(), track.size());
+        Samples joined = heard;
         joined.insert(joined.end(), heard.begin(), heard.end());
+        EXPECT_LT(LargestStep(joined, 1000), 1.3 * SteepestStep(tone, one.Rate));
+        EXPECT_NEAR(AmplitudeOf(tone.frequency, joined, 2000, 5000, 0, one.Rate), tone.amplitude, 0.005);
     }
-    EXPECT_LT(LargestStep(joined, 1000), 1.3 * SteepestStep(tone));
+}
+
+TEST_F(ConvertSongTest, WindowsMediaBeginsWithTheFirstSample) {
+    for (const int rate : {8000, 22050, 44100}) {
+        const Samples sweep = Sweep(0.5, rate);
+        WriteWav(folder_.Path(u"a.wav"_s), sweep, rate);
+        const ConversionJob job = Job(u"a.wav"_s, MusicFormat::Wma);
+        Convert(job);
+        const Samples heard = Decoded(job.Target);
+        QFile::remove(job.Target);
+        ASSERT_GE(heard.size(), sweep.size());
+        for (std::size_t i = 0; i < 3000; i += 50)
+            ASSERT_NEAR(heard[i], sweep[i], 0.05) << rate << " Hz, " << i;
+    }
 }
 
 TEST_F(ConvertSongTest, CoverAndTrackTotalComeFromTheSource) {
@@ -165,7 +194,7 @@ TEST_F(ConvertSongTest, WhatTheScriptDoesWrongIsToldAndLeavesNothing) {
         {"echo 'kein Codec' >&2; exit 3", u"(Rückgabewert 3): kein Codec"_s},
         {"exit 0", u"keine Datei geschrieben"_s},
         {"echo halb > \"$2\"; exit 1", u"(Rückgabewert 1)."_s},
-        {"echo unsinn > \"$2\"", u""_s},
+        {"echo unsinn > \"$2\"", u"keine Musikdatei"_s},
         {"kill -9 $$", u"gescheitert"_s},
         {"sleep 1000", late},
         {"sleep 1000 & wait", late},
@@ -259,6 +288,7 @@ TEST_F(ConvertSongTest, AFailedSongDoesNotStopTheOthersAndAStopLeavesNothing) {
     const auto outcomes = RunConversions(jobs, settings_, [](const ConversionState&) { return true; });
     EXPECT_TRUE(outcomes[0].Done);
     EXPECT_FALSE(outcomes[1].Done || outcomes[2].Done || outcomes[3].Done);
+    EXPECT_TRUE(outcomes[1].Error.contains(u"beschädigt"_s));
     EXPECT_TRUE(outcomes[2].Error.contains(u"gibt es schon"_s));
     EXPECT_EQ(folder_.Get(u"b.wav.wav"_s), "da");
 
