@@ -161,20 +161,26 @@ TID3Tag ReadBack(const ConversionJob& job) {
     return std::move(reading.Tag);
 }
 
+void MakeTarget(const ConversionJob& job, const EncoderSettings& settings, const ConversionProgress& goOn) {
+    PartialFile file(job.Target);
+    Conversion conversion(job, settings, goOn);
+    conversion.Run(file.Path());
+    CheckLength(file.Path(), job.Format, conversion.Made());
+    WriteTags(job, file.Path());
+    file.TakeName();
+}
+
 }  // namespace
 
 TID3Tag ConvertSong(const ConversionJob& job, const EncoderSettings& settings,
                     const ConversionProgress& goOn) {
     if (StateOf(job.Target).Exists()) throw EStreamError(u"Diese Datei gibt es schon: "_s + job.Target);
-    PartialFile file(job.Target);
-    Conversion conversion(job, settings, goOn);
     try {
-        conversion.Run(file.Path());
+        MakeTarget(job, settings, goOn);
     } catch (const ESoundFileError& error) {
         throw ERukException(ReasonOf(error));
+    } catch (const EStreamError& error) {
+        throw EStreamError(NamedAsTarget(error.Message(), job.Target));
     }
-    CheckLength(file.Path(), job.Format, conversion.Made());
-    WriteTags(job, file.Path());
-    file.TakeName();
     return ReadBack(job);
 }

@@ -12,7 +12,7 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-constexpr qint64 kPartsOfASong = 1000;  // in the progress
+constexpr qint64 kPartsOfASong = 100;  // in the progress
 
 // A song of the collection on its way.
 struct Way {
@@ -86,13 +86,13 @@ class SongConversion {
 
     bool GoOn(const ConversionState& state) {
         const QString& source = ways_[state.Song].Job.Source;
-        result_.Stopped = database_.Progress(
-            {.Cur = static_cast<qint64>(state.Part * static_cast<double>(ways_.size()) * kPartsOfASong),
-             .Max = static_cast<qint64>(ways_.size()) * kPartsOfASong,
-             .CurSub = static_cast<qint64>(state.SongPart * kPartsOfASong),
-             .MaxSub = kPartsOfASong,
-             .Type = ptOther,
-             .Description = source.mid(source.lastIndexOf(u'/') + 1)});
+        result_.Stopped =
+            database_.Progress({.Cur = static_cast<qint64>(state.Part * static_cast<double>(ways_.size())),
+                                .Max = static_cast<qint64>(ways_.size()),
+                                .CurSub = static_cast<qint64>(state.SongPart * kPartsOfASong),
+                                .MaxSub = kPartsOfASong,
+                                .Type = ptOther,
+                                .Description = source.mid(source.lastIndexOf(u'/') + 1)});
         return !result_.Stopped;
     }
 

@@ -44,8 +44,8 @@ class RunningScript {
         GiveOwnGroup(script_);
         script_.start(call.Program, call.Arguments, QIODevice::ReadOnly);
         if (!script_.waitForStarted(kTimeToStart))
-            throw ERukException(u"Das Encoder-Skript lässt sich nicht starten: "_s + call.Program + u": "_s +
-                                script_.errorString());
+            throw ERukException(u"Das Encoder-Skript lässt sich nicht starten. Ist es da und ausführbar? "_s +
+                                call.Program);
     }
     ~RunningScript() {
         if (script_.state() == QProcess::NotRunning) return;

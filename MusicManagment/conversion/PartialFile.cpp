@@ -4,6 +4,7 @@
 #include <QDir>
 #include <QFile>
 #include <QRandomGenerator>
+#include <QRegularExpression>
 
 #include "CommonRUKTools/FileChange.h"
 
@@ -34,6 +35,12 @@ void PartialFile::TakeName() {
     FlushFiles({path_});
     MoveFile(path_, target_);
     hasName_ = true;
+}
+
+QString NamedAsTarget(QString message, const QString& target) {
+    static const QRegularExpression kName(QRegularExpression::escape(kBegin) + u"[0-9a-z]+"_s +
+                                          QRegularExpression::escape(kEnd));
+    return message.replace(kName, target.mid(target.lastIndexOf(u'/') + 1));
 }
 
 void SweepPartialFiles(const QString& folder) {

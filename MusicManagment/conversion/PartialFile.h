@@ -26,6 +26,9 @@ class PartialFile {
     bool hasName_ = false;
 };
 
+// A message in which the user's own name stands for those of files on their way to it.
+QString NamedAsTarget(QString message, const QString& target);
+
 // Removes what conversions that did not come to their end have left in the folder: what was not written for
 // an hour.
 void SweepPartialFiles(const QString& folder);

@@ -11,8 +11,6 @@
 #include <QStackedWidget>
 #include <QVBoxLayout>
 
-#include "CommonRUKTools/CommandRunner.h"
-#include "CommonRUKTools/Dialogs.h"
 #include "app/dialogs/ConversionPages.h"
 #include "app/dialogs/DecisionButtons.h"
 #include "app/dialogs/RootFolderField.h"
@@ -77,12 +75,12 @@ QGroupBox* ConversionDialog::MakePlaces() {
     beside_->setObjectName(u"beside"_s);
     inFolder_->setObjectName(u"inFolder"_s);
     inPlace_->setObjectName(u"inPlace"_s);
-    auto* note = new WrappedLabel(u"note"_s);
-    note->setText(
+    note_ = new WrappedLabel(u"note"_s);
+    note_->setText(
         u"Songs auf Datenträgern bekommen, außer im Ordner, eine Kopie auf der Festplatte. "
         "Rückgängig holt die Quellen zurück."_s);
     auto* layout = new QVBoxLayout(box);
-    for (QWidget* row : std::initializer_list<QWidget*>{beside_, inFolder_, folder_, inPlace_, note})
+    for (QWidget* row : std::initializer_list<QWidget*>{beside_, inFolder_, folder_, inPlace_, note_})
         layout->addWidget(row);
     QRadioButton* const rows[] = {beside_, inFolder_, inPlace_};
     rows[static_cast<std::size_t>(given_.Order.Place)]->setChecked(true);
@@ -140,11 +138,10 @@ ConversionChoice ConversionDialog::Choice() const {
 void ConversionDialog::accept() {
     if (Place() != ConversionPlace::Folder || QDir::isAbsolutePath(folder_->Folder()))
         return QDialog::accept();
-    RunCommand([this] {
-        UserDialogs().ShowMessage(MessageKind::Warning,
-                                  folder_->Folder().isEmpty()
-                                      ? u"Wählen Sie den Ordner für die konvertierten Songs."_s
-                                      : folder_->Folder() + u" ist kein vollständiger Pfad."_s);
-    });
+    QFont strong = note_->font();
+    strong.setBold(true);
+    note_->setFont(strong);
+    note_->setText(folder_->Folder().isEmpty() ? u"Wählen Sie den Ordner für die konvertierten Songs."_s
+                                               : folder_->Folder() + u" ist kein vollständiger Pfad."_s);
     folder_->Edit().setFocus();
 }

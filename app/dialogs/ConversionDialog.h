@@ -12,6 +12,7 @@ class QStackedWidget;
 class RootFolderField;
 class WavPage;
 class WmaPage;
+class WrappedLabel;
 
 // What is to be converted, into what, and where it goes.
 struct ConversionChoice {
@@ -27,7 +28,7 @@ class ConversionDialog : public QDialog {
                      QWidget* parent = nullptr);
 
     ConversionChoice Choice() const;
-    // A folder that cannot be one keeps the dialog open.
+    // A folder that cannot be one keeps the dialog open, with a line that says why.
     void accept() override;
 
  private:
@@ -52,4 +53,5 @@ class ConversionDialog : public QDialog {
     QRadioButton* inFolder_ = nullptr;
     QRadioButton* inPlace_ = nullptr;
     RootFolderField* folder_;
+    WrappedLabel* note_ = nullptr;
 };
