@@ -1,6 +1,8 @@
 #include "MusicManagment/conversion/ConvertSong.h"
 
 #include <algorithm>
+#include <cmath>
+#include <span>
 #include <vector>
 
 #include "CommonRUKTools/FileChange.h"
@@ -33,8 +35,8 @@ class Conversion {
         : job_(job), settings_(settings), goOn_(goOn) {}
 
     void Run(const QString& target) {
-        const DecodedSong song = OpenDecodedSong(
-            job_.Source, [this](int rate) { return TargetRate(job_.Format, settings_, rate); });
+        const DecodedSong song = Open();
+        if (song.File != nullptr && song.File->Channels() > 2) gain_ = GainOfMix();
         const SampleKind samples{.Rate = song.Rate, .IsMono = song.IsMono, .FitsIn16Bits = song.FitsIn16Bits};
         if (job_.Format == MusicFormat::Wma)
             EncodeByScript(song, samples, target);
@@ -44,6 +46,25 @@ class Conversion {
     const Sound& Made() const { return made_; }
 
  private:
+    DecodedSong Open() const {
+        return OpenDecodedSong(job_.Source,
+                               [this](int rate) { return TargetRate(job_.Format, settings_, rate); });
+    }
+
+    // Many sides in two may be louder than samples can be, and what a file cuts off stays lost: the whole is
+    // as loud as it plays, or as loud as it may be.
+    float GainOfMix() const {
+        const DecodedSong song = Open();
+        std::vector<float> block(2 * kBlock);
+        float peak = 1;
+        while (const std::size_t frames = song.Source->Read(block.data(), kBlock)) {
+            for (const float sample : std::span(block).first(2 * frames))
+                peak = std::max(peak, std::abs(sample));
+            GoOn(0);
+        }
+        return std::isfinite(peak) ? 1 / peak : 1;
+    }
+
     std::unique_ptr<SongEncoder> MakeEncoder(const QString& target, const SampleKind& samples) const {
         return job_.Format == MusicFormat::Mp3 ? MakeMp3Encoder(target, settings_.Mp3, samples)
                                                : MakeWaveEncoder(target, settings_.Wav, samples);
@@ -57,6 +78,8 @@ class Conversion {
         for (;;) {
             const std::size_t frames = song.Source->Read(block.data(), kBlock);
             if (frames == 0) break;
+            for (float& sample : std::span(block).first(2 * frames))
+                sample *= gain_;
             encoder.Write(block.data(), frames);
             made_.Frames += static_cast<std::int64_t>(frames);
             GoOn(share * std::min(1.0, static_cast<double>(made_.Frames) / length));
@@ -86,6 +109,7 @@ class Conversion {
     const ConversionJob& job_;
     const EncoderSettings& settings_;
     const ConversionProgress& goOn_;
+    float gain_ = 1;
     Sound made_;
 };
 
