@@ -86,6 +86,7 @@ QGroupBox* ConversionDialog::MakePlaces() {
     rows[static_cast<std::size_t>(given_.Order.Place)]->setChecked(true);
     folder_->SetFolder(given_.Order.Folder);
     connect(inFolder_, &QRadioButton::toggled, this, [this] { EnableFolder(); });
+    connect(inFolder_, &QRadioButton::clicked, folder_, [this] { folder_->setFocus(); });
     EnableFolder();
     return box;
 }
@@ -94,13 +95,14 @@ void ConversionDialog::SetUpLayout() {
     auto* form = new QFormLayout;
     form->addRow(u"&Songs:"_s, songs_);
     form->addRow(u"Forma&t:"_s, format_);
-    const DecisionButtons buttons = MakeDecisionButtons(*this, u"&Konvertieren"_s);
-    buttons.Agree->setDefault(true);
     auto* layout = new QVBoxLayout(this);
     layout->addLayout(form);
     layout->addWidget(MakePages());
     layout->addWidget(MakePlaces());
     layout->addStretch();
+    // The last, so that the keyboard comes to them last.
+    const DecisionButtons buttons = MakeDecisionButtons(*this, u"&Konvertieren"_s);
+    buttons.Agree->setDefault(true);
     layout->addWidget(buttons.Box);
     // The note needs more lines the narrower it is.
     const int width = kWidth * fontMetrics().averageCharWidth();

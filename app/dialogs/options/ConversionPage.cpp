@@ -25,7 +25,7 @@ auto PropertyOf(const Setting<QString>& row, QString ConversionSettings::*member
 }  // namespace
 
 ConversionPage::ConversionPage()
-    : OptionsPage(u"Konvertierung"_s, ThemeIcon(u"audio-x-generic"_s, QStyle::SP_MediaVolume)) {
+    : OptionsPage(u"Konvertierung"_s, ThemeIcon(u"document-export"_s, QStyle::SP_MediaVolume)) {
     QFormLayout& group = AddGroup(u"Windows Media (WMA)"_s);
     script_ = AddField(group, u"WMAEncoderScript"_s, u"&Encoder-Skript"_s, new QLineEdit,
                        u"Das Programm, das WMA-Dateien macht, mit vollständigem Pfad"_s);
