@@ -133,8 +133,7 @@ class SongChanges {
         batch_.Settle();
         const TID3Tag* after = database_.Songs().Find(other.Song);
         if (after != nullptr && after->FileName == other.File)
-            MoveTo({.Song = other.Song, .Record = *after},
-                   RenameTarget(database_, NameInsteadOf(other), *after));
+            MoveTo({.Song = other.Song, .Record = *after}, NameAfter(other, *after));
         if (!restore) return;
         batch_.Settle();
         after = database_.Songs().Find(other.Song);
@@ -233,6 +232,14 @@ class SongChanges {
         const QString ending = other.File.mid(other.File.lastIndexOf(u'.'));
         const qsizetype dot = other.Source.lastIndexOf(u'.');
         return (dot > LastSeparator(other.Source) ? other.Source.left(dot) : other.Source) + ending;
+    }
+
+    // By the rules for names. Another file that has the song's own name is not asked about: the number that
+    // tells the two apart stays.
+    QString NameAfter(const SongSubstitute& other, const TID3Tag& record) {
+        const QString own = NameInsteadOf(other);
+        const QString name = RenameTarget(database_, own, record);
+        return name == own && IsTaken(own) ? record.FileName : name;
     }
 
     void RemoveUnused(const QString& file) {
