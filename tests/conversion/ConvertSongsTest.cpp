@@ -96,6 +96,15 @@ TEST_F(ConvertSongsTest, InPlaceTheSongGoesOnWithItsNewFileAndIsTakenBack) {
     EXPECT_EQ(Song(small).FileName, folder_.Path(u"zwei.mp3"_s));
 }
 
+TEST_F(ConvertSongsTest, TwoOfOneNameGetANumberAndNothingIsAsked) {
+    database_.SetRenameAndMoveMP3s(false);
+    Add(u"lied.wav"_s);
+    Add(u"lied.ogg"_s);
+    EXPECT_EQ(ConvertSongs(database_, AllSongs(database_), {.Place = ConversionPlace::InPlace}).Replaced, 2);
+    EXPECT_EQ(Sounds(), (QStringList{u"lied (2).mp3"_s, u"lied.mp3"_s}));
+    EXPECT_EQ(dialogs_.Questions, QStringList());
+}
+
 TEST_F(ConvertSongsTest, BesideAndInAFolderTheCollectionStaysAsItIs) {
     const SongHandle a = Add(u"a.wav"_s);
     const TID3Tag before = Song(a);
