@@ -17,7 +17,7 @@ class ConversionTargets {
     QString Instead(const QString& path);
 
  private:
-    // `isOwn`: a file that is there and has the name makes way to a number, too.
+    // Where the name would be `own`, any file that has it makes way to a number, too.
     QString Free(const QString& base, const QString& own);
 
     QString extension_;
