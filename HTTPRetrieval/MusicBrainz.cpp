@@ -5,6 +5,7 @@
 #include <QJsonObject>
 #include <QUrl>
 #include <algorithm>
+#include <cmath>
 
 using namespace Qt::StringLiterals;
 
@@ -42,7 +43,7 @@ QString QueryOf(const QString& text) {
 QString ArtistOf(const QJsonObject& owner) {
     QString artist;
     const QJsonArray credits = owner["artist-credit"_L1].toArray();
-    for (const QJsonValue& credit : credits)
+    for (const auto& credit : credits)
         artist += credit["name"_L1].toString() + credit["joinphrase"_L1].toString();
     return artist;
 }
@@ -70,7 +71,7 @@ int TrackOf(const QJsonObject& release) {
 int SecondsOf(const QJsonValue& milliseconds) {
     constexpr double kSecond = 1000;
     const double seconds = milliseconds.toDouble() / kSecond;
-    return seconds > 0 && seconds <= kMostSeconds ? static_cast<int>(seconds + 0.5) : 0;
+    return seconds > 0 && seconds <= kMostSeconds ? static_cast<int>(std::lround(seconds)) : 0;
 }
 
 void AddHits(const QJsonObject& recording, std::vector<SearchHit>& hits) {
@@ -83,7 +84,7 @@ void AddHits(const QJsonObject& recording, std::vector<SearchHit>& hits) {
     const QJsonArray releases = recording["releases"_L1].toArray();
     if (releases.isEmpty()) hits.push_back(hit);
     const auto first = static_cast<std::ptrdiff_t>(hits.size());
-    for (const QJsonValue& value : releases) {
+    for (const auto& value : releases) {
         const QJsonObject release = value.toObject();
         hit.Album = release["title"_L1].toString();
         hit.Release = release["id"_L1].toString();
