@@ -56,8 +56,11 @@ QComboBox* AddBitRate(QFormLayout& form, int current) {
 std::vector<Choice> Qualities() {
     constexpr int kUsualRates[] = {245, 225, 190, 175, 165, 130, 115, 100, 85, 65};  // kbit/s of stereo music
     std::vector<Choice> choices;
-    for (int quality = 0; quality < 10; ++quality)
-        choices.push_back({u"V%1 (etwa %2 kbit/s)"_s.arg(quality).arg(kUsualRates[quality]), quality});
+    choices.reserve(std::size(kUsualRates));
+    for (const int rate : kUsualRates) {
+        const int quality = static_cast<int>(choices.size());
+        choices.push_back({u"V%1 (etwa %2 kbit/s)"_s.arg(quality).arg(rate), quality});
+    }
     return choices;
 }
 
