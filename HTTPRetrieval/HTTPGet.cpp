@@ -10,6 +10,7 @@
 #include "CommonRUKTools/CodePage.h"
 #include "CommonRUKTools/CommandRunner.h"
 #include "HTTPRetrieval/HTTPWorker.h"
+#include "HTTPRetrieval/WebAddress.h"
 
 using namespace Qt::StringLiterals;
 
@@ -42,11 +43,6 @@ class Mailbox {
 QUrl UrlOf(QString address) {
     static const QRegularExpression loose(u"%(?![0-9A-Fa-f]{2})"_s);
     return QUrl(address.replace(loose, u"%25"_s));
-}
-
-bool IsWebAddress(const QUrl& url) {
-    return url.isValid() && !url.host().isEmpty() &&
-           (url.scheme() == "http"_L1 || url.scheme() == "https"_L1);
 }
 
 }  // namespace

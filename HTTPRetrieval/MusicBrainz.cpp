@@ -7,6 +7,8 @@
 #include <algorithm>
 #include <cmath>
 
+#include "HTTPRetrieval/WebAddress.h"
+
 using namespace Qt::StringLiterals;
 
 namespace {
@@ -14,13 +16,6 @@ namespace {
 constexpr int kMostRecordings = 50;
 constexpr int kMostTracks = 9999;
 constexpr qint64 kMostSeconds = 0xFFFF;  // that a record can hold
-
-QString WithoutSlash(QString address) {
-    address = address.trimmed();
-    while (address.endsWith(u'/'))
-        address.chop(1);
-    return address;
-}
 
 // The query language gives these characters a meaning of their own.
 QString Plain(const QString& words) {
@@ -102,7 +97,7 @@ void AddHits(const QJsonObject& recording, std::vector<SearchHit>& hits) {
 }  // namespace
 
 QString MusicBrainzUrl(const QString& address, const QString& query) {
-    return WithoutSlash(address) + u"/ws/2/recording?fmt=json&limit=%1&query="_s.arg(kMostRecordings) +
+    return AddressBase(address) + u"/ws/2/recording?fmt=json&limit=%1&query="_s.arg(kMostRecordings) +
            QString::fromLatin1(QUrl::toPercentEncoding(QueryOf(query)));
 }
 
@@ -117,6 +112,6 @@ std::optional<std::vector<SearchHit>> ReadMusicBrainz(const QByteArray& json) {
 }
 
 QString CoverUrl(const QString& address, const QString& release) {
-    return WithoutSlash(address) + u"/release/"_s + QString::fromLatin1(QUrl::toPercentEncoding(release)) +
+    return AddressBase(address) + u"/release/"_s + QString::fromLatin1(QUrl::toPercentEncoding(release)) +
            u"/front-500"_s;
 }

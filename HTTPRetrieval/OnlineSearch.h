@@ -45,6 +45,8 @@ class OnlineSearch {
 
     // May wait a moment, where the service wants that.
     void Ask(const OnlineServices& services, const QString& query);
+    // That was asked last.
+    SearchService Service() const { return service_; }
     bool IsRunning() const { return get_.IsRunning() || later_.isActive(); }
 
  private:

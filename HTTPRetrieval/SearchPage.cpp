@@ -1,5 +1,7 @@
 #include "HTTPRetrieval/SearchPage.h"
 
+#include "HTTPRetrieval/WebAddress.h"
+
 using namespace Qt::StringLiterals;
 
 namespace {
@@ -27,11 +29,8 @@ QString Escaped(const QString& query) {
 }  // namespace
 
 QString SearchPageUrl(const QString& host, const QString& query) {
-    QString address = host.trimmed();
-    if (!address.contains(u"://"_s)) address.prepend(u"http://"_s);
-    while (address.endsWith(u'/'))
-        address.chop(1);
-    return address + u"/list/searches.php?searchType=0&searchStr="_s + Escaped(query);
+    const QString protocol = host.contains(u"://"_s) ? QString() : u"http://"_s;
+    return protocol + AddressBase(host) + u"/list/searches.php?searchType=0&searchStr="_s + Escaped(query);
 }
 
 std::optional<SearchHit> SearchPage::Next() {

@@ -3,6 +3,7 @@
 #include "CommonRUKTools/CommandDispatcher.h"
 #include "MusicManagment/database/Command.h"
 #include "MusicManagment/database/batches/BatchReport.h"
+#include "app/SongChoice.h"
 #include "app/dialogs/ConversionDialog.h"
 #include "app/views/SongListWidget.h"
 #include "app/views/WindowSettings.h"
@@ -16,16 +17,9 @@ ConversionCommands::ConversionCommands(TMusicDatabase& database, SongListWidget&
         handlers_ += database_.Commands().Handle(id, {.Run = [this] { Convert(); }});
 }
 
-BatchSongs ConversionCommands::Marked() const {
-    ViewSelection selection{.Marked = list_.ChosenHandles()};
-    if (const SongIndex focused = list_.FocusedSong(); focused >= 0)
-        selection.Selected = database_.Songs().HandleOf(focused);
-    return selection.Marked.empty() ? BatchSongs() : MarkedSongs(selection);
-}
-
 void ConversionCommands::Convert() {
     if (database_.Count() == 0) return;
-    const BatchSongs marked = Marked();
+    const BatchSongs marked = MarkedIn(database_, list_);
     ConversionSettings& stored = database_.Conversion();
     ConversionChoice choice{
         .Range = BatchRange::Marked,

@@ -16,7 +16,6 @@ class ConversionCommands : public SettingsClient {
 
  private:
     void Convert();
-    BatchSongs Marked() const;
 
     TMusicDatabase& database_;
     SongListWidget& list_;

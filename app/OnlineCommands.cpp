@@ -78,7 +78,7 @@ void OnlineCommands::Search() {
 void OnlineCommands::Show(HitSource hits) {
     Notice(QString());
     auto* form = new OnlineSearchForm(std::move(hits),
-                                      services_.Service == ssPage ? OnlineSearchForm::Details::ArtistAndTitle
+                                      search_.Service() == ssPage ? OnlineSearchForm::Details::ArtistAndTitle
                                                                   : OnlineSearchForm::Details::Album,
                                       &window_);
     form->setAttribute(Qt::WA_DeleteOnClose);

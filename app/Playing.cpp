@@ -4,6 +4,7 @@
 #include <QMainWindow>
 #include <QMenu>
 #include <QMenuBar>
+#include <QScopeGuard>
 #include <QSet>
 #include <QTimer>
 #include <algorithm>
@@ -310,6 +311,7 @@ void Playing::OpenPlayListLater(const QString& path) {
     if (std::exchange(opensList_, true))
         throw EPlayListException(u"Tunestead wartet noch auf eine Antwort zur PlayList."_s);
     QTimer::singleShot(0, listForm_, [this, path] {
+        const auto asksNoMore = qScopeGuard([this] { opensList_ = false; });
         const std::function<void(const QString&)> tell = [this](const QString& text) {
             Tell(InOneLine(text));
         };
@@ -321,7 +323,6 @@ void Playing::OpenPlayListLater(const QString& path) {
             list_.SetPlayListFileName(path);
             PlayFromStart(path);
         });
-        opensList_ = false;
     });
 }
 

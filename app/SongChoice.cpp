@@ -6,12 +6,15 @@
 
 using namespace Qt::StringLiterals;
 
-BatchSongs ChosenSongs(const TMusicDatabase& database, const SongListWidget& list) {
+BatchSongs MarkedIn(const TMusicDatabase& database, const SongListWidget& list) {
     ViewSelection selection{.Marked = list.ChosenHandles()};
     if (const SongIndex focused = list.FocusedSong(); focused >= 0)
         selection.Selected = database.Songs().HandleOf(focused);
-    if (selection.Marked.empty()) return {};
-    BatchSongs songs = MarkedSongs(selection);
+    return selection.Marked.empty() ? BatchSongs() : MarkedSongs(selection);
+}
+
+BatchSongs ChosenSongs(const TMusicDatabase& database, const SongListWidget& list) {
+    BatchSongs songs = MarkedIn(database, list);
     TellOfPassedMarks(songs);
     return songs;
 }

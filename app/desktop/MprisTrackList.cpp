@@ -62,11 +62,17 @@ std::optional<QVariantList> MprisTrackList::Call(const QString& method, const QV
              method == u"RemoveTrack"_s) {
         if (index >= 0) list_.Remove(index);
     } else if (method == u"GoTo"_s) {
-        if (index >= 0 && !list_.PlayEntry(index, {.Change = player_.ChangeOnDemand()}))
-            throw EPlayListException(u"Die Datei ist nicht verfügbar: "_s + list_.Entry(index).Name);
+        if (index >= 0) GoTo(index);
     } else
         return std::nullopt;
     return QVariantList();
+}
+
+// While the user is asked for a medium the list may change.
+void MprisTrackList::GoTo(int index) {
+    const QString name = list_.Entry(index).Name;
+    if (!list_.PlayEntry(index, {.Change = player_.ChangeOnDemand()}))
+        throw EPlayListException(u"Die Datei ist nicht verfügbar: "_s + name);
 }
 
 QVariantMap MprisTrackList::MetadataAt(int index) const {

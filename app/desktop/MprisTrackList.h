@@ -33,6 +33,7 @@ class MprisTrackList {
     QList<EntryId> Shown() const;
     QVariantMap MetadataAt(int index) const;
     QVariantList MetadataOf(const QVariant& tracks) const;
+    void GoTo(int index);
     void Add(const QVariantList& arguments);
     void TellDifference(const QList<EntryId>& now, const Signal& tell) const;
 

@@ -83,7 +83,7 @@ QString PreviewLine(const TagPreviewRow& row) {
 
 QString PreviewSummary(const TagPreview& preview, const QString& button) {
     if (preview.Songs == 0) return u"„%1“ ändert nichts."_s.arg(button);
-    const QString songs = preview.Songs == 1 ? u"1 Song"_s : u"%1 Songs"_s.arg(preview.Songs);
+    const QString songs = SongCountText(static_cast<std::size_t>(preview.Songs));
     if (preview.Renamed == 0) return u"„%1“ ändert %2 und benennt keine Datei um."_s.arg(button, songs);
     if (preview.Renamed > 1)
         return u"„%1“ ändert %2 und benennt %3 Dateien um."_s.arg(button, songs).arg(preview.Renamed);

@@ -164,6 +164,7 @@ void TID3TagForm::ShowSongs(const std::vector<SongHandle>& songs, ChosenBy by) {
 void TID3TagForm::Take(const std::vector<SongHandle>& songs) {
     stale_ = false;
     kept_.clear();
+    proposed_.clear();
     tooMany_ = songs.size() > kMostSongs;
     const auto wanted = tooMany_ ? std::vector<SongHandle>() : songs;
     if (wanted == edits_.Songs() && !edits_.Touched()) return ShowHead();

@@ -105,7 +105,7 @@ class TID3TagForm : public QDockWidget {
     QPushButton* discard_;
     std::vector<SongHandle> chosen_;  // in the list, which may be other songs than those edited
     std::vector<SongHandle> kept_;    // chosen when the user decided to go on editing
-    FieldTexts proposed_;             // the last proposal
+    FieldTexts proposed_;             // the last one for these songs
     bool stale_ = false;              // other songs were chosen while it could not be seen
     bool tooMany_ = false;
     bool asking_ = false;

@@ -3,22 +3,13 @@
 #include <QComboBox>
 #include <QFormLayout>
 #include <QLineEdit>
-#include <QUrl>
 
 #include "HTTPRetrieval/OnlineSearch.h"
 #include "HTTPRetrieval/SearchPage.h"
+#include "HTTPRetrieval/WebAddress.h"
 #include "app/desktop/Icons.h"
 
 using namespace Qt::StringLiterals;
-
-namespace {
-
-bool IsWebAddress(const QString& text) {
-    const QUrl url(text.trimmed());
-    return (url.scheme() == u"https"_s || url.scheme() == u"http"_s) && !url.host().isEmpty();
-}
-
-}  // namespace
 
 InternetPage::InternetPage()
     : OptionsPage(u"Internet"_s, ThemeIcon(u"internet-services"_s, QStyle::SP_DriveNetIcon)) {
@@ -41,13 +32,13 @@ InternetPage::InternetPage()
 
 std::optional<OptionsFault> InternetPage::Check() {
     const QString host = host_->text().trimmed();
-    if (!host.isEmpty() && !IsWebAddress(SearchPageUrl(host, {})))
+    if (!host.isEmpty() && !IsWebAddress(QUrl(SearchPageUrl(host, {}))))
         return OptionsFault{
             u"\"%1\" ist kein Rechner im Internet; erwartet wird ein Name wie musik.example."_s.arg(
                 host_->text()),
             host_};
     for (QLineEdit* field : {musicBrainz_, coverArt_})
-        if (!IsWebAddress(field->text()))
+        if (!IsWebAddress(QUrl(field->text().trimmed())))
             return OptionsFault{
                 u"\"%1\" ist keine Adresse im Internet; sie beginnt mit https://."_s.arg(field->text()),
                 field};
